@@ -1,0 +1,43 @@
+#include "LogGenerator/LogGenerator.h"
+
+#include "platform/DateText.h"
+#include "platform/Environment.h"
+
+namespace kelvo {
+
+namespace {
+constexpr std::size_t kHistoryLimit = 5;
+}
+
+LogGenerator::LogGenerator() { logLine(Level::Warning, "Creating Log object: %p", static_cast<const void*>(this)); }
+
+std::unique_ptr<LogGenerator> LogGenerator::generatorFromTechnology(std::string_view) {
+    return nullptr;  // no family is built yet
+}
+
+void LogGenerator::updateHistoryInState(Dictionary& state) {
+    ArrayRef history = state["History"].array();
+    if (!history) {
+        history = Array::make();
+        state.set("History", history);
+    } else if (history->size() >= kHistoryLimit) {
+        history->removeFirst(history->size() - (kHistoryLimit - 1));
+    }
+
+    // The list of pairs ends at the first value that is absent: without a "DisplayState" the snapshot is empty.
+    const DictionaryRef snapshot = Dictionary::make();
+    bool complete = true;
+    for (const char* key : {"DisplayState", "Display", "ExtraInfo"}) {
+        const Value& value = state[key];
+        complete = complete && static_cast<bool>(value);
+        if (complete) snapshot->set(key, value.copy());
+    }
+    if (complete) {
+        const std::string date = dateDescription(clock().now());
+        snapshot->set("Date", date);
+        snapshot->set("Description", "Snapshot (" + date + ")");
+    }
+    history->append(snapshot);
+}
+
+}  // namespace kelvo

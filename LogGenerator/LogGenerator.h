@@ -1,0 +1,41 @@
+#pragma once
+
+#include <memory>
+#include <string_view>
+
+#include "platform/Bytes.h"
+#include "platform/Value.h"
+
+namespace kelvo {
+
+/// Decodes the messages of one technology family. It keeps nothing of the decoded picture itself: that lives in the
+/// state dictionary, which outlives generators and is passed to every call.
+///
+/// The state's keys: "Template" (dictionary), "Display" (dictionary; the live values, which sections update in place),
+/// "ExtraInfo" (dictionary), "Lookup" (dictionary, CDMA only), "DisplayState" (data: the raw log since the last
+/// rebuild; cell-monitor generator: the tree as received) and "History" (array of snapshots, oldest first, at most 5).
+class LogGenerator {
+public:
+    LogGenerator();
+    virtual ~LogGenerator() = default;
+    LogGenerator(const LogGenerator&) = delete;
+    LogGenerator& operator=(const LogGenerator&) = delete;
+
+    /// Decodes one message of the log channel into the state. `data` is borrowed for the call.
+    virtual void updateState(Dictionary& state, ByteView data) = 0;
+    /// What the screens show: a tree of dictionaries, arrays and strings, or none. Records a snapshot in the history,
+    /// so it is called once per rebuild of the display.
+    virtual Value generateLogUsingState(Dictionary& state) = 0;
+    /// The command that makes the service stream this family's records.
+    virtual DictionaryRef getStartCommand() = 0;
+    /// The contents of a snapshot file.
+    virtual ArrayRef getSaveContentsFromState(Dictionary& state) = 0;
+
+    /// The generator of a technology, by one of the kPLLogChannelTechnology_ identifiers; none for any other text.
+    static std::unique_ptr<LogGenerator> generatorFromTechnology(std::string_view technology);
+
+    /// Appends a snapshot of the state to its "History" and drops the oldest beyond five.
+    static void updateHistoryInState(Dictionary& state);
+};
+
+}  // namespace kelvo

@@ -1,0 +1,33 @@
+# What a preset may vary, and the compiler settings that every target shares.
+option(KELVO_WITH_QT "Build the parts that stand on Qt: host platform, service, tools, application" ON)
+option(KELVO_TESTS "Build the tests" ON)
+option(KELVO_BENCH "Build the benchmarks" OFF)
+option(KELVO_FUZZ "Build the libFuzzer targets (clang only)" OFF)
+option(KELVO_WERROR "Treat warnings as errors" OFF)
+set(KELVO_SANITIZE "" CACHE STRING "Sanitizers for every target, as -fsanitize= takes them")
+
+set(CMAKE_CXX_STANDARD 20)
+set(CMAKE_CXX_STANDARD_REQUIRED ON)
+set(CMAKE_CXX_EXTENSIONS OFF)
+set(CMAKE_EXPORT_COMPILE_COMMANDS ON)
+set(CMAKE_POSITION_INDEPENDENT_CODE ON)
+
+if(NOT CMAKE_BUILD_TYPE)
+    set(CMAKE_BUILD_TYPE Release CACHE STRING "" FORCE)
+endif()
+
+add_compile_options(-Wall -Wextra -Wpedantic -Wconversion -Wno-sign-conversion -Wnon-virtual-dtor
+                    -Woverloaded-virtual)
+if(CMAKE_CXX_COMPILER_ID STREQUAL "GNU")
+    add_compile_options(-Wno-restrict)  # GCC 12 sees overlaps in std::string's operator+ that are not there
+endif()
+if(KELVO_WERROR)
+    add_compile_options(-Werror)
+endif()
+if(KELVO_SANITIZE)
+    add_compile_options(-fsanitize=${KELVO_SANITIZE} -fno-omit-frame-pointer -fno-sanitize-recover=all)
+    add_link_options(-fsanitize=${KELVO_SANITIZE})
+endif()
+
+# Headers are included by their path from the root: "platform/Value.h".
+include_directories(${CMAKE_SOURCE_DIR})

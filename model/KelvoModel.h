@@ -1,0 +1,77 @@
+#pragma once
+
+#include <functional>
+#include <memory>
+#include <string>
+#include <vector>
+
+#include "LogGenerator/LogGenerator.h"
+#include "model/KelvoModelNode.h"
+#include "platform/MainQueue.h"
+#include "platform/MessagePorts.h"
+#include "platform/Telephony.h"
+
+namespace kelvo {
+
+/// The one live monitor between the program and the baseband's log stream: owns the two ports of the log channel, picks
+/// the generator by the technology the modem speaks, feeds it every message, and every two seconds tells the screens
+/// when there is something new. Main queue only; the technology query blocks it for at most two seconds.
+class KelvoModel {
+public:
+    /// The name of the local port on which the service delivers to the application.
+    static constexpr const char* kLogChannelPortName = "com.zorvik.BasebandStateReport.LogChannel";
+
+    /// What the model stands on; the references outlive it.
+    struct Services {
+        MainQueue& queue;
+        MessagePorts& ports;
+        TelephonyClient& telephony;
+        /// Runs on the main queue when a tick found new data.
+        std::function<void()> updateViewControllerFromModel;
+        /// The application's port name; another program that watches beside it brings its own.
+        std::string portName = kLogChannelPortName;
+    };
+
+    explicit KelvoModel(Services services);
+    ~KelvoModel();
+    KelvoModel(const KelvoModel&) = delete;
+    KelvoModel& operator=(const KelvoModel&) = delete;
+
+    /// Tears the ports down and starts again. Never fails: a start that does is tried again every five seconds.
+    void restartMonitor();
+    /// Starts unless the monitor runs already.
+    void startMonitor();
+    /// One tick of the refresh timer.
+    void refresh();
+    void refresh(const Value& ignored);
+
+    /// True while both ports are there.
+    bool isConnected() const;
+    /// The root of the display tree, built when it is not cached; none while there is no generator.
+    NodeRef topLevelNodes();
+    /// The node at `path`; none when the tree has no such node.
+    NodeRef nodeAtPath(const std::string& path);
+    /// Hands one message of the log channel to the generator.
+    void updateWithData(ByteView data);
+    /// The contents of a snapshot file; none while there is no generator.
+    ArrayRef getSaveContents();
+
+private:
+    bool createPorts();
+    void destroyPorts();
+    void configureGenerator();
+    void retry();
+
+    const Services _services;
+    std::unique_ptr<LocalPort> _recvPort;
+    std::unique_ptr<RemotePort> _sendPort;
+    std::unique_ptr<RepeatingTimer> _displayUpdateTimer;  // its presence means that the monitor runs
+    const DictionaryRef _state = Dictionary::make();      // outlives every restart and every generator
+    NodeRef _nodes;
+    NodesByPath _nodesByPath;  // built with _nodes and empty without
+    std::unique_ptr<LogGenerator> _logGenerator;
+    bool _updated = false;
+    std::shared_ptr<bool> _alive = std::make_shared<bool>(true);  // tasks on the queue outlive the model
+};
+
+}  // namespace kelvo

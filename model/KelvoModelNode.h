@@ -1,0 +1,45 @@
+#pragma once
+
+#include <memory>
+#include <string>
+#include <string_view>
+#include <unordered_map>
+#include <vector>
+
+#include "platform/Value.h"
+
+namespace kelvo {
+
+class KelvoModelNode;
+using NodeRef = std::shared_ptr<const KelvoModelNode>;
+using NodesByPath = std::unordered_map<std::string, NodeRef>;
+
+/// One named node of the display tree. Immutable once built; panes hold on to nodes of an older tree while they need
+/// them.
+class KelvoModelNode {
+public:
+    using Children = std::vector<NodeRef>;
+
+    explicit KelvoModelNode(std::string name) : _name(std::move(name)) {}
+    virtual ~KelvoModelNode() = default;
+    KelvoModelNode(const KelvoModelNode&) = delete;
+    KelvoModelNode& operator=(const KelvoModelNode&) = delete;
+
+    const std::string& displayName() const { return _name; }
+    /// The children in their order; null for a leaf.
+    virtual const Children* childNodes() const { return nullptr; }
+    /// The value shown; null for an inner node.
+    virtual const std::string* value() const { return nullptr; }
+
+    /// Builds the tree of a display object: root "Kelvo" at "/". Every node is stored in `nodesByPath` under its path;
+    /// of two nodes with one path the later stays.
+    static NodeRef makeTreeFromObject(const Value& object, NodesByPath& nodesByPath);
+
+private:
+    std::string _name;
+};
+
+/// `parent` extended by `name` as a path component: "/" and "A" give "/A", "/A" and "B" give "/A/B".
+std::string pathByAppending(std::string_view parent, std::string_view name);
+
+}  // namespace kelvo

@@ -1,0 +1,32 @@
+#include "platform/DirectoryResources.h"
+
+#include <algorithm>
+#include <fstream>
+#include <iterator>
+
+#include "platform/PropertyList.h"
+
+namespace kelvo {
+
+Result<DictionaryRef> DirectoryResources::dictionary(std::string_view name) const {
+    const std::filesystem::path path = _directory / (std::string(name) + ".plist");
+    std::ifstream file(path, std::ios::binary);
+    if (!file) return Failure{"no resource " + path.string()};
+    const Bytes bytes{std::istreambuf_iterator<char>(file), std::istreambuf_iterator<char>()};
+    Result<Value> value = readPropertyList(bytes);
+    if (!value) return Failure{path.string() + ": " + value.error().reason};
+    if (!value->dictionary()) return Failure{path.string() + ": not a dictionary"};
+    return value->dictionary();
+}
+
+std::vector<std::string> DirectoryResources::pathsOfType(std::string_view type) const {
+    std::vector<std::string> paths;
+    std::error_code unreadable;  // a missing directory holds nothing
+    for (const auto& entry : std::filesystem::directory_iterator(_directory, unreadable)) {
+        if (entry.path().extension() == "." + std::string(type)) paths.push_back(entry.path().string());
+    }
+    std::sort(paths.begin(), paths.end());
+    return paths;
+}
+
+}  // namespace kelvo

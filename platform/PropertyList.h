@@ -1,0 +1,22 @@
+#pragma once
+
+#include "platform/Bytes.h"
+#include "platform/Result.h"
+#include "platform/Value.h"
+
+namespace kelvo {
+
+/// Property lists as bytes. Readers treat their input as hostile: nesting deeper than `kMaxPropertyListDepth`, cyclic or
+/// dangling object references, lying counts and unknown encodings are failures with a reason, never a crash; no
+/// external entity is followed.
+inline constexpr int kMaxPropertyListDepth = 512;
+
+/// Reads a property list in any encoding: XML, binary ("bplist00") or the old text form. The result is never none.
+Result<Value> readPropertyList(ByteView data);
+
+/// Encodes `value` as XML: the XML declaration and <plist version="1.0">, no document type. Fails when a none value
+/// stands anywhere in the tree or the tree is deeper than readers accept. A character that XML 1.0 cannot carry, and a
+/// byte that is not UTF-8, is written as U+FFFD.
+Result<Bytes> writeXmlPropertyList(const Value& value);
+
+}  // namespace kelvo

@@ -1,0 +1,37 @@
+#pragma once
+
+#include <string>
+#include <utility>
+#include <variant>
+
+namespace kelvo {
+
+/// Why something failed, in one line for a person.
+struct Failure {
+    std::string reason;
+};
+
+/// Either the value that was asked for or the error that prevented it.
+/// `value()` and `error()` may only be called on the matching kind.
+template <class T, class E = Failure>
+class Result {
+public:
+    Result(T value) : _content(std::in_place_index<0>, std::move(value)) {}
+    Result(E error) : _content(std::in_place_index<1>, std::move(error)) {}
+
+    explicit operator bool() const { return _content.index() == 0; }
+    T& value() & { return std::get<0>(_content); }
+    const T& value() const& { return std::get<0>(_content); }
+    T&& value() && { return std::get<0>(std::move(_content)); }
+    const E& error() const { return std::get<1>(_content); }
+
+    T& operator*() { return value(); }
+    const T& operator*() const { return value(); }
+    T* operator->() { return &value(); }
+    const T* operator->() const { return &value(); }
+
+private:
+    std::variant<T, E> _content;
+};
+
+}  // namespace kelvo

@@ -1,7 +1,9 @@
 #include "LogGenerator/LogGenerator.h"
 
+#include "LogGenerator/LTE/LTELogGenerator.h"
 #include "platform/DateText.h"
 #include "platform/Environment.h"
+#include "platform/TelephonyConstants.h"
 
 namespace kelvo {
 
@@ -11,8 +13,9 @@ constexpr std::size_t kHistoryLimit = 5;
 
 LogGenerator::LogGenerator() { logLine(Level::Warning, "Creating Log object: %p", static_cast<const void*>(this)); }
 
-std::unique_ptr<LogGenerator> LogGenerator::generatorFromTechnology(std::string_view) {
-    return nullptr;  // no family is built yet
+std::unique_ptr<LogGenerator> LogGenerator::generatorFromTechnology(std::string_view technology) {
+    if (technology == kPLLogChannelTechnology_Oskra_LTE) return LTELogGenerator::generator();
+    return nullptr;
 }
 
 void LogGenerator::updateHistoryInState(Dictionary& state) {

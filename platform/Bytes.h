@@ -17,8 +17,6 @@ inline ByteView bytesOf(std::string_view text) {
     return {reinterpret_cast<const std::uint8_t*>(text.data()), text.size()};
 }
 
-inline std::string_view textOf(ByteView bytes) {
-    return {reinterpret_cast<const char*>(bytes.data()), bytes.size()};
-}
+inline std::string_view textOf(ByteView bytes) { return {reinterpret_cast<const char*>(bytes.data()), bytes.size()}; }
 
 }  // namespace kelvo

@@ -13,7 +13,8 @@ DictionaryRef Dictionary::make(std::initializer_list<std::pair<std::string_view,
 std::size_t Dictionary::indexOf(Key key) const {
     if (_index) {
         const auto [first, last] = _index->equal_range(key.hash());
-        const auto at = std::find_if(first, last, [&](const auto& hit) { return _entries[hit.second].key == key.text(); });
+        const auto at =
+            std::find_if(first, last, [&](const auto& hit) { return _entries[hit.second].key == key.text(); });
         return at != last ? at->second : kNotFound;
     }
     for (std::size_t i = 0; i < _hashes.size(); ++i) {
@@ -58,6 +59,11 @@ void Dictionary::clear() {
     _entries.clear();
     _hashes.clear();
     _index.reset();
+}
+
+void Dictionary::reserve(std::size_t entries) {
+    _entries.reserve(entries);
+    _hashes.reserve(entries);
 }
 
 void Dictionary::buildIndex() {

@@ -44,6 +44,7 @@ public:
     /// Removes `key` and keeps the order of the others; false when it was not there.
     bool remove(Key key);
     void clear();
+    void reserve(std::size_t entries);
 
     DictionaryRef copy() const;  ///< deep
     friend bool operator==(const Dictionary& a, const Dictionary& b);
@@ -56,7 +57,7 @@ private:
     void buildIndex();
 
     std::vector<Entry> _entries;
-    std::vector<std::uint32_t> _hashes;                      // of the entries' keys, side by side
+    std::vector<std::uint32_t> _hashes;  // of the entries' keys, side by side
     using Index = std::unordered_multimap<std::uint32_t, std::size_t>;
     std::unique_ptr<Index> _index;  // hash to position, once past kScanLimit
 };

@@ -19,6 +19,7 @@ struct Environment {
     const Clock* clock = nullptr;          ///< null: the machine's clock
     const Resources* resources = nullptr;  ///< null: no resource is found
     std::FILE* standardOutput = nullptr;   ///< null: `printLine` is silent
+    std::string_view version = {};         ///< of the application; empty: it has none
 
     /// The environment in force.
     static const Environment& current();

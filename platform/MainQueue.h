@@ -23,7 +23,8 @@ public:
     virtual void post(Task task) = 0;
     /// Runs `task` once, `delay` from now.
     virtual void postAfter(std::chrono::nanoseconds delay, Task task) = 0;
-    /// Runs `task` every `interval`, first one interval from now, until the timer is destroyed. The task may destroy it.
+    /// Runs `task` every `interval`, first one interval from now, until the timer is destroyed. The task may destroy
+    /// it.
     virtual std::unique_ptr<RepeatingTimer> repeat(std::chrono::nanoseconds interval, Task task) = 0;
 };
 

@@ -16,7 +16,9 @@ public:
     using nanoseconds = std::chrono::nanoseconds;
 
     void post(Task task) override { _ready.push_back(std::move(task)); }
-    void postAfter(nanoseconds delay, Task task) override { _delayed.push_back({_now + delay, _order++, std::move(task)}); }
+    void postAfter(nanoseconds delay, Task task) override {
+        _delayed.push_back({_now + delay, _order++, std::move(task)});
+    }
     std::unique_ptr<RepeatingTimer> repeat(nanoseconds interval, Task task) override {
         auto timer = std::make_unique<Timer>();
         armTimer(interval, std::move(task), timer->alive);
@@ -37,9 +39,10 @@ public:
         run();
         const nanoseconds end = _now + by;
         while (true) {
-            const auto next = std::min_element(_delayed.begin(), _delayed.end(), [](const Delayed& a, const Delayed& b) {
-                return std::pair(a.due, a.order) < std::pair(b.due, b.order);
-            });
+            const auto next =
+                std::min_element(_delayed.begin(), _delayed.end(), [](const Delayed& a, const Delayed& b) {
+                    return std::pair(a.due, a.order) < std::pair(b.due, b.order);
+                });
             if (next == _delayed.end() || next->due > end) break;
             _now = next->due;
             Task task = std::move(next->task);

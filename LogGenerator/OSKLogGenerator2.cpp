@@ -1,0 +1,178 @@
+#include "LogGenerator/OSKLogGenerator2.h"
+
+#include <algorithm>
+#include <charconv>
+#include <set>
+#include <stdexcept>
+
+#include "LogGenerator/Framing.h"
+#include "LogGenerator/UnknownDataException.h"
+#include "platform/Environment.h"
+
+namespace kelvo {
+
+namespace {
+
+void collectKeys(const Value& node, std::set<std::string_view>& keys) {
+    if (node.array()) {
+        for (const Value& element : *node.array()) collectKeys(element, keys);
+    } else if (node.dictionary()) {
+        for (const auto& [key, value] : *node.dictionary()) {
+            keys.insert(key);
+            collectKeys(value, keys);
+        }
+    }
+}
+
+}  // namespace
+
+OSKLogGenerator2::OSKLogGenerator2(std::string name, std::unique_ptr<ClassIndex> cIndexObj)
+    : OSKLogGenerator2(announce(std::move(cIndexObj)), std::move(name)) {}
+
+// The line comes before the base class's own, so it is written while the arguments are made.
+OSKLogGenerator2::Announced OSKLogGenerator2::announce(std::unique_ptr<ClassIndex> classIndex) {
+    logLine(Level::Error, "Creating OSKLogGenerator2 object with %p", static_cast<const void*>(classIndex.get()));
+    return {std::move(classIndex)};
+}
+
+OSKLogGenerator2::OSKLogGenerator2(Announced announced, std::string name)
+    : pListName(std::move(name)), cIndex(std::move(announced.classIndex)) {
+    logLine(Level::Error, "Class Index: %ld", 1L);  // its owners: this generator alone
+}
+
+OSKLogGenerator2::~OSKLogGenerator2() {
+    logLine(Level::Warning, "OSK_GSMLogGenerator is destructed %p", static_cast<const void*>(this));
+}
+
+void OSKLogGenerator2::updateState(Dictionary& state, ByteView data) {
+    getDisplayFromState(state);
+    updateWithData(data);
+    _binData.insert(_binData.end(), data.begin(), data.end());
+}
+
+void OSKLogGenerator2::updateWithData(ByteView data) {
+    if (data.size() < kMinimumMessageSize) return;
+    const ByteView packet = stripPrefix(data);
+    const std::uint8_t type = packet.front();
+    if (type != 1 && type < 255) {
+        logLine(Level::Error, "Invalid log type: %x. Dropping.", static_cast<unsigned>(type));
+        return;
+    }
+    const LogCode code = logCode(packet.data());
+    const CodeDictionary::Subscribers* subscribers = cIndex->getSubscribers(code);
+    if (subscribers == nullptr) return;
+    for (Base* section : *subscribers) {
+        try {
+            section->updateWithData(packet, code);
+        } catch (const LogCode_0xFF0000::UnknownDataException&) {
+            // Contained here: the section has written its error line, the others go on and the record is kept.
+        }
+    }
+}
+
+Value OSKLogGenerator2::getDisplayFromState(Dictionary& state) {
+    if (const Value& display = state["Display"]) {
+        if (display.dictionary() != _boundDisplay.dictionary()) adoptDisplay(display);
+        return display;
+    }
+    buildDisplay(state);
+    return {};
+}
+
+void OSKLogGenerator2::buildDisplay(Dictionary& state) {
+    if (!state["Template"].dictionary()) {
+        const Resources* resources = Environment::current().resources;
+        Result<DictionaryRef> loaded =
+            resources != nullptr ? resources->dictionary(pListName) : Result<DictionaryRef>(Failure{"no resources"});
+        if (!loaded) {
+            logLine(Level::Error, "Cannot load template for display");
+            return;
+        }
+        state.set("Template", *loaded);
+    }
+    logLine(Level::Warning, "Initialized class index: %p, Self: %p", static_cast<const void*>(cIndex.get()),
+            static_cast<const void*>(this));
+    cIndex->status();
+    _boundDisplay = processTemplate(state["Template"]);
+    printDict(_boundDisplay);
+    state.set("Display", _boundDisplay);
+    state.set("ExtraInfo", Dictionary::make());
+}
+
+// A display that another generator has left is taken over when it has a place for every section; one of another
+// technology stays as it is.
+void OSKLogGenerator2::adoptDisplay(const Value& display) {
+    _boundDisplay = display;
+    std::set<std::string_view> keys;
+    collectKeys(display, keys);
+    const std::vector<std::string_view> names = cIndex->getAllNames();
+    if (std::all_of(names.begin(), names.end(), [&](std::string_view name) { return keys.contains(name); })) {
+        bindSections(display);
+    }
+}
+
+void OSKLogGenerator2::bindSections(const Value& node) {
+    if (node.array()) {
+        for (const Value& element : *node.array()) bindSections(element);
+    } else if (node.dictionary()) {
+        for (const auto& [key, value] : *node.dictionary()) {
+            bindSections(value);
+            if (Base* section = cIndex->getClass(key)) section->updateSectionRef(value);
+        }
+    }
+}
+
+Value OSKLogGenerator2::processTemplate(const Value& node) {
+    if (node.string() != nullptr) return node;
+    if (node.array()) {
+        const ArrayRef processed = Array::make();
+        for (const Value& element : *node.array()) processed->append(processTemplate(element));
+        return processed;
+    }
+    if (node.dictionary()) {
+        const DictionaryRef processed = Dictionary::make();
+        for (const auto& [key, value] : *node.dictionary()) {
+            Value part = processTemplate(value);
+            if (Base* section = cIndex->getClass(key)) section->updateSectionRef(part);
+            processed->set(key, std::move(part));
+        }
+        return processed;
+    }
+    logLine(Level::Error, "Received an object of unknown type");
+    logLine(Level::Warning, "Processing the template");
+    throw std::invalid_argument("a template holds nothing but dictionaries, arrays and strings");
+}
+
+void OSKLogGenerator2::printDict(const Value& node) const {
+    if (node.array()) {
+        for (const Value& element : *node.array()) printDict(element);
+    } else if (node.dictionary()) {
+        for (const auto& [key, value] : *node.dictionary()) printDict(value);
+    } else if (node.string() == nullptr) {
+        logLine(Level::Error, "Received an object of unknown type");
+    }
+}
+
+Value OSKLogGenerator2::generateLogUsingState(Dictionary& state) {
+    Value display = getDisplayFromState(state);
+    moveBinDataInto(state);
+    updateHistoryInState(state);
+    return display;
+}
+
+DictionaryRef OSKLogGenerator2::getStartCommand() {
+    const ArrayRef ordinary = Array::make();
+    const ArrayRef extended = Array::make();
+    for (const std::string& key : cIndex->getAllLogCodes()) {
+        std::int64_t code = 0;
+        std::from_chars(key.data(), key.data() + key.size(), code);
+        if (code >= kExtendedLogCodes) {
+            extended->append(code - kExtendedLogCodes);
+        } else {
+            ordinary->append(code);
+        }
+    }
+    return Dictionary::make({{"SetState", "Streaming"}, {"SetOskraLogCodes", ordinary}, {"SetPlExtraCodes", extended}});
+}
+
+}  // namespace kelvo

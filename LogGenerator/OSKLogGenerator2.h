@@ -1,0 +1,50 @@
+#pragma once
+
+#include <memory>
+#include <string>
+
+#include "LogGenerator/ClassIndex.h"
+#include "LogGenerator/OSKLogGenerator.h"
+
+namespace kelvo {
+
+/// The generator of the technologies whose screens are described by a template and filled by sections: loads the
+/// template once, binds every section to its part of the display, and routes each packet to the sections that
+/// subscribed to its code. Subclasses choose the template's name and the class index.
+class OSKLogGenerator2 : public OSKLogGenerator {
+public:
+    /// `pListName` is the base name of a template resource of type "plist".
+    OSKLogGenerator2(std::string pListName, std::unique_ptr<ClassIndex> cIndexObj);
+    ~OSKLogGenerator2() override;
+
+    void updateState(Dictionary& state, ByteView data) override;
+    Value generateLogUsingState(Dictionary& state) override;
+    DictionaryRef getStartCommand() override;
+
+    /// Routes one message to its subscribers; a message that is no packet is dropped.
+    void updateWithData(ByteView data);
+    /// The live copy of a template node, with the sections in it bound to their parts. Throws std::invalid_argument
+    /// for anything but dictionaries, arrays and strings.
+    Value processTemplate(const Value& node);
+    /// Checks that a processed node holds nothing but dictionaries, arrays and strings.
+    void printDict(const Value& node) const;
+    /// The state's display. The call that has to build it returns none; later ones return it.
+    Value getDisplayFromState(Dictionary& state);
+
+private:
+    struct Announced {
+        std::unique_ptr<ClassIndex> classIndex;
+    };
+    static Announced announce(std::unique_ptr<ClassIndex> classIndex);
+    OSKLogGenerator2(Announced announced, std::string pListName);
+
+    void buildDisplay(Dictionary& state);
+    void adoptDisplay(const Value& display);
+    void bindSections(const Value& node);
+
+    std::string pListName;
+    std::unique_ptr<ClassIndex> cIndex;
+    Value _boundDisplay;  // the display that this generator has built or adopted
+};
+
+}  // namespace kelvo

@@ -1,0 +1,102 @@
+#include "LogGenerator/FieldTable.h"
+
+#include <gtest/gtest.h>
+
+#include <cstdio>
+
+namespace kelvo {
+namespace {
+
+std::string printed(std::int64_t raw, const Shown& shown) {
+    std::string text;
+    print(text, raw, shown);
+    return text;
+}
+
+std::string byPrintf(const char* format, double value) {
+    char text[400];
+    std::snprintf(text, sizeof text, format, value);
+    return text;
+}
+
+TEST(RecordView, ReadsBothByteOrdersAndSigns) {
+    const Bytes bytes = {0x01, 0xFE, 0xFF, 0x80};
+    const RecordView record(bytes);
+    EXPECT_EQ(record.read(0, u8), 1);
+    EXPECT_EQ(record.read(1, i8), -2);
+    EXPECT_EQ(record.read(0, u16), 0xFE01);
+    EXPECT_EQ(record.read(0, u16.bigEndian()), 0x01FE);
+    EXPECT_EQ(record.read(1, i16), -2);
+    EXPECT_EQ(record.read(0, u32), 0x80FFFE01);
+    EXPECT_EQ(record.read(0, i32), static_cast<std::int32_t>(0x80FFFE01));
+    EXPECT_EQ(record.read(0, u32.bits(25, 31)), 64);
+    EXPECT_EQ(record.read(0, u16.bit(0)), 1);
+    EXPECT_EQ(record.read(0, i16.bits(9, 15)), -1);
+}
+
+TEST(RecordView, ReadsZeroPastTheEnd) {
+    const Bytes bytes = {0x11, 0x22, 0x33};
+    const RecordView record(bytes);
+    EXPECT_EQ(record.read(2, u16), 0x33);
+    EXPECT_EQ(record.read(2, u16.bigEndian()), 0x3300);
+    EXPECT_EQ(record.read(3, u32), 0);
+    EXPECT_EQ(record.read(static_cast<std::size_t>(-1), u8), 0);
+    EXPECT_EQ(RecordView({}).read(0, u8), 0);
+}
+
+TEST(RecordEntries, RefusesAnIndexThatTheCountDoesNotCover) {
+    const RecordEntries entries(29, 6, 2);
+    EXPECT_EQ(entries.offsetOf(1), 35U);
+    EXPECT_THROW(entries.offsetOf(2), ArrayOutOfBoundsException);
+}
+
+TEST(FieldTable, PrintsWholeNumbersAsPrintfDoes) {
+    EXPECT_EQ(printed(-7, decimal), "-7");
+    EXPECT_EQ(printed(0xFFFFFFFF, asSigned), "-1");
+    EXPECT_EQ(printed(0xFFFFFFFF, asUnsigned), "4294967295");
+    EXPECT_EQ(printed(5, whole(2, -140, "%d dBm")), "-130 dBm");
+    EXPECT_EQ(printed(5, whole(1, 0, "%+d dBm")), "+5 dBm");
+    EXPECT_EQ(printed(-5, whole(1, 0, "%+d dBm")), "-5 dBm");
+    EXPECT_EQ(printed(64, whole(1, -30, "%d dBm").unless(64, "Not Present")), "Not Present");
+}
+
+TEST(FieldTable, NamesValuesAndFallsBack) {
+    static constexpr ValueTable kDense({{0, "A"}, {1, "B"}}, "Unknown");
+    static constexpr ValueTable kSparse({{6, "six"}, {255, "last"}}, "[Reserved %d]");
+    EXPECT_EQ(printed(1, label(kDense)), "B");
+    EXPECT_EQ(printed(2, label(kDense)), "Unknown");
+    EXPECT_EQ(printed(255, label(kSparse)), "last");
+    EXPECT_EQ(printed(0, label(kSparse)), "[Reserved 0]");
+    EXPECT_EQ(printed(0, flag("ON", "OFF")), "OFF");
+    EXPECT_EQ(printed(200, flag("ON", "OFF")), "ON");
+}
+
+TEST(FieldTable, PrintsEveryStepOfAnEighthAsPrintfDoes) {
+    for (std::int64_t raw = 0; raw <= 65535; ++raw) {
+        const double value = static_cast<double>(raw);
+        ASSERT_EQ(printed(raw, linear(0.25, -140.0, "%4.2f dBm")), byPrintf("%4.2f dBm", value * 0.25 - 140.0));
+        ASSERT_EQ(printed(raw, linear(0.125, -20.0, "%4.2f dB")), byPrintf("%4.2f dB", value * 0.125 - 20.0));
+        ASSERT_EQ(printed(raw, linear(0.5, -30.0, "%+.2f dB")), byPrintf("%+.2f dB", value * 0.5 - 30.0));
+        ASSERT_EQ(printed(raw, linear(0.125, -20.0, "%8.2f")), byPrintf("%8.2f", value * 0.125 - 20.0));
+    }
+}
+
+TEST(FieldTable, PrintsOtherRealNumbersAsPrintfDoes) {
+    for (std::int64_t raw = -32768; raw <= 32767; ++raw) {
+        const double value = static_cast<double>(raw);
+        ASSERT_EQ(printed(raw, linear(1.0 / 256, 0.0, "%f")), byPrintf("%f", value * (1.0 / 256)));
+        ASSERT_EQ(printed(raw, linear(0.334, -63.248, "%+.2f dBm")), byPrintf("%+.2f dBm", value * 0.334 - 63.248));
+    }
+}
+
+TEST(FieldTable, DoesNotMakeUpRowsBeyondTheEnd) {
+    static constexpr auto kCell = entry(4, {{0, u16, "ID", decimal}, {2, u16, "Level", decimal}});
+    const Bytes bytes = {0xEE, 1, 0, 2, 0, 3, 0};  // one whole entry and half of the next
+    const std::vector<Value> cells = rows(ByteView(bytes), 1, 200, kCell);
+    EXPECT_EQ(Value(std::make_shared<Array>(cells)),
+              Value(Array::make({Dictionary::make({{"ID", "1"}, {"Level", "2"}}),
+                                 Dictionary::make({{"ID", "3"}, {"Level", "0"}})})));
+}
+
+}  // namespace
+}  // namespace kelvo

@@ -94,8 +94,8 @@ TEST(FieldTable, DoesNotMakeUpRowsBeyondTheEnd) {
     const Bytes bytes = {0xEE, 1, 0, 2, 0, 3, 0};  // one whole entry and half of the next
     const std::vector<Value> cells = rows(ByteView(bytes), 1, 200, kCell);
     EXPECT_EQ(Value(std::make_shared<Array>(cells)),
-              Value(Array::make({Dictionary::make({{"ID", "1"}, {"Level", "2"}}),
-                                 Dictionary::make({{"ID", "3"}, {"Level", "0"}})})));
+              Value(Array::make(
+                  {Dictionary::make({{"ID", "1"}, {"Level", "2"}}), Dictionary::make({{"ID", "3"}, {"Level", "0"}})})));
 }
 
 }  // namespace

@@ -30,9 +30,7 @@ public:
     const Bytes& bytes() const { return _bytes; }
     LogCode code() const { return _code; }
     /// The first `size` bytes alone, the header's record length as it was.
-    Bytes cut(std::size_t size) const {
-        return {_bytes.begin(), _bytes.begin() + static_cast<std::ptrdiff_t>(size)};
-    }
+    Bytes cut(std::size_t size) const { return {_bytes.begin(), _bytes.begin() + static_cast<std::ptrdiff_t>(size)}; }
 
 private:
     Record& grow(std::size_t at, std::uint32_t value, std::size_t width) {

@@ -78,8 +78,7 @@ TEST(LTEServingCellInfo, KeepsTheOldValuesWhenARecordIsOneByteShort) {
 TEST(LTEServingCellInfo, ShowsAntennasAndStillReportsTheCode) {
     Fed<LTEServingCellInfo> section(Record(0xB0C1, 22).u8(20, 2));
     EXPECT_EQ(section["Num Tx Antennas"], "2");
-    EXPECT_EQ(section.log(),
-              (Lines{{4, "LTE Serving Cell Info"}, {3, "Received an unknown log message: 45249"}}));
+    EXPECT_EQ(section.log(), (Lines{{4, "LTE Serving Cell Info"}, {3, "Received an unknown log message: 45249"}}));
     section.clearLog();
     section.feed(Record(0xB0C1, 21).u8(20, 4));
     EXPECT_EQ(section["Num Tx Antennas"], "2");
@@ -88,20 +87,19 @@ TEST(LTEServingCellInfo, ShowsAntennasAndStillReportsTheCode) {
 
 TEST(LTEServingCellInfo, ReportsACodeOfOthers) {
     Fed<LTEServingCellInfo> section(Record(0xB179, 40));
-    EXPECT_EQ(section.log(),
-              (Lines{{4, "LTE Serving Cell Info"}, {3, "Received an unknown log message: 45433"}}));
+    EXPECT_EQ(section.log(), (Lines{{4, "LTE Serving Cell Info"}, {3, "Received an unknown log message: 45433"}}));
     EXPECT_TRUE(section.part().dictionary()->empty());
 }
 
 TEST(LTEServingCellInfo, TakesTheFirstServingLteCellOfTheCellArray) {
-    Fed<LTEServingCellInfo> section(cellArray(
-        cell("GSM", "Serving", entry("kPLCellMonitorTAC", number(1))) + "<dict/>" +
-        cell("LTE", "Neighbor", entry("kPLCellMonitorTAC", number(2))) +
-        cell("LTE", "Serving",
-             entry("kPLCellMonitorTAC", number(4566)) + entry("kPLCellMonitorCellId", number(-5)) +
-                 entry("kPLCellMonitorPID", number(301)) + entry("kPLCellMonitorBandInfo", number(17)) +
-                 entry("kPLCellMonitorUARFCN", number(5780))) +
-        cell("LTE", "Serving", entry("kPLCellMonitorTAC", number(3)))));
+    Fed<LTEServingCellInfo> section(
+        cellArray(cell("GSM", "Serving", entry("kPLCellMonitorTAC", number(1))) + "<dict/>" +
+                  cell("LTE", "Neighbor", entry("kPLCellMonitorTAC", number(2))) +
+                  cell("LTE", "Serving",
+                       entry("kPLCellMonitorTAC", number(4566)) + entry("kPLCellMonitorCellId", number(-5)) +
+                           entry("kPLCellMonitorPID", number(301)) + entry("kPLCellMonitorBandInfo", number(17)) +
+                           entry("kPLCellMonitorUARFCN", number(5780))) +
+                  cell("LTE", "Serving", entry("kPLCellMonitorTAC", number(3)))));
     EXPECT_EQ(section["Tracking Area Code"], "4566");
     EXPECT_EQ(section["Cell Identity"], "-5");
     EXPECT_EQ(section["Physical Cell ID"], "301");
@@ -127,8 +125,7 @@ TEST(LTEServingCellInfo, SaysWhichValueACellLacksAndShowsTheOthers) {
 }
 
 TEST(LTEServingCellInfo, TakesItsOwnFrequenciesOverTheCellArraysUarfcn) {
-    Fed<LTEServingCellInfo> section(
-        cellArray(cell("LTE", "Serving", entry("kPLCellMonitorUARFCN", number(5780)))));
+    Fed<LTEServingCellInfo> section(cellArray(cell("LTE", "Serving", entry("kPLCellMonitorUARFCN", number(5780)))));
     ASSERT_EQ(section["UARFCN"], "5780");
     section.feed(Record(0xB0C2, 38));
     EXPECT_EQ(section["UARFCN"], "(absent)");

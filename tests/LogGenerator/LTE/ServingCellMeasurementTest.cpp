@@ -56,11 +56,8 @@ TEST(ServingCellMeasurement, ShowsTheLowestValuesOfAnEmptyRecord) {
 }
 
 TEST(ServingCellMeasurement, KeepsNeighbouringBitFieldsApart) {
-    Fed<ServingCellMeasurement> section(Record(0xB17F, 33)
-                                            .u16(19, 0xFFFF)
-                                            .u32(21, 0xFFFFFFFF)
-                                            .u32(25, 0xFFFFFFFF)
-                                            .u32(29, 0xFFFFFFFF));
+    Fed<ServingCellMeasurement> section(
+        Record(0xB17F, 33).u16(19, 0xFFFF).u32(21, 0xFFFFFFFF).u32(25, 0xFFFFFFFF).u32(29, 0xFFFFFFFF));
     EXPECT_EQ(section["Physical Cell ID"], "511");
     EXPECT_EQ(section["Serving Layer Priority"], "15");
     EXPECT_EQ(section["Measured RSRP"], "-12.25 dBm");
@@ -79,8 +76,7 @@ TEST(ServingCellMeasurement, KeepsNeighbouringBitFieldsApart) {
 }
 
 TEST(ServingCellMeasurement, SaysWhatTheNetworkDoesNotSend) {
-    Fed<ServingCellMeasurement> section(
-        Record(0xB17F, 33).u32(25, bits(64, 15)).u32(29, bits(32, 13) | bits(32, 19)));
+    Fed<ServingCellMeasurement> section(Record(0xB17F, 33).u32(25, bits(64, 15)).u32(29, bits(32, 13) | bits(32, 19)));
     EXPECT_EQ(section["P_Max"], "Not Present");
     EXPECT_EQ(section["S Intra Search"], "Not Present");
     EXPECT_EQ(section["S Non Intra Search"], "Not Present");

@@ -1,6 +1,7 @@
 #include "model/KelvoModelNode.h"
 
 #include <algorithm>
+#include <optional>
 
 #include "LogGenerator/ArrayLock.h"
 #include "model/KelvoModelLeafNode.h"
@@ -71,9 +72,12 @@ private:
 
     KelvoModelNode::Children childrenOf(const Array& array) {
         KelvoModelNode::Children children;
-        const ArrayLock::Held lock;
+        // The outermost array takes the lock for all: it counts its depth in 8 bits, and a display can nest deeper.
+        std::optional<ArrayLock::Held> lock;
+        if (_openArrays++ == 0) lock.emplace();
         children.reserve(array.size());
         for (const Value& element : array) children.push_back(buildChild(std::to_string(children.size()), element));
+        --_openArrays;
         return children;
     }
 
@@ -88,6 +92,7 @@ private:
     NodesByPath& _nodesByPath;
     std::string _path = "/";
     int _depth = 0;
+    int _openArrays = 0;
 };
 
 }  // namespace

@@ -6,6 +6,7 @@
 #include <unordered_map>
 #include <vector>
 
+#include "platform/PropertyList.h"
 #include "platform/Value.h"
 
 namespace kelvo {
@@ -37,7 +38,7 @@ public:
     static NodeRef makeTreeFromObject(const Value& object, NodesByPath& nodesByPath);
 
     /// How many dictionaries and arrays may stand inside one another; no property list that is read nests deeper.
-    static constexpr int kMaxDepth = 512;
+    static constexpr int kMaxDepth = kMaxPropertyListDepth;
 
 private:
     std::string _name;

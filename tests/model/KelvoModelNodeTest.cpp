@@ -1,5 +1,8 @@
 #include <gtest/gtest.h>
 
+#include <thread>
+
+#include "LogGenerator/ArrayLock.h"
 #include "model/KelvoModelNode.h"
 
 namespace kelvo {
@@ -177,6 +180,13 @@ TEST_P(DeepDisplay, EndsInAnUnknownLeafBeyond) {
     int levels = 0;
     EXPECT_EQ(innermostValue(KelvoModelNode::makeTreeFromObject(nest.outermost(), nodes), levels), "(unknown)");
     EXPECT_EQ(levels, 512);
+}
+
+TEST_P(DeepDisplay, LeavesTheArrayLockFree) {
+    const Nest nest(300, GetParam());
+    NodesByPath nodes;
+    KelvoModelNode::makeTreeFromObject(nest.outermost(), nodes);
+    std::thread([] { const ArrayLock::Held held; }).join();  // hangs while this thread still holds it
 }
 
 INSTANTIATE_TEST_SUITE_P(Kinds, DeepDisplay, testing::Bool(),

@@ -13,8 +13,8 @@ namespace kelvo::test {
 class FakeTelephony final : public TelephonyClient {
 public:
     bool reachable = true;
-    PLLogChannel answer = {.portName = "service"};  ///< what asking for a log channel gives
-    bool announces = false;                         ///< calls the notification callback while it is being asked
+    PLLogChannel answer = {.error = {}, .portName = "service"};  ///< what asking for a log channel gives
+    bool announces = false;  ///< calls the notification callback while it is being asked
 
     std::vector<std::string> askedFor;  ///< local port names of the log channels asked for, in order
     int openConnections = 0;

@@ -58,20 +58,27 @@ public:
 
 private:
     bool createPorts();
+    bool openLogChannel();
     void destroyPorts();
     void configureGenerator();
-    void retry();
+    void chooseGenerator(const Value& answer);
+    bool startStreaming();
+    void didReceive(std::int32_t id, ByteView data);
+    void didInvalidate(const LocalPort& port);
+    template <class Work>
+    auto whileAlive(Work work) const;
 
     const Services _services;
+    const DictionaryRef _state = Dictionary::make();                 // outlives every restart and every generator
+    std::vector<std::unique_ptr<LogGenerator>> _replacedGenerators;  // intended: one that was replaced is kept as well
+    std::unique_ptr<LogGenerator> _logGenerator;
+    NodeRef _nodes;
+    NodesByPath _nodesByPath;  // built with _nodes and empty without
     std::unique_ptr<LocalPort> _recvPort;
     std::unique_ptr<RemotePort> _sendPort;
     std::unique_ptr<RepeatingTimer> _displayUpdateTimer;  // its presence means that the monitor runs
-    const DictionaryRef _state = Dictionary::make();      // outlives every restart and every generator
-    NodeRef _nodes;
-    NodesByPath _nodesByPath;  // built with _nodes and empty without
-    std::unique_ptr<LogGenerator> _logGenerator;
     bool _updated = false;
-    std::shared_ptr<bool> _alive = std::make_shared<bool>(true);  // tasks on the queue outlive the model
+    const std::shared_ptr<bool> _alive = std::make_shared<bool>();  // its owners: tasks on the queue outlive the model
 };
 
 }  // namespace kelvo

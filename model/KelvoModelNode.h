@@ -6,6 +6,7 @@
 #include <unordered_map>
 #include <vector>
 
+#include "platform/PropertyList.h"
 #include "platform/Value.h"
 
 namespace kelvo {
@@ -32,14 +33,19 @@ public:
     virtual const std::string* value() const { return nullptr; }
 
     /// Builds the tree of a display object: root "Kelvo" at "/". Every node is stored in `nodesByPath` under its path;
-    /// of two nodes with one path the later stays.
+    /// of two nodes with one path the later stays, and a parent is stored after its children. A dictionary or an array
+    /// nested deeper than `kMaxDepth` is shown as "(unknown)", so that no tree can exhaust the stack.
     static NodeRef makeTreeFromObject(const Value& object, NodesByPath& nodesByPath);
+
+    /// How many dictionaries and arrays may stand inside one another; no property list that is read nests deeper.
+    static constexpr int kMaxDepth = kMaxPropertyListDepth;
 
 private:
     std::string _name;
 };
 
-/// `parent` extended by `name` as a path component: "/" and "A" give "/A", "/A" and "B" give "/A/B".
+/// `parent` extended by `name` as a path component: "/" and "A" give "/A", "/A" and "B" give "/A/B". No separator is
+/// doubled where the two meet, and an empty name leaves the path as it is.
 std::string pathByAppending(std::string_view parent, std::string_view name);
 
 }  // namespace kelvo

@@ -1,0 +1,8 @@
+#include "model/KelvoModelTreeNode.h"
+
+namespace kelvo {
+
+KelvoModelTreeNode::KelvoModelTreeNode(std::string name, Children children)
+    : KelvoModelNode(std::move(name)), _childNodes(std::move(children)) {}
+
+}  // namespace kelvo

@@ -1,0 +1,116 @@
+#pragma once
+
+#include <gtest/gtest.h>
+
+#include <algorithm>
+#include <cstdio>
+#include <cstdlib>
+#include <memory>
+#include <regex>
+#include <string>
+#include <vector>
+
+#include "model/KelvoModel.h"
+#include "platform/DirectoryResources.h"
+#include "platform/Environment.h"
+#include "tests/support/FakePorts.h"
+#include "tests/support/FakeTelephony.h"
+#include "tests/support/ManualClock.h"
+#include "tests/support/ManualQueue.h"
+#include "tests/support/Record.h"
+#include "tests/support/RecordingLog.h"
+
+namespace kelvo::test {
+
+/// A model on a queue, ports and a telephony service that the test moves.
+class MonitoredModel : public testing::Test {
+protected:
+    using Texts = std::vector<std::string>;
+    static constexpr const char* kLocalPort = "com.zorvik.BasebandStateReport.LogChannel";
+    static constexpr const char* kLte = "kPLLogChannelTechnology_Oskra_LTE";
+    static constexpr const char* kCellPath = "/Serving Cell Info/Physical Cell ID";
+
+    /// The error lines since the last call, in order, every pointer written as %p.
+    Texts errors() {
+        Texts texts;
+        for (const auto& [level, text] : log.lines()) {
+            if (level == 3) texts.push_back(std::regex_replace(text, std::regex("0x[0-9a-f]+"), "%p"));
+        }
+        log.clear();
+        return texts;
+    }
+    bool logged(int level, const std::string& text) const {
+        for (const RecordingLog::Line& line : log.lines()) {
+            if (line == RecordingLog::Line(level, text)) return true;
+        }
+        return false;
+    }
+    /// A serving cell as the service delivers it.
+    static Bytes servingCell(std::uint32_t physicalCellId) {
+        return Record(0xB0C2, 38).u16(14, physicalCellId).bytes();
+    }
+    std::optional<Bytes> deliver(const Bytes& message, std::int32_t id = 0) {
+        return ports.deliver(kLocalPort, id, message);
+    }
+    /// The value at `path` of the display tree; "(no node)" when there is none.
+    std::string shown(const std::string& path = kCellPath) {
+        const NodeRef node = model->nodeAtPath(path);
+        if (!node) return "(no node)";
+        return node->value() != nullptr ? *node->value() : "(children)";
+    }
+    std::size_t queries() const {
+        return static_cast<std::size_t>(std::count_if(
+            ports.sent.begin(), ports.sent.end(), [](const auto& message) { return message.replyLimit.has_value(); }));
+    }
+    /// A model that streams LTE; what it logged on the way is forgotten.
+    void startLte() {
+        ports.onRequest = speaking(kLte);
+        model->restartMonitor();
+        ASSERT_TRUE(model->isConnected());
+        log.clear();
+        ports.sent.clear();
+    }
+
+    std::unique_ptr<KelvoModel> newModel() {
+        return std::make_unique<KelvoModel>(KelvoModel::Services{
+            .queue = queue, .ports = ports, .telephony = telephony, .updateViewControllerFromModel = [this] {
+                ++updates;
+            }});
+    }
+
+    /// The program's standard output.
+    class Output {
+    public:
+        Output() = default;
+        ~Output() {
+            std::fclose(_file);
+            std::free(_text);
+        }
+        Output(const Output&) = delete;
+        Output& operator=(const Output&) = delete;
+        std::FILE* file() const { return _file; }
+        std::string text() const {
+            std::fflush(_file);
+            return _text;
+        }
+
+    private:
+        char* _text = nullptr;
+        std::size_t _size = 0;
+        std::FILE* _file = open_memstream(&_text, &_size);
+    };
+
+    ManualQueue queue;
+    FakePorts ports;
+    FakeTelephony telephony;
+    RecordingLog log;
+    ManualClock clock;
+    DirectoryResources resources{KELVO_RESOURCE_DIR};
+    Output output;
+    Environment::Scope environment{
+        {.log = &log, .clock = &clock, .resources = &resources, .standardOutput = output.file()}};
+    int updates = 0;  // of the screens
+    std::unique_ptr<KelvoModel> model = newModel();
+};
+
+}  // namespace kelvo::test

@@ -28,6 +28,9 @@ if(KELVO_SANITIZE)
     add_compile_options(-fsanitize=${KELVO_SANITIZE} -fno-omit-frame-pointer -fno-sanitize-recover=all)
     add_link_options(-fsanitize=${KELVO_SANITIZE})
 endif()
+if(KELVO_FUZZ)
+    add_compile_options(-fsanitize=fuzzer-no-link)  # the libraries count their branches for the fuzz targets
+endif()
 
 # Headers are included by their path from the root: "platform/Value.h".
 include_directories(${CMAKE_SOURCE_DIR})

@@ -43,8 +43,8 @@ private:
     };
 
     bool readTrailer() {
-        if (textOf(_data.first(kHeaderSize)) != "bplist00") return fail("unknown version of binary property list", 0);
         if (_data.size() < kHeaderSize + kTrailerSize) return fail("binary property list cut short", _data.size());
+        if (textOf(_data.first(kHeaderSize)) != "bplist00") return fail("unknown version of binary property list", 0);
         const std::size_t trailer = _data.size() - kTrailerSize;
         _offsetSize = _data[trailer + 6];
         _referenceSize = _data[trailer + 7];
@@ -274,10 +274,7 @@ private:
 
 }  // namespace
 
-bool isBinaryPropertyList(std::string_view data) {
-    const auto isDigit = [](char c) { return c >= '0' && c <= '9'; };
-    return data.size() >= kHeaderSize && data.starts_with("bplist") && isDigit(data[6]) && isDigit(data[7]);
-}
+bool isBinaryPropertyList(std::string_view data) { return data.starts_with("bplist"); }
 
 Result<Value> readBinaryPropertyList(ByteView data) { return BinaryReader(data).read(); }
 

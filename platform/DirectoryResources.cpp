@@ -2,7 +2,6 @@
 
 #include <algorithm>
 #include <fstream>
-#include <iterator>
 
 #include "platform/PropertyList.h"
 
@@ -10,9 +9,14 @@ namespace kelvo {
 
 Result<DictionaryRef> DirectoryResources::dictionary(std::string_view name) const {
     const std::filesystem::path path = _directory / (std::string(name) + ".plist");
+    std::error_code missing;
+    const auto size = std::filesystem::file_size(path, missing);
     std::ifstream file(path, std::ios::binary);
-    if (!file) return Failure{"no resource " + path.string()};
-    const Bytes bytes{std::istreambuf_iterator<char>(file), std::istreambuf_iterator<char>()};
+    if (missing || !file) return Failure{"no resource " + path.string()};
+    Bytes bytes(size);
+    if (!file.read(reinterpret_cast<char*>(bytes.data()), static_cast<std::streamsize>(size))) {
+        return Failure{path.string() + ": cannot be read"};
+    }
     Result<Value> value = readPropertyList(bytes);
     if (!value) return Failure{path.string() + ": " + value.error().reason};
     if (!value->dictionary()) return Failure{path.string() + ": not a dictionary"};

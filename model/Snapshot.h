@@ -1,0 +1,34 @@
+#pragma once
+
+#include <optional>
+#include <string>
+#include <string_view>
+
+#include "platform/Bytes.h"
+#include "platform/Clock.h"
+#include "platform/Result.h"
+#include "platform/Value.h"
+
+namespace kelvo {
+
+/// One saved snapshot: when it was taken, the contents a generator hands out, and what the user says about it.
+/// The file ends at the first part that is absent: without `data` it holds the time alone, without a description the
+/// time and the data.
+struct Snapshot {
+    Clock::TimePoint timestamp;
+    ArrayRef data;
+    std::optional<std::string> description;
+
+    /// The dictionary "Timestamp" (UTC, "2011-03-04 09:15:02 +0000"), "Data", "Description".
+    DictionaryRef dictionary() const;
+    /// The file's bytes, an XML property list.
+    Result<Bytes> propertyList() const;
+
+    /// The file's path in `directory`, by whole seconds since 1970: two in one second share it.
+    static std::string pathInDirectory(std::string_view directory, Clock::TimePoint now);
+};
+
+/// Writes `bytes` to `path` in place, over what was there. The error names the reason; what could be written stays.
+std::optional<Failure> writeFileInPlace(const std::string& path, ByteView bytes);
+
+}  // namespace kelvo

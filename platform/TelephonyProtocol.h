@@ -1,0 +1,35 @@
+#pragma once
+
+#include <string_view>
+
+/// How a client asks the telephony service for a log channel: one message of id 0 to the control port, answered at
+/// once. Both are XML property lists:
+///     request  { "CreateLogChannel": <name of the client's local port> }
+///     answer   { "Error": n, "ErrorDomain": n, "PortName": <name of the service's port> }
+/// Error and ErrorDomain are 0, and PortName is there, when the channel exists.
+namespace kelvo {
+
+inline constexpr std::string_view kPLTelephonyServicePort = "com.zorvik.TelephonyService";
+inline constexpr std::string_view kPLCreateLogChannel = "CreateLogChannel";
+inline constexpr std::string_view kPLError = "Error";
+inline constexpr std::string_view kPLErrorDomain = "ErrorDomain";
+inline constexpr std::string_view kPLPortName = "PortName";
+
+/// Error domains: who says so.
+inline constexpr long kPLErrorDomainService = 1;
+inline constexpr long kPLErrorDomainClient = 2;
+
+/// Errors of the service's domain.
+inline constexpr long kPLErrorBadRequest = 1;       ///< not understood
+inline constexpr long kPLErrorTooManyChannels = 2;  ///< the service serves no more clients
+inline constexpr long kPLErrorPortUnreachable = 3;  ///< the client's local port cannot be opened
+inline constexpr long kPLErrorNoPort = 4;           ///< the service could not make a port of its own
+/// Errors of the client's domain.
+inline constexpr long kPLErrorServiceGone = 1;  ///< it ended before it answered
+inline constexpr long kPLErrorNoAnswer = 2;     ///< none came in time
+inline constexpr long kPLErrorBadAnswer = 3;    ///< one came that is no answer
+
+/// Announced on an open connection when the service ends.
+inline constexpr std::string_view kPLNotificationServiceGone = "kPLNotificationServiceGone";
+
+}  // namespace kelvo

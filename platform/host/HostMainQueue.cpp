@@ -1,0 +1,54 @@
+#include "platform/host/HostMainQueue.h"
+
+#include <QTimer>
+#include <algorithm>
+#include <limits>
+
+namespace kelvo {
+namespace {
+
+using std::chrono::milliseconds;
+
+// Qt's timers count whole milliseconds in an int: never early by rounding, at most 24 days.
+milliseconds wholeMilliseconds(std::chrono::nanoseconds time) {
+    constexpr milliseconds kLongest{std::numeric_limits<int>::max()};
+    return std::clamp(std::chrono::ceil<milliseconds>(time), milliseconds{0}, kLongest);
+}
+
+Qt::TimerType typeFor(milliseconds time) {
+    return time >= std::chrono::seconds(1) ? Qt::CoarseTimer : Qt::PreciseTimer;
+}
+
+class HostTimer final : public RepeatingTimer {
+public:
+    HostTimer(milliseconds interval, MainQueue::Task task) : _timer(new QTimer) {
+        QObject::connect(_timer, &QTimer::timeout, _timer, [run = std::move(task)] { run(); });
+        _timer->setTimerType(typeFor(interval));
+        _timer->start(interval);
+    }
+    ~HostTimer() override {
+        _timer->stop();
+        _timer->deleteLater();  // its own task may be what destroys it
+    }
+
+private:
+    QTimer* _timer;
+};
+
+}  // namespace
+
+void HostMainQueue::post(Task task) {
+    QMetaObject::invokeMethod(
+        &_context, [run = std::move(task)] { run(); }, Qt::QueuedConnection);
+}
+
+void HostMainQueue::postAfter(std::chrono::nanoseconds delay, Task task) {
+    const milliseconds time = wholeMilliseconds(delay);
+    QTimer::singleShot(time, typeFor(time), &_context, [run = std::move(task)] { run(); });
+}
+
+std::unique_ptr<RepeatingTimer> HostMainQueue::repeat(std::chrono::nanoseconds interval, Task task) {
+    return std::make_unique<HostTimer>(wholeMilliseconds(interval), std::move(task));
+}
+
+}  // namespace kelvo

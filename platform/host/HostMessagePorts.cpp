@@ -1,0 +1,61 @@
+#include "platform/host/HostMessagePorts.h"
+
+#include <cerrno>
+#include <cstring>
+
+#include "platform/Environment.h"
+#include "platform/host/HostLocalPort.h"
+#include "platform/host/HostPaths.h"
+#include "platform/host/HostRemotePort.h"
+#include "platform/host/PortServer.h"
+#include "platform/host/PrivateDirectory.h"
+
+namespace kelvo {
+namespace {
+
+bool checkName(std::string_view name) {
+    if (isPortName(name)) return true;
+    logLine(Level::Error, "Not a port name (%d characters)", name.size());  // hostile texts stay out of the log
+    return false;
+}
+
+UniqueFd openDirectory(const std::filesystem::path& path) {
+    Result<UniqueFd> opened = openPrivateDirectory(path);
+    if (opened) return std::move(opened).value();
+    logLine(Level::Error, "No message ports: %s", opened.error().reason);
+    return {};
+}
+
+}  // namespace
+
+HostMessagePorts::HostMessagePorts(std::filesystem::path directory) : _directory(std::move(directory)) {}
+HostMessagePorts::HostMessagePorts() : HostMessagePorts(HostPaths::portDirectory()) {}
+
+MessagePorts::Local HostMessagePorts::createLocal(std::string_view name, MessageCallback callback) {
+    if (!checkName(name)) return {};
+    UniqueFd directory = openDirectory(_directory);
+    if (!directory) return {};
+    auto claim = PortClaim::take(std::move(directory), std::string(name));
+    if (!claim) {
+        const bool taken = claim.error() == PortClaim::Refusal::Taken;
+        if (!taken) logLine(Level::Error, "Cannot make port %s: %s", name, std::strerror(errno));
+        return {nullptr, taken};
+    }
+    auto server = std::make_shared<PortServer>(std::move(claim).value(), std::string(name), std::move(callback));
+    return {std::make_unique<HostLocalPort>(std::move(server)), false};
+}
+
+std::unique_ptr<RemotePort> HostMessagePorts::openRemote(std::string_view name) {
+    if (!checkName(name)) return nullptr;
+    const UniqueFd directory = openDirectory(_directory);
+    if (!directory) return nullptr;
+    UniqueFd connection = connectToPort(directory.get(), std::string(name));
+    if (!connection) return nullptr;
+    if (!isPeerOfThisUser(connection.get())) {
+        logLine(Level::Error, "Port %s belongs to another user's process", name);
+        return nullptr;
+    }
+    return std::make_unique<HostRemotePort>(std::move(connection), std::string(name));
+}
+
+}  // namespace kelvo

@@ -1,0 +1,24 @@
+#pragma once
+
+#include <filesystem>
+
+#include "platform/MessagePorts.h"
+
+namespace kelvo {
+
+/// Message ports as sockets in a directory that only this user can enter. Needs a QCoreApplication.
+/// Every operation that fails for another reason than a missing or a taken port writes one log line.
+class HostMessagePorts final : public MessagePorts {
+public:
+    /// Both ends must be given the same directory; it is made when a port is first used.
+    explicit HostMessagePorts(std::filesystem::path directory);
+    HostMessagePorts();  ///< the user's own directory, where all programs meet
+
+    Local createLocal(std::string_view name, MessageCallback callback) override;
+    std::unique_ptr<RemotePort> openRemote(std::string_view name) override;
+
+private:
+    const std::filesystem::path _directory;
+};
+
+}  // namespace kelvo

@@ -1,0 +1,44 @@
+#pragma once
+
+#include <spdlog/fwd.h>
+
+#include <cstddef>
+#include <memory>
+#include <string>
+
+#include "platform/SystemLog.h"
+
+namespace spdlog::details {
+class thread_pool;
+}
+
+namespace kelvo {
+
+/// The system log on a thread of its own: taking a line never waits for whoever writes it out. Lines wait in a queue;
+/// in an overflow the oldest go, and one line tells how many once the queue is empty again. Destruction writes
+/// everything that still waits. Lines go to syslog where the system has one, and to standard error elsewhere or when a
+/// terminal is there to read it.
+class HostSystemLog final : public SystemLog {
+public:
+    static constexpr std::size_t kQueueLength = 8192;  // lines
+
+    enum class To { System, StandardError };
+
+    /// `program` stands in front of every line. A system without syslog has its lines on standard error, too.
+    explicit HostSystemLog(const std::string& program, To destination = To::System);
+    /// For a destination of the caller's choice, which is used on the log's own thread only.
+    explicit HostSystemLog(std::shared_ptr<spdlog::sinks::sink> destination, std::size_t queueLength = kQueueLength);
+    ~HostSystemLog() override;
+
+    bool wants(Level level) const override;
+    void write(Level level, std::string_view text) override;
+
+private:
+    class CountingSink;
+
+    std::shared_ptr<spdlog::details::thread_pool> _worker;
+    std::shared_ptr<CountingSink> _sink;
+    std::shared_ptr<spdlog::logger> _logger;
+};
+
+}  // namespace kelvo

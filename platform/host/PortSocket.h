@@ -1,0 +1,46 @@
+#pragma once
+
+#include <string>
+#include <string_view>
+
+#include "platform/Result.h"
+#include "platform/host/UniqueFd.h"
+
+namespace kelvo {
+
+/// Port names are 1 to 80 characters out of letters, digits, '.', '_' and '-': nothing else becomes a file name.
+inline constexpr std::size_t kMaxPortNameLength = 80;
+bool isPortName(std::string_view name);
+
+/// A connection to the port `name` in the directory `directory`; none when nobody of this user listens there. Never
+/// blocks.
+UniqueFd connectToPort(int directory, const std::string& name);
+
+/// True when the process at the other end runs under this process's user.
+bool isPeerOfThisUser(int fd);
+
+/// The right to a port's name, and the socket that listens under it: `<name>.port` beside `<name>.lock`, which is held
+/// locked for as long as the owner lives. A lock that is free therefore marks what a dead owner left behind.
+class PortClaim {
+public:
+    enum class Refusal { Taken, Failed };  ///< a live owner has it; the system refused, errno says why
+
+    static Result<PortClaim, Refusal> take(UniqueFd directory, std::string name);
+    PortClaim(PortClaim&&) = default;
+    PortClaim& operator=(PortClaim&&) = delete;
+    ~PortClaim();  ///< removes both files
+
+    int listener() const { return _listener.get(); }
+
+private:
+    PortClaim(UniqueFd directory, std::string name) : _directory(std::move(directory)), _name(std::move(name)) {}
+    Result<bool, Refusal> lock();
+    bool listen();
+
+    UniqueFd _directory;
+    std::string _name;
+    UniqueFd _lock;
+    UniqueFd _listener;
+};
+
+}  // namespace kelvo

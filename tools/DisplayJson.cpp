@@ -1,0 +1,57 @@
+#include "tools/DisplayJson.h"
+
+#include "platform/Base64.h"
+#include "platform/IsoDate.h"
+
+namespace kelvo {
+
+namespace {
+
+using Json = nlohmann::ordered_json;
+
+Json jsonFrom(const Number& number) { return number.isReal() ? Json(number.real()) : Json(number.integer()); }
+
+Json jsonFrom(const Bytes& data) {
+    std::string text;
+    appendBase64(text, data);
+    return {{"$data", std::move(text)}};
+}
+
+Json jsonFrom(Date date) { return {{"$date", hasIsoForm(date) ? Json(isoDate(date)) : Json()}}; }
+
+Json jsonFrom(const Array& array) {
+    Json json = Json::array();
+    for (const Value& element : array) json.push_back(kelvo::jsonFrom(element));
+    return json;
+}
+
+Json jsonFrom(const Dictionary& dictionary) {
+    Json::object_t object;  // keys are unique already: no search for each of them
+    object.reserve(dictionary.size());
+    for (const Dictionary::Entry& entry : dictionary) {
+        object.Container::emplace_back(entry.key, kelvo::jsonFrom(entry.value));
+    }
+    return object;
+}
+
+}  // namespace
+
+nlohmann::ordered_json jsonFrom(const Value& value) {
+    switch (value.kind()) {
+        case Value::Kind::None: return nullptr;
+        case Value::Kind::String: return *value.string();
+        case Value::Kind::Number: return jsonFrom(*value.number());
+        case Value::Kind::Boolean: return *value.boolean();
+        case Value::Kind::Data: return jsonFrom(*value.data());
+        case Value::Kind::Date: return jsonFrom(*value.date());
+        case Value::Kind::Array: return jsonFrom(*value.array());
+        case Value::Kind::Dictionary: return jsonFrom(*value.dictionary());
+    }
+    return nullptr;
+}
+
+std::string printedJson(const nlohmann::ordered_json& json) {
+    return json.dump(2, ' ', false, nlohmann::ordered_json::error_handler_t::replace) + "\n";
+}
+
+}  // namespace kelvo

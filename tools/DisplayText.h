@@ -1,0 +1,23 @@
+#pragma once
+
+#include <cstddef>
+#include <string>
+#include <string_view>
+#include <vector>
+
+#include "model/KelvoModelNode.h"
+
+namespace kelvo {
+
+/// `text` made safe to print on one line of a terminal: control characters, which a record could hold to take the
+/// terminal over, and bytes that are not UTF-8 become U+FFFD.
+std::string printable(std::string_view text);
+
+/// The display tree as lines without their line ends: a node's children in their order, two blanks deeper than the
+/// node; among siblings the values start in one column. The root shows as itself only when it is a leaf.
+std::vector<std::string> displayLines(const KelvoModelNode& root);
+
+/// The same as one text. A display of none shows as on the screens.
+std::string displayText(const Value& display);
+
+}  // namespace kelvo

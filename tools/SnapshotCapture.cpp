@@ -1,0 +1,78 @@
+#include "tools/SnapshotCapture.h"
+
+#include <fmt/format.h>
+
+#include <ctime>
+#include <limits>
+#include <optional>
+
+#include "platform/PropertyList.h"
+#include "platform/host/Capture.h"
+#include "tools/CommandFailure.h"
+#include "tools/RawRecords.h"
+
+namespace kelvo {
+
+namespace {
+
+constexpr std::chrono::seconds kRefresh{2};
+
+/// The date of an entry, "2011-03-04 09:15:02 +0100"; none when there is none, it reads otherwise or lies outside the
+/// 32 bits that a capture has for its seconds.
+std::optional<CaptureTime> timeOf(const SnapshotFile::Entry& entry) {
+    std::tm broken{};
+    if (!entry.date || strptime(entry.date->c_str(), "%Y-%m-%d %H:%M:%S %z", &broken) == nullptr) return std::nullopt;
+    const long eastOfUtc = broken.tm_gmtoff;
+    const std::time_t seconds = timegm(&broken) - eastOfUtc;
+    if (seconds < 0 || seconds > std::numeric_limits<std::uint32_t>::max()) return std::nullopt;
+    return CaptureTime(std::chrono::seconds(seconds));
+}
+
+/// The messages of one entry; what is odd about them goes to `odd`.
+std::vector<Bytes> messagesOf(const SnapshotFile::Entry& entry, bool asTree, const std::string& where,
+                              std::vector<std::string>& odd) {
+    const Value& state = entry.displayState;
+    if (!state) return {};
+    if (asTree) {  // a cell monitor's message is the tree itself
+        const Result<Bytes> message = writeXmlPropertyList(state);
+        if (message) return {*message};
+        odd.push_back(where + ": " + message.error().reason);
+        return {};
+    }
+    if (state.data() == nullptr) {
+        odd.push_back(fmt::format("{} has a {} as \"DisplayState\", not raw records", where, kindName(state.kind())));
+        return {};
+    }
+    const RawRecords records = splitRawRecords(*state.data());
+    if (records.leftOver != 0) {
+        odd.push_back(fmt::format("{} ends in {} bytes that form no whole record", where, records.leftOver));
+    }
+    std::vector<Bytes> messages;
+    for (ByteView message : records.messages) messages.emplace_back(message.begin(), message.end());
+    return messages;
+}
+
+}  // namespace
+
+std::size_t writeSnapshotCapture(const SnapshotFile& snapshot, Technology technology, const std::string& path,
+                                 std::vector<std::string>& odd) {
+    std::optional<CaptureWriter> writer;
+    std::size_t total = 0;
+    CaptureTime end{};
+    for (std::size_t i = 0; i < snapshot.entries.size(); ++i) {
+        const SnapshotFile::Entry& entry = snapshot.entries[i];
+        const auto messages = messagesOf(entry, technology == Technology::IFX, fmt::format("entry {}", i + 1), odd);
+        end = std::max(end + kRefresh, timeOf(entry).value_or(CaptureTime()));
+        for (std::size_t m = 0; m < messages.size(); ++m) {
+            if (!writer) writer.emplace(orFail(CaptureWriter::create(path, technology)));
+            const std::chrono::nanoseconds before =
+                std::chrono::nanoseconds(kRefresh) * (messages.size() - m) / static_cast<long>(messages.size());
+            if (const auto failure = writer->append(end - before, messages[m])) throw CommandFailure(*failure);
+            ++total;
+        }
+    }
+    if (total == 0) throw CommandFailure("the snapshot holds no raw records");
+    return total;
+}
+
+}  // namespace kelvo

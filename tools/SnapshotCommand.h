@@ -1,0 +1,10 @@
+#pragma once
+
+#include <CLI/CLI.hpp>
+
+namespace kelvo {
+
+/// "kelvoctl snapshot": what a saved snapshot holds.
+void addSnapshotCommand(CLI::App& app);
+
+}  // namespace kelvo

@@ -1,0 +1,97 @@
+#include "tools/SnapshotFile.h"
+
+#include <fmt/format.h>
+
+#include <cerrno>
+#include <cstdio>
+#include <memory>
+#include <system_error>
+
+#include "platform/PropertyList.h"
+
+namespace kelvo {
+
+namespace {
+
+Result<Bytes> readFile(const std::string& name) {
+    const auto failure = [&name] {
+        return Failure{name + " cannot be read: " + std::generic_category().message(errno)};
+    };
+    const std::unique_ptr<std::FILE, int (*)(std::FILE*)> file(std::fopen(name.c_str(), "rb"), std::fclose);
+    if (!file) return failure();
+    Bytes bytes;
+    constexpr std::size_t kChunk = 1 << 16;
+    std::size_t count = kChunk;
+    while (count == kChunk) {
+        const std::size_t length = bytes.size();
+        bytes.resize(length + kChunk);
+        count = std::fread(bytes.data() + length, 1, kChunk, file.get());
+        bytes.resize(length + count);
+    }
+    if (std::ferror(file.get()) != 0) return failure();
+    return bytes;
+}
+
+/// Reads values out of one dictionary and notes what is of another kind than it should be.
+class Reader {
+public:
+    Reader(std::string where, const Dictionary& dictionary, std::vector<std::string>& odd)
+        : _where(std::move(where)), _dictionary(dictionary), _odd(odd) {}
+
+    std::optional<std::string> string(const char* key) const {
+        const Value& value = ofKind(key, Value::Kind::String);
+        return value ? std::optional(*value.string()) : std::nullopt;
+    }
+    const Value& ofKind(const char* key, Value::Kind kind) const {
+        static const Value kNone;
+        const Value& value = _dictionary[key];
+        if (!value || value.kind() == kind) return value;
+        _odd.push_back(
+            fmt::format("{} has a {} as \"{}\", not a {}", _where, kindName(value.kind()), key, kindName(kind)));
+        return kNone;
+    }
+
+private:
+    std::string _where;
+    const Dictionary& _dictionary;
+    std::vector<std::string>& _odd;
+};
+
+SnapshotFile::Entry entryFrom(const Value& value, std::size_t number, std::vector<std::string>& odd) {
+    const std::string where = fmt::format("entry {}", number);
+    if (!value.dictionary()) {
+        odd.push_back(fmt::format("{} is a {}, not a dictionary", where, kindName(value.kind())));
+        return {};
+    }
+    const Dictionary& dictionary = *value.dictionary();
+    const Reader reader(where, dictionary, odd);
+    return {reader.string("Description"), reader.string("Date"), dictionary["DisplayState"], dictionary["Display"],
+            reader.ofKind("DLF", Value::Kind::Data)};
+}
+
+}  // namespace
+
+Result<SnapshotFile> SnapshotFile::read(const std::filesystem::path& path) {
+    const std::string name = path.string();
+    const Result<Bytes> bytes = readFile(name);
+    if (!bytes) return bytes.error();
+    if (bytes->empty()) return Failure{name + " is empty"};
+    const Result<Value> tree = readPropertyList(*bytes);
+    if (!tree) return Failure{name + " is not a snapshot: " + tree.error().reason};
+    const DictionaryRef& dictionary = tree->dictionary();
+    if (!dictionary) return Failure{fmt::format("{} is not a snapshot: it holds a {}", name, kindName(tree->kind()))};
+    if (!(*dictionary)["Timestamp"] && !(*dictionary)["Data"]) {
+        return Failure{name + " is not a snapshot: it has neither \"Timestamp\" nor \"Data\""};
+    }
+
+    SnapshotFile file;
+    const Reader reader("the snapshot", *dictionary, file.odd);
+    file.timestamp = reader.string("Timestamp");
+    file.description = reader.string("Description");
+    if (const ArrayRef& data = reader.ofKind("Data", Value::Kind::Array).array()) {
+        for (const Value& entry : *data) file.entries.push_back(entryFrom(entry, file.entries.size() + 1, file.odd));
+    }
+    return file;
+}
+
+}  // namespace kelvo

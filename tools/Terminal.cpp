@@ -1,0 +1,86 @@
+#include "tools/Terminal.h"
+
+#include <fmt/format.h>
+#include <sys/ioctl.h>
+#include <unistd.h>
+
+#include <algorithm>
+#include <cerrno>
+
+namespace kelvo {
+
+namespace {
+
+// Alternate screen, no cursor, no wrapping at the edge; and back in the other order.
+constexpr std::string_view kEnter = "\x1b[?1049h\x1b[?25l\x1b[?7l\x1b[2J";
+constexpr std::string_view kLeave = "\x1b[?7h\x1b[?25h\x1b[?1049l";
+
+/// The first `columns` characters of UTF-8 text.
+std::string_view cut(std::string_view text, std::size_t columns) {
+    std::size_t at = 0;
+    for (; at < text.size(); ++at) {
+        const bool begins = (text[at] & 0xc0) != 0x80;
+        if (begins && columns-- == 0) break;
+    }
+    return text.substr(0, at);
+}
+
+}  // namespace
+
+Terminal::Terminal(int input, int output) : _input(input), _output(output) { enter(); }
+
+Terminal::~Terminal() { leave(); }
+
+void Terminal::enter() {
+    termios settings{};
+    if (tcgetattr(_input, &settings) == 0) {
+        _before = settings;
+        settings.c_lflag &= ~static_cast<tcflag_t>(ICANON | ECHO);
+        tcsetattr(_input, TCSADRAIN, &settings);
+    }
+    write(kEnter);
+    _entered = true;
+    _shown.clear();
+}
+
+void Terminal::leave() {
+    if (!_entered) return;
+    _entered = false;
+    write(kLeave);
+    if (_before) tcsetattr(_input, TCSADRAIN, &*_before);
+}
+
+Terminal::Size Terminal::size() const {
+    winsize size{};
+    if (ioctl(_output, TIOCGWINSZ, &size) != 0 || size.ws_row == 0 || size.ws_col == 0) return {24, 80};
+    return {size.ws_row, size.ws_col};
+}
+
+void Terminal::forget() {
+    write("\x1b[2J");
+    _shown.clear();
+}
+
+void Terminal::draw(const std::vector<std::string>& rows, std::size_t highlighted) {
+    const std::size_t columns = size().columns;
+    std::string out;
+    std::vector<std::string> now;
+    for (std::size_t i = 0; i < std::max(rows.size(), _shown.size()); ++i) {
+        std::string row(i < rows.size() ? cut(rows[i], columns) : std::string_view());
+        if (i == highlighted) row = "\x1b[7m" + row + "\x1b[0m";
+        if (i >= _shown.size() || _shown[i] != row) out += fmt::format("\x1b[{};1H{}\x1b[K", i + 1, row);
+        if (i < rows.size()) now.push_back(std::move(row));
+    }
+    _shown = std::move(now);
+    write(out);  // in one piece, so that no half-drawn screen is seen
+}
+
+void Terminal::write(std::string_view text) const {
+    while (!text.empty()) {
+        const ssize_t count = ::write(_output, text.data(), text.size());
+        if (count < 0 && errno != EINTR) return;  // the terminal is gone; its hangup ends the program
+        text.remove_prefix(static_cast<std::size_t>(std::max<ssize_t>(count, 0)));
+    }
+}
+
+}  // namespace kelvo

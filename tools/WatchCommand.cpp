@@ -1,0 +1,175 @@
+#include "tools/WatchCommand.h"
+
+#include <fmt/format.h>
+#include <langinfo.h>
+#include <unistd.h>
+
+#include <QCoreApplication>
+#include <array>
+#include <clocale>
+#include <csignal>
+#include <cstdlib>
+#include <optional>
+
+#include "model/KelvoModel.h"
+#include "platform/Environment.h"
+#include "platform/host/FdWatcher.h"
+#include "platform/host/HostMainQueue.h"
+#include "platform/host/HostMessagePorts.h"
+#include "platform/host/HostSystemLog.h"
+#include "platform/host/HostTelephonyClient.h"
+#include "platform/host/UnixSignals.h"
+#include "tools/CommandFailure.h"
+#include "tools/DisplayText.h"
+#include "tools/WatchView.h"
+
+namespace kelvo {
+
+namespace {
+
+using namespace std::chrono_literals;
+
+constexpr const char* kConnecting = "Connecting...";
+
+Terminal* terminalToRestore = nullptr;  // for the terminate handler, which nothing can be handed to
+
+/// What ends the program, a record or a full disk, does so from within the event loop; the terminal must survive it.
+[[noreturn]] void endTidily() {
+    if (terminalToRestore != nullptr) terminalToRestore->leave();
+    fmt::print(stderr, "kelvoctl: the watch ends: {}\n", printable(currentExceptionText()));
+    std::_Exit(1);
+}
+
+/// The model and what the view shows of it.
+class Watch {
+public:
+    Watch(MainQueue& queue, MessagePorts& ports, TelephonyClient& telephony, WatchView& view)
+        : _view(view),
+          _model({queue, ports, telephony, [this] { update(); },
+                  fmt::format("{}.watch.{}", KelvoModel::kLogChannelPortName, getpid())}),
+          _statusTimer(queue.repeat(2s, [this] { updateStatus(); })) {
+        queue.post([this] { _model.restartMonitor(); });
+        _view.showStatus(_shownStatus);
+    }
+
+private:
+    void update() {
+        if (!_model.isConnected()) return updateStatus();
+        const NodeRef root = _model.topLevelNodes();
+        const std::tm now = clock().local(clock().now());
+        std::array<char, 64> text{};
+        std::strftime(text.data(), text.size(), "Updated %Y-%m-%d at %H:%M:%S", &now);
+        _shownStatus = _updateMessage = text.data();
+        _view.showDisplay(root ? displayLines(*root) : std::vector<std::string>(), _shownStatus);
+    }
+
+    /// The model does not tell when its ports come and go.
+    void updateStatus() {
+        const std::string& status = _model.isConnected() ? _updateMessage : kConnecting;
+        if (status == _shownStatus) return;
+        _shownStatus = status;
+        _view.showStatus(status);
+    }
+
+    WatchView& _view;
+    std::string _updateMessage = kConnecting;
+    std::string _shownStatus = kConnecting;
+    KelvoModel _model;
+    const std::unique_ptr<RepeatingTimer> _statusTimer;
+};
+
+/// Qt complains on standard error about a locale that is not UTF-8, which a bare shell on a router board has.
+void ensureUtf8Locale() {
+    std::setlocale(LC_ALL, "");
+    if (std::string_view(nl_langinfo(CODESET)) != "UTF-8") setenv("LC_ALL", "C.UTF-8", 1);
+}
+
+/// The terminal's part in a watch: keys scroll and quit, signals resize, suspend and quit.
+class TerminalControl {
+public:
+    TerminalControl() {
+        terminalToRestore = &_terminal;
+        if (isatty(STDIN_FILENO) != 0) {
+            _input.emplace(STDIN_FILENO, FdWatcher::For::Reading, [this] { readKeys(); });
+        }
+    }
+    ~TerminalControl() { terminalToRestore = nullptr; }
+
+    TerminalWatchView& view() { return _view; }
+    void resized() { _view.redraw(); }
+    void suspend() {
+        _terminal.leave();
+        std::raise(SIGSTOP);  // returns when the user takes the program to the front again
+        _terminal.enter();
+        _view.redraw();
+    }
+
+private:
+    void readKeys() {
+        std::array<char, 256> bytes{};
+        const ssize_t count = ::read(STDIN_FILENO, bytes.data(), bytes.size());
+        if (count <= 0) return QCoreApplication::quit();
+        for (const TerminalKey key : _keys.feed({bytes.data(), static_cast<std::size_t>(count)})) {
+            if (key == TerminalKey::Quit) return QCoreApplication::quit();
+            _view.press(key);
+        }
+    }
+
+    Terminal _terminal{STDIN_FILENO, STDOUT_FILENO};
+    TerminalWatchView _view{_terminal};
+    TerminalKeys _keys;
+    std::optional<FdWatcher> _input;
+};
+
+void watch() {
+    ensureUtf8Locale();
+    std::string name = "kelvoctl";
+    std::array<char*, 2> arguments{name.data(), nullptr};
+    int count = 1;
+    const QCoreApplication application(count, arguments.data());
+    std::set_terminate(endTidily);
+
+    // The log would write into the picture, unless it is sent elsewhere.
+    std::optional<HostSystemLog> log;
+    if (isatty(STDERR_FILENO) == 0) log.emplace("kelvoctl", HostSystemLog::To::StandardError);
+    Environment environment = Environment::current();
+    environment.log = log ? &*log : nullptr;
+    const Environment::Scope scope(environment);
+
+    std::optional<TerminalControl> terminal;
+    if (isatty(STDOUT_FILENO) != 0) terminal.emplace();
+    PrintedWatchView printed;
+    WatchView& view = terminal ? static_cast<WatchView&>(terminal->view()) : printed;
+
+    const UnixSignals unixSignals({SIGINT, SIGTERM, SIGHUP, SIGWINCH, SIGTSTP}, [&terminal](int signal) {
+        if (signal == SIGTSTP) {
+            terminal ? terminal->suspend() : static_cast<void>(std::raise(SIGSTOP));
+        } else if (signal != SIGWINCH) {
+            QCoreApplication::quit();
+        } else if (terminal) {
+            terminal->resized();
+        }
+    });
+    HostMainQueue queue;
+    HostMessagePorts ports;
+    HostTelephonyClient telephony(ports);
+    const Watch watch(queue, ports, telephony, view);
+    QCoreApplication::exec();
+}
+
+}  // namespace
+
+void addWatchCommand(CLI::App& app) {
+    CLI::App& command = *app.add_subcommand("watch", "Shows the live screens, refreshed every two seconds");
+    command.footer(
+        "On a terminal: arrows, PageUp, PageDown, Home and End scroll, q quits.\n"
+        "Elsewhere every refresh is printed under its status line; the log goes to standard error when that is no\n"
+        "terminal.\n\n"
+        "Examples:\n"
+        "  kelvoctl watch\n"
+        "  kelvoctl watch 2>watch.log\n"
+        "  kelvoctl watch | grep 'Physical Cell ID'\n");
+    command.callback([] { watch(); });
+}
+
+}  // namespace kelvo

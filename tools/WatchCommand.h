@@ -1,0 +1,10 @@
+#pragma once
+
+#include <CLI/CLI.hpp>
+
+namespace kelvo {
+
+/// "kelvoctl watch": the live screens in the terminal.
+void addWatchCommand(CLI::App& app);
+
+}  // namespace kelvo

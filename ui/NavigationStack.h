@@ -15,6 +15,7 @@ class NavigationStack : public QObject {
     Q_OBJECT
     QML_ELEMENT
     QML_UNCREATABLE("The application makes its navigation stack")
+    Q_PROPERTY(kelvo::KelvoPaneController* rootViewController READ rootViewController CONSTANT)
     Q_PROPERTY(bool toolbarHidden READ isToolbarHidden NOTIFY toolbarHiddenChanged)
 public:
     using Panes = std::vector<std::unique_ptr<KelvoPaneController>>;
@@ -41,8 +42,7 @@ public:
     Q_INVOKABLE bool popViewController();
     /// The screen no longer draws a pane that was popped.
     Q_INVOKABLE void didRemoveView(kelvo::KelvoPaneController* pane);
-    /// The pane at the bottom.
-    Q_INVOKABLE kelvo::KelvoPaneController* rootViewController() const { return _panes.front().get(); }
+    KelvoPaneController* rootViewController() const { return _panes.front().get(); }
 
     bool isToolbarHidden() const { return _toolbarHidden; }
     void setToolbarHidden(bool hidden);

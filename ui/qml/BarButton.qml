@@ -8,6 +8,7 @@ T.AbstractButton {
 
     property bool leads: false
     property bool strong: false
+    property bool textHidden: false
 
     implicitWidth: contentItem.implicitWidth + leftPadding + rightPadding
     implicitHeight: 44
@@ -34,6 +35,7 @@ T.AbstractButton {
         }
         Text {
             id: label
+            visible: !button.textHidden
             x: button.leads ? 20 : 0
             width: parent.width - x
             anchors.verticalCenter: parent.verticalCenter

@@ -47,7 +47,7 @@ FocusScope {
             push(page, { "pane": pane }, animated ? T.StackView.PushTransition : T.StackView.Immediate);
         }
 
-        Component.onCompleted: show(screen.application.navigation.rootViewController(), false)
+        Component.onCompleted: show(screen.application.navigation.rootViewController, false)
     }
 
     Component {

@@ -45,8 +45,13 @@ Scene::Scene(bool savingPermitted, QSize size) {
 Scene::~Scene() { useDarkColours(false); }
 
 void Scene::settle() {
-    // Longer than any transition; what follows does not depend on how long it took.
-    QTest::qWait(400);
+    const bool settled = QTest::qWaitFor([this] {
+        const QQuickItem* stack = itemOfType("QQuickStackView");
+        const QQuickItem* sheet = itemOfType("SaveSheet");
+        const bool sliding = stack->property("busy").toBool() || (sheet != nullptr && sheet->property("moving").toBool());
+        return !sliding && (sheet != nullptr) == (_app->saveViewController() != nullptr);
+    });
+    EXPECT_TRUE(settled) << "something never stops moving";
     _view->grabWindow();
 }
 
@@ -63,19 +68,36 @@ QQuickItem* Scene::itemWithText(const QString& text) {
     return item;
 }
 
+KelvoCell* Scene::row(const QString& key) {
+    QQuickItem* item = findItem(_view->contentItem(), [&](QQuickItem* candidate) {
+        const auto* cell = qobject_cast<KelvoCell*>(candidate);
+        return cell != nullptr && cell->key() == key;
+    });
+    EXPECT_NE(item, nullptr) << "no row is called " << key.toStdString();
+    return qobject_cast<KelvoCell*>(item);
+}
+
 QQuickItem* Scene::itemOfType(const char* type) {
     return findItem(_view->contentItem(), [&](QQuickItem* item) {
         return QByteArray(item->metaObject()->className()).startsWith(type) || item->inherits(type);
     });
 }
 
+void Scene::touch(const QPointF& at) { QTest::touchEvent(_view, touchScreen()).press(0, at.toPoint()); }
+void Scene::move(const QPointF& to) { QTest::touchEvent(_view, touchScreen()).move(0, to.toPoint()); }
+void Scene::lift(const QPointF& at) { QTest::touchEvent(_view, touchScreen()).release(0, at.toPoint()); }
+
 void Scene::tap(const QPointF& at) {
-    QTest::touchEvent(_view, touchScreen()).press(0, at.toPoint());
-    QTest::touchEvent(_view, touchScreen()).release(0, at.toPoint());
+    touch(at);
+    lift(at);
 }
 
 void Scene::tap(QQuickItem* item) {
     if (item != nullptr) tap(item->mapToScene({item->width() / 2, item->height() / 2}));
+}
+
+void Scene::type(const char* text) {
+    for (const char* letter = text; *letter != 0; ++letter) QTest::keyClick(_view, *letter);
 }
 
 void Scene::press(Qt::Key key, Qt::KeyboardModifiers modifiers) { QTest::keyClick(_view, key, modifiers); }

@@ -4,6 +4,7 @@
 #include <QString>
 
 #include "tests/ui/AppWorld.h"
+#include "ui/KelvoCell.h"
 #include "ui/QuickWindow.h"
 
 namespace kelvo::test {
@@ -27,9 +28,16 @@ public:
     /// The first visible item of a type, by the name its class starts with; null when there is none.
     QQuickItem* itemOfType(const char* type);
 
+    /// The visible row of that key; fails the test when there is none.
+    KelvoCell* row(const QString& key);
+
+    void touch(const QPointF& at);
+    void move(const QPointF& to);
+    void lift(const QPointF& at);
     void tap(const QPointF& at);
     void tap(QQuickItem* item);
     void tapText(const QString& text) { tap(itemWithText(text)); }
+    void type(const char* text);
     void press(Qt::Key key, Qt::KeyboardModifiers modifiers = Qt::NoModifier);
     static void useDarkColours(bool dark);
 

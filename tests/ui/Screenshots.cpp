@@ -1,7 +1,6 @@
 // Draws the main screens into a directory, light and dark, without a display: kelvo_screenshots DIRECTORY
 #include <QDir>
 #include <QGuiApplication>
-#include <QTest>
 #include <cstdio>
 
 #include "tests/ui/Scene.h"
@@ -98,7 +97,7 @@ private:
         scene.tapText("Save");
         shoot(scene, "save");
         scene.tapText("Description");
-        for (char c : std::string("drive")) QTest::keyClick(&scene.view(), c);
+        scene.type("drive");
         shoot(scene, "save-description");
         scene.app().saveViewController()->savePressed();
         scene.connect();

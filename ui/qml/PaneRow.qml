@@ -43,6 +43,7 @@ KelvoCell {
 
         Flickable {
             id: strip
+            objectName: "strip"
 
             x: row.viewFrame.x
             y: row.viewFrame.y

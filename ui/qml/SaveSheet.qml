@@ -9,6 +9,8 @@ FocusScope {
     required property KelvoApp application
     required property KelvoSaveViewController saveView
 
+    readonly property bool moving: arriving.running || leaving.running
+
     function leave() {
         enabled = false;
         leaving.start();

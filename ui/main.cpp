@@ -20,7 +20,7 @@ int main(int argc, char** argv) {
     QGuiApplication application(argc, argv);
     QGuiApplication::setApplicationName(QStringLiteral("kelvo"));
     QGuiApplication::setApplicationDisplayName(QStringLiteral("Kelvo"));
-    QGuiApplication::setDesktopFileName(QStringLiteral("kelvo"));
+    QGuiApplication::setDesktopFileName(QStringLiteral("org.kelvo.Kelvo"));
 
     HostSystemLog log("kelvo");
     const DirectoryResources resources(HostPaths::resourcesDirectory());

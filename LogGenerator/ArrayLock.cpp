@@ -19,6 +19,7 @@ public:
         _owner.store(self, std::memory_order_relaxed);
     }
     void release() {
+        if (_owner.load(std::memory_order_relaxed) != std::this_thread::get_id()) return;  // after the depth wrapped
         _owner.store(std::thread::id(), std::memory_order_relaxed);
         _mutex.unlock();
     }

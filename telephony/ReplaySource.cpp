@@ -12,7 +12,7 @@ using namespace std::chrono_literals;
 using std::chrono::nanoseconds;
 
 constexpr int kRecordsPerTurn = 256;
-constexpr nanoseconds kLongPause = 60s;
+constexpr nanoseconds kLongestPause = 5s;
 constexpr double kLongestWaitNs = 1e18;  // some 30 years
 
 }  // namespace
@@ -38,7 +38,7 @@ ReplaySource::ReplaySource(std::filesystem::path path, CaptureReader reader, Tec
 
 void ReplaySource::start(RecordSink& sink) {
     _sink = &sink;
-    _passStart = _due = _now();
+    _due = _now();
     pumpAfter(0ns);
 }
 
@@ -95,20 +95,22 @@ bool ReplaySource::beginNextPass() {
     _reader = std::move(reader).value();
     // At full speed only a pass that nobody wanted any record of needs a rest.
     const nanoseconds gap = _options.speed ? scaled(typicalInterval()) : _taken ? 0ns : nanoseconds(1s);
-    _passStart = _due = (_options.speed ? _due : _now()) + gap;
+    _due = (_options.speed ? _due : _now()) + gap;
     _packets = 0;
+    _played = 0ns;
     _taken = false;
     return true;
 }
 
 void ReplaySource::setDueTime() {
-    if (_packets++ == 0) _first = _last = _next->time;
-    if (!_options.speed) return;
-    const nanoseconds before = _due;
-    _due = std::max(before, _passStart + scaled(_next->time - _first));
+    if (_packets++ == 0) {
+        _last = _next->time;
+        return;
+    }
+    const nanoseconds gap = std::clamp<nanoseconds>(_next->time - _last, 0ns, kLongestPause);
     _last = std::max(_last, _next->time);
-    if (_due - before >= kLongPause)
-        logLine(Level::Notice, "The capture pauses for %d seconds", (_due - before) / std::chrono::seconds(1));
+    _played += gap;
+    if (_options.speed) _due += scaled(gap);
 }
 
 nanoseconds ReplaySource::timeUntilNext() { return _due - _now(); }
@@ -120,7 +122,7 @@ nanoseconds ReplaySource::scaled(nanoseconds captured) const {
 
 nanoseconds ReplaySource::typicalInterval() const {
     if (_packets < 2) return 1s;
-    const nanoseconds mean = (_last - _first) / static_cast<std::int64_t>(_packets - 1);
+    const nanoseconds mean = _played / static_cast<std::int64_t>(_packets - 1);
     return std::clamp<nanoseconds>(mean, 10ms, 1s);
 }
 

@@ -12,8 +12,8 @@
 
 namespace kelvo {
 
-/// Replays a capture with the time between its packets as it was: pauses included, however long (one of a minute and
-/// more is announced in the log). A packet older than the one before it follows at once.
+/// Replays a capture with the time between its packets as it was, but for pauses of more than five seconds, which last
+/// five: captures are merged from logs that lie days apart. A packet older than the one before it follows at once.
 /// After the last packet the source is silent; in a loop the capture starts again one typical interval later (the mean
 /// of its intervals, 10 ms to 1 s).
 class ReplaySource final : public RecordSource {
@@ -57,13 +57,12 @@ private:
     const Now _now;
     RecordSink* _sink = nullptr;
     std::optional<CapturePacket> _next;  // read and not yet given
-    nanoseconds _passStart{0};           // when the first packet of this pass was due
     nanoseconds _due{0};                 // of _next, and before that of the packet before
-    CaptureTime _first;                  // of this pass
-    CaptureTime _last;
-    std::size_t _packets = 0;  // of this pass
-    bool _taken = false;       // a client wanted one of this pass
-    bool _waiting = false;     // pump() is on the queue
+    nanoseconds _played{0};              // of this pass, at its own speed
+    CaptureTime _last;                   // the latest of this pass
+    std::size_t _packets = 0;            // of this pass
+    bool _taken = false;                 // a client wanted one of this pass
+    bool _waiting = false;               // pump() is on the queue
     bool _toldFailure = false;
     std::shared_ptr<bool> _alive = std::make_shared<bool>(true);  // tasks on the queue outlive the source
 };

@@ -33,9 +33,8 @@ ParsedOptions parseServiceOptions(int argc, const char* const* argv) {
     app.footer(
         "A capture is a pcap file whose link type names the technology: 147 IFX, 148 GSM/UMTS, 149 CDMA, 150 LTE,\n"
         "151 UTRAN. The replay starts with the first client and keeps the time between packets; pauses of more than\n"
-        "five seconds last five. After the last packet the service stays; SIGINT or SIGTERM ends it. It logs to "
-        "standard error in a terminal\n"
-        "and to the system log otherwise.");
+        "five seconds last five. After the last packet the service stays; SIGINT or SIGTERM ends it. It logs to\n"
+        "standard error in a terminal and to the system log otherwise.");
     app.add_option("--replay", file, "The capture to replay")->required()->type_name("FILE");
     app.add_flag("--loop", options.replayOptions.loop, "Start again after the last packet");
     app.add_option("--speed", speed,

@@ -12,8 +12,8 @@ namespace kelvo {
 class ClientQueue {
 public:
     struct Limits {
-        std::size_t records = 65'536;
-        std::size_t bytes = std::size_t{16} * 1024 * 1024;
+        std::size_t records = 32'768;
+        std::size_t bytes = std::size_t{4} * 1024 * 1024;
     };
 
     explicit ClientQueue(Limits limits) : _limits(limits) {}

@@ -17,7 +17,7 @@ namespace kelvo {
 class TelephonyService final : private RecordSink, private LogChannel::Owner {
 public:
     struct Limits {
-        std::size_t channels = 32;
+        std::size_t channels = 16;
         std::size_t channelsPerClient = 4;  ///< that deliver to one local port
         ClientQueue::Limits queue{};        ///< of every client
     };

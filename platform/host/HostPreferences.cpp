@@ -8,7 +8,6 @@
 #include <QSaveFile>
 #include <algorithm>
 #include <cctype>
-#include <cstdlib>
 #include <string>
 
 #include "platform/Environment.h"
@@ -72,23 +71,31 @@ Result<bool> change(const std::filesystem::path& directory, std::string_view dom
     return save(path, *preferences);
 }
 
-// Asking for the bus where there is none would start one, or wait for one.
-bool hasSessionBus() {
-    const char* address = std::getenv("DBUS_SESSION_BUS_ADDRESS");
-    if (address != nullptr && *address != '\0') return true;
-    const char* runtime = std::getenv("XDG_RUNTIME_DIR");
-    return runtime != nullptr && QFileInfo::exists(QString::fromLocal8Bit(runtime) + "/bus");
+// Where the session bus is; empty where there is none. To ask for it by its kind would start one, or wait for one.
+QString sessionBusAddress() {
+    const QString address = qEnvironmentVariable("DBUS_SESSION_BUS_ADDRESS");
+    if (!address.isEmpty()) return address;
+    const QString socket = qEnvironmentVariable("XDG_RUNTIME_DIR") + "/bus";
+    return QFileInfo::exists(socket) ? "unix:path=" + socket : QString();
 }
 
-bool sendChanged(const QString& domain, const QString& key) {
-    QDBusConnection bus = QDBusConnection::sessionBus();
-    QDBusMessage signal = QDBusMessage::createSignal("/com/zorvik/Preferences", "com.zorvik.Preferences", "Changed");
-    signal << domain << key;
+bool sendOn(QDBusConnection bus, const QDBusMessage& signal) {
     if (!bus.isConnected() || !bus.send(signal)) return false;
     // Sending only queues. What the bus answers comes after everything that was queued before.
     const QDBusMessage question = QDBusMessage::createMethodCall("org.freedesktop.DBus", "/org/freedesktop/DBus",
                                                                  "org.freedesktop.DBus", "GetId");
     return bus.call(question, QDBus::Block, kBusLimitMs).type() == QDBusMessage::ReplyMessage;
+}
+
+bool sendChanged(const QString& domain, const QString& key) {
+    const QString address = sessionBusAddress();
+    if (address.isEmpty()) return false;
+    QDBusMessage signal = QDBusMessage::createSignal("/com/zorvik/Preferences", "com.zorvik.Preferences", "Changed");
+    signal << domain << key;
+    const QString connection = "kelvo-preferences";
+    const bool sent = sendOn(QDBusConnection::connectToBus(address, connection), signal);
+    QDBusConnection::disconnectFromBus(connection);
+    return sent;
 }
 
 }  // namespace
@@ -107,7 +114,7 @@ void HostPreferences::broadcastChange(std::string_view domain, std::string_view 
     const auto text = [](std::string_view from) {
         return QString::fromUtf8(from.data(), static_cast<qsizetype>(from.size()));
     };
-    if (!hasSessionBus() || !sendChanged(text(domain), text(key)))
+    if (!sendChanged(text(domain), text(key)))
         logLine(Level::Error, "Could not tell that preference %s of %s changed: no session bus", key, domain);
 }
 

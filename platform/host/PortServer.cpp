@@ -13,7 +13,8 @@ namespace kelvo {
 namespace {
 
 constexpr std::size_t kMaxConnections = 64;
-constexpr std::size_t kMessagesPerTurn = 256;  // over all connections
+constexpr std::size_t kMessagesPerTurn = 256;         // over all connections
+constexpr std::chrono::milliseconds kTimePerTurn{8};  // for one connection: half a frame of the screen
 constexpr int kAcceptsPerTurn = 16;
 constexpr std::chrono::milliseconds kAcceptPause{500};
 
@@ -77,8 +78,9 @@ void PortServer::receive(int fd) {
     const auto self = shared_from_this();
     _delivering = true;
     const std::size_t share = std::max<std::size_t>(1, kMessagesPerTurn / _connections.size());
-    for (std::size_t i = 0; i < share && isOpen() && receiveOne(fd); ++i) {
-    }
+    const auto end = std::chrono::steady_clock::now() + kTimePerTurn;
+    for (std::size_t i = 0; i < share && isOpen() && receiveOne(fd); ++i)
+        if (std::chrono::steady_clock::now() > end) break;
     _delivering = false;
 }
 

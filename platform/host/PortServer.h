@@ -15,7 +15,7 @@ namespace kelvo {
 
 /// What works behind a local port: accepts senders, reads their messages, sends the replies. It is shared with the
 /// delivery that is running, so that a message's callback may close or destroy the port.
-/// One turn of the event loop takes a bounded number of messages, an equal share from every sender.
+/// One turn of the event loop takes a bounded number of messages, an equal share from every sender, in bounded time.
 class PortServer : public std::enable_shared_from_this<PortServer> {
 public:
     PortServer(PortClaim claim, std::string name, MessageCallback callback);

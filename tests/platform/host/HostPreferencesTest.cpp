@@ -4,6 +4,7 @@
 #include <sys/stat.h>
 #include <unistd.h>
 
+#include <QProcess>
 #include <fstream>
 #include <sstream>
 
@@ -119,4 +120,30 @@ TEST_F(HostPreferencesTest, WithABusThatDoesNotAnswerWritesOneLine) {
     _preferences.broadcastChange("com.zorvik.dockmere", "DMShowGSMRSSI");
     ::unsetenv("DBUS_SESSION_BUS_ADDRESS");
     EXPECT_EQ(_log.lines().size(), 1U);
+}
+
+TEST_F(HostPreferencesTest, TellsTheChangeOnTheSessionBus) {
+    QProcess bus;
+    bus.start("dbus-daemon", {"--session", "--nofork", "--print-address"});
+    if (!bus.waitForStarted()) GTEST_SKIP() << "no bus is installed";
+    ASSERT_TRUE(test::runUntil([&] { return bus.canReadLine(); }));
+    const QByteArray address = bus.readLine().trimmed();
+    ::setenv("DBUS_SESSION_BUS_ADDRESS", address.constData(), 1);
+    QProcess monitor;
+    monitor.start("dbus-monitor", {"--address", address, "interface='com.zorvik.Preferences'"});
+    ASSERT_TRUE(monitor.waitForStarted());
+    QByteArray seen;
+    ASSERT_TRUE(test::runUntil([&] {  // told until the monitor listens, too
+        _preferences.broadcastChange("com.zorvik.dockmere", "DMShowGSMRSSI");
+        seen += monitor.readAllStandardOutput();
+        return seen.contains("member=Changed") && seen.contains("string \"DMShowGSMRSSI\"");
+    }));
+    EXPECT_TRUE(seen.contains("path=/com/zorvik/Preferences; interface=com.zorvik.Preferences; member=Changed"));
+    EXPECT_TRUE(seen.contains("string \"com.zorvik.dockmere\""));
+    EXPECT_TRUE(_log.lines().empty());
+    ::unsetenv("DBUS_SESSION_BUS_ADDRESS");
+    for (QProcess* process : {&monitor, &bus}) {
+        process->kill();
+        process->waitForFinished();
+    }
 }

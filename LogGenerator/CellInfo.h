@@ -2,7 +2,9 @@
 
 #include <span>
 #include <string_view>
+#include <vector>
 
+#include "LogGenerator/FieldTable.h"
 #include "platform/Bytes.h"
 #include "platform/Value.h"
 
@@ -13,8 +15,11 @@ namespace kelvo {
 /// The property list behind a packet's 13-byte header, in any encoding; none when it does not parse.
 Value payloadPropertyList(ByteView packet);
 
-/// The cell-information array of a packet. A payload that does not parse gives none and two error lines; one that
-/// parses to something else than an array holds no cells.
+/// The cell-information array in a payload. One that did not parse gives none and two error lines; one that parsed to
+/// something else than an array holds no cells.
+ArrayRef cellsOf(const Value& payload);
+
+/// The cell-information array of a packet: `cellsOf` its payload.
 ArrayRef cellInfoArray(ByteView packet);
 
 /// Whether `cell` is a dictionary that says both `technology` and `cellType`.
@@ -28,9 +33,18 @@ struct CellField {
     std::string_view cellKey;
     Key displayKey;
     const char* failure;  ///< the error line when the cell lacks it or it is no 32-bit integer
+    Shown shown = decimal;
 };
 
-/// Shows each field with "%d", in order; one that fails leaves its display key as it was.
+/// Shows each field in order; one that fails leaves its display key as it was.
 void showCell(Dictionary& shown, const Dictionary& cell, std::span<const CellField> fields);
+
+/// Shows the first serving cell of `technology` in a packet's cell-information array; without one, or with nowhere to
+/// show it, nothing changes.
+void showServingCell(const DictionaryRef& shown, ByteView packet, std::string_view technology,
+                     std::span<const CellField> fields);
+
+/// One row for each neighbour cell of `technology`, in the array's order. A field that fails is missing in its row.
+std::vector<Value> neighborRows(const Array& cells, std::string_view technology, std::span<const CellField> fields);
 
 }  // namespace kelvo

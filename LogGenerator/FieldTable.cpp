@@ -22,13 +22,13 @@ public:
     void appendNumber(How... how) {
         _end = std::to_chars(_end, _text.data() + _text.size(), how...).ptr;
     }
-    /// Pads what was written since `from` with blanks on its left.
-    void padSince(std::size_t from, int width) {
+    /// Pads what was written since `from` on its left.
+    void padSince(std::size_t from, int width, char filler) {
         const std::size_t length = size() - from;
         if (length >= static_cast<std::size_t>(width)) return;
         const std::size_t missing = std::min(static_cast<std::size_t>(width) - length, room());
         std::memmove(_text.data() + from + missing, _text.data() + from, length);
-        std::memset(_text.data() + from, ' ', missing);
+        std::memset(_text.data() + from, filler, missing);
         _end += missing;
     }
     std::size_t size() const { return static_cast<std::size_t>(_end - _text.data()); }
@@ -48,7 +48,7 @@ void printBetween(std::string& text, const NumberFormat& format, bool negative, 
     const std::size_t from = line.size();
     if (format.plus && !negative) line.append('+');
     digits(line);
-    line.padSince(from, format.width);
+    line.padSince(from, format.width, format.zeros ? '0' : ' ');
     line.append(format.after);
     text.assign(line.text());
 }
@@ -58,12 +58,12 @@ void printInteger(std::string& text, std::int64_t value, const NumberFormat& for
         text.assign(format.before);
         return;
     }
+    if (format.conversion == 'x') {
+        printBetween(text, format, false,
+                     [value](Line& line) { line.appendNumber(static_cast<std::uint64_t>(value), 16); });
+        return;
+    }
     printBetween(text, format, value < 0, [value](Line& line) { line.appendNumber(value); });
-}
-
-void printReal(std::string& text, double value, const NumberFormat& format) {
-    printBetween(text, format, std::signbit(value),
-                 [&](Line& line) { line.appendNumber(value, std::chars_format::fixed, format.precision); });
 }
 
 /// Two decimals of a number of eighths. 1/8 is 12.5 hundredths; the half goes to the even neighbour, as printf rounds.
@@ -111,11 +111,16 @@ void print(std::string& text, std::int64_t raw, const Shown& shown) {
         case Shown::How::Signed32: printInteger(text, static_cast<std::int32_t>(raw), shown.format); break;
         case Shown::How::Label: printLabel(text, raw, shown); break;
         case Shown::How::Linear:
-            printReal(text, static_cast<double>(raw) * shown.scale + shown.offset, shown.format);
+            print(text, static_cast<double>(raw) * shown.scale + shown.offset, shown.format);
             break;
         case Shown::How::Eighths: printEighths(text, raw * shown.factor + shown.summand, shown.format); break;
         case Shown::How::Whole: printInteger(text, raw * shown.factor + shown.summand, shown.format); break;
     }
+}
+
+void print(std::string& text, double value, const NumberFormat& format) {
+    printBetween(text, format, std::signbit(value),
+                 [&](Line& line) { line.appendNumber(value, std::chars_format::fixed, format.precision); });
 }
 
 void showFields(Dictionary& shown, RecordView record, std::size_t base, std::span<const Field> fields) {

@@ -65,6 +65,11 @@ inline constexpr Shown asSigned{.how = Shown::How::Signed32, .format = "%d"};
 /// Printed as an unsigned number.
 inline constexpr Shown asUnsigned{.how = Shown::How::Unsigned, .format = "%u"};
 
+/// Printed in base 16, as the format's "%x" says.
+constexpr Shown hexadecimal(const char* format) { return {.how = Shown::How::Unsigned, .format = format}; }
+/// One text whatever the value is.
+constexpr Shown fixedText(const char* text) { return {.how = Shown::How::Decimal, .format = text}; }
+
 /// The value's name.
 template <std::size_t N>
 constexpr Shown label(const ValueTable<N>& table) {
@@ -148,6 +153,8 @@ consteval Layout<N> entry(std::size_t size, const Field (&fields)[N]) {
 
 /// Writes `raw` to `text` in the way `shown` says.
 void print(std::string& text, std::int64_t raw, const Shown& shown);
+/// Writes a real number to `text`; infinities and not-a-number as printf writes them.
+void print(std::string& text, double value, const NumberFormat& format);
 
 /// Shows fields in their order; `base` is the offset from which theirs count.
 void showFields(Dictionary& shown, RecordView record, std::size_t base, std::span<const Field> fields);

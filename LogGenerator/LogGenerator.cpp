@@ -1,5 +1,7 @@
 #include "LogGenerator/LogGenerator.h"
 
+#include "LogGenerator/CDMA/C2KLogGenerator.h"
+#include "LogGenerator/GSMUMTS/OSK_GSMLogGenerator.h"
 #include "LogGenerator/LTE/LTELogGenerator.h"
 #include "platform/DateText.h"
 #include "platform/Environment.h"
@@ -14,6 +16,8 @@ constexpr std::size_t kHistoryLimit = 5;
 LogGenerator::LogGenerator() { logLine(Level::Warning, "Creating Log object: %p", static_cast<const void*>(this)); }
 
 std::unique_ptr<LogGenerator> LogGenerator::generatorFromTechnology(std::string_view technology) {
+    if (technology == kPLLogChannelTechnology_Oskra_GSM) return OSK_GSMLogGenerator::generator();
+    if (technology == kPLLogChannelTechnology_Oskra_CDMA) return C2KLogGenerator::generator();
     if (technology == kPLLogChannelTechnology_Oskra_LTE) return LTELogGenerator::generator();
     return nullptr;
 }

@@ -202,21 +202,30 @@ private:
     /// First the references to all keys, then those to their values.
     bool readDictionary(const Object& object, int depth, Value& out) {
         auto dictionary = std::make_shared<Dictionary>();
+        dictionary->reserve(object.count);
         for (std::size_t i = 0; i < object.count; ++i) {
             std::size_t value = 0;
-            if (!readKey(object, i) || !readReference(object, object.count + i, value)) return false;
-            if (!readObject(value, depth + 1, dictionary->slot(_key))) return false;
+            std::string_view key;
+            if (!readKey(object, i, key) || !readReference(object, object.count + i, value)) return false;
+            if (!readObject(value, depth + 1, dictionary->slot(key))) return false;
         }
         out = std::move(dictionary);
         return true;
     }
 
-    bool readKey(const Object& dictionary, std::size_t i) {
+    /// The key is read where it stands when it is ASCII; it is valid until the next one.
+    bool readKey(const Object& dictionary, std::size_t i, std::string_view& out) {
         std::size_t index = 0;
         Object key{};
         if (!readReference(dictionary, i, index) || !openObject(index, key)) return false;
         if (key.kind != 0x5 && key.kind != 0x6) return fail("key that is not a string", key.at);
-        return readString(key, _key);
+        if (key.kind == 0x5 && fits(key, key.count)) {
+            out = textOf(_data.subspan(key.start, key.count));
+            if (isAscii(out)) return spend(_bytesLeft, key.count, key);
+        }
+        if (!readString(key, _key)) return false;
+        out = _key;
+        return true;
     }
 
     /// Reference `i` of a container whose references are known to lie inside the document.

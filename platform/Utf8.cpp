@@ -6,11 +6,17 @@ namespace kelvo {
 
 namespace {
 
-bool isAscii(char c) { return static_cast<unsigned char>(c) < 0x80; }
+bool isAsciiByte(char c) { return static_cast<unsigned char>(c) < 0x80; }
 bool isHighSurrogate(char32_t unit) { return unit >= 0xD800 && unit < 0xDC00; }
 bool isLowSurrogate(char32_t unit) { return unit >= 0xDC00 && unit < 0xE000; }
 
 }  // namespace
+
+bool isAscii(std::string_view text) {
+    unsigned bits = 0;  // a loop without a way out, which compilers turn into wide steps
+    for (const char c : text) bits |= static_cast<unsigned char>(c);
+    return bits < 0x80;
+}
 
 Utf8Character firstUtf8Character(std::string_view text) {
     constexpr Utf8Character kMalformed{kReplacementCharacter, 1};
@@ -48,7 +54,8 @@ void appendUtf8(std::string& out, char32_t code) {
 
 void appendCleanUtf8(std::string& out, std::string_view text) {
     while (!text.empty()) {
-        const auto run = static_cast<std::size_t>(std::find_if_not(text.begin(), text.end(), isAscii) - text.begin());
+        const auto run =
+            static_cast<std::size_t>(std::find_if_not(text.begin(), text.end(), isAsciiByte) - text.begin());
         out.append(text, 0, run);
         text.remove_prefix(run);
         if (text.empty()) return;

@@ -18,6 +18,9 @@ struct Utf8Character {
     std::size_t length;
 };
 
+/// Whether every byte of `text` is below 0x80.
+bool isAscii(std::string_view text);
+
 /// The first code point of `text`, which is not empty. A byte that is not UTF-8 (overlong forms, surrogates and cut
 /// sequences included) gives U+FFFD with length 1.
 Utf8Character firstUtf8Character(std::string_view text);

@@ -3,7 +3,6 @@
 #include <fmt/format.h>
 
 #include <algorithm>
-#include <array>
 #include <charconv>
 #include <optional>
 #include <pugixml.hpp>
@@ -19,9 +18,18 @@ namespace kelvo {
 
 namespace {
 
-// References are resolved here and not by the parser, which keeps unknown ones as text and ends a text at "&#0;". White
-// space is kept, because it may be all that a string holds.
-constexpr unsigned kParseFlags = pugi::parse_cdata | pugi::parse_eol | pugi::parse_ws_pcdata | pugi::parse_fragment;
+// References are resolved here and not by the parser, which keeps unknown ones as text and ends a text at "&#0;".
+constexpr unsigned kParseFlags = pugi::parse_cdata | pugi::parse_eol | pugi::parse_fragment;
+
+/// How the parser treats text that is white space alone. All of it matters once a comment, an instruction or character
+/// data may cut a string in pieces; a document without any reads a good deal faster when what lies between elements is
+/// left out.
+unsigned spaceFlag(std::string_view text) {
+    const std::size_t prolog = text.starts_with("<?xml") ? text.find("?>") : std::string_view::npos;
+    const std::size_t body = prolog == std::string_view::npos ? 0 : prolog + 2;
+    const bool mayBeCut = text.find('!') != std::string_view::npos || text.find('?', body) != std::string_view::npos;
+    return mayBeCut ? pugi::parse_ws_pcdata : pugi::parse_ws_pcdata_single;
+}
 
 bool isSpace(char c) { return c == ' ' || (c >= '\t' && c <= '\r'); }
 
@@ -77,7 +85,7 @@ std::optional<char32_t> parseReference(std::string_view name) {
 class XmlReader {
 public:
     Result<Value> read(std::string_view text) {
-        const pugi::xml_parse_result parsed = _document.load_buffer(text.data(), text.size(), kParseFlags);
+        const auto parsed = _document.load_buffer(text.data(), text.size(), kParseFlags | spaceFlag(text));
         if (!parsed) {
             return Failure{fmt::format("not well-formed XML at offset {}: {}", parsed.offset, parsed.description())};
         }
@@ -190,7 +198,7 @@ private:
         const pugi::xml_node first = node.first_child();
         if (!first.next_sibling() && !isElement(first)) {
             const std::string_view text = first.value();
-            if (std::all_of(text.begin(), text.end(), isPlain)) return text;
+            if (isAscii(text) && text.find('&') == std::string_view::npos) return text;
         }
         _text.clear();
         for (pugi::xml_node child : node.children()) {
@@ -202,8 +210,6 @@ private:
         }
         return _text;
     }
-
-    static bool isPlain(char c) { return c != '&' && static_cast<unsigned char>(c) < 0x80; }
 
     bool appendText(pugi::xml_node node) {
         std::string_view text = node.value();

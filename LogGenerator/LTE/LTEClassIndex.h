@@ -1,6 +1,8 @@
 #pragma once
 
 #include "LogGenerator/ClassIndex.h"
+#include "LogGenerator/GSMUMTS/PDPContextList.h"
+#include "LogGenerator/GSMUMTS/SimInfo.h"
 #include "LogGenerator/LTE/ConnectedModeMeasurementMisc.h"
 #include "LogGenerator/LTE/LTEServingCellInfo.h"
 #include "LogGenerator/LTE/ServingCellMeasurement.h"
@@ -16,6 +18,8 @@ private:
     LTEServingCellInfo objLTEServingCellInfo{classDict, codeDictionary};
     ConnectedModeMeasurementMisc objConnectedModeMeasurementMisc{classDict, codeDictionary};
     ServingCellMeasurement objServingCellMeasurement{classDict, codeDictionary};
+    SimInfo objSimInfo{classDict, codeDictionary};
+    PDPContextList objPDPContextList{classDict, codeDictionary};
 };
 
 }  // namespace kelvo

@@ -53,17 +53,9 @@ void LTEServingCellInfo::updateWithData(ByteView data, LogCode logCode) {
         case 0xB0C1:
             if (show(data, kAntennas)) reportUnknown(logCode);  // intended: shown and still reported
             break;
-        case 0xFF0001: showCellArray(data); break;
+        case 0xFF0001: showServingCell(values(), data, kPLCellMonitorRadioAccessTechnologyLTE, kCell); break;
         default: reportUnknown(logCode);
     }
-}
-
-void LTEServingCellInfo::showCellArray(ByteView data) {
-    const ArrayRef cells = cellInfoArray(data);
-    if (!cells) return;
-    const Dictionary* serving =
-        firstCell(*cells, kPLCellMonitorRadioAccessTechnologyLTE, kPLCellMonitorCellTypeServing);
-    if (serving != nullptr && values()) showCell(*values(), *serving, kCell);
 }
 
 }  // namespace kelvo

@@ -14,9 +14,6 @@ public:
 
     using Section::Section;
     void updateWithData(ByteView data, LogCode logCode) override;
-
-private:
-    void showCellArray(ByteView data);
 };
 
 }  // namespace kelvo

@@ -2,6 +2,7 @@
 
 #include <gtest/gtest.h>
 
+#include <cmath>
 #include <cstdio>
 
 namespace kelvo {
@@ -60,6 +61,19 @@ TEST(FieldTable, PrintsWholeNumbersAsPrintfDoes) {
     EXPECT_EQ(printed(64, whole(1, -30, "%d dBm").unless(64, "Not Present")), "Not Present");
 }
 
+TEST(FieldTable, PrintsHexadecimalNumbersAsPrintfDoes) {
+    EXPECT_EQ(printed(0xabc, hexadecimal("0x%06x")), "0x000abc");
+    EXPECT_EQ(printed(0xfedcba, hexadecimal("0x%06x")), "0xfedcba");
+    EXPECT_EQ(printed(0x1234567, hexadecimal("%06x")), "1234567");
+    EXPECT_EQ(printed(0xF0, hexadecimal("%x h")), "f0 h");
+    EXPECT_EQ(printed(10, hexadecimal("%4x")), "   a");
+}
+
+TEST(FieldTable, ShowsAFixedTextWhateverTheValue) {
+    EXPECT_EQ(printed(0, fixedText("N/A")), "N/A");
+    EXPECT_EQ(printed(-1, fixedText("N/A")), "N/A");
+}
+
 TEST(FieldTable, NamesValuesAndFallsBack) {
     static constexpr ValueTable kDense({{0, "A"}, {1, "B"}}, "Unknown");
     static constexpr ValueTable kSparse({{6, "six"}, {255, "last"}}, "[Reserved %d]");
@@ -87,6 +101,17 @@ TEST(FieldTable, PrintsOtherRealNumbersAsPrintfDoes) {
         ASSERT_EQ(printed(raw, linear(1.0 / 256, 0.0, "%f")), byPrintf("%f", value * (1.0 / 256)));
         ASSERT_EQ(printed(raw, linear(0.334, -63.248, "%+.2f dBm")), byPrintf("%+.2f dBm", value * 0.334 - 63.248));
     }
+}
+
+TEST(FieldTable, PrintsRealNumbersOutsideTheNumberLineAsPrintfDoes) {
+    for (const double value : {-1.0 / 0.0, 1.0 / 0.0, std::nan(""), -std::nan(""), -0.0, 0.0, -0.001, 1e300}) {
+        std::string text;
+        print(text, value, "%+.2f dB");
+        EXPECT_EQ(text, byPrintf("%+.2f dB", value));
+    }
+    std::string text;
+    print(text, -1.0 / 0.0, "%+.2f dB");
+    EXPECT_EQ(text, "-inf dB");
 }
 
 TEST(FieldTable, DoesNotMakeUpRowsBeyondTheEnd) {

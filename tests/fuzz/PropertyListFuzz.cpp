@@ -30,9 +30,7 @@ Bytes mustWrite(const Value& value) {
 }
 
 /// Characters that XML cannot carry may make two keys one, which only then changes the document once more.
-bool hasReplacements(const Bytes& document) {
-    return textOf(document).find("\xEF\xBF\xBD") != std::string_view::npos;
-}
+bool hasReplacements(const Bytes& document) { return textOf(document).find("\xEF\xBF\xBD") != std::string_view::npos; }
 
 }  // namespace
 

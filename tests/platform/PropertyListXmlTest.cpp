@@ -116,6 +116,9 @@ TEST(XmlPropertyListReader, KeepsWhiteSpaceInStrings) {
 
 TEST(XmlPropertyListReader, JoinsTheTextAroundCommentsAndCharacterData) {
     EXPECT_EQ(value("<string>a<!-- <b> --> <![CDATA[<&amp;]]>&lt;c</string>"), Value("a <&amp;<c"));
+    EXPECT_EQ(value("<string> <![CDATA[]]></string>"), Value(" "));
+    EXPECT_EQ(*read("<?xml version=\"1.0\"?><string>a<?pi?> <?pi?>b</string>"), Value("a b"));
+    EXPECT_EQ(*read("<string> <?pi?></string>"), Value(" "));
 }
 
 TEST(XmlPropertyListReader, ResolvesReferences) {

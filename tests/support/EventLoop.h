@@ -1,9 +1,7 @@
 #pragma once
 
 #include <QCoreApplication>
-#include <QTemporaryDir>
 #include <chrono>
-#include <filesystem>
 #include <thread>
 
 namespace kelvo::test {
@@ -24,14 +22,5 @@ bool runUntil(Condition condition) {
 inline void settle() {
     for (int turn = 0; turn < 20; ++turn) QCoreApplication::processEvents(QEventLoop::AllEvents);
 }
-
-/// A directory of the test's own, gone with it.
-class TemporaryDirectory {
-public:
-    std::filesystem::path path() const { return _directory.path().toStdString(); }
-
-private:
-    QTemporaryDir _directory;
-};
 
 }  // namespace kelvo::test

@@ -11,6 +11,7 @@
 #include "platform/PropertyList.h"
 #include "tests/support/EventLoop.h"
 #include "tests/support/RecordingLog.h"
+#include "tests/support/TemporaryDirectory.h"
 
 namespace fs = std::filesystem;
 using namespace kelvo;

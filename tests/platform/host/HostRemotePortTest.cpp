@@ -9,6 +9,7 @@
 #include "tests/platform/host/RawPort.h"
 #include "tests/support/EventLoop.h"
 #include "tests/support/RecordingLog.h"
+#include "tests/support/TemporaryDirectory.h"
 
 using namespace kelvo;
 using namespace std::chrono_literals;

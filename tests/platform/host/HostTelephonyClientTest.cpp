@@ -7,6 +7,7 @@
 #include "platform/host/HostMessagePorts.h"
 #include "tests/platform/host/RawPort.h"
 #include "tests/support/EventLoop.h"
+#include "tests/support/TemporaryDirectory.h"
 
 using namespace kelvo;
 using test::runUntil;

@@ -1,0 +1,12 @@
+#pragma once
+
+#include "platform/Bytes.h"
+#include "platform/Dictionary.h"
+
+namespace kelvo {
+
+/// 0x1183: channel, levels, states and addresses of EV-DO (3GPP2 C.S0024), in a record of exactly 50 bytes. The second
+/// receive chain and the transmitter show "N/A" unless the device has access.
+void decodeEVDOStatus(ByteView packet, Dictionary& state, const DictionaryRef& lookup);
+
+}  // namespace kelvo

@@ -1,0 +1,33 @@
+#pragma once
+
+#include <memory>
+
+#include "LogGenerator/OSKLogGenerator.h"
+
+namespace kelvo {
+
+/// The generator of CDMA2000 modems, 1x and EV-DO. Its screens come from the template "C2KTemplate": a text in it is
+/// the lookup key of the value that is to be shown there, and a decoded value is shown at every place that names its
+/// key. Everything it keeps lives in the state: beside the keys of every generator, "Lookup" (lookup key to the places
+/// in the live display) and the running values of the data rates and the frame error rate.
+class C2KLogGenerator final : public OSKLogGenerator {
+public:
+    static std::unique_ptr<LogGenerator> generator() { return std::make_unique<C2KLogGenerator>(); }
+
+    void updateState(Dictionary& state, ByteView data) override;
+    Value generateLogUsingState(Dictionary& state) override;
+    DictionaryRef getStartCommand() override;
+
+    /// Decodes one message and keeps its packet for the raw log, also when its decoder refuses it. Messages that are
+    /// no packet, and codes that were not asked for, leave no trace. A null lookup shows nothing.
+    void updateFromLog(ByteView data, const DictionaryRef& usingLookup, Dictionary& usingState);
+
+    /// Fills `storeDisplayIntoDict` with the template's screens, every value still "", and `storeLookupIntoDict` with
+    /// the places of each lookup key. What is neither a dictionary nor a string is left out.
+    static void processTemplate(const Dictionary& templateDict, const DictionaryRef& storeDisplayIntoDict,
+                                Dictionary& storeLookupIntoDict);
+    /// The state's display, built on the first call; none, with one line, while the template cannot be loaded.
+    static Value getDisplayFromState(Dictionary& state);
+};
+
+}  // namespace kelvo

@@ -1,0 +1,20 @@
+#include "LogGenerator/CDMA/C2KPilotList.h"
+
+#include <fmt/format.h>
+
+#include "LogGenerator/FieldTable.h"
+
+namespace kelvo {
+
+C2KPilotList::C2KPilotList(std::size_t pilots) { _rows->reserve(1 + pilots); }
+
+void C2KPilotList::add(std::size_t position, std::int64_t pn, double level, const NumberFormat& format) {
+    print(_rows->slot(fmt::format("{};{}", position, pn)).text(), level, format);
+}
+
+Value C2KPilotList::rowsOrNone() const {
+    if (_rows->size() == 1) return "(none)";  // the mark of the key order alone
+    return _rows;
+}
+
+}  // namespace kelvo

@@ -1,0 +1,52 @@
+#include "LogGenerator/CDMA/C2KTrafficFER.h"
+
+#include "LogGenerator/CDMA/C2KFindSubpacket.h"
+#include "LogGenerator/CDMA/C2KStoreDisplayValue.h"
+#include "LogGenerator/RecordView.h"
+#include "platform/Environment.h"
+
+namespace kelvo {
+
+namespace {
+
+constexpr std::size_t kMinimum = 17;
+constexpr Key kTrafficFER("TrafficFER");
+
+/// In single precision, as the filter has always run: one frame in 64 counts.
+float filtered(bool erased, const Number* previous) {
+    float rate = (erased ? 1.0F : 0.0F) * 0.015625F;
+    if (previous != nullptr) rate += 0.984375F * static_cast<float>(previous->real());
+    return rate;
+}
+
+void show(const char* format, double rate, const DictionaryRef& lookup) {
+    C2KStoreDisplayValue("k1xTrafficFER", fmt::sprintf(format, 100 * rate), lookup);
+}
+
+}  // namespace
+
+void decodeTrafficFER(ByteView packet, Dictionary& state, const DictionaryRef& lookup) {
+    if (packet.size() < kMinimum) {
+        logLine(Level::Error, "Log code 0x119d is %d bytes long but must be at least %ld bytes.", packet.size(),
+                kMinimum);
+        return;
+    }
+    const auto demodulation = C2KFindSubpacket(packet, 11);
+    if (!demodulation) {
+        logLine(Level::Warning, "Log code 0x119d: missing traffic demod subpacket.");
+        return;
+    }
+    const bool erased = RecordView(packet).read(*demodulation + 24, u8) != 0;
+    const double rate = filtered(erased, state[kTrafficFER].number());
+    state.set(kTrafficFER, rate);
+    show("%.02f%%", rate, lookup);
+}
+
+void endTrafficFER(Dictionary& state, const DictionaryRef& lookup) {
+    const Number* rate = state[kTrafficFER].number();
+    if (rate == nullptr) return;
+    show("%.02f%% (old)", rate->real(), lookup);
+    state.remove(kTrafficFER);
+}
+
+}  // namespace kelvo

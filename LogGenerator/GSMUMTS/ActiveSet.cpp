@@ -1,0 +1,58 @@
+#include "LogGenerator/GSMUMTS/ActiveSet.h"
+
+#include "platform/Environment.h"
+
+namespace kelvo {
+
+namespace {
+
+constexpr std::size_t kCellSize = 15;
+constexpr std::size_t kMeasurementSize = 44;
+
+// clang-format off
+constexpr auto kCell = entry(kCellSize, {
+    { 7, u16.bits(0, 12), "Scrambling Code", decimal },
+});
+// clang-format on
+constexpr Raw kSetType = u16.bits(13, 15);  // at 7 as well; 0 is the active set
+constexpr Shown kDecibel = whole(1, 0, "%d dB");
+
+/// The cell's energy in dB: the first of its three measurements that is there.
+std::int64_t energyOf(RecordView record, std::size_t measurement) {
+    std::int64_t raw = 0;
+    for (std::size_t at : {32, 36, 40}) {
+        if (raw == 0) raw = record.read(measurement + at, u32);
+    }
+    return Base::lookUpECNO(static_cast<std::uint32_t>(raw));
+}
+
+}  // namespace
+
+void ActiveSet::updateWithData(ByteView data, LogCode logCode) {
+    logLine(Level::Warning, "ActiveSet");
+    if (logCode != 0x417a) return reportUnknown(logCode);
+    if (data.size() < 16) return;
+    clearElementsInArray(list());
+    const auto count = static_cast<std::size_t>(RecordView(data).read(15, u8));
+    if (count > 0) replaceArray(list(), activeCells(data, count));
+}
+
+std::vector<Value> ActiveSet::activeCells(ByteView data, std::size_t count) {
+    const RecordView record(data);
+    const std::int64_t rssi = (record.read(13, i16) + 512) / 10 - 106;
+    const RecordEntries cells(16, kCellSize, count);
+    const RecordEntries measurements(16 + kCellSize * count, kMeasurementSize, count);
+    std::vector<Value> active;
+    for (std::size_t i = 0; i < count && cells.offsetOf(i) < data.size(); ++i) {
+        if (record.read(cells.offsetOf(i) + 7, kSetType) != 0) continue;
+        const std::int64_t energy = energyOf(record, measurements.offsetOf(i));
+        const DictionaryRef cell = Dictionary::make();
+        showFields(*cell, record, cells.offsetOf(i), kCell.fields);
+        print(cell->slot("RSCP").text(), rssi + energy, kDecibel);
+        print(cell->slot("Energy Per Chip").text(), energy, kDecibel);
+        active.emplace_back(cell);
+    }
+    return active;
+}
+
+}  // namespace kelvo

@@ -1,0 +1,31 @@
+#include "LogGenerator/GSMUMTS/BLER.h"
+
+#include "platform/Environment.h"
+
+namespace kelvo {
+
+namespace {
+
+// clang-format off
+constexpr auto kWindow = record(16, {
+    { 14, u16, "Window Size",           decimal  },
+});
+
+constexpr auto kChannel = entry(9, {
+    { 0,  u8,  "Transport Channel ID",  decimal  },
+    { 1,  u32, "CRC Received",          asSigned },
+    { 5,  u32, "CRC Received in Error", asSigned },
+});
+// clang-format on
+
+}  // namespace
+
+void BLER::updateWithData(ByteView data, LogCode logCode) {
+    logLine(Level::Warning, "BLER");
+    if (logCode != 0x4116) return reportUnknown(logCode);
+    if (!show(data, kWindow) || !values()) return;
+    const auto count = static_cast<std::size_t>(RecordView(data).read(13, u8));
+    values()->set("Transport Channels", std::make_shared<Array>(rows(data, 16, count, kChannel)));
+}
+
+}  // namespace kelvo

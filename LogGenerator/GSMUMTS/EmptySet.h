@@ -1,0 +1,26 @@
+#pragma once
+
+#include <array>
+
+#include "LogGenerator/Base.h"
+#include "platform/Environment.h"
+
+namespace kelvo {
+
+/// A cell set of the UMTS searcher that stays empty, as intended: the searcher's record (0x417a) empties it and none of
+/// its cells is taken in. `Derived` says with `kTraceWord` what each record writes to the log.
+template <class Derived>
+class EmptySet : public Section<Derived> {
+public:
+    static constexpr std::array<LogCode, 1> kLogCodes = {0x417a};
+
+    using Section<Derived>::Section;
+
+    void updateWithData(ByteView data, LogCode logCode) final {
+        logLine(Level::Warning, Derived::kTraceWord);
+        if (logCode != 0x417a) return this->reportUnknown(logCode);
+        if (data.size() >= 16) this->clearElementsInArray(this->list());
+    }
+};
+
+}  // namespace kelvo

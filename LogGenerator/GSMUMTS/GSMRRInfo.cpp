@@ -1,0 +1,70 @@
+#include "LogGenerator/GSMUMTS/GSMRRInfo.h"
+
+#include "platform/Environment.h"
+
+namespace kelvo {
+
+namespace {
+
+// clang-format off
+constexpr ValueTable kStates({  // the blanks within 13, 19 and 21 are meant to be there
+    {  0, "RR_INACTIVE"                          },
+    {  1, "RR_GOING_ACTIVE"                      },
+    {  2, "RR_GOING_INACTIVE"                    },
+    {  3, "RR_CELL_SELECTION"                    },
+    {  4, "RR_PLMN_LIST_CONSTRUCTION"            },
+    {  5, "RR_IDLE"                              },
+    {  6, "RR_CELL_RESELECTION"                  },
+    {  7, "RR_CONNECTION_PENDING"                },
+    {  8, "RR_CHOOSE_CELL"                       },
+    {  9, "RR_DATA_TRANSFER"                     },
+    { 10, "RR_NO_CHANNELS"                       },
+    { 11, "RR_CONNECTION_RELEASE"                },
+    { 12, "RR_EARLY_CAMPED_WAIT_FOR_SI"          },
+    { 13, "RR_W2G_INTERRAT_HANDOVER_ PROGRESS"   },
+    { 14, "RR_W2G_INTERRAT_RESELECTION_PROGRESS" },
+    { 15, "RR_WAIT_FOR_EARLY_PSCAN"              },
+    { 16, "GRR51"                                },
+    { 17, "GRR52"                                },
+    { 18, "RR_G2W_INTERRAT_RESELECTION_PROGRESS" },
+    { 19, "RR_G2W_INTERRAT_HANDOVER_ PROGRESS"   },
+    { 20, "RR_CELL_REEST"                        },
+    { 21, "RR_W2G_INTERRAT_CC_ORDER_ PROGRESS"   },
+}, "Unknown");
+
+constexpr auto kState = record(17, {  // 0x512c
+    { 13, u8,  "RR State",         label(kStates)          },
+    { 14, u8,  "RR Sub State",     decimal                 },
+    { 15, u8,  "RR Status",        decimal                 },
+    { 16, u8,  "RR Mode",          flag("Data", "Voice")   },
+});
+
+constexpr auto kMeasurement = record(29, {  // 0x5137; GSM Serving Cell shows the same bytes in its own way
+    { 15, u8,  "Serving Rx Level", decimal                 },
+    { 16, u32, "Rx Quality Full",  asSigned                },
+    { 20, u32, "Rx Quality Sub",   asSigned                },
+});
+
+constexpr auto kDTX = record(20, {  // 0x5072
+    { 19, u8,  "DTX Used",         flag("ON", "OFF")       },
+});
+
+constexpr auto kDRX = record(24, {  // 0x51f6
+    { 16, u8,  "DRX Used",         whole(1, 0, "%d sec")   },
+});
+// clang-format on
+
+}  // namespace
+
+void GSMRRInfo::updateWithData(ByteView data, LogCode logCode) {
+    logLine(Level::Warning, "GSMRRInfo");
+    switch (logCode) {
+        case 0x512c: show(data, kState); break;
+        case 0x5137: show(data, kMeasurement); break;
+        case 0x5072: show(data, kDTX); break;
+        case 0x51f6: show(data, kDRX); break;
+        default: reportUnknown(logCode);
+    }
+}
+
+}  // namespace kelvo

@@ -1,0 +1,48 @@
+#include "LogGenerator/GSMUMTS/HSDPAInformation.h"
+
+#include "platform/Environment.h"
+
+namespace kelvo {
+
+namespace {
+
+// clang-format off
+constexpr ValueTable kCarriers({
+    { 0, "Single Carrier" },
+    { 1, "MIMO"           },
+    { 2, "Dual Carrier"   },
+    { 3, "Reserved"       },
+}, "Unknown");
+
+constexpr auto kDownlink = record(18, {
+    { 13, u8,               "Version",      asUnsigned       },
+    { 14, u16.bits( 0,  9), "Sub Frames",   asUnsigned       },
+    { 14, u16.bits(10, 11), "Carrier Info", label(kCarriers) },
+});
+
+constexpr auto kProcess = entry(9, {
+    { 0,  u8,               "Process ID",   asUnsigned       },
+    { 1,  u32,              "No Rx Bits",   asUnsigned       },
+    { 5,  u16,              "New Tx",       asUnsigned       },
+    { 7,  u16,              "Block Errors", asUnsigned       },
+});
+// clang-format on
+
+}  // namespace
+
+void HSDPAInformation::updateWithData(ByteView data, LogCode logCode) {
+    logLine(Level::Warning, "HSDPA Info");
+    if (logCode != 0x4221 || !show(data, kDownlink)) return;
+    const RecordView record(data);
+    const auto primary = static_cast<std::size_t>(record.read(16, u8));
+    const auto secondary = static_cast<std::size_t>(record.read(17, u8));
+    showProcesses("Primary HARQ Process", data, 18, primary);
+    showProcesses("Secondary HARQ Process", data, 18 + 162 * primary, secondary);  // intended: a gap lies before them
+}
+
+void HSDPAInformation::showProcesses(Key key, ByteView data, std::size_t start, std::size_t count) {
+    if (count == 0 || !values()) return;
+    values()->set(key, std::make_shared<Array>(rows(data, start, count, kProcess)));
+}
+
+}  // namespace kelvo

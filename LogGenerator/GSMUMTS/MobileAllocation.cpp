@@ -1,0 +1,32 @@
+#include "LogGenerator/GSMUMTS/MobileAllocation.h"
+
+#include "platform/Environment.h"
+
+namespace kelvo {
+
+namespace {
+
+// clang-format off
+constexpr auto kSequence = record(15, {
+    { 13, u8, "HSN", decimal },
+});
+// clang-format on
+
+}  // namespace
+
+void MobileAllocation::updateWithData(ByteView data, LogCode logCode) {
+    logLine(Level::Warning, "MobileAllocation");
+    if (logCode != 0x51f8) return reportUnknown(logCode);
+    if (!show(data, kSequence) || !values()) return;
+    const RecordView record(data);
+    const RecordEntries entries(15, 2, static_cast<std::size_t>(record.read(14, u8)));
+    const ArrayRef channels = Array::make();
+    for (std::size_t i = 0; i < entries.count() && entries.offsetOf(i) < data.size(); ++i) {
+        Value channel;
+        print(channel.text(), record.read(entries.offsetOf(i), u16), decimal);
+        channels->append(std::move(channel));
+    }
+    values()->set("ARFCNs", channels);
+}
+
+}  // namespace kelvo

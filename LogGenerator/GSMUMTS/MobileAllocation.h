@@ -1,0 +1,19 @@
+#pragma once
+
+#include <array>
+
+#include "LogGenerator/Base.h"
+
+namespace kelvo {
+
+/// The channels of the hopping sequence and its number (3GPP TS 44.018, mobile allocation).
+class MobileAllocation final : public Section<MobileAllocation> {
+public:
+    static constexpr std::string_view kSectionName = "Mobile Allocation";
+    static constexpr std::array<LogCode, 1> kLogCodes = {0x51f8};
+
+    using Section::Section;
+    void updateWithData(ByteView data, LogCode logCode) override;
+};
+
+}  // namespace kelvo

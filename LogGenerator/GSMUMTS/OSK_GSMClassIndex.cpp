@@ -1,0 +1,9 @@
+#include "LogGenerator/GSMUMTS/OSK_GSMClassIndex.h"
+
+#include "platform/Environment.h"
+
+namespace kelvo {
+
+OSK_GSMClassIndex::~OSK_GSMClassIndex() { printLine("Deallocing OSK_GSMClassIndex"); }
+
+}  // namespace kelvo

@@ -1,0 +1,75 @@
+#include "LogGenerator/GSMUMTS/UMTSRRInfo.h"
+
+#include "LogGenerator/CellInfo.h"
+#include "platform/Environment.h"
+#include "platform/TelephonyConstants.h"
+
+namespace kelvo {
+
+namespace {
+
+// clang-format off
+constexpr ValueTable kRRCStates({
+    { 0, "Disconnected" },
+    { 1, "Connecting"   },
+    { 2, "CELL_FACH"    },
+    { 3, "CELL_DCH"     },
+    { 4, "CELL_PCH"     },
+    { 5, "URA_PCH"      },
+}, "Unknown");
+
+constexpr auto kState = record(14, {  // 0x4125
+    { 13, u8,  "RRC State",          label(kRRCStates)           },
+});
+
+constexpr auto kCell = record(29, {  // 0x4127
+    { 21, u32, "Cell ID",            asSigned                    },
+    { 17, u32, "Downlink Frequency", asSigned                    },
+    { 13, u32, "Uplink Frequency",   asSigned                    },
+    removed(   "UARFCN"                                          ),  // the cell array's key: these frequencies replace it
+    { 25, u16, "URA ID",             decimal                     },
+});
+
+constexpr auto kCiphering = record(19, {  // 0x4157
+    { 13, u8,  "Ciphering",          flag("Enabled", "Disabled") },
+});
+
+constexpr CellField kServingCell[] = {
+    { kPLCellMonitorCellId, "Cell ID",         "UMTSRRInfo: Failed to retrieve Cell ID\n"         },
+    { kPLCellMonitorUARFCN, "UARFCN",          "UMTSRRInfo: Failed to retrieve UARFCN\n"          },
+    { kPLCellMonitorSCN,    "Scrambling Code", "UMTSRRInfo: Failed to retrieve Scrambling Code\n" },
+};
+// clang-format on
+
+}  // namespace
+
+void UMTSRRInfo::updateWithData(ByteView data, LogCode logCode) {
+    logLine(Level::Warning, "UMTSRRInfo");
+    switch (logCode) {
+        case 0x4125: show(data, kState); break;
+        case 0x4031: showTransmitPower(data); break;
+        case 0x4127: show(data, kCell); break;
+        case 0x4157: show(data, kCiphering); break;
+        case 0xff0001: showServingCell(values(), data, kPLCellMonitorRadioAccessTechnologyUMTS, kServingCell); break;
+        default: reportUnknown(logCode);
+    }
+}
+
+void UMTSRRInfo::showTransmitPower(ByteView data) {
+    if (data.size() < 16 || !values()) return;
+    const RecordView record(data);
+    const RecordEntries entries(16, 14, static_cast<std::size_t>(record.read(14, u8)));
+    double sum = 0.0;
+    int count = 0;
+    for (std::size_t i = 0; i < entries.count(); ++i) {
+        const std::int64_t raw = record.read(entries.offsetOf(i) + 4, i16);
+        if (raw == 0) continue;
+        sum += static_cast<double>((raw + 512) / 10 - 70);
+        ++count;
+    }
+    // Intended: without an entry that counts, 0/0 shows as printf has it. Not through printf: its decimal point moves
+    // with the locale.
+    values()->slot("Transmit Power").text() = fmt::sprintf("%4.2lf dBm", sum / count);
+}
+
+}  // namespace kelvo

@@ -1,0 +1,36 @@
+#pragma once
+
+#include <cstddef>
+#include <deque>
+#include <utility>
+
+#include "platform/Bytes.h"
+
+namespace kelvo {
+
+/// Records that wait for a client that does not read them fast enough. Bounded: the oldest make room for the newest.
+class ClientQueue {
+public:
+    struct Limits {
+        std::size_t records = 65'536;
+        std::size_t bytes = std::size_t{16} * 1024 * 1024;
+    };
+
+    explicit ClientQueue(Limits limits) : _limits(limits) {}
+
+    bool empty() const { return _records.empty(); }
+    ByteView front() const { return _records.front(); }
+    void pop();
+    /// Appends a copy; what no longer fits is lost, from the oldest on (a record beyond the limits goes itself).
+    void push(ByteView record);
+    /// How many records were lost since the last call.
+    std::size_t takeLost() { return std::exchange(_lost, 0); }
+
+private:
+    const Limits _limits;
+    std::deque<Bytes> _records;
+    std::size_t _bytes = 0;
+    std::size_t _lost = 0;
+};
+
+}  // namespace kelvo

@@ -1,0 +1,60 @@
+#pragma once
+
+#include <memory>
+#include <string>
+
+#include "platform/MessagePorts.h"
+#include "platform/Technology.h"
+#include "telephony/ClientQueue.h"
+#include "telephony/RecordFilter.h"
+
+namespace kelvo {
+
+/// One client of the service: takes its commands on a port of its own and delivers the records it asked for to the
+/// client's local port, as messages of id 0. A client that stops reading loses its oldest records; one log line counts
+/// them when it catches up or leaves. Main queue only.
+class LogChannel {
+public:
+    /// Who keeps the channel.
+    class Owner {
+    public:
+        virtual ~Owner() = default;
+        virtual void channelStreams(LogChannel& channel) = 0;     ///< the client asked for its stream
+        virtual void channelIsHungry(LogChannel& channel) = 0;    ///< the client has caught up
+        virtual void channelLostClient(LogChannel& channel) = 0;  ///< to be destroyed, at once or later
+    };
+
+    /// A channel for the client whose local port is called `clientName` and reached by `client`.
+    LogChannel(Technology technology, std::string clientName, std::unique_ptr<RemotePort> client, Owner& owner,
+               ClientQueue::Limits limits);
+    ~LogChannel();
+    LogChannel(const LogChannel&) = delete;
+    LogChannel& operator=(const LogChannel&) = delete;
+
+    /// Makes the channel's port; false when there is none.
+    bool open(MessagePorts& ports, const std::string& name);
+
+    const std::string& clientName() const { return _clientName; }
+    bool hasClient() const { return _client->isValid(); }
+    bool isHungry() const { return _streaming && _queue.empty(); }
+    /// Delivers a record; false when the client did not ask for it.
+    bool take(ByteView record);
+
+private:
+    Bytes handle(std::int32_t id, ByteView message);
+    Bytes refuse(const std::string& reason);
+    void flush();
+    bool send(ByteView record);
+    void tellLost();
+
+    const Technology _technology;
+    const std::string _clientName;
+    const std::unique_ptr<RemotePort> _client;
+    Owner& _owner;
+    std::unique_ptr<LocalPort> _port;
+    RecordFilter _filter;
+    ClientQueue _queue;
+    bool _streaming = false;
+};
+
+}  // namespace kelvo

@@ -1,0 +1,33 @@
+#pragma once
+
+#include "platform/Bytes.h"
+#include "platform/Technology.h"
+
+namespace kelvo {
+
+/// Where a source leaves its records.
+class RecordSink {
+public:
+    virtual ~RecordSink() = default;
+
+    /// Takes one record, exactly as the modem's log service words it; false when no client wants it. `record` is
+    /// borrowed for the call. Never blocks.
+    virtual bool take(ByteView record) = 0;
+    /// True while some client has read all it was given: a source without a clock of its own goes on only then.
+    virtual bool isHungry() const = 0;
+};
+
+/// Where the modem's records come from. Main queue only.
+class RecordSource {
+public:
+    virtual ~RecordSource() = default;
+
+    virtual Technology technology() const = 0;
+    /// Gives records to `sink`, which outlives the source's work, from now on. Called once, when the first client
+    /// streams.
+    virtual void start(RecordSink& sink) = 0;
+    /// Some client is hungry again, after none was.
+    virtual void feed() {}
+};
+
+}  // namespace kelvo

@@ -1,0 +1,93 @@
+#include "telephony/TelephonyService.h"
+
+#include <fmt/format.h>
+#include <unistd.h>
+
+#include <algorithm>
+
+#include "platform/Environment.h"
+#include "telephony/Answer.h"
+
+namespace kelvo {
+namespace {
+
+// The local port's name in a request for a log channel; none when it is no such request.
+std::optional<std::string> parseRequest(std::int32_t id, ByteView message) {
+    if (id != 0) return std::nullopt;
+    const auto read = readPropertyList(message);
+    if (!read || !read->dictionary() || read->dictionary()->size() != 1) return std::nullopt;
+    const std::string* name = (*read->dictionary())[kPLCreateLogChannel].string();
+    return name != nullptr ? std::optional(*name) : std::nullopt;
+}
+
+Bytes refuse(long error, const char* reason) {
+    logLine(Level::Error, "Refused a log channel: %s", reason);
+    return errorAnswer(error);
+}
+
+}  // namespace
+
+TelephonyService::TelephonyService(MessagePorts& ports, RecordSource& source, Limits limits)
+    : _ports(ports), _source(source), _limits(limits) {}
+
+std::optional<Failure> TelephonyService::open() {
+    auto made = _ports.createLocal(kPLTelephonyServicePort,
+                                   [this](std::int32_t id, ByteView message) { return handle(id, message); });
+    if (made.alreadyExisted) return Failure{"another telephony service is running"};
+    if (!made.port) return Failure{fmt::format("cannot make the port {}", kPLTelephonyServicePort)};
+    _controlPort = std::move(made.port);
+    _controlPort->schedule();
+    return std::nullopt;
+}
+
+Bytes TelephonyService::handle(std::int32_t id, ByteView message) {
+    const auto clientName = parseRequest(id, message);
+    return clientName ? createLogChannel(*clientName) : refuse(kPLErrorBadRequest, "the request is not understood");
+}
+
+Bytes TelephonyService::createLogChannel(const std::string& clientName) {
+    _channels.remove_if([](const LogChannel& channel) { return !channel.hasClient(); });  // it may be back already
+    if (!hasRoomFor(clientName)) return refuse(kPLErrorTooManyChannels, "there are too many");
+    // The service must not deliver to itself.
+    auto client = clientName.starts_with(kPLTelephonyServicePort) ? nullptr : _ports.openRemote(clientName);
+    if (!client) return refuse(kPLErrorPortUnreachable, "the client's port cannot be opened");
+    LogChannel::Owner& owner = *this;
+    _channels.emplace_back(_source.technology(), clientName, std::move(client), owner, _limits.queue);
+    // With the process in it, no port of a service that ran before is mistaken for this one's.
+    const std::string name = fmt::format("{}.LogChannel.{}.{}", kPLTelephonyServicePort, ::getpid(), ++_channelsMade);
+    if (!_channels.back().open(_ports, name)) {
+        _channels.pop_back();
+        return refuse(kPLErrorNoPort, "its port cannot be made");
+    }
+    return encodeAnswer({{kPLError, 0}, {kPLErrorDomain, 0}, {kPLPortName, name}});
+}
+
+bool TelephonyService::hasRoomFor(const std::string& clientName) const {
+    const auto ofClient = std::count_if(_channels.begin(), _channels.end(),
+                                        [&](const LogChannel& channel) { return channel.clientName() == clientName; });
+    return _channels.size() < _limits.channels && static_cast<std::size_t>(ofClient) < _limits.channelsPerClient;
+}
+
+bool TelephonyService::take(ByteView record) {
+    bool taken = false;
+    for (LogChannel& channel : _channels) taken |= channel.take(record);
+    return taken;
+}
+
+bool TelephonyService::isHungry() const {
+    return std::any_of(_channels.begin(), _channels.end(),
+                       [](const LogChannel& channel) { return channel.isHungry(); });
+}
+
+void TelephonyService::channelStreams(LogChannel&) {
+    if (std::exchange(_started, true)) return _source.feed();
+    _source.start(*this);
+}
+
+void TelephonyService::channelIsHungry(LogChannel&) { _source.feed(); }
+
+void TelephonyService::channelLostClient(LogChannel& channel) {
+    _channels.remove_if([&](const LogChannel& other) { return &other == &channel; });
+}
+
+}  // namespace kelvo

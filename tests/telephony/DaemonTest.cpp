@@ -1,0 +1,143 @@
+#include <gtest/gtest.h>
+#include <signal.h>
+
+#include <QProcess>
+#include <QProcessEnvironment>
+#include <algorithm>
+
+#include "platform/PropertyList.h"
+#include "platform/host/Capture.h"
+#include "platform/host/HostMessagePorts.h"
+#include "platform/host/HostTelephonyClient.h"
+#include "tests/support/EventLoop.h"
+#include "tests/support/TemporaryDirectory.h"
+
+using namespace kelvo;
+using namespace std::chrono_literals;
+using test::runUntil;
+
+namespace {
+
+class DaemonTest : public testing::Test {
+protected:
+    void SetUp() override {
+        auto writer = CaptureWriter::create(_capture, Technology::IFX);
+        for (int i = 0; i < 3; ++i)
+            ASSERT_FALSE(writer->append(CaptureTime(std::chrono::hours(i)), bytesOf("tree " + std::to_string(i))));
+    }
+    static void prepare(QProcess& process, const std::filesystem::path& runtime) {
+        QProcessEnvironment environment = QProcessEnvironment::systemEnvironment();
+        environment.insert("XDG_RUNTIME_DIR", QString::fromStdString(runtime));
+        process.setProcessEnvironment(environment);
+        process.setProgram(KELVO_TELEPHONYD);
+    }
+    void startDaemon() {
+        prepare(_daemon, _temporary.path());
+        _daemon.setArguments({"--replay", QString::fromStdString(_capture), "--speed", "max"});
+        _daemon.start();
+        ASSERT_TRUE(runUntil([&] { return (_connection = _client.createServerConnection({})) != nullptr; }));
+    }
+    // Exit status and what stood on standard error.
+    std::pair<int, std::string> run(const QStringList& arguments) {
+        QProcess process;
+        prepare(process, _temporary.path());
+        process.setArguments(arguments);
+        process.start();
+        if (!process.waitForFinished(10'000)) return {-1, "still running"};
+        _output = process.readAllStandardOutput().toStdString();
+        return {process.exitCode(), process.readAllStandardError().toStdString()};
+    }
+
+    test::TemporaryDirectory _temporary;
+    std::filesystem::path _capture = _temporary.path() / "ifx.pcap";
+    std::filesystem::path _directory = _temporary.path() / "kelvo/ports";
+    HostMessagePorts _ports{_directory};
+    HostTelephonyClient _client{_ports};
+    std::unique_ptr<PLServerConnection> _connection;
+    QProcess _daemon;
+    std::string _output;
+};
+
+}  // namespace
+
+TEST_F(DaemonTest, ServesAClientFromFirstToLastWord) {
+    startDaemon();
+    std::vector<std::string> records;
+    const auto local = _ports.createLocal("client", [&](std::int32_t, ByteView data) {
+        records.emplace_back(textOf(data));
+        return Bytes{};
+    });
+    local.port->schedule();
+    const PLLogChannel channel = PLServerConnectionNetworkMonitorCreateLogChannel(*_connection, "client");
+    ASSERT_EQ(channel.error.error, 0);
+    const auto remote = _ports.openRemote(channel.portName);
+    ASSERT_TRUE(remote);
+    const auto query = writeXmlPropertyList(Dictionary::make({{"GetTechnology", "GetTechnology"}}));
+    const auto answer = remote->request(0, *query, 1s, 1s);
+    ASSERT_TRUE(answer);
+    EXPECT_EQ((*readPropertyList(*answer)->dictionary())["GetTechnology"], Value("kPLLogChannelTechnology_IFX"));
+    const auto start = writeXmlPropertyList(Dictionary::make({{"SetState", "Streaming"}}));
+    ASSERT_TRUE(remote->request(0, *start, 1s, std::nullopt));
+    ASSERT_TRUE(runUntil([&] { return records.size() == 3; }));
+    EXPECT_EQ(records, (std::vector<std::string>{"tree 0", "tree 1", "tree 2"}));
+    EXPECT_TRUE(remote->isValid());  // the channel stays after the last packet
+
+    _daemon.terminate();
+    ASSERT_TRUE(_daemon.waitForFinished(10'000));
+    EXPECT_EQ(_daemon.exitStatus(), QProcess::NormalExit);
+    EXPECT_EQ(_daemon.exitCode(), 0);
+    EXPECT_FALSE(remote->isValid());
+    std::vector<std::string> files;
+    for (const auto& file : std::filesystem::directory_iterator(_directory)) files.push_back(file.path().filename());
+    std::sort(files.begin(), files.end());
+    EXPECT_EQ(files, (std::vector<std::string>{"client.lock", "client.port"}));
+}
+
+TEST_F(DaemonTest, EndsCleanlyOnAnInterrupt) {
+    startDaemon();
+    ::kill(static_cast<pid_t>(_daemon.processId()), SIGINT);
+    ASSERT_TRUE(_daemon.waitForFinished(10'000));
+    EXPECT_EQ(_daemon.exitCode(), 0);
+    EXPECT_TRUE(std::filesystem::is_empty(_directory));
+}
+
+TEST_F(DaemonTest, IsStartedAgainAfterAViolentEnd) {
+    startDaemon();
+    _daemon.kill();
+    ASSERT_TRUE(_daemon.waitForFinished(10'000));
+    _connection.reset();
+    startDaemon();
+    _daemon.terminate();
+    ASSERT_TRUE(_daemon.waitForFinished(10'000));
+}
+
+TEST_F(DaemonTest, RefusesToRunTwice) {
+    startDaemon();
+    const auto [status, error] = run({"--replay", QString::fromStdString(_capture)});
+    EXPECT_EQ(status, 1);
+    EXPECT_EQ(error, "kelvo-telephonyd: another telephony service is running\n");
+    _daemon.terminate();
+    ASSERT_TRUE(_daemon.waitForFinished(10'000));
+}
+
+TEST_F(DaemonTest, SaysInOneLineWhatIsWrongWithItsCommandLine) {
+    const QString capture = QString::fromStdString(_capture);
+    const QString missing = QString::fromStdString(_temporary.path() / "missing");
+    for (const QStringList& arguments :
+         {QStringList{}, QStringList{"--replay"}, QStringList{"--replay", missing},
+          QStringList{"--replay", capture, "--speed", "0"}, QStringList{"--replay", capture, "--speed", "-1"},
+          QStringList{"--replay", capture, "--speed", "fast"}, QStringList{"--replay", capture, "--speed", "inf"},
+          QStringList{"--replay", capture, "more"}, QStringList{"--replay", "/proc/self/mem"}}) {
+        const auto [status, error] = run(arguments);
+        EXPECT_EQ(status, 1);
+        EXPECT_EQ(std::count(error.begin(), error.end(), '\n'), 1) << error;
+        EXPECT_EQ(error.rfind("kelvo-telephonyd: ", 0), 0U) << error;
+    }
+}
+
+TEST_F(DaemonTest, HelpsOnStandardOutput) {
+    const auto [status, error] = run({"--help"});
+    EXPECT_EQ(status, 0);
+    EXPECT_EQ(error, "");
+    for (const char* word : {"--replay", "--loop", "--speed"}) EXPECT_NE(_output.find(word), std::string::npos);
+}

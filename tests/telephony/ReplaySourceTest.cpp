@@ -1,0 +1,236 @@
+#include "telephony/ReplaySource.h"
+
+#include <gtest/gtest.h>
+
+#include <fstream>
+#include <string>
+#include <vector>
+
+#include "platform/Environment.h"
+#include "tests/support/EventLoop.h"
+#include "tests/support/ManualQueue.h"
+#include "tests/support/RecordingLog.h"
+#include "tests/support/TemporaryDirectory.h"
+
+using namespace kelvo;
+using namespace std::chrono_literals;
+using std::chrono::nanoseconds;
+
+namespace {
+
+// Notes every record with the time it came, in milliseconds.
+class NotingSink final : public RecordSink {
+public:
+    explicit NotingSink(const test::ManualQueue& queue) : _queue(queue) {}
+
+    bool take(ByteView record) override {
+        const auto ms = std::chrono::duration_cast<std::chrono::milliseconds>(_queue.now()).count();
+        notes.push_back(std::to_string(ms) + std::string(textOf(record)));
+        if (appetite > 0) --appetite;
+        return wanted;
+    }
+    bool isHungry() const override { return appetite > 0; }
+
+    std::vector<std::string> notes;
+    int appetite = 1'000'000;
+    bool wanted = true;
+
+private:
+    const test::ManualQueue& _queue;
+};
+
+using Notes = std::vector<std::string>;
+
+class ReplaySourceTest : public testing::Test {
+protected:
+    // A capture of packets "a", "b", … taken at these times (milliseconds from some day on).
+    void capture(const std::vector<int>& times, Technology technology = Technology::LTE) {
+        auto writer = CaptureWriter::create(_path, technology);
+        ASSERT_TRUE(writer);
+        std::string text = "a";
+        for (const int ms : times) {
+            ASSERT_FALSE(writer->append(CaptureTime(1'600'000'000s + std::chrono::milliseconds(ms)), bytesOf(text)));
+            ++text[0];
+        }
+    }
+    void open(ReplaySource::Options options = {}) {
+        auto opened = ReplaySource::open(_path, options, _queue, [this] { return _queue.now(); });
+        ASSERT_TRUE(opened) << opened.error().reason;
+        _source = std::move(opened).value();
+    }
+    void play(ReplaySource::Options options = {}) {
+        open(options);
+        _source->start(_sink);
+        _queue.run();
+    }
+
+    test::TemporaryDirectory _temporary;
+    std::filesystem::path _path = _temporary.path() / "test.pcap";
+    test::ManualQueue _queue;
+    NotingSink _sink{_queue};
+    test::RecordingLog _log;
+    Environment::Scope _scope{Environment{.log = &_log}};
+    std::unique_ptr<ReplaySource> _source;
+};
+
+}  // namespace
+
+TEST_F(ReplaySourceTest, NamesTheTechnologyOfTheCapture) {
+    for (const Technology technology : {Technology::IFX, Technology::GSM, Technology::CDMA, Technology::UTRAN}) {
+        capture({}, technology);
+        open();
+        EXPECT_EQ(_source->technology(), technology);
+    }
+}
+
+TEST_F(ReplaySourceTest, KeepsTheTimeBetweenPacketsFromTheStartOn) {
+    capture({500, 500, 1500, 4000});
+    open();
+    _queue.advance(10s);
+    EXPECT_TRUE(_sink.notes.empty());
+    _source->start(_sink);
+    _queue.advance(10s);
+    EXPECT_EQ(_sink.notes, (Notes{"10000a", "10000b", "11000c", "13500d"}));
+}
+
+TEST_F(ReplaySourceTest, StaysSilentAfterTheLastPacket) {
+    capture({0, 10});
+    play();
+    _queue.advance(24h);
+    EXPECT_EQ(_sink.notes.size(), 2U);
+    EXPECT_TRUE(_log.lines().empty());
+}
+
+TEST_F(ReplaySourceTest, MultipliesTheSpeed) {
+    capture({0, 1000, 4000});
+    play({.speed = 2.0});
+    _queue.advance(10s);
+    EXPECT_EQ(_sink.notes, (Notes{"0a", "500b", "2000c"}));
+    _sink.notes.clear();
+    const auto begin = _queue.now() / 1ms;
+    play({.speed = 0.5});
+    _queue.advance(10s);
+    EXPECT_EQ(_sink.notes, (Notes{std::to_string(begin) + "a", std::to_string(begin + 2000) + "b",
+                                  std::to_string(begin + 8000) + "c"}));
+}
+
+TEST_F(ReplaySourceTest, LoopsAfterTheMeanInterval) {
+    capture({0, 100, 400});  // mean 200 ms
+    play({.loop = true});
+    _queue.advance(1200ms);
+    EXPECT_EQ(_sink.notes, (Notes{"0a", "100b", "400c", "600a", "700b", "1000c", "1200a"}));
+}
+
+TEST_F(ReplaySourceTest, LoopsASinglePacketOnceASecondAndNoneNever) {
+    capture({0});
+    play({.loop = true});
+    _queue.advance(2s);
+    EXPECT_EQ(_sink.notes, (Notes{"0a", "1000a", "2000a"}));
+    capture({});
+    play({.loop = true});
+    _queue.advance(10s);
+    EXPECT_EQ(_sink.notes.size(), 3U);
+}
+
+TEST_F(ReplaySourceTest, LoopsWithoutSpinningWhenAllPacketsHaveOneTime) {
+    capture({0, 0});
+    play({.loop = true});
+    _queue.advance(20ms);
+    EXPECT_EQ(_sink.notes, (Notes{"0a", "0b", "10a", "10b", "20a", "20b"}));
+}
+
+TEST_F(ReplaySourceTest, SendsAPacketThatIsOlderThanTheOneBeforeAtOnce) {
+    capture({0, 1000, 300, 1200});
+    play();
+    _queue.advance(2s);
+    EXPECT_EQ(_sink.notes, (Notes{"0a", "1000b", "1000c", "1200d"}));
+}
+
+TEST_F(ReplaySourceTest, KeepsLongPausesAndAnnouncesThem) {
+    capture({0, 3'600'000});
+    play();
+    EXPECT_EQ(_log.lines(), (std::vector<test::RecordingLog::Line>{{5, "The capture pauses for 3600 seconds"}}));
+    _queue.advance(3599s);
+    EXPECT_EQ(_sink.notes, Notes{"0a"});
+    _queue.advance(1s);
+    EXPECT_EQ(_sink.notes, (Notes{"0a", "3600000b"}));
+}
+
+TEST_F(ReplaySourceTest, GoesAsFastAsAHungryClientReads) {
+    capture({0, 1000, 2000, 3000});
+    _sink.appetite = 2;
+    play({.speed = std::nullopt});
+    _queue.advance(1h);
+    EXPECT_EQ(_sink.notes, (Notes{"0a", "0b"}));
+    _sink.appetite = 10;
+    _source->feed();
+    _source->feed();
+    _queue.run();
+    EXPECT_EQ(_sink.notes, (Notes{"0a", "0b", "3600000c", "3600000d"}));
+}
+
+TEST_F(ReplaySourceTest, RestsBetweenPassesThatNobodyWantedAtFullSpeed) {
+    capture({0, 1});
+    _sink.wanted = false;
+    play({.loop = true, .speed = std::nullopt});
+    EXPECT_EQ(_sink.notes, (Notes{"0a", "0b"}));
+    _queue.advance(1s);
+    EXPECT_EQ(_sink.notes, (Notes{"0a", "0b", "1000a", "1000b"}));
+}
+
+TEST_F(ReplaySourceTest, LetsOtherWorkRunAmongManyPackets) {
+    capture(std::vector<int>(1000, 0));
+    open();
+    _source->start(_sink);
+    std::size_t before = 0;
+    _queue.post([&] { before = _sink.notes.size(); });
+    _queue.run();
+    EXPECT_EQ(_sink.notes.size(), 1000U);
+    EXPECT_LE(before, 256U);
+}
+
+TEST_F(ReplaySourceTest, TellsOfADamagedCaptureOnceAndPlaysWhatIsWhole) {
+    capture({0, 100, 200});
+    std::filesystem::resize_file(_path, std::filesystem::file_size(_path) - 1);
+    play({.loop = true});
+    _queue.advance(1s);
+    EXPECT_EQ(_sink.notes,
+              (Notes{"0a", "100b", "200a", "300b", "400a", "500b", "600a", "700b", "800a", "900b", "1000a"}));
+    ASSERT_EQ(_log.lines().size(), 1U);
+    EXPECT_NE(_log.lines()[0].second.find("test.pcap"), std::string::npos);
+}
+
+TEST_F(ReplaySourceTest, EndsWhenTheCaptureIsGoneBeforeTheNextPass) {
+    capture({0});
+    play({.loop = true});
+    EXPECT_EQ(_sink.notes.size(), 1U);
+    // The second pass was opened when the first one ended; the third finds no file.
+    std::filesystem::remove(_path);
+    _queue.advance(10s);
+    EXPECT_EQ(_sink.notes.size(), 2U);
+    EXPECT_EQ(_log.lines().size(), 1U);
+}
+
+TEST_F(ReplaySourceTest, RefusesFilesThatAreNoCapturesOfAModem) {
+    const auto reason = [&] {
+        const auto opened = ReplaySource::open(_path, {}, _queue, [] { return 0ns; });
+        return opened ? "opened" : opened.error().reason;
+    };
+    EXPECT_NE(reason().find("No such file"), std::string::npos);
+    std::ofstream(_path) << "no capture at all, but long enough for a header";
+    EXPECT_NE(reason().find("test.pcap"), std::string::npos);
+    capture({0});
+    std::fstream file(_path, std::ios::in | std::ios::out | std::ios::binary);
+    file.seekp(20);  // the link type: 1, Ethernet
+    file.write("\1\0\0\0", 4);
+    file.close();
+    EXPECT_EQ(reason(), _path.string() + ": its link type is none of a modem's log (147 to 151)");
+}
+
+TEST_F(ReplaySourceTest, LeavesNothingOnTheQueueThatOutlivesIt) {
+    capture({0, 100});
+    play();
+    _source.reset();
+    _queue.advance(1s);
+    EXPECT_EQ(_sink.notes, Notes{"0a"});
+}

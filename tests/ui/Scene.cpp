@@ -1,0 +1,112 @@
+#include "tests/ui/Scene.h"
+
+#include <gtest/gtest.h>
+
+#include <QGuiApplication>
+#include <QPalette>
+#include <QPointingDevice>
+#include <QQuickItem>
+#include <QTest>
+#include <functional>
+
+namespace kelvo::test {
+namespace {
+
+QPointingDevice* touchScreen() {
+    static QPointingDevice* const kDevice = QTest::createTouchDevice();
+    return kDevice;
+}
+
+QQuickItem* findItem(QQuickItem* item, const std::function<bool(QQuickItem*)>& matches) {
+    if (!item->isVisible()) return nullptr;
+    const QList<QQuickItem*> children = item->childItems();
+    for (auto child = children.rbegin(); child != children.rend(); ++child) {
+        if (QQuickItem* found = findItem(*child, matches)) return found;
+    }
+    return matches(item) ? item : nullptr;
+}
+
+}  // namespace
+
+Scene::Scene(bool savingPermitted, QSize size) {
+    if (savingPermitted) permitSaving();
+    KelvoApp::Services parts = services();
+    parts.createWindow = [this, size] {
+        auto window = std::make_unique<QuickWindow>();
+        _view = &window->view();
+        _view->resize(size);
+        return window;
+    };
+    _app = std::make_unique<KelvoApp>(std::move(parts));
+    _app->applicationDidFinishLaunching();
+    EXPECT_TRUE(QTest::qWaitForWindowActive(_view));
+}
+
+Scene::~Scene() { useDarkColours(false); }
+
+void Scene::settle() {
+    const bool settled = QTest::qWaitFor([this] {
+        const QQuickItem* stack = itemOfType("QQuickStackView");
+        const QQuickItem* sheet = itemOfType("SaveSheet");
+        const bool sliding = stack->property("busy").toBool() || (sheet != nullptr && sheet->property("moving").toBool());
+        return !sliding && (sheet != nullptr) == (_app->saveViewController() != nullptr);
+    });
+    EXPECT_TRUE(settled) << "something never stops moving";
+    _view->grabWindow();
+}
+
+QQuickItem* Scene::find(const QString& text) {
+    return findItem(_view->contentItem(), [&](QQuickItem* item) {
+        const bool isText = item->inherits("QQuickText");
+        return isText && item->property("text").toString() == text;
+    });
+}
+
+QQuickItem* Scene::itemWithText(const QString& text) {
+    QQuickItem* item = find(text);
+    EXPECT_NE(item, nullptr) << "nothing on the screen says " << text.toStdString();
+    return item;
+}
+
+KelvoCell* Scene::row(const QString& key) {
+    QQuickItem* item = findItem(_view->contentItem(), [&](QQuickItem* candidate) {
+        const auto* cell = qobject_cast<KelvoCell*>(candidate);
+        return cell != nullptr && cell->key() == key;
+    });
+    EXPECT_NE(item, nullptr) << "no row is called " << key.toStdString();
+    return qobject_cast<KelvoCell*>(item);
+}
+
+QQuickItem* Scene::itemOfType(const char* type) {
+    return findItem(_view->contentItem(), [&](QQuickItem* item) {
+        return QByteArray(item->metaObject()->className()).startsWith(type) || item->inherits(type);
+    });
+}
+
+void Scene::touch(const QPointF& at) { QTest::touchEvent(_view, touchScreen()).press(0, at.toPoint()); }
+void Scene::move(const QPointF& to) { QTest::touchEvent(_view, touchScreen()).move(0, to.toPoint()); }
+void Scene::lift(const QPointF& at) { QTest::touchEvent(_view, touchScreen()).release(0, at.toPoint()); }
+
+void Scene::tap(const QPointF& at) {
+    touch(at);
+    lift(at);
+}
+
+void Scene::tap(QQuickItem* item) {
+    if (item != nullptr) tap(item->mapToScene({item->width() / 2, item->height() / 2}));
+}
+
+void Scene::type(const char* text) {
+    for (const char* letter = text; *letter != 0; ++letter) QTest::keyClick(_view, *letter);
+}
+
+void Scene::press(Qt::Key key, Qt::KeyboardModifiers modifiers) { QTest::keyClick(_view, key, modifiers); }
+
+void Scene::useDarkColours(bool dark) {
+    QPalette palette;
+    palette.setColor(QPalette::Window, dark ? QColor(0x20, 0x20, 0x20) : QColor(0xef, 0xef, 0xef));
+    palette.setColor(QPalette::WindowText, dark ? Qt::white : Qt::black);
+    QGuiApplication::setPalette(palette);
+}
+
+}  // namespace kelvo::test

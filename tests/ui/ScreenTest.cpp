@@ -1,0 +1,342 @@
+#include <gtest/gtest.h>
+
+#include <QAccessible>
+#include <QQuickItem>
+#include <fstream>
+#include <iterator>
+
+#include "tests/ui/Scene.h"
+#include "ui/ActivityIndicator.h"
+#include "ui/Theme.h"
+
+namespace kelvo {
+namespace {
+
+using namespace std::chrono_literals;
+using test::sampleTree;
+using test::Scene;
+
+QString text(const char* latin1) { return QString::fromLatin1(latin1); }
+
+/// A scene that is connected and shows the sample tree with three neighbours.
+class Screen : public testing::Test {
+protected:
+    Scene& start(bool savingPermitted = false, QSize size = {360, 640}) {
+        scene = std::make_unique<Scene>(savingPermitted, size);
+        scene->connect();
+        scene->show(sampleTree(3));
+        scene->settle();
+        return *scene;
+    }
+    std::size_t depth() { return scene->app().navigation()->viewControllers().size(); }
+    void expectTop(const char* title) {
+        scene->settle();
+        EXPECT_EQ(scene->app().navigation()->topViewController().title(), text(title));
+        EXPECT_TRUE(scene->shows(text(title)));
+    }
+    void openSheet() {
+        scene->tapText(text("Save"));
+        scene->settle();
+        ASSERT_TRUE(scene->shows(text("Save Snapshot")));
+    }
+    std::vector<std::filesystem::path> savedFiles() {
+        return {std::filesystem::directory_iterator(scene->snapshotDirectory()), std::filesystem::directory_iterator()};
+    }
+    std::string savedDescription() {
+        std::ifstream file(savedFiles().at(0), std::ios::binary);
+        const std::string bytes{std::istreambuf_iterator<char>(file), std::istreambuf_iterator<char>()};
+        return *(*readPropertyList(bytesOf(bytes))->dictionary())["Description"].string();
+    }
+
+    std::unique_ptr<Scene> scene;
+};
+
+TEST_F(Screen, ShowsThatItConnectsBeforeAnythingIsThere) {
+    Scene fresh;
+    EXPECT_TRUE(fresh.shows(text("Kelvo")));
+    EXPECT_TRUE(fresh.shows(text("Connecting")));
+    EXPECT_FALSE(fresh.shows(text("Save")));
+    const auto* indicator = qobject_cast<ActivityIndicator*>(fresh.itemOfType("kelvo::ActivityIndicator"));
+    ASSERT_NE(indicator, nullptr);
+    EXPECT_TRUE(indicator->isTurning());
+}
+
+TEST_F(Screen, StopsTheIndicatorOnceItIsConnected) {
+    start();
+    EXPECT_TRUE(scene->shows(text("Updated 2011-03-04 at 09:15:04")));
+    EXPECT_EQ(scene->itemOfType("kelvo::ActivityIndicator"), nullptr);
+}
+
+TEST_F(Screen, OpensAPaneWithATapAndLeavesItByItsWayBack) {
+    start();
+    scene->tapText(text("Serving Cell"));
+    expectTop("Serving Cell");
+    EXPECT_TRUE(scene->shows(text("-95 dBm")));
+    scene->tapText(text("Kelvo"));
+    expectTop("Kelvo");
+    EXPECT_EQ(depth(), 1U);
+}
+
+TEST_F(Screen, StaysWhereItIsForATapOnALeaf) {
+    start();
+    scene->tapText(text("Registration"));
+    scene->settle();
+    EXPECT_EQ(depth(), 1U);
+}
+
+TEST_F(Screen, WalksByKeys) {
+    start();
+    scene->press(Qt::Key_Down);
+    scene->press(Qt::Key_Down);
+    scene->press(Qt::Key_Return);
+    expectTop("Neighbor Cells");
+    scene->press(Qt::Key_Down);
+    scene->press(Qt::Key_Enter);
+    expectTop("0");
+    scene->press(Qt::Key_Escape);
+    expectTop("Neighbor Cells");
+    scene->press(Qt::Key_Backspace);
+    expectTop("Kelvo");
+    scene->press(Qt::Key_Up);
+    scene->press(Qt::Key_Space);
+    expectTop("Serving Cell");
+    scene->press(Qt::Key_Left, Qt::AltModifier);
+    expectTop("Kelvo");
+    scene->press(Qt::Key_Escape);
+    expectTop("Kelvo");
+}
+
+TEST_F(Screen, GoesBackByItselfWhenAPanesBranchVanishes) {
+    start();
+    scene->tapText(text("Neighbor Cells"));
+    expectTop("Neighbor Cells");
+    scene->tap(scene->row(text("2")));
+    expectTop("2");
+    scene->show(sampleTree(1));
+    expectTop("Neighbor Cells");
+    EXPECT_FALSE(scene->shows(text("2")));
+}
+
+TEST_F(Screen, SaysThatAListIsEmpty) {
+    start();
+    scene->show(sampleTree(0));
+    scene->tapText(text("Neighbor Cells"));
+    scene->settle();
+    EXPECT_TRUE(scene->shows(text("None reported")));
+    scene->show(sampleTree(1));
+    EXPECT_FALSE(scene->shows(text("None reported")));
+}
+
+TEST_F(Screen, SavesWithTheDescriptionThatWasTyped) {
+    start(true);
+    openSheet();
+    EXPECT_TRUE(scene->shows(text("Snapshot (2011-03-04 09:15:04 +0000)")));
+    scene->tapText(text("Description"));
+    scene->type("drive home");
+    QQuickItem* field = scene->itemOfType("QQuickTextField");
+    ASSERT_NE(field, nullptr);
+    EXPECT_TRUE(field->hasActiveFocus());
+    scene->press(Qt::Key_Return);
+    EXPECT_FALSE(field->hasActiveFocus());
+    scene->tapText(text("Save"));  // the sheet's own, which lies on top
+    scene->queue.run();
+    scene->settle();
+    EXPECT_FALSE(scene->shows(text("Save Snapshot")));
+    ASSERT_EQ(savedFiles().size(), 1U);
+    EXPECT_EQ(savedDescription(), "drive home");
+}
+
+TEST_F(Screen, GivesTheKeyboardUpForATouchElsewhereAndForARow) {
+    start(true);
+    openSheet();
+    QQuickItem* field = scene->itemOfType("QQuickTextField");
+    scene->tap(field);
+    EXPECT_TRUE(field->hasActiveFocus());
+    scene->tap(QPointF(180, 600));
+    EXPECT_FALSE(field->hasActiveFocus());
+    scene->tap(field);
+    EXPECT_TRUE(field->hasActiveFocus());
+    scene->tapText(text("Snapshot (2011-03-04 09:15:04 +0000)"));
+    EXPECT_FALSE(field->hasActiveFocus());
+    EXPECT_NE(scene->app().saveViewController(), nullptr);
+}
+
+TEST_F(Screen, WritesNothingWhenSavingIsCancelledByTouchOrByKey) {
+    start(true);
+    openSheet();
+    scene->tapText(text("Cancel"));
+    scene->queue.run();
+    scene->settle();
+    EXPECT_FALSE(scene->shows(text("Save Snapshot")));
+    openSheet();
+    scene->press(Qt::Key_Escape);
+    scene->queue.run();
+    scene->settle();
+    EXPECT_FALSE(scene->shows(text("Save Snapshot")));
+    EXPECT_TRUE(savedFiles().empty());
+    scene->press(Qt::Key_Down);
+    scene->press(Qt::Key_Return);  // the panes have the keyboard again
+    expectTop("Serving Cell");
+}
+
+TEST_F(Screen, KeepsThePanesOutOfReachWhileTheSaveScreenIsUp) {
+    start(true);
+    openSheet();
+    scene->press(Qt::Key_Down);
+    scene->press(Qt::Key_Return);
+    scene->press(Qt::Key_Backspace);
+    scene->tap(QPointF(180, 12));
+    EXPECT_EQ(depth(), 1U);
+    EXPECT_NE(scene->app().saveViewController(), nullptr);
+}
+
+TEST_F(Screen, ShowsTheAlertOverThePaneUntilItIsClosed) {
+    start(true);
+    openSheet();
+    std::filesystem::remove(scene->snapshotDirectory());
+    scene->tapText(text("Save"));
+    EXPECT_TRUE(scene->shows(text("File Error")));
+    scene->queue.run();
+    scene->settle();
+    EXPECT_FALSE(scene->shows(text("Save Snapshot")));
+    EXPECT_TRUE(scene->shows(text("Unable to write file to disk")));
+    scene->tap(QPointF(100, 80));  // a pane's row below the alert
+    EXPECT_EQ(depth(), 1U);
+    scene->tapText(text("Close"));
+    scene->settle();
+    EXPECT_FALSE(scene->shows(text("File Error")));
+    scene->tapText(text("Serving Cell"));
+    expectTop("Serving Cell");
+}
+
+TEST_F(Screen, ClosesTheAlertByKey) {
+    start();
+    scene->app().showAlert(text("File Error"), text("Unable to write file to disk"), text("Close"));
+    scene->settle();
+    scene->press(Qt::Key_Return);
+    EXPECT_FALSE(scene->app().isAlertShown());
+}
+
+TEST_F(Screen, LeavesARowAloneThatAFingerScrollsSidewaysDuringAReload) {
+    start();
+    const std::string state = "a value that is much too long for the width of one row of this telephone";
+    const auto tree = [&](const char* level) {
+        return Dictionary::make({{"Level", level}, {"State", state}, {"Cells", Array::make()}});
+    };
+    scene->show(tree("-95 dBm"));
+    scene->settle();
+    KelvoCell* row = scene->row(text("State"));
+    QQuickItem* strip = row->findChild<QQuickItem*>(text("strip"));
+    ASSERT_NE(strip, nullptr);
+
+    const QPointF from = row->mapToScene({300, 25});
+    scene->touch(from);
+    for (int x = 10; x <= 120; x += 10) scene->move(from - QPointF(x, 0));
+    const double scrolled = strip->property("contentX").toDouble();
+    EXPECT_GT(scrolled, 40);
+    scene->show(tree("-80 dBm"));
+    EXPECT_TRUE(scene->shows(text("-80 dBm")));
+    EXPECT_EQ(scene->row(text("State")), row);
+    EXPECT_EQ(strip->property("contentX").toDouble(), scrolled);
+    EXPECT_TRUE(strip->property("dragging").toBool());
+    scene->move(from - QPointF(140, 0));
+    EXPECT_EQ(strip->property("contentX").toDouble(), scrolled + 20);
+    scene->lift(from - QPointF(140, 0));
+    EXPECT_EQ(depth(), 1U);
+}
+
+TEST_F(Screen, KeepsTheScrollPositionAndTheRowsThroughAReload) {
+    start();
+    const auto tree = [](const char* level, int rows) {
+        const DictionaryRef display = Dictionary::make();
+        for (int row = 0; row < rows; ++row) display->set("Row " + std::to_string(row), level);
+        return Value(display);
+    };
+    scene->show(tree("-95 dBm", 40));
+    scene->settle();
+    QQuickItem* list = scene->itemOfType("QQuickListView");
+    list->setProperty("contentY", 620);
+    scene->settle();
+    KelvoCell* row = scene->row(text("Row 15"));
+    scene->show(tree("-80 dBm", 42));
+    scene->settle();
+    EXPECT_EQ(list->property("contentY").toInt(), 620);
+    EXPECT_EQ(scene->row(text("Row 15")), row);
+    EXPECT_EQ(row->value(), text("-80 dBm"));
+}
+
+TEST_F(Screen, ShowsEveryRecycledRowEitherWholeOrByItsNameOnly) {
+    start();
+    const DictionaryRef display = Dictionary::make();
+    for (int row = 0; row < 30; ++row) display->set("Branch " + std::to_string(row), Array::make());
+    for (int row = 0; row < 30; ++row) display->set("Leaf " + std::to_string(row), "value");
+    scene->show(display);
+    QQuickItem* list = scene->itemOfType("QQuickListView");
+    for (int y = 0; y <= 2400; y += 100) {
+        list->setProperty("contentY", y);
+        scene->settle();
+    }
+    int byNameOnly = 0;
+    for (int leaf = 22; leaf < 29; ++leaf) {
+        const KelvoCell* row = scene->row(text("Leaf ") + QString::number(leaf));
+        EXPECT_EQ(row->shownValue(), row->kind() == KelvoCell::Kind::Value ? text("value") : QString());
+        byNameOnly += row->kind() == KelvoCell::Kind::Key ? 1 : 0;
+    }
+    EXPECT_GT(byNameOnly, 0);  // rows that came from the branches, all under one reuse identifier
+}
+
+TEST_F(Screen, ScrollsALongValueByKeys) {
+    start();
+    scene->show(Dictionary::make({{"A", std::string(80, 'x')}, {"B", "1"}}));
+    scene->settle();
+    QQuickItem* strip = scene->row(text("A"))->findChild<QQuickItem*>(text("strip"));
+    scene->press(Qt::Key_Down);
+    scene->press(Qt::Key_Right);
+    EXPECT_EQ(strip->property("contentX").toInt(), 80);
+    scene->press(Qt::Key_Left);
+    EXPECT_EQ(strip->property("contentX").toInt(), 0);
+}
+
+TEST_F(Screen, FollowsTheSystemsColoursWhileItRuns) {
+    start();
+    const auto middle = [this] { return scene->view().grabWindow().pixelColor(180, 500).lightness(); };
+    EXPECT_GT(middle(), 200);
+    Scene::useDarkColours(true);
+    EXPECT_LT(middle(), 60);
+    Scene::useDarkColours(false);
+    EXPECT_GT(middle(), 200);
+}
+
+TEST_F(Screen, NamesItsRowsForAScreenReader) {
+    QAccessible::setActive(true);
+    start();
+    scene->tapText(text("Serving Cell"));
+    scene->settle();
+    QAccessibleInterface* row = QAccessible::queryAccessibleInterface(scene->row(text("RSRP")));
+    ASSERT_NE(row, nullptr);
+    EXPECT_EQ(row->text(QAccessible::Name), text("RSRP, -95 dBm"));
+    EXPECT_EQ(row->role(), QAccessible::ListItem);
+    QAccessible::setActive(false);
+}
+
+TEST_F(Screen, KeepsRowsReadableOnAWideScreenAndFitsATinyOne) {
+    start(true, {1200, 800});
+    EXPECT_EQ(scene->row(text("Registration"))->width(), 640);
+    scene->view().resize(240, 240);
+    scene->settle();
+    EXPECT_EQ(scene->row(text("Registration"))->width(), 240);
+    EXPECT_TRUE(scene->shows(text("Save")));
+}
+
+TEST_F(Screen, TakesItsWindowAwayAtTheEnd) {
+    start(true);
+    scene->tapText(text("Serving Cell"));
+    scene->settle();
+    openSheet();
+    scene->app().applicationWillTerminate();
+    EXPECT_EQ(scene->app().model(), nullptr);
+    EXPECT_EQ(scene->ports.openLocals(), 0U);
+}
+
+}  // namespace
+}  // namespace kelvo

@@ -1,0 +1,120 @@
+#include "ui/KelvoApp.h"
+
+#include <algorithm>
+#include <filesystem>
+
+#include "platform/Environment.h"
+
+namespace kelvo {
+
+KelvoApp::KelvoApp(Services services) : _services(std::move(services)) {}
+
+KelvoApp::~KelvoApp() { *_alive = false; }
+
+void KelvoApp::applicationDidFinishLaunching() {
+    getSaveButtonPref();
+    _window = _services.createWindow();
+    _model = std::make_unique<KelvoModel>(KelvoModel::Services{_services.queue, _services.ports, _services.telephony,
+                                                               [this] { updateViewControllerFromModel(); }});
+    setUpdateMessage(QStringLiteral("Connecting..."));
+    _dateFormatter = std::make_unique<DateFormatter>(QStringLiteral("'Updated' yyyy-MM-dd 'at' HH:mm:ss"));
+    auto root = std::make_unique<KelvoPaneController>(nullptr, "/", *this);
+    root->setStatus(QStringLiteral("Connecting"), true);  // the dots come with the first refresh of the status
+    _navController = std::make_unique<NavigationStack>(std::move(root));
+    _navController->setDelegate(this);
+    _window->setRootScreen(*this);
+    _navController->viewWillAppear();
+    _window->makeKeyAndVisible();
+    _services.queue.post([this, alive = _alive] {
+        if (*alive && _model) _model->restartMonitor();
+    });
+}
+
+void KelvoApp::getSaveButtonPref() {
+    std::error_code unreadable;  // no marker to be seen, no button
+    setAllowSaveButton(std::filesystem::exists(_services.saveMarkerPath, unreadable));
+}
+
+void KelvoApp::updateStatusForViewController(KelvoPaneController& pane) {
+    if (_model && _model->isConnected()) {
+        pane.setStatus(_updateMessage, false);
+    } else {
+        pane.setStatus(QStringLiteral("Connecting..."), true);
+    }
+}
+
+void KelvoApp::updateViewControllerFromModel() {
+    if (!_model) return;  // a refresh that was on its way when the program ended
+    reloadPanes();
+    if (_model->isConnected()) setUpdateMessage(_dateFormatter->stringFromDate(clock().now()));
+    updateStatusForViewController(_navController->topViewController());
+}
+
+void KelvoApp::reloadPanes() {
+    const NavigationStack::Panes& panes = _navController->viewControllers();
+    panes[0]->reloadWithNode(_model->topLevelNodes());
+    for (std::size_t i = 1; i < panes.size(); ++i) {
+        NodeRef node = _model->nodeAtPath(panes[i]->path());
+        if (!node) return _navController->popToViewController(*panes[i - 1], true);
+        panes[i]->reloadWithNode(std::move(node));
+    }
+}
+
+void KelvoApp::willShowViewController(KelvoPaneController& pane, bool) { updateStatusForViewController(pane); }
+
+void KelvoApp::showSaveView() {
+    if (_saveViewController || !_model) return;
+    _saveViewController = std::make_unique<KelvoSaveViewController>(
+        _model->getSaveContents(),
+        KelvoSaveViewController::Services{_services.queue, *this, _services.snapshotDirectory});
+    Q_EMIT saveViewPresented(_saveViewController.get());
+}
+
+void KelvoApp::closeSaveView() {
+    if (!_saveViewController) return;
+    _leavingSaveViews.push_back(std::move(_saveViewController));
+    Q_EMIT saveViewDismissed();
+}
+
+void KelvoApp::didRemoveSaveView(KelvoSaveViewController* screen) {
+    const auto at = std::find_if(_leavingSaveViews.begin(), _leavingSaveViews.end(),
+                                 [&](const auto& each) { return each.get() == screen; });
+    if (at == _leavingSaveViews.end()) return;
+    at->release()->deleteLater();  // its view may still be unwinding
+    _leavingSaveViews.erase(at);
+}
+
+void KelvoApp::showAlert(const QString& title, const QString& message, const QString& button) {
+    _alertTitle = title;
+    _alertMessage = message;
+    _alertButton = button;
+    _alertShown = true;
+    Q_EMIT alertChanged();
+}
+
+void KelvoApp::alertButtonPressed() {
+    _alertShown = false;
+    Q_EMIT alertChanged();
+}
+
+// The home screen stops showing the signal as a number: this program is done with it.
+void KelvoApp::setGSMRSSI(bool shown) {
+    constexpr const char* kDomain = "com.zorvik.dockmere";
+    constexpr const char* kKey = "DMShowGSMRSSI";
+    _services.preferences.set(kDomain, kKey, shown);
+    _services.preferences.broadcastChange(kDomain, kKey);
+}
+
+void KelvoApp::applicationWillTerminate() {
+    if (_terminated) return;
+    _terminated = true;
+    setGSMRSSI(false);
+    setUpdateMessage({});
+    _dateFormatter.reset();
+    closeSaveView();
+    if (_window) _window->orderOut();
+    _window.reset();
+    _model.reset();
+}
+
+}  // namespace kelvo

@@ -1,0 +1,106 @@
+#pragma once
+
+#include <QObject>
+#include <QString>
+#include <QtQml/qqmlregistration.h>
+#include <functional>
+#include <memory>
+#include <string>
+#include <vector>
+
+#include "model/KelvoModel.h"
+#include "platform/Preferences.h"
+#include "ui/DateFormatter.h"
+#include "ui/KelvoSaveViewController.h"
+#include "ui/NavigationStack.h"
+#include "ui/ScreenHost.h"
+#include "ui/Window.h"
+
+namespace kelvo {
+
+/// The application: owns the model, the window, the stack of panes, the status text that every pane shows and the save
+/// screen. Main thread only.
+class KelvoApp : public QObject, public ScreenHost, public NavigationStack::Delegate {
+    Q_OBJECT
+    QML_ELEMENT
+    QML_UNCREATABLE("There is one application")
+    Q_PROPERTY(kelvo::NavigationStack* navigation READ navigation CONSTANT)
+    Q_PROPERTY(QString alertTitle READ alertTitle NOTIFY alertChanged)
+    Q_PROPERTY(QString alertMessage READ alertMessage NOTIFY alertChanged)
+    Q_PROPERTY(QString alertButton READ alertButton NOTIFY alertChanged)
+    Q_PROPERTY(bool alertShown READ isAlertShown NOTIFY alertChanged)
+public:
+    /// What the application stands on; everything outlives it.
+    struct Services {
+        MainQueue& queue;
+        MessagePorts& ports;
+        TelephonyClient& telephony;
+        Preferences& preferences;
+        std::function<std::unique_ptr<Window>()> createWindow;
+        /// A file or directory here permits saving.
+        std::string saveMarkerPath = "/ZorvikInternal/Library/PreferenceBundles/Carrier Settings.bundle";
+        std::string snapshotDirectory = "/var/mobile/Library/Logs/Quillet";
+    };
+
+    explicit KelvoApp(Services services);
+    ~KelvoApp() override;
+
+    /// The launch sequence, once. The connection starts only after it has returned, so that a first frame can be drawn.
+    void applicationDidFinishLaunching();
+    /// The termination sequence; whatever ends the program, it runs once.
+    void applicationWillTerminate();
+
+    NavigationStack* navigation() const { return _navController.get(); }  ///< null before launch
+    KelvoModel* model() const { return _model.get(); }                    ///< null before launch and after termination
+    KelvoSaveViewController* saveViewController() const { return _saveViewController.get(); }
+
+    const QString& updateMessage() const { return _updateMessage; }
+    void setUpdateMessage(const QString& message) { _updateMessage = message; }
+    bool allowSaveButton() const override { return _allowSaveButton; }
+    void setAllowSaveButton(bool allow) { _allowSaveButton = allow; }
+
+    void updateStatusForViewController(KelvoPaneController& pane);
+    /// Reloads every pane from the model, bottom first; a pane whose path is gone takes itself and all above with it.
+    void updateViewControllerFromModel();
+    void willShowViewController(KelvoPaneController& pane, bool animated) override;
+
+    void showSaveView() override;
+    void closeSaveView() override;
+    /// The screen no longer draws a save screen that was closed.
+    Q_INVOKABLE void didRemoveSaveView(kelvo::KelvoSaveViewController* screen);
+
+    void showAlert(const QString& title, const QString& message, const QString& button) override;
+    Q_INVOKABLE void alertButtonPressed();
+    bool isAlertShown() const { return _alertShown; }
+    const QString& alertTitle() const { return _alertTitle; }
+    const QString& alertMessage() const { return _alertMessage; }
+    const QString& alertButton() const { return _alertButton; }
+
+Q_SIGNALS:
+    void saveViewPresented(kelvo::KelvoSaveViewController* screen);
+    void saveViewDismissed();
+    void alertChanged();
+
+private:
+    void getSaveButtonPref();
+    void reloadPanes();
+    void setGSMRSSI(bool shown);
+
+    const Services _services;
+    std::unique_ptr<KelvoModel> _model;
+    QString _updateMessage;
+    bool _allowSaveButton = false;
+    std::unique_ptr<DateFormatter> _dateFormatter;
+    std::unique_ptr<NavigationStack> _navController;
+    std::unique_ptr<KelvoSaveViewController> _saveViewController;
+    std::vector<std::unique_ptr<KelvoSaveViewController>> _leavingSaveViews;  // still drawn sliding away
+    bool _alertShown = false;
+    QString _alertTitle;
+    QString _alertMessage;
+    QString _alertButton;
+    bool _terminated = false;
+    std::shared_ptr<bool> _alive = std::make_shared<bool>(true);  // tasks on the queue outlive the application
+    std::unique_ptr<Window> _window;  // last, so that nothing it draws goes before it
+};
+
+}  // namespace kelvo

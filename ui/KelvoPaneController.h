@@ -1,0 +1,107 @@
+#pragma once
+
+#include <QAbstractListModel>
+#include <QString>
+#include <QtQml/qqmlregistration.h>
+#include <vector>
+
+#include "model/KelvoModelNode.h"
+
+namespace kelvo {
+
+class NavigationStack;
+class ScreenHost;
+
+/// One item of a pane's toolbar.
+struct ToolbarItem {
+    enum class Kind { ActivityIndicator, StatusLabel, FlexibleSpace, SaveButton };
+    Kind kind;
+    QString text = {};      ///< the label's
+    bool spinning = false;  ///< the indicator's; hidden when stopped
+    friend bool operator==(const ToolbarItem&, const ToolbarItem&) = default;
+};
+
+/// One table screen: the children of one node of the display tree, found again by its path after every rebuild.
+/// Main thread only. Rows are ready to draw: QML adds no text and takes no decision.
+class KelvoPaneController : public QAbstractListModel {
+    Q_OBJECT
+    QML_ELEMENT
+    QML_UNCREATABLE("The application makes its panes")
+    Q_PROPERTY(QString title READ title NOTIFY titleChanged)
+    Q_PROPERTY(QString backTitle READ backTitle CONSTANT)
+    Q_PROPERTY(QString emptyText READ emptyText NOTIFY reloaded)
+    Q_PROPERTY(int selectedRow READ selectedRow NOTIFY selectedRowChanged)
+    Q_PROPERTY(QString status READ status NOTIFY toolbarChanged)
+    Q_PROPERTY(bool loading READ isLoading NOTIFY toolbarChanged)
+    Q_PROPERTY(bool offersSave READ offersSave NOTIFY toolbarChanged)
+public:
+    enum Role { KeyRole = Qt::UserRole + 1, ValueRole, OpensRole };  // in QML: key, value, opens
+
+    /// A pane for `node`, which may be none, at `path`, which never changes. `host` outlives the pane.
+    KelvoPaneController(NodeRef node, std::string path, ScreenHost& host);
+
+    const std::string& path() const { return _keyPath; }
+    const QString& title() const { return _title; }          ///< the node's name, "Kelvo" while there is none
+    const QString& backTitle() const { return _backTitle; }  ///< the pane below; empty at the bottom of the stack
+    QString emptyText() const;                               ///< what to say in place of rows; empty while there are some
+    int selectedRow() const { return _selectedRow; }         ///< the highlighted row, -1 for none
+
+    /// Replaces the node. Only the rows that differ change, so that fingers and scroll positions stay where they are.
+    void reloadWithNode(NodeRef node);
+    void setStatus(const QString& status, bool isLoading);
+    void viewWillAppear();
+    void viewWillDisappear();
+
+    /// Left to right.
+    const std::vector<ToolbarItem>& toolbarItems() const { return _toolbarItems; }
+    const QString& status() const { return _status; }
+    bool isLoading() const { return _isLoading; }
+    bool offersSave() const;
+
+    /// Pushes the pane of a child that has children; a leaf only loses its highlight.
+    Q_INVOKABLE void didSelectRow(int row);
+    Q_INVOKABLE void saveButtonPressed();
+
+    int rowCount(const QModelIndex& parent = {}) const override;
+    QVariant data(const QModelIndex& index, int role) const override;
+    QHash<int, QByteArray> roleNames() const override;
+
+Q_SIGNALS:
+    void titleChanged();
+    void reloaded();
+    void selectedRowChanged();
+    void toolbarChanged();
+    void resignFirstResponder();  ///< the keyboard is no longer the pane's
+
+private:
+    friend class NavigationStack;  // which tells a pane where it stands
+
+    struct Row {
+        QString key;
+        QString value;
+        bool opens;
+        bool isSameChild(const Row& other) const { return key == other.key && opens == other.opens; }
+    };
+    static std::vector<Row> rowsOf(const NodeRef& node);
+
+    void setTitle();
+    void createToolbarItems();
+    void reloadData(std::vector<Row> rows);
+    void replaceRows(std::size_t first, std::size_t last, const std::vector<Row>& rows, std::size_t count);
+    void updateValues(std::size_t first, std::size_t last, const Row* rows);
+    void selectRow(int row);
+
+    NodeRef _nodes;
+    const std::string _keyPath;
+    QString _status = QStringLiteral("");
+    bool _isLoading = true;
+    ScreenHost& _host;
+    NavigationStack* _navigationController = nullptr;
+    QString _title;
+    QString _backTitle;
+    int _selectedRow = -1;
+    std::vector<Row> _rows;
+    std::vector<ToolbarItem> _toolbarItems;
+};
+
+}  // namespace kelvo

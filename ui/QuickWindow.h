@@ -1,0 +1,30 @@
+#pragma once
+
+#include <QQuickView>
+#include <memory>
+
+#include "ui/Window.h"
+
+namespace kelvo {
+
+/// The window on the desktop or the phone's screen, drawn by the Qt Quick scene graph.
+class QuickWindow final : public Window {
+public:
+    /// Chooses how windows are drawn: by the CPU where the machine has no graphics device, else by the GPU. Before the
+    /// first window.
+    static void chooseSceneGraph();
+
+    QuickWindow();
+    ~QuickWindow() override;
+
+    void setRootScreen(KelvoApp& application) override;
+    void makeKeyAndVisible() override;
+    void orderOut() override;
+
+    QQuickView& view() { return *_view; }
+
+private:
+    std::unique_ptr<QQuickView> _view;
+};
+
+}  // namespace kelvo

@@ -1,0 +1,22 @@
+#pragma once
+
+#include <QString>
+
+namespace kelvo {
+
+/// What a screen may ask of the application that shows it. Main thread only.
+class ScreenHost {
+public:
+    virtual ~ScreenHost() = default;
+
+    /// Whether panes offer to save; decided once, at launch.
+    virtual bool allowSaveButton() const = 0;
+    /// Presents the save screen over the panes; does nothing while one is there.
+    virtual void showSaveView() = 0;
+    /// Takes the save screen away and releases it.
+    virtual void closeSaveView() = 0;
+    /// Shows an alert with one button over everything; it stays until the button is pressed.
+    virtual void showAlert(const QString& title, const QString& message, const QString& button) = 0;
+};
+
+}  // namespace kelvo

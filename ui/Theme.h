@@ -1,0 +1,51 @@
+#pragma once
+
+#include <QColor>
+#include <QObject>
+#include <QtQml/qqmlregistration.h>
+
+namespace kelvo {
+
+/// The colours and sizes of the screens. Light or dark follows the system's palette, while the program runs as well.
+class Theme : public QObject {
+    Q_OBJECT
+    QML_ELEMENT
+    QML_SINGLETON
+    Q_PROPERTY(bool dark READ isDark NOTIFY changed)
+    Q_PROPERTY(QColor background READ background NOTIFY changed)
+    Q_PROPERTY(QColor bar READ bar NOTIFY changed)
+    Q_PROPERTY(QColor row READ row NOTIFY changed)
+    Q_PROPERTY(QColor pressed READ pressed NOTIFY changed)
+    Q_PROPERTY(QColor hairline READ hairline NOTIFY changed)
+    Q_PROPERTY(QColor text READ text NOTIFY changed)
+    Q_PROPERTY(QColor secondaryText READ secondaryText NOTIFY changed)
+    Q_PROPERTY(QColor accent READ accent NOTIFY changed)
+    Q_PROPERTY(QColor shade READ shade NOTIFY changed)
+public:
+    explicit Theme(QObject* parent = nullptr);
+
+    bool isDark() const { return _dark; }
+    QColor background() const;     ///< behind the rows
+    QColor bar() const;            ///< title bar and toolbar
+    QColor row() const;            ///< rows, fields and sheets
+    QColor pressed() const;        ///< a row or button under a finger
+    QColor hairline() const;       ///< the lines between things
+    QColor text() const;           ///< keys and titles
+    QColor secondaryText() const;  ///< values, status and hints
+    QColor accent() const;         ///< what can be tapped, and where the keyboard is
+    QColor shade() const;          ///< over what a modal screen covers
+
+Q_SIGNALS:
+    void changed();
+
+protected:
+    bool eventFilter(QObject* watched, QEvent* event) override;
+
+private:
+    static bool systemIsDark();
+    QColor choose(QRgb light, QRgb dark) const { return QColor::fromRgba(_dark ? dark : light); }
+
+    bool _dark;
+};
+
+}  // namespace kelvo

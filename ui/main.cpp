@@ -1,0 +1,40 @@
+#include <QGuiApplication>
+#include <csignal>
+#include <cstdio>
+
+#include "platform/DirectoryResources.h"
+#include "platform/Environment.h"
+#include "platform/host/HostMainQueue.h"
+#include "platform/host/HostMessagePorts.h"
+#include "platform/host/HostPaths.h"
+#include "platform/host/HostPreferences.h"
+#include "platform/host/HostSystemLog.h"
+#include "platform/host/HostTelephonyClient.h"
+#include "platform/host/UnixSignals.h"
+#include "ui/KelvoApp.h"
+#include "ui/QuickWindow.h"
+
+int main(int argc, char** argv) {
+    using namespace kelvo;
+    QuickWindow::chooseSceneGraph();
+    QGuiApplication application(argc, argv);
+    QGuiApplication::setApplicationName(QStringLiteral("kelvo"));
+    QGuiApplication::setApplicationDisplayName(QStringLiteral("Kelvo"));
+    QGuiApplication::setDesktopFileName(QStringLiteral("org.kelvo.Kelvo"));
+
+    HostSystemLog log("kelvo");
+    const DirectoryResources resources(HostPaths::resourcesDirectory());
+    const Environment::Scope environment({.log = &log, .resources = &resources, .standardOutput = stdout});
+
+    HostMainQueue queue;
+    HostMessagePorts ports;
+    HostTelephonyClient telephony(ports);
+    HostPreferences preferences;
+    KelvoApp app({queue, ports, telephony, preferences, [] { return std::make_unique<QuickWindow>(); }});
+    app.applicationDidFinishLaunching();
+
+    // Closing the window, Ctrl-C and a polite kill end the program the same way.
+    QObject::connect(&application, &QGuiApplication::aboutToQuit, &app, &KelvoApp::applicationWillTerminate);
+    const UnixSignals endings({SIGINT, SIGTERM, SIGHUP}, [](int) { QGuiApplication::quit(); });
+    return QGuiApplication::exec();
+}

@@ -1,0 +1,55 @@
+import QtQuick
+import QtQuick.Templates as T
+import Kelvo.Ui
+
+// A button that is only its text, and for the way back an arrow before it.
+T.AbstractButton {
+    id: button
+
+    property bool leads: false
+    property bool strong: false
+    property bool textHidden: false
+
+    implicitWidth: contentItem.implicitWidth + leftPadding + rightPadding
+    implicitHeight: 44
+    leftPadding: leads ? 6 : 12
+    rightPadding: 12
+    activeFocusOnTab: true
+    focusPolicy: Qt.TabFocus
+    Keys.onReturnPressed: click()
+    Keys.onEnterPressed: click()
+
+    Accessible.role: Accessible.Button
+    Accessible.name: text
+    Accessible.onPressAction: click()
+
+    contentItem: Item {
+        implicitWidth: label.x + label.implicitWidth
+        Glyph {
+            visible: button.leads
+            anchors.verticalCenter: parent.verticalCenter
+            width: 20
+            height: 20
+            shape: Glyph.Back
+            color: Theme.accent
+        }
+        Text {
+            id: label
+            visible: !button.textHidden
+            x: button.leads ? 20 : 0
+            width: parent.width - x
+            anchors.verticalCenter: parent.verticalCenter
+            text: button.text
+            textFormat: Text.PlainText
+            elide: Text.ElideRight
+            color: Theme.accent
+            font { pixelSize: 16; bold: button.strong }
+        }
+    }
+
+    background: Rectangle {
+        radius: 8
+        color: button.down ? Theme.pressed : "transparent"
+        border { width: button.visualFocus ? 2 : 0; color: Theme.accent }
+    }
+}

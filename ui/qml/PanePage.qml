@@ -1,0 +1,105 @@
+import QtQuick
+import QtQuick.Templates as T
+import Kelvo.Ui
+
+// One pane: its title, its rows and its toolbar.
+FocusScope {
+    id: page
+
+    required property KelvoPaneController pane
+    required property NavigationStack navigation
+
+    Component.onDestruction: navigation.didRemoveView(pane)
+
+    Rectangle {
+        anchors.fill: parent
+        color: Theme.background
+    }
+
+    ListView {
+        id: list
+
+        anchors {
+            top: titleBar.bottom
+            bottom: toolbar.visible ? toolbar.top : parent.bottom
+            horizontalCenter: parent.horizontalCenter
+        }
+        width: Math.min(parent.width, 640)
+        clip: true
+        focus: true
+        activeFocusOnTab: true
+        currentIndex: -1  // nothing is marked until a key is pressed
+        highlightMoveDuration: 0
+        reuseItems: true
+        model: page.pane
+        delegate: PaneRow {
+            pane: page.pane
+            width: list.width
+            onTouched: list.currentIndex = -1
+        }
+
+        Accessible.role: Accessible.List
+        Accessible.name: page.pane.title
+
+        Keys.onReturnPressed: page.pane.didSelectRow(currentIndex)
+        Keys.onEnterPressed: page.pane.didSelectRow(currentIndex)
+        Keys.onSpacePressed: page.pane.didSelectRow(currentIndex)
+        Keys.onPressed: event => {
+            const row = currentItem as PaneRow;
+            const plain = row && !(event.modifiers & Qt.AltModifier);
+            if (plain && event.key === Qt.Key_Right)
+                event.accepted = row.scrollSideways(80);
+            else if (plain && event.key === Qt.Key_Left)
+                event.accepted = row.scrollSideways(-80);
+        }
+
+        T.ScrollIndicator.vertical: T.ScrollIndicator {
+            id: indicator
+            implicitWidth: 7
+            contentItem: Rectangle {
+                implicitWidth: 3
+                radius: 1.5
+                color: Theme.secondaryText
+                opacity: indicator.active && indicator.size < 1 ? 0.6 : 0
+                Behavior on opacity {
+                    NumberAnimation { duration: 300 }
+                }
+            }
+        }
+    }
+
+    Text {
+        anchors.centerIn: list
+        width: list.width - 64
+        visible: text !== ""
+        text: page.pane.emptyText
+        horizontalAlignment: Text.AlignHCenter
+        wrapMode: Text.Wrap
+        color: Theme.secondaryText
+        font.pixelSize: 15
+    }
+
+    TitleBar {
+        id: titleBar
+        anchors { left: parent.left; right: parent.right; top: parent.top }
+        title: page.pane.title
+        backTitle: page.pane.backTitle
+        onBack: page.navigation.popViewController()
+    }
+
+    StatusBar {
+        id: toolbar
+        anchors { left: parent.left; right: parent.right; bottom: parent.bottom }
+        visible: !page.navigation.toolbarHidden
+        pane: page.pane
+    }
+
+    Connections {
+        target: page.pane
+        function onResignFirstResponder() {
+            list.focus = false;
+        }
+    }
+
+    onActiveFocusChanged: if (activeFocus) list.focus = true
+}

@@ -1,0 +1,125 @@
+import QtQuick
+import Kelvo.Ui
+
+// Draws one row where KelvoCell puts it. The strip scrolls sideways when a value is too long for the row.
+KelvoCell {
+    id: row
+
+    required property int index
+    required property KelvoPaneController pane
+    readonly property bool marked: ListView.isCurrentItem && ListView.view.activeFocus
+
+    signal touched
+
+    height: 50
+    contentArea: Qt.rect(0, 0, content.width, content.height)
+
+    function scrollSideways(by: real): bool {
+        if (!strip.interactive)
+            return false;
+        strip.contentX = Math.max(0, Math.min(strip.contentWidth - strip.width, strip.contentX + by));
+        return true;
+    }
+
+    ListView.onPooled: strip.contentX = 0
+
+    Accessible.role: Accessible.ListItem
+    Accessible.name: accessibleName
+    Accessible.focusable: true
+    Accessible.focused: marked
+    Accessible.onPressAction: pane.didSelectRow(index)
+
+    Rectangle {
+        anchors.fill: parent
+        color: row.opens && (tap.pressed || row.pane.selectedRow === row.index) ? Theme.pressed : Theme.row
+    }
+
+    Item {
+        id: content
+
+        x: 6
+        width: row.width - 22 - (row.opens ? 18 : 0)
+        height: row.height
+
+        Flickable {
+            id: strip
+            objectName: "strip"
+
+            x: row.viewFrame.x
+            y: row.viewFrame.y
+            width: row.viewFrame.width > 0 ? row.viewFrame.width : content.width
+            height: content.height
+            contentWidth: row.viewContentSize.width
+            contentHeight: height
+            flickableDirection: Flickable.HorizontalFlick
+            interactive: contentWidth > width
+            clip: interactive
+
+            Text {
+                x: row.keyFrame.x
+                y: row.keyFrame.y
+                width: row.keyFrame.width
+                height: row.keyFrame.height
+                text: row.key
+                textFormat: Text.PlainText
+                color: Theme.text
+                font { pixelSize: 15; bold: true }
+                Accessible.ignored: true
+            }
+
+            Text {
+                x: row.valueFrame.x
+                y: row.valueFrame.y
+                width: row.valueFrame.width
+                height: row.valueFrame.height
+                visible: text !== ""
+                text: row.shownValue
+                textFormat: Text.PlainText
+                color: Theme.secondaryText
+                font.pixelSize: 15
+                Accessible.ignored: true
+            }
+        }
+
+        // More lies to the right.
+        Rectangle {
+            anchors { right: parent.right; top: parent.top; bottom: parent.bottom; bottomMargin: 1 }
+            width: 28
+            visible: strip.interactive && !strip.atXEnd
+            gradient: Gradient {
+                orientation: Gradient.Horizontal
+                GradientStop { position: 0; color: Qt.rgba(Theme.row.r, Theme.row.g, Theme.row.b, 0) }
+                GradientStop { position: 1; color: Theme.row }
+            }
+        }
+    }
+
+    Glyph {
+        anchors { right: parent.right; rightMargin: 14; verticalCenter: parent.verticalCenter }
+        visible: row.opens
+        width: 14
+        height: 14
+        shape: Glyph.Disclosure
+        color: Theme.secondaryText
+    }
+
+    Rectangle {
+        anchors { left: parent.left; leftMargin: 16; right: parent.right; bottom: parent.bottom }
+        height: 1
+        color: Theme.hairline
+    }
+
+    Rectangle {
+        anchors { fill: parent; margins: 2 }
+        visible: row.marked
+        color: "transparent"
+        radius: 6
+        border { width: 2; color: Theme.accent }
+    }
+
+    TapHandler {
+        id: tap
+        onPressedChanged: if (pressed) row.touched()
+        onTapped: row.pane.didSelectRow(row.index)
+    }
+}

@@ -1,0 +1,111 @@
+import QtQuick
+import QtQuick.Templates as T
+import Kelvo.Ui
+
+// The window's content: the stack of panes, the save screen over it, and an alert over both.
+FocusScope {
+    id: screen
+
+    required property KelvoApp application
+    property SaveSheet sheet: null
+
+    focus: true
+
+    function giveFocus() {
+        if (alert.shown)
+            alert.forceActiveFocus();
+        else if (sheet)
+            sheet.forceActiveFocus();
+        else
+            stack.forceActiveFocus();
+    }
+
+    Rectangle {
+        anchors.fill: parent
+        color: Theme.background
+    }
+
+    T.StackView {
+        id: stack
+
+        anchors.fill: parent
+        focus: true
+        enabled: !screen.sheet && !alert.shown
+
+        pushEnter: Slide { property: "x"; from: stack.width; to: 0 }
+        pushExit: Slide { property: "x"; from: 0; to: -stack.width / 3 }
+        popEnter: Slide { property: "x"; from: -stack.width / 3; to: 0 }
+        popExit: Slide { property: "x"; from: 0; to: stack.width }
+
+        Keys.onPressed: event => {
+            const back = event.key === Qt.Key_Escape || event.key === Qt.Key_Back || event.key === Qt.Key_Backspace
+                || (event.key === Qt.Key_Left && (event.modifiers & Qt.AltModifier));
+            event.accepted = back && screen.application.navigation.popViewController();
+        }
+
+        function show(pane: KelvoPaneController, animated: bool) {
+            push(page, { "pane": pane }, animated ? T.StackView.PushTransition : T.StackView.Immediate);
+        }
+
+        Component.onCompleted: show(screen.application.navigation.rootViewController, false)
+    }
+
+    Component {
+        id: page
+        PanePage {
+            navigation: screen.application.navigation
+        }
+    }
+
+    Component {
+        id: saveSheet
+        SaveSheet {
+            application: screen.application
+            anchors.fill: parent
+        }
+    }
+
+    AlertBox {
+        id: alert
+        anchors.fill: parent
+        z: 1
+        application: screen.application
+        onShownChanged: screen.giveFocus()
+    }
+
+    Connections {
+        target: screen.application.navigation
+
+        function onPushed(pane: KelvoPaneController, animated: bool) {
+            stack.show(pane, animated);
+        }
+        function onPopped(depth: int, animated: bool) {
+            stack.pop(stack.get(depth - 1), animated ? T.StackView.PopTransition : T.StackView.Immediate);
+        }
+    }
+
+    Connections {
+        target: screen.application
+
+        function onSaveViewPresented(presented: KelvoSaveViewController) {
+            screen.sheet = saveSheet.createObject(screen, { "saveView": presented }) as SaveSheet;
+            screen.giveFocus();
+        }
+        function onSaveViewDismissed() {
+            screen.sheet.leave();
+            screen.sheet = null;
+            screen.giveFocus();
+        }
+    }
+
+    component Slide: Transition {
+        property alias property: animation.property
+        property alias from: animation.from
+        property alias to: animation.to
+        NumberAnimation {
+            id: animation
+            duration: 240
+            easing.type: Easing.OutCubic
+        }
+    }
+}

@@ -108,6 +108,14 @@ TEST_F(View, ScrollsWithinTheDisplay) {
     EXPECT_NE(written().find("\x1b[1;1Ha\x1b[K"), std::string::npos);
 }
 
+TEST_F(View, DropsHintsBeforeTheStatus) {
+    TerminalWatchView view(*terminal);
+    view.showDisplay({"a", "b", "c", "d", "e", "f"}, "Updating");
+    EXPECT_NE(written().find(" Updating  1-4 of 6 "), std::string::npos);
+    view.showStatus("Connecting...");
+    EXPECT_NE(written().find("\x1b[7m Connecting...      \x1b[0m"), std::string::npos);
+}
+
 TEST_F(View, DrawsEverythingAgainAfterAChangeOfSize) {
     TerminalWatchView view(*terminal);
     view.showDisplay({"a", "b", "c"}, "s");

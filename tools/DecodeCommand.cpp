@@ -128,6 +128,13 @@ void decode(const Options& options) {
     }
 }
 
+/// What is wrong with a count; nothing when it is one.
+std::string countFromOne(const std::string& text) {
+    const bool digits = text.find_first_not_of("0123456789") == text.npos;
+    const bool positive = text.find_first_not_of('0') != text.npos;
+    return digits && positive ? "" : text + " is not a whole number from 1";
+}
+
 }  // namespace
 
 void addDecodeCommand(CLI::App& app) {
@@ -139,7 +146,7 @@ void addDecodeCommand(CLI::App& app) {
         .add_option("--refresh-every", options->refreshEvery,
                     "Rebuilds the display, and so records a snapshot, after every N messages too")
         ->type_name("N")
-        ->check(CLI::PositiveNumber);
+        ->check(countFromOne);
     command.add_option("--save", options->save, "Writes the snapshot that the save screen would write")
         ->type_name("OUT.kelvo");
     command.add_flag("--log", options->log, "Shows the system log's lines as well, before the display");

@@ -3,10 +3,24 @@
 #include <fmt/format.h>
 
 #include <algorithm>
+#include <initializer_list>
 
 #include "tools/StandardOutput.h"
 
 namespace kelvo {
+
+namespace {
+
+/// The status, and at the right edge the first of `hints` that leaves room for it.
+std::string statusRow(const std::string& status, std::initializer_list<std::string> hints, std::size_t columns) {
+    for (const std::string& hint : hints) {
+        const std::size_t left = columns - std::min(columns, hint.size() + 1);
+        if (status.size() < left) return fmt::format(" {:<{}}{}", status, left, hint);
+    }
+    return fmt::format(" {:<{}}", status, columns);
+}
+
+}  // namespace
 
 void PrintedWatchView::showDisplay(std::vector<std::string> lines, const std::string& status) {
     std::string text = status + "\n";
@@ -55,9 +69,8 @@ void TerminalWatchView::draw() {
     std::vector<std::string> shown(first, first + static_cast<std::ptrdiff_t>(count));
     shown.resize(page);
     const std::string where =
-        count < _lines.size() ? fmt::format("{}-{} of {}  ", _top + 1, _top + count, _lines.size()) : "";
-    const std::string keys = where + "q quits ";
-    shown.push_back(fmt::format(" {:<{}}{}", _status, columns - std::min(columns, keys.size() + 1), keys));
+        count < _lines.size() ? fmt::format("{}-{} of {} ", _top + 1, _top + count, _lines.size()) : "";
+    shown.push_back(statusRow(_status, {where + " q quits ", where}, columns));
     _terminal.draw(shown, page);
 }
 

@@ -1,0 +1,189 @@
+#include "platform/PropertyList.h"
+#include "tests/tools/KelvoctlTest.h"
+
+namespace kelvo {
+namespace {
+
+using test::contentsOf;
+using test::expectFailure;
+using test::Finished;
+using test::KelvoctlTest;
+using test::servingCell;
+
+struct DecodeCommand : KelvoctlTest {
+    nlohmann::ordered_json servingSection(std::vector<std::string> arguments) {
+        return json(std::move(arguments))["display"]["Serving Cell Info"];
+    }
+};
+
+std::vector<std::string> keysOf(const nlohmann::ordered_json& object) {
+    std::vector<std::string> keys;
+    for (const auto& [key, value] : object.items()) keys.push_back(key);
+    return keys;
+}
+
+TEST_F(DecodeCommand, ShowsWhatTheLastMessagesGave) {
+    const auto shown =
+        servingSection({"decode", "--json", capture(Technology::LTE, {servingCell(301), servingCell(302)})});
+    EXPECT_EQ(shown["Physical Cell ID"], "302");
+    EXPECT_EQ(shown["Download Frequency"], "5780");
+    EXPECT_EQ(shown["Download Bandwidth"], "10 MHz");
+    EXPECT_EQ(shown["Upload Bandwidth"], "5 MHz");
+}
+
+TEST_F(DecodeCommand, PrintsTheTreeWithAlignedValues) {
+    const Finished done = kelvoctl({"decode", capture(Technology::LTE, {servingCell(301)})});
+    EXPECT_EQ(done.status, 0);
+    EXPECT_EQ(done.errors, "");
+    EXPECT_EQ(done.output.find("Serving Cell Info\n"
+                               "  Physical Cell ID     301\n"
+                               "  Cell Identity        77\n"
+                               "  Tracking Area Code   4566\n"),
+              0U);
+    EXPECT_EQ(done.output.find("Creating"), std::string::npos);
+}
+
+TEST_F(DecodeCommand, JsonHasThreeKeysAndTheLogOnlyWhenAsked) {
+    const std::string file = capture(Technology::LTE, {servingCell(1), servingCell(2)});
+    const auto plain = json({"decode", "--json", file});
+    EXPECT_EQ(keysOf(plain), (std::vector<std::string>{"technology", "messages", "display"}));
+    EXPECT_EQ(plain["technology"], "LTE");
+    EXPECT_EQ(plain["messages"], 2);
+
+    const auto logged = json({"decode", "--json", "--log", file});
+    EXPECT_EQ(keysOf(logged), (std::vector<std::string>{"technology", "messages", "display", "log"}));
+    const auto wanted = nlohmann::ordered_json::array({4, "LTE Serving Cell Info"});
+    EXPECT_EQ(std::count(logged["log"].begin(), logged["log"].end(), wanted), 2);
+}
+
+TEST_F(DecodeCommand, TextHasTheLogBeforeTheTree) {
+    const Finished done = kelvoctl({"decode", "--log", capture(Technology::LTE, {servingCell(301)})});
+    const std::size_t line = done.output.find("[4] LTE Serving Cell Info\n");
+    const std::size_t tree = done.output.find("\nServing Cell Info\n");
+    ASSERT_NE(line, std::string::npos);
+    ASSERT_NE(tree, std::string::npos);
+    EXPECT_LT(line, tree);
+    EXPECT_EQ(done.output.find("\n[", tree), std::string::npos);
+}
+
+TEST_F(DecodeCommand, TellsOfAnInvalidLogTypeInTheLog) {
+    Bytes message = servingCell(1);
+    message[0] = 254;
+    const auto logged = json({"decode", "--json", "--log", capture(Technology::LTE, {message})});
+    const auto wanted = nlohmann::ordered_json::array({3, "Invalid log type: fe. Dropping."});
+    EXPECT_EQ(std::count(logged["log"].begin(), logged["log"].end(), wanted), 1);
+}
+
+TEST_F(DecodeCommand, ACaptureWithoutMessagesHasNoDisplay) {
+    const std::string file = capture(Technology::LTE, {});
+    const auto plain = json({"decode", "--json", file});
+    EXPECT_EQ(plain["messages"], 0);
+    EXPECT_TRUE(plain["display"].is_null());
+    EXPECT_EQ(kelvoctl({"decode", file}).output, "Kelvo  (unknown)\n");
+}
+
+TEST_F(DecodeCommand, TheNamedTechnologyOverridesTheLinkType) {
+    const std::string file = capture(Technology::CDMA, {servingCell(301)});
+    const auto decoded = json({"decode", "--technology", "lte", "--json", file});
+    EXPECT_EQ(decoded["technology"], "LTE");
+    EXPECT_EQ(decoded["display"]["Serving Cell Info"]["Physical Cell ID"], "301");
+}
+
+TEST_F(DecodeCommand, RefusesAnotherLinkTypeUnlessATechnologyIsNamed) {
+    std::string bytes = contentsOf(capture(Technology::LTE, {servingCell(301)}));
+    bytes[20] = 1;
+    const std::string file = directory.write("ethernet.pcap", bytesOf(bytes));
+    expectFailure(kelvoctl({"decode", file}),
+                  file + " has a link type that names no technology; --technology names one");
+    EXPECT_EQ(servingSection({"decode", "--technology", "lte", "--json", file})["Physical Cell ID"], "301");
+}
+
+TEST_F(DecodeCommand, SaysInOneLineWhyAFileCannotBeRead) {
+    expectFailure(kelvoctl({"decode", path("none.pcap")}),
+                  path("none.pcap") + " cannot be opened: No such file or directory");
+    const std::string text = directory.write("text", bytesOf("no capture at all"));
+    expectFailure(kelvoctl({"decode", text}), text + " is not a pcap file: unknown file format");
+}
+
+TEST_F(DecodeCommand, ATruncatedCaptureEndsInAFailureAndNoHalfAnswer) {
+    std::string bytes = contentsOf(capture(Technology::LTE, {servingCell(1), servingCell(2)}));
+    bytes.resize(bytes.size() - 5);
+    const std::string file = directory.write("cut.pcap", bytesOf(bytes));
+    const Finished done = kelvoctl({"decode", "--json", file});
+    EXPECT_EQ(done.status, 1);
+    EXPECT_EQ(done.output, "");
+    EXPECT_EQ(done.errors.find("kelvoctl: " + file + " cannot be read at packet 2: "), 0U);
+    EXPECT_EQ(std::count(done.errors.begin(), done.errors.end(), '\n'), 1);
+}
+
+TEST_F(DecodeCommand, RefusesWhatItDoesNotKnow) {
+    const std::string file = capture(Technology::LTE, {});
+    expectFailure(kelvoctl({"decode", "--technology", "5g", file}),
+                  "unknown technology 5g: there are ifx, gsm, cdma, lte and utran");
+    expectFailure(kelvoctl({"decode", "--fast", file}),
+                  "The following argument was not expected: --fast (kelvoctl --help tells what there is)");
+    expectFailure(kelvoctl({"decode"}), "FILE is required (kelvoctl --help tells what there is)");
+    for (const char* count : {"0", "1.5", "many"}) {
+        expectFailure(kelvoctl({"decode", "--refresh-every", count, file}),
+                      std::string("--refresh-every: ") + count +
+                          " is not a whole number from 1 (kelvoctl --help tells what there is)");
+    }
+}
+
+TEST_F(DecodeCommand, RebuildsAtTheEndOnlyUnlessAsked) {
+    const std::string file = capture(Technology::LTE, {servingCell(1), servingCell(2), servingCell(3), servingCell(4)});
+    const auto entries = [&](std::vector<std::string> options) {
+        options.insert(options.begin(), {"decode", "--save", path("out.kelvo"), file});
+        EXPECT_EQ(kelvoctl(options).status, 0);
+        const std::string bytes = contentsOf(path("out.kelvo"));
+        return (*readPropertyList(bytesOf(bytes))->dictionary())["Data"].array()->size() - 1;  // less the DLF
+    };
+    EXPECT_EQ(entries({}), 1U);
+    EXPECT_EQ(entries({"--refresh-every", "3"}), 2U);
+    EXPECT_EQ(entries({"--refresh-every", "2"}), 3U);
+    EXPECT_EQ(entries({"--refresh-every", "1"}), 5U);
+}
+
+TEST_F(DecodeCommand, SavesTheHistoryAndTheDlfWithAnEmptyDescription) {
+    const Bytes message = servingCell(301);
+    EXPECT_EQ(kelvoctl({"decode", "--save", path("out.kelvo"), capture(Technology::LTE, {message})}).status, 0);
+    const std::string bytes = contentsOf(path("out.kelvo"));
+    EXPECT_EQ(bytes.find("<?xml"), 0U);
+    const auto file = readPropertyList(bytesOf(bytes));
+    ASSERT_TRUE(file);
+    const Dictionary& snapshot = *file->dictionary();
+    EXPECT_EQ(snapshot["Description"], Value(""));
+    EXPECT_EQ(snapshot["Timestamp"].string()->substr(19), " +0000");
+    const Array& data = *snapshot["Data"].array();
+    ASSERT_EQ(data.size(), 2U);
+    EXPECT_EQ((*data[0].dictionary())["DisplayState"], Value(message));
+    EXPECT_EQ((*data[1].dictionary())["Description"], Value("DLF binary (198 bytes)"));  // 161 + 38 - 1
+}
+
+TEST_F(DecodeCommand, SaysWhyASnapshotCannotBeSaved) {
+    const Finished done = kelvoctl({"decode", "--save", path("none/out"), capture(Technology::LTE, {servingCell(1)})});
+    expectFailure(done, path("none/out") + " cannot be written: No such file or directory");
+}
+
+TEST_F(DecodeCommand, PrintsTheStartCommand) {
+    const Finished done = kelvoctl({"start-command", "--technology", "lte"});
+    EXPECT_EQ(done.status, 0);
+    const auto command = readPropertyList(bytesOf(done.output));
+    ASSERT_TRUE(command);
+    EXPECT_EQ((*command->dictionary())["SetState"], Value("Streaming"));
+    const Array& codes = *(*command->dictionary())["SetOskraLogCodes"].array();
+    EXPECT_EQ(std::count(codes.begin(), codes.end(), Value(0xB0C2)), 1);
+    EXPECT_TRUE((*command->dictionary())["SetPlExtraCodes"].array());
+}
+
+TEST_F(DecodeCommand, HelpTellsOfEveryCommandOnStandardOutput) {
+    const Finished done = kelvoctl({"--help"});
+    EXPECT_EQ(done.status, 0);
+    for (const char* command : {"decode", "watch", "snapshot", "start-command"}) {
+        EXPECT_NE(done.output.find(command), std::string::npos) << command;
+        EXPECT_NE(kelvoctl({command, "--help"}).output.find("Example"), std::string::npos) << command;
+    }
+}
+
+}  // namespace
+}  // namespace kelvo

@@ -20,6 +20,7 @@ protected:
     /// Launched, connected and showing a tree with three neighbours.
     void run() {
         launch();
+        world.queue.run();
         world.show(sampleTree(3));
     }
     KelvoPaneController& pane(std::size_t depth) { return *app->navigation()->viewControllers()[depth]; }

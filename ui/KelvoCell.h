@@ -19,16 +19,16 @@ namespace kelvo {
 class KelvoCell : public QQuickItem {
     Q_OBJECT
     QML_ELEMENT
-    Q_PROPERTY(QString key READ key WRITE setKey NOTIFY contentChanged REQUIRED)
-    Q_PROPERTY(QString value READ value WRITE setValue NOTIFY contentChanged REQUIRED)
-    Q_PROPERTY(bool opens READ opens WRITE setOpens NOTIFY contentChanged REQUIRED)
+    Q_PROPERTY(QString key READ key WRITE setKey NOTIFY keyChanged REQUIRED)
+    Q_PROPERTY(QString value READ value WRITE setValue NOTIFY valueChanged REQUIRED)
+    Q_PROPERTY(bool opens READ opens WRITE setOpens NOTIFY opensChanged REQUIRED)
     Q_PROPERTY(QString shownValue READ shownValue NOTIFY laidOut)
     Q_PROPERTY(QString accessibleName READ accessibleName NOTIFY laidOut)
     Q_PROPERTY(QRectF keyFrame READ keyFrame NOTIFY laidOut)
     Q_PROPERTY(QRectF valueFrame READ valueFrame NOTIFY laidOut)
     Q_PROPERTY(QRectF viewFrame READ viewFrame NOTIFY laidOut)
     Q_PROPERTY(QSizeF viewContentSize READ viewContentSize NOTIFY laidOut)
-    Q_PROPERTY(QRectF contentArea READ contentArea WRITE setContentArea NOTIFY laidOut)
+    Q_PROPERTY(QRectF contentArea READ contentArea WRITE setContentArea NOTIFY contentAreaChanged)
 public:
     static constexpr const char* kReuseIdentifier = "KelvoPaneControllerCell";
     static constexpr qreal kStripHeight = 50;
@@ -61,7 +61,10 @@ public:
     void componentComplete() override;
 
 Q_SIGNALS:
-    void contentChanged();
+    void keyChanged();
+    void valueChanged();
+    void opensChanged();
+    void contentAreaChanged();
     void laidOut();
 
 private:

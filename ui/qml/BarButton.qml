@@ -16,12 +16,12 @@ T.AbstractButton {
     rightPadding: 12
     activeFocusOnTab: true
     focusPolicy: Qt.TabFocus
-    Keys.onReturnPressed: click()
-    Keys.onEnterPressed: click()
+    Keys.onReturnPressed: clicked()
+    Keys.onEnterPressed: clicked()
 
     Accessible.role: Accessible.Button
     Accessible.name: text
-    Accessible.onPressAction: click()
+    Accessible.onPressAction: clicked()
 
     contentItem: Item {
         implicitWidth: label.x + label.implicitWidth

@@ -1,10 +1,10 @@
 #pragma once
 
+#include <QtQml/qqmlregistration.h>
 #include <QQuickItem>
 #include <QRectF>
 #include <QSizeF>
 #include <QString>
-#include <QtQml/qqmlregistration.h>
 
 #include "ui/TextMeasure.h"
 
@@ -55,7 +55,7 @@ public:
     QString accessibleName() const;  ///< key and shown value, for a screen reader
     const QRectF& keyFrame() const { return _keyFrame; }
     const QRectF& valueFrame() const { return _valueFrame; }
-    const QRectF& viewFrame() const { return _viewFrame; }            ///< empty in a key row
+    const QRectF& viewFrame() const { return _viewFrame; }              ///< empty in a key row
     const QSizeF& viewContentSize() const { return _viewContentSize; }  ///< empty in a key row
 
     void componentComplete() override;

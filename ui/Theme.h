@@ -1,8 +1,8 @@
 #pragma once
 
+#include <QtQml/qqmlregistration.h>
 #include <QColor>
 #include <QObject>
-#include <QtQml/qqmlregistration.h>
 
 namespace kelvo {
 

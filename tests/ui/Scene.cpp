@@ -49,7 +49,8 @@ void Scene::settle() {
     const bool settled = QTest::qWaitFor([this] {
         const QQuickItem* stack = itemOfType("QQuickStackView");
         const QQuickItem* sheet = itemOfType("SaveSheet");
-        const bool sliding = stack->property("busy").toBool() || (sheet != nullptr && sheet->property("moving").toBool());
+        const bool sliding =
+            stack->property("busy").toBool() || (sheet != nullptr && sheet->property("moving").toBool());
         return !sliding && (sheet != nullptr) == (_app->saveViewController() != nullptr);
     });
     EXPECT_TRUE(settled) << "something never stops moving";

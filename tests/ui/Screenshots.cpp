@@ -36,9 +36,9 @@ Value readings() {
                                               {"Num of Consecutive DRX Cycles of S < 0", "0"},
                                               {"Measurement Rules", "Intra-frequency and inter-frequency, always"},
                                               {"Version", "1"}})},
-        {"Measured Neighbor Cells", Array::make({"", neighbor("302", "-101.25 dBm", "-12.50 dB"),
-                                                 neighbor("417", "-104.00 dBm", "-13.25 dB"),
-                                                 neighbor("88", "-110.50 dBm", "-16.00 dB")})},
+        {"Measured Neighbor Cells",
+         Array::make({"", neighbor("302", "-101.25 dBm", "-12.50 dB"), neighbor("417", "-104.00 dBm", "-13.25 dB"),
+                      neighbor("88", "-110.50 dBm", "-16.00 dB")})},
         {"Detected Neighbor Cells", Array::make({""})},
         {"PDP Contexts", leaves({{"APN", "internet"}, {"Address", "10.64.3.17"}})},
         {"Registration", "Registered, home network"},
@@ -58,8 +58,9 @@ public:
 private:
     void shoot(Scene& scene, const char* name) {
         scene.settle();
-        const QString file = QStringLiteral("%1/%2-%3%4.png").arg(_directory, QLatin1String(name), _dark ? "dark" : "light",
-            _size.width() == 360 ? QString() : QStringLiteral("-%1").arg(_size.width()));
+        const QString file = QStringLiteral("%1/%2-%3%4.png")
+                                 .arg(_directory, QLatin1String(name), _dark ? "dark" : "light",
+                                      _size.width() == 360 ? QString() : QStringLiteral("-%1").arg(_size.width()));
         if (!scene.view().grabWindow().save(file)) std::fprintf(stderr, "cannot write %s\n", qPrintable(file));
     }
 

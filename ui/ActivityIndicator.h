@@ -1,9 +1,9 @@
 #pragma once
 
+#include <QtQml/qqmlregistration.h>
 #include <QBasicTimer>
 #include <QColor>
 #include <QQuickPaintedItem>
-#include <QtQml/qqmlregistration.h>
 
 namespace kelvo {
 

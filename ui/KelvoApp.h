@@ -1,8 +1,8 @@
 #pragma once
 
+#include <QtQml/qqmlregistration.h>
 #include <QObject>
 #include <QString>
-#include <QtQml/qqmlregistration.h>
 #include <functional>
 #include <memory>
 #include <string>
@@ -100,7 +100,7 @@ private:
     QString _alertButton;
     bool _terminated = false;
     std::shared_ptr<bool> _alive = std::make_shared<bool>(true);  // tasks on the queue outlive the application
-    std::unique_ptr<Window> _window;  // last, so that nothing it draws goes before it
+    std::unique_ptr<Window> _window;                              // last, so that nothing it draws goes before it
 };
 
 }  // namespace kelvo

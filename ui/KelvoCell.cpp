@@ -7,24 +7,28 @@ KelvoCell::KelvoCell(const TextMeasure& measure, QQuickItem* parent) : QQuickIte
 void KelvoCell::setKey(const QString& key) {
     if (_key == key) return;
     _key = key;
+    Q_EMIT keyChanged();
     show();
 }
 
 void KelvoCell::setValue(const QString& value) {
     if (_value == value) return;
     _value = value;
+    Q_EMIT valueChanged();
     show();
 }
 
 void KelvoCell::setOpens(bool opens) {
     if (_opens == opens) return;
     _opens = opens;
+    Q_EMIT opensChanged();
     show();
 }
 
 void KelvoCell::setContentArea(const QRectF& area) {
     if (_contentArea == area) return;
     _contentArea = area;
+    Q_EMIT contentAreaChanged();
     show();
 }
 
@@ -41,7 +45,6 @@ void KelvoCell::show() {
     } else {
         setLayout();
     }
-    Q_EMIT contentChanged();
     Q_EMIT laidOut();
 }
 

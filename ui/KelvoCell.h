@@ -1,10 +1,10 @@
 #pragma once
 
+#include <QtQml/qqmlregistration.h>
 #include <QQuickItem>
 #include <QRectF>
 #include <QSizeF>
 #include <QString>
-#include <QtQml/qqmlregistration.h>
 
 #include "ui/TextMeasure.h"
 
@@ -19,16 +19,16 @@ namespace kelvo {
 class KelvoCell : public QQuickItem {
     Q_OBJECT
     QML_ELEMENT
-    Q_PROPERTY(QString key READ key WRITE setKey NOTIFY contentChanged REQUIRED)
-    Q_PROPERTY(QString value READ value WRITE setValue NOTIFY contentChanged REQUIRED)
-    Q_PROPERTY(bool opens READ opens WRITE setOpens NOTIFY contentChanged REQUIRED)
+    Q_PROPERTY(QString key READ key WRITE setKey NOTIFY keyChanged REQUIRED)
+    Q_PROPERTY(QString value READ value WRITE setValue NOTIFY valueChanged REQUIRED)
+    Q_PROPERTY(bool opens READ opens WRITE setOpens NOTIFY opensChanged REQUIRED)
     Q_PROPERTY(QString shownValue READ shownValue NOTIFY laidOut)
     Q_PROPERTY(QString accessibleName READ accessibleName NOTIFY laidOut)
     Q_PROPERTY(QRectF keyFrame READ keyFrame NOTIFY laidOut)
     Q_PROPERTY(QRectF valueFrame READ valueFrame NOTIFY laidOut)
     Q_PROPERTY(QRectF viewFrame READ viewFrame NOTIFY laidOut)
     Q_PROPERTY(QSizeF viewContentSize READ viewContentSize NOTIFY laidOut)
-    Q_PROPERTY(QRectF contentArea READ contentArea WRITE setContentArea NOTIFY laidOut)
+    Q_PROPERTY(QRectF contentArea READ contentArea WRITE setContentArea NOTIFY contentAreaChanged)
 public:
     static constexpr const char* kReuseIdentifier = "KelvoPaneControllerCell";
     static constexpr qreal kStripHeight = 50;
@@ -55,13 +55,16 @@ public:
     QString accessibleName() const;  ///< key and shown value, for a screen reader
     const QRectF& keyFrame() const { return _keyFrame; }
     const QRectF& valueFrame() const { return _valueFrame; }
-    const QRectF& viewFrame() const { return _viewFrame; }            ///< empty in a key row
+    const QRectF& viewFrame() const { return _viewFrame; }              ///< empty in a key row
     const QSizeF& viewContentSize() const { return _viewContentSize; }  ///< empty in a key row
 
     void componentComplete() override;
 
 Q_SIGNALS:
-    void contentChanged();
+    void keyChanged();
+    void valueChanged();
+    void opensChanged();
+    void contentAreaChanged();
     void laidOut();
 
 private:

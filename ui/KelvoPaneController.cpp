@@ -88,9 +88,8 @@ void KelvoPaneController::setStatus(const QString& status, bool isLoading) {
 
 void KelvoPaneController::createToolbarItems() {
     using Kind = ToolbarItem::Kind;
-    std::vector<ToolbarItem> items = {{Kind::ActivityIndicator, {}, _isLoading},
-                                      {Kind::StatusLabel, _status},
-                                      {Kind::FlexibleSpace}};
+    std::vector<ToolbarItem> items = {
+        {Kind::ActivityIndicator, {}, _isLoading}, {Kind::StatusLabel, _status}, {Kind::FlexibleSpace}};
     if (_host.allowSaveButton()) items.push_back({Kind::SaveButton});
     if (items == _toolbarItems) return;
     _toolbarItems = std::move(items);

@@ -1,8 +1,8 @@
 #pragma once
 
+#include <QtQml/qqmlregistration.h>
 #include <QAbstractListModel>
 #include <QString>
-#include <QtQml/qqmlregistration.h>
 #include <vector>
 
 #include "model/KelvoModelNode.h"
@@ -43,8 +43,8 @@ public:
     const std::string& path() const { return _keyPath; }
     const QString& title() const { return _title; }          ///< the node's name, "Kelvo" while there is none
     const QString& backTitle() const { return _backTitle; }  ///< the pane below; empty at the bottom of the stack
-    QString emptyText() const;                               ///< what to say in place of rows; empty while there are some
-    int selectedRow() const { return _selectedRow; }         ///< the highlighted row, -1 for none
+    QString emptyText() const;                        ///< what to say in place of rows; empty while there are some
+    int selectedRow() const { return _selectedRow; }  ///< the highlighted row, -1 for none
 
     /// Replaces the node. Only the rows that differ change, so that fingers and scroll positions stay where they are.
     void reloadWithNode(NodeRef node);

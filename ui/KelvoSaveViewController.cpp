@@ -1,5 +1,8 @@
 #include "ui/KelvoSaveViewController.h"
 
+#include <QGuiApplication>
+#include <QInputMethod>
+
 #include "model/Snapshot.h"
 #include "platform/Environment.h"
 #include "ui/ScreenHost.h"
@@ -18,6 +21,7 @@ void KelvoSaveViewController::setSaveDescription(const QString& text) {
 }
 
 void KelvoSaveViewController::savePressed() {
+    QGuiApplication::inputMethod()->commit();  // what is still being composed belongs to the description
     writeSnapshot();
     close();
 }

@@ -41,7 +41,8 @@ bool NavigationStack::popViewController() {
 }
 
 void NavigationStack::didRemoveView(KelvoPaneController* pane) {
-    const auto at = std::find_if(_leaving.begin(), _leaving.end(), [&](const auto& each) { return each.get() == pane; });
+    const auto at =
+        std::find_if(_leaving.begin(), _leaving.end(), [&](const auto& each) { return each.get() == pane; });
     if (at == _leaving.end()) return;
     at->release()->deleteLater();  // its last page may still be unwinding
     _leaving.erase(at);

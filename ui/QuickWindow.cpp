@@ -1,8 +1,11 @@
 #include "ui/QuickWindow.h"
 
 #include <QDir>
+#include <QEventLoop>
 #include <QQmlEngine>
 #include <QScreen>
+#include <QTimer>
+#include <chrono>
 
 #include "ui/KelvoApp.h"
 
@@ -29,9 +32,16 @@ void QuickWindow::setRootScreen(KelvoApp& application) {
     _view->setSource(QUrl(QStringLiteral("qrc:/qt-project.org/imports/Kelvo/Ui/qml/Screen.qml")));
 }
 
+// Whatever is posted by now may hold the main queue up for a while, so the first frame goes before it. A window that
+// the system does not show yet is not waited for.
 void QuickWindow::makeKeyAndVisible() {
+    constexpr auto kPatience = std::chrono::milliseconds(250);
+    QEventLoop untilDrawn;
+    QObject::connect(_view.get(), &QQuickWindow::frameSwapped, &untilDrawn, &QEventLoop::quit);
+    QTimer::singleShot(kPatience, &untilDrawn, &QEventLoop::quit);
     _view->show();
     _view->requestActivate();
+    untilDrawn.exec(QEventLoop::ExcludeUserInputEvents);
 }
 
 void QuickWindow::orderOut() { _view->hide(); }

@@ -24,6 +24,7 @@ bool Theme::eventFilter(QObject* watched, QEvent* event) {
 QColor Theme::background() const { return choose(0xfff3f5f6, 0xff0e1113); }
 QColor Theme::bar() const { return choose(0xfffafbfb, 0xff161a1d); }
 QColor Theme::row() const { return choose(0xffffffff, 0xff161a1d); }
+QColor Theme::raised() const { return choose(0xffffffff, 0xff252c31); }
 QColor Theme::pressed() const { return choose(0xffe3ebea, 0xff243030); }
 QColor Theme::hairline() const { return choose(0xffdde2e4, 0xff2b3236); }
 QColor Theme::text() const { return choose(0xff14191c, 0xffedf1f2); }

@@ -1,8 +1,8 @@
 #pragma once
 
+#include <QtQml/qqmlregistration.h>
 #include <QColor>
 #include <QObject>
-#include <QtQml/qqmlregistration.h>
 
 namespace kelvo {
 
@@ -15,6 +15,7 @@ class Theme : public QObject {
     Q_PROPERTY(QColor background READ background NOTIFY changed)
     Q_PROPERTY(QColor bar READ bar NOTIFY changed)
     Q_PROPERTY(QColor row READ row NOTIFY changed)
+    Q_PROPERTY(QColor raised READ raised NOTIFY changed)
     Q_PROPERTY(QColor pressed READ pressed NOTIFY changed)
     Q_PROPERTY(QColor hairline READ hairline NOTIFY changed)
     Q_PROPERTY(QColor text READ text NOTIFY changed)
@@ -28,6 +29,7 @@ public:
     QColor background() const;     ///< behind the rows
     QColor bar() const;            ///< title bar and toolbar
     QColor row() const;            ///< rows, fields and sheets
+    QColor raised() const;         ///< an alert, above everything
     QColor pressed() const;        ///< a row or button under a finger
     QColor hairline() const;       ///< the lines between things
     QColor text() const;           ///< keys and titles

@@ -24,7 +24,8 @@ int main(int argc, char** argv) {
 
     HostSystemLog log("kelvo");
     const DirectoryResources resources(HostPaths::resourcesDirectory());
-    const Environment::Scope environment({.log = &log, .resources = &resources, .standardOutput = stdout});
+    const Environment::Scope environment(
+        {.log = &log, .resources = &resources, .standardOutput = stdout, .version = KELVO_VERSION});
 
     HostMainQueue queue;
     HostMessagePorts ports;

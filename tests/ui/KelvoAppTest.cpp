@@ -20,6 +20,7 @@ protected:
     /// Launched, connected and showing a tree with three neighbours.
     void run() {
         launch();
+        world.queue.run();
         world.show(sampleTree(3));
     }
     KelvoPaneController& pane(std::size_t depth) { return *app->navigation()->viewControllers()[depth]; }
@@ -72,10 +73,9 @@ TEST_F(App, LaunchesInItsOrderAndConnectsOnlyAfterwards) {
     services.createWindow = [this] { return std::make_unique<WatchingWindow>(*app, world); };
     app = std::make_unique<KelvoApp>(std::move(services));
     launch();
-    EXPECT_EQ(world.events,
-              (Events{"created: save yes, no model, message '', asked 0, ports 0",
-                      "root: save yes, model, message 'Connecting...', Connecting, asked 0, ports 0",
-                      "shown: save yes, model, message 'Connecting...', Connecting, asked 0, ports 0"}));
+    EXPECT_EQ(world.events, (Events{"created: save yes, no model, message '', asked 0, ports 0",
+                                    "root: save yes, model, message 'Connecting...', Connecting, asked 0, ports 0",
+                                    "shown: save yes, model, message 'Connecting...', Connecting, asked 0, ports 0"}));
     world.queue.run();
     EXPECT_EQ(world.telephony.askedFor.size(), 1U);
     EXPECT_TRUE(app->model()->isConnected());

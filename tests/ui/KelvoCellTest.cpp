@@ -8,9 +8,7 @@ namespace {
 /// Texts as wide as their number says: "key 120" is 120 by 18.
 class StatedWidths final : public TextMeasure {
 public:
-    QSizeF boldSize(const QString& text) const override {
-        return {text.section(QLatin1Char(' '), 1).toDouble(), 18};
-    }
+    QSizeF boldSize(const QString& text) const override { return {text.section(QLatin1Char(' '), 1).toDouble(), 18}; }
 };
 
 class Cell : public testing::Test {

@@ -87,7 +87,8 @@ TEST_F(Pane, HasNoRowsForANodeThatIsALeaf) {
 }
 
 TEST_F(Pane, HasThreeToolbarItemsWithoutTheSavePermission) {
-    EXPECT_EQ(toolbar(paneOf(branch())), (std::vector{Kind::ActivityIndicator, Kind::StatusLabel, Kind::FlexibleSpace}));
+    EXPECT_EQ(toolbar(paneOf(branch())),
+              (std::vector{Kind::ActivityIndicator, Kind::StatusLabel, Kind::FlexibleSpace}));
 }
 
 TEST_F(Pane, HasFourToolbarItemsWithIt) {

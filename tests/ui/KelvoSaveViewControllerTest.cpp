@@ -76,9 +76,8 @@ TEST_F(SaveScreen, WritesTheTimeItWasOpenedTheHistoryAndTheDescription) {
     save.setSaveDescription(QStringLiteral("Håkon's drive <1>"));
     save.savePressed();
 
-    const Value expected = Dictionary::make({{"Timestamp", "2011-03-04 09:15:02 +0000"},
-                                             {"Data", twoEntries()},
-                                             {"Description", "Håkon's drive <1>"}});
+    const Value expected = Dictionary::make(
+        {{"Timestamp", "2011-03-04 09:15:02 +0000"}, {"Data", twoEntries()}, {"Description", "Håkon's drive <1>"}});
     EXPECT_EQ(contents(pathAt(1299230160)), expected);
     EXPECT_EQ(files(), 1);
     EXPECT_TRUE(textOfFile(pathAt(1299230160)).starts_with("<?xml"));
@@ -95,8 +94,8 @@ TEST_F(SaveScreen, WritesTheThreePartsInTheirOrder) {
 
 TEST_F(SaveScreen, WritesAnEmptyListAndAnEmptyDescription) {
     open(Array::make()).savePressed();
-    const Value expected = Dictionary::make(
-        {{"Timestamp", "2011-03-04 09:15:02 +0000"}, {"Data", Array::make()}, {"Description", ""}});
+    const Value expected =
+        Dictionary::make({{"Timestamp", "2011-03-04 09:15:02 +0000"}, {"Data", Array::make()}, {"Description", ""}});
     EXPECT_EQ(contents(pathAt(1299230102)), expected);
 }
 

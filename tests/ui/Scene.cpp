@@ -45,10 +45,12 @@ Scene::Scene(bool savingPermitted, QSize size) {
 Scene::~Scene() { useDarkColours(false); }
 
 void Scene::settle() {
+    QCoreApplication::processEvents();  // a resize, or a start that is posted
     const bool settled = QTest::qWaitFor([this] {
         const QQuickItem* stack = itemOfType("QQuickStackView");
         const QQuickItem* sheet = itemOfType("SaveSheet");
-        const bool sliding = stack->property("busy").toBool() || (sheet != nullptr && sheet->property("moving").toBool());
+        const bool sliding =
+            stack->property("busy").toBool() || (sheet != nullptr && sheet->property("moving").toBool());
         return !sliding && (sheet != nullptr) == (_app->saveViewController() != nullptr);
     });
     EXPECT_TRUE(settled) << "something never stops moving";
@@ -84,7 +86,20 @@ QQuickItem* Scene::itemOfType(const char* type) {
 }
 
 void Scene::touch(const QPointF& at) { QTest::touchEvent(_view, touchScreen()).press(0, at.toPoint()); }
-void Scene::move(const QPointF& to) { QTest::touchEvent(_view, touchScreen()).move(0, to.toPoint()); }
+void Scene::move(const QPointF& to) {
+    QTest::touchEvent(_view, touchScreen()).move(0, to.toPoint());
+    nextFrame();  // with which moves are handed on
+}
+
+void Scene::nextFrame() {
+    bool drawn = false;
+    const QMetaObject::Connection watching =
+        QObject::connect(_view, &QQuickWindow::frameSwapped, _view, [&drawn] { drawn = true; });
+    _view->update();
+    EXPECT_TRUE(QTest::qWaitFor([&drawn] { return drawn; }));
+    QObject::disconnect(watching);
+}
+
 void Scene::lift(const QPointF& at) { QTest::touchEvent(_view, touchScreen()).release(0, at.toPoint()); }
 
 void Scene::tap(const QPointF& at) {

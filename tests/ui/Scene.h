@@ -43,6 +43,7 @@ public:
 
 private:
     QQuickItem* find(const QString& text);
+    void nextFrame();
 
     std::unique_ptr<KelvoApp> _app;
     QQuickView* _view = nullptr;

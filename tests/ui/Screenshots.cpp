@@ -1,7 +1,9 @@
-// Draws the main screens into a directory, light and dark, without a display: kelvo_screenshots DIRECTORY
+// Draws the main screens into a directory, light and dark, without a display:
+// kelvo_screenshots DIRECTORY [WIDTH HEIGHT]
 #include <QDir>
 #include <QGuiApplication>
 #include <cstdio>
+#include <cstdlib>
 
 #include "tests/ui/Scene.h"
 
@@ -36,9 +38,9 @@ Value readings() {
                                               {"Num of Consecutive DRX Cycles of S < 0", "0"},
                                               {"Measurement Rules", "Intra-frequency and inter-frequency, always"},
                                               {"Version", "1"}})},
-        {"Measured Neighbor Cells", Array::make({"", neighbor("302", "-101.25 dBm", "-12.50 dB"),
-                                                 neighbor("417", "-104.00 dBm", "-13.25 dB"),
-                                                 neighbor("88", "-110.50 dBm", "-16.00 dB")})},
+        {"Measured Neighbor Cells",
+         Array::make({"", neighbor("302", "-101.25 dBm", "-12.50 dB"), neighbor("417", "-104.00 dBm", "-13.25 dB"),
+                      neighbor("88", "-110.50 dBm", "-16.00 dB")})},
         {"Detected Neighbor Cells", Array::make({""})},
         {"PDP Contexts", leaves({{"APN", "internet"}, {"Address", "10.64.3.17"}})},
         {"Registration", "Registered, home network"},
@@ -52,14 +54,14 @@ public:
     void all() {
         Scene::useDarkColours(_dark);
         panes();
-        if (_size.width() < 600) saving();
+        saving();
     }
 
 private:
     void shoot(Scene& scene, const char* name) {
         scene.settle();
-        const QString file = QStringLiteral("%1/%2-%3%4.png").arg(_directory, QLatin1String(name), _dark ? "dark" : "light",
-            _size.width() == 360 ? QString() : QStringLiteral("-%1").arg(_size.width()));
+        const QString file =
+            QStringLiteral("%1/%2-%3.png").arg(_directory, QLatin1String(name), _dark ? "dark" : "light");
         if (!scene.view().grabWindow().save(file)) std::fprintf(stderr, "cannot write %s\n", qPrintable(file));
     }
 
@@ -113,13 +115,13 @@ private:
 }  // namespace kelvo::test
 
 int main(int argc, char** argv) {
-    if (argc != 2) return std::fprintf(stderr, "usage: kelvo_screenshots DIRECTORY\n"), 2;
+    if (argc != 2 && argc != 4) return std::fprintf(stderr, "usage: kelvo_screenshots DIRECTORY [WIDTH HEIGHT]\n"), 2;
     qputenv("QT_QPA_PLATFORM", "offscreen");
     qputenv("QT_QUICK_BACKEND", "software");
     QGuiApplication application(argc, argv);
-    QDir().mkpath(QString::fromLocal8Bit(argv[1]));
-    for (const QSize size : {QSize(360, 640), QSize(412, 915), QSize(1000, 700)}) {
-        for (const bool dark : {false, true}) kelvo::test::Shooter(QString::fromLocal8Bit(argv[1]), size, dark).all();
-    }
+    const QString directory = QString::fromLocal8Bit(argv[1]);
+    QDir().mkpath(directory);
+    const QSize size = argc == 4 ? QSize(std::atoi(argv[2]), std::atoi(argv[3])) : QSize(360, 640);
+    for (const bool dark : {false, true}) kelvo::test::Shooter(directory, size, dark).all();
     return 0;
 }

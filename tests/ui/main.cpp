@@ -18,7 +18,6 @@ int main(int argc, char** argv) {
     testing::InitGoogleTest(&argc, argv);
     qputenv("QT_QPA_PLATFORM", "offscreen");
     qputenv("QT_QUICK_BACKEND", "software");
-    if (!qEnvironmentVariableIsSet("XDG_RUNTIME_DIR")) qputenv("XDG_RUNTIME_DIR", "/tmp");
     QGuiApplication application(argc, argv);
     before = qInstallMessageHandler(complain);
     return RUN_ALL_TESTS();

@@ -30,7 +30,7 @@ FocusScope {
         width: Math.min(300, parent.width - 48)
         height: column.implicitHeight
         radius: 14
-        color: Theme.row
+        color: Theme.raised
 
         Column {
             id: column

@@ -16,17 +16,38 @@ T.AbstractButton {
     rightPadding: 12
     activeFocusOnTab: true
     focusPolicy: Qt.TabFocus
-    Keys.onReturnPressed: click()
-    Keys.onEnterPressed: click()
+    Keys.onReturnPressed: clicked()
+    Keys.onEnterPressed: clicked()
 
     Accessible.role: Accessible.Button
     Accessible.name: text
-    Accessible.onPressAction: click()
+    Accessible.onPressAction: clicked()
 
-    contentItem: Item {
+    contentItem: Label {
+        text: button.text
+        textHidden: button.textHidden
+        leads: button.leads
+        strong: button.strong
+    }
+
+    background: Rectangle {
+        radius: 8
+        color: button.down ? Theme.pressed : "transparent"
+        border { width: button.visualFocus ? 2 : 0; color: Theme.accent }
+    }
+
+    component Label: Item {
+        id: content
+
+        property alias text: label.text
+        property alias strong: label.font.bold
+        property bool textHidden
+        property bool leads
+
         implicitWidth: label.x + label.implicitWidth
+
         Glyph {
-            visible: button.leads
+            visible: content.leads
             anchors.verticalCenter: parent.verticalCenter
             width: 20
             height: 20
@@ -35,21 +56,14 @@ T.AbstractButton {
         }
         Text {
             id: label
-            visible: !button.textHidden
-            x: button.leads ? 20 : 0
+            visible: !content.textHidden
+            x: content.leads ? 20 : 0
             width: parent.width - x
             anchors.verticalCenter: parent.verticalCenter
-            text: button.text
             textFormat: Text.PlainText
             elide: Text.ElideRight
             color: Theme.accent
-            font { pixelSize: 16; bold: button.strong }
+            font.pixelSize: 16
         }
-    }
-
-    background: Rectangle {
-        radius: 8
-        color: button.down ? Theme.pressed : "transparent"
-        border { width: button.visualFocus ? 2 : 0; color: Theme.accent }
     }
 }

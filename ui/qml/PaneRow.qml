@@ -21,7 +21,11 @@ KelvoCell {
         return true;
     }
 
-    ListView.onPooled: strip.contentX = 0
+    ListView.onPooled: {
+        visible = false;
+        strip.contentX = 0;
+    }
+    ListView.onReused: visible = true
 
     Accessible.role: Accessible.ListItem
     Accessible.name: accessibleName

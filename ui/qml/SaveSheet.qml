@@ -1,3 +1,4 @@
+pragma ComponentBehavior: Bound
 import QtQuick
 import QtQuick.Templates as T
 import Kelvo.Ui
@@ -79,10 +80,7 @@ FocusScope {
             anchors { right: parent.right; rightMargin: 4; top: parent.top; topMargin: 6 }
             text: qsTr("Save")
             strong: true
-            onClicked: {
-                Qt.inputMethod.commit();  // what is still being composed belongs to the description
-                sheet.saveView.savePressed();
-            }
+            onClicked: sheet.saveView.savePressed()
         }
 
         Column {

@@ -56,6 +56,10 @@ struct Shown {
         changed.exceptionText = text;
         return changed;
     }
+
+    /// Whether the text shows a real number: raw x scale + offset.
+    constexpr bool isReal() const { return how == How::Linear || how == How::Eighths; }
+    constexpr double real(std::int64_t raw) const { return static_cast<double>(raw) * scale + offset; }
 };
 
 /// "%d"; for 32 unsigned bits say `asSigned` or `asUnsigned`.

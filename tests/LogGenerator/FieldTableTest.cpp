@@ -114,6 +114,15 @@ TEST(FieldTable, PrintsRealNumbersOutsideTheNumberLineAsPrintfDoes) {
     EXPECT_EQ(text, "-inf dB");
 }
 
+TEST(FieldTable, TellsTheNumberBehindARealValue) {
+    EXPECT_DOUBLE_EQ(linear(0.25, -140.0, "%4.2f dBm").real(2), -139.5);
+    EXPECT_DOUBLE_EQ(linear(0.334, -63.248, "%.2f dBm").real(1), -62.914);
+    EXPECT_TRUE(linear(0.25, -140.0, "%4.2f dBm").isReal());
+    EXPECT_TRUE(linear(0.334, -63.248, "%.2f dBm").isReal());
+    EXPECT_FALSE(decimal.isReal());
+    EXPECT_FALSE(whole(2, -140, "%d dBm").isReal());
+}
+
 TEST(FieldTable, DoesNotMakeUpRowsBeyondTheEnd) {
     static constexpr auto kCell = entry(4, {{0, u16, "ID", decimal}, {2, u16, "Level", decimal}});
     const Bytes bytes = {0xEE, 1, 0, 2, 0, 3, 0};  // one whole entry and half of the next

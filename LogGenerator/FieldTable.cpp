@@ -123,10 +123,11 @@ void print(std::string& text, double value, const NumberFormat& format) {
 
 void showFields(Dictionary& shown, RecordView record, std::size_t base, std::span<const Field> fields) {
     for (const Field& field : fields) {
-        if (field.shown.how == Shown::How::Nothing) {
+        const std::int64_t raw = record.read(base + field.at, field.raw);
+        if (field.shown.leavesOut(raw)) {
             shown.remove(field.key);
         } else {
-            print(shown.slot(field.key).text(), record.read(base + field.at, field.raw), field.shown);
+            print(shown.slot(field.key).text(), raw, field.shown);
         }
     }
 }

@@ -8,13 +8,13 @@ namespace {
 
 // clang-format off
 constexpr auto kCell = entry(20, {
-    {  0, u32.bits( 0,  8), "Physical Cell ID",    decimal                          },
+    {  0, u32.bits( 0,  8), "Physical Cell ID",    decimal                           },
     {  0, u32.bits( 9, 16), "Measured RSSI",       linear(0.5,  -140.0, "%4.2f dBm") },
     {  0, u32.bits(17, 25), "Measured RSRP",       linear(0.5,  -140.0, "%4.2f dBm") },  // intended: the serving cell's steps are 0.25
     {  4, u32.bits( 0,  8), "Average RSRP",        linear(0.5,  -140.0, "%4.2f dBm") },
     {  4, u32.bits( 9, 15), "Measured RSRQ",       linear(0.25,  -30.0, "%4.2f dB")  },
     {  4, u32.bits(16, 22), "Average RSRQ",        linear(0.25,  -30.0, "%4.2f dB")  },
-    {  4, u32.bits(23, 29), "Srxlev",              whole(1, -30, "%d dBm")           },
+    {  4, u32.bits(23, 29), "Srxlev",              whole(1, -30, "%d dBm")            },
     {  8, u16,              "Frequency Offset",    decimal                           },
     { 12, u32.bits( 0, 10), "Ant 0 Frame Offset",  decimal                           },
     { 12, u32.bits(11, 29), "Ant 0 Sample Offset", decimal                           },

@@ -1,6 +1,7 @@
 #include "LogGenerator/LogGenerator.h"
 
 #include "LogGenerator/CDMA/C2KLogGenerator.h"
+#include "LogGenerator/GSM/GSMLogGenerator.h"
 #include "LogGenerator/GSMUMTS/OSK_GSMLogGenerator.h"
 #include "LogGenerator/LTE/LTELogGenerator.h"
 #include "LogGenerator/UTRAN/UTRANLogGenerator.h"
@@ -20,6 +21,7 @@ LogGenerator::LogGenerator(Built built) {
 }
 
 std::unique_ptr<LogGenerator> LogGenerator::generatorFromTechnology(std::string_view technology) {
+    if (technology == kPLLogChannelTechnology_IFX) return GSMLogGenerator::generator();
     if (technology == kPLLogChannelTechnology_Oskra_GSM) return OSK_GSMLogGenerator::generator();
     if (technology == kPLLogChannelTechnology_Oskra_CDMA) return C2KLogGenerator::generator();
     if (technology == kPLLogChannelTechnology_Oskra_LTE) return LTELogGenerator::generator();

@@ -1,5 +1,8 @@
 #include <gtest/gtest.h>
 
+#include "LogGenerator/CDMA/C2KLogGenerator.h"
+#include "LogGenerator/GSM/GSMLogGenerator.h"
+#include "LogGenerator/GSMUMTS/OSK_GSMLogGenerator.h"
 #include "LogGenerator/LTE/LTELogGenerator.h"
 #include "LogGenerator/UTRAN/UTRANLogGenerator.h"
 
@@ -13,6 +16,9 @@ bool makes(std::string_view technology) {
 }
 
 TEST(Factory, MakesTheGeneratorOfATechnology) {
+    EXPECT_TRUE(makes<GSMLogGenerator>("kPLLogChannelTechnology_IFX"));
+    EXPECT_TRUE(makes<OSK_GSMLogGenerator>("kPLLogChannelTechnology_Oskra_GSM"));
+    EXPECT_TRUE(makes<C2KLogGenerator>("kPLLogChannelTechnology_Oskra_CDMA"));
     EXPECT_TRUE(makes<LTELogGenerator>("kPLLogChannelTechnology_Oskra_LTE"));
     EXPECT_TRUE(makes<UTRANLogGenerator>("kPLLogChannelTechnology_Oskra_UTRAN2"));
 }

@@ -45,7 +45,7 @@ void showCell(Dictionary& shown, const Dictionary& cell, std::span<const CellFie
         const auto value = number != nullptr ? number->int32() : std::nullopt;
         if (value) {
             print(shown.slot(field.displayKey).text(), *value, field.shown);
-        } else {
+        } else if (field.failure != nullptr) {
             logLine(Level::Error, field.failure);
         }
     }

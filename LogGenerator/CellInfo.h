@@ -32,7 +32,8 @@ const Dictionary* firstCell(const Array& cells, std::string_view technology, std
 struct CellField {
     std::string_view cellKey;
     Key displayKey;
-    const char* failure;  ///< the error line when the cell lacks it or it is no 32-bit integer
+    /// The error line when the cell lacks it or it is no 32-bit integer; null when another field has said so.
+    const char* failure;
     Shown shown = decimal;
 };
 

@@ -110,9 +110,7 @@ void print(std::string& text, std::int64_t raw, const Shown& shown) {
         case Shown::How::Unsigned: printInteger(text, raw, shown.format); break;
         case Shown::How::Signed32: printInteger(text, static_cast<std::int32_t>(raw), shown.format); break;
         case Shown::How::Label: printLabel(text, raw, shown); break;
-        case Shown::How::Linear:
-            print(text, static_cast<double>(raw) * shown.scale + shown.offset, shown.format);
-            break;
+        case Shown::How::Linear: print(text, shown.real(raw), shown.format); break;
         case Shown::How::Eighths: printEighths(text, raw * shown.factor + shown.summand, shown.format); break;
         case Shown::How::Whole: printInteger(text, raw * shown.factor + shown.summand, shown.format); break;
     }
@@ -125,10 +123,11 @@ void print(std::string& text, double value, const NumberFormat& format) {
 
 void showFields(Dictionary& shown, RecordView record, std::size_t base, std::span<const Field> fields) {
     for (const Field& field : fields) {
-        if (field.shown.how == Shown::How::Nothing) {
+        const std::int64_t raw = record.read(base + field.at, field.raw);
+        if (field.shown.leavesOut(raw)) {
             shown.remove(field.key);
         } else {
-            print(shown.slot(field.key).text(), record.read(base + field.at, field.raw), field.shown);
+            print(shown.slot(field.key).text(), raw, field.shown);
         }
     }
 }

@@ -48,6 +48,7 @@ struct Shown {
     std::span<const ValueRow> rows{};
     std::int64_t exception = std::numeric_limits<std::int64_t>::min();
     std::string_view exceptionText{};
+    bool exceptionIsAbsent = false;
 
     /// Shows `text` when the raw value equals `raw`.
     constexpr Shown unless(std::int64_t raw, std::string_view text) const {
@@ -56,6 +57,19 @@ struct Shown {
         changed.exceptionText = text;
         return changed;
     }
+    /// Leaves the key out when the raw value equals `raw`.
+    constexpr Shown absentAt(std::int64_t raw) const {
+        Shown changed = unless(raw, {});
+        changed.exceptionIsAbsent = true;
+        return changed;
+    }
+    constexpr bool leavesOut(std::int64_t raw) const {
+        return how == How::Nothing || (exceptionIsAbsent && raw == exception);
+    }
+
+    /// Whether the text shows a real number: raw x scale + offset.
+    constexpr bool isReal() const { return how == How::Linear || how == How::Eighths; }
+    constexpr double real(std::int64_t raw) const { return static_cast<double>(raw) * scale + offset; }
 };
 
 /// "%d"; for 32 unsigned bits say `asSigned` or `asUnsigned`.

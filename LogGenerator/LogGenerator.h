@@ -16,7 +16,7 @@ namespace kelvo {
 /// rebuild; cell-monitor generator: the tree as received) and "History" (array of snapshots, oldest first, at most 5).
 class LogGenerator {
 public:
-    LogGenerator();
+    LogGenerator() : LogGenerator(Built::Wholly) {}
     virtual ~LogGenerator() = default;
     LogGenerator(const LogGenerator&) = delete;
     LogGenerator& operator=(const LogGenerator&) = delete;
@@ -36,6 +36,11 @@ public:
 
     /// Appends a snapshot of the state to its "History" and drops the oldest beyond five.
     static void updateHistoryInState(Dictionary& state);
+
+protected:
+    /// A half-built generator lacks what it needs to decode; it is made without a word on the log.
+    enum class Built { Wholly, Half };
+    explicit LogGenerator(Built built);
 };
 
 }  // namespace kelvo

@@ -20,6 +20,8 @@ public:
     static std::optional<Bytes> generateDlfFromState(const Dictionary& state);
 
 protected:
+    using LogGenerator::LogGenerator;
+
     /// Moves the collected records into the state's "DisplayState" and begins anew.
     void moveBinDataInto(Dictionary& state);
 

@@ -31,13 +31,17 @@ OSKLogGenerator2::OSKLogGenerator2(std::string name, std::unique_ptr<ClassIndex>
 
 // The line comes before the base class's own, so it is written while the arguments are made.
 OSKLogGenerator2::Announced OSKLogGenerator2::announce(std::unique_ptr<ClassIndex> classIndex) {
-    logLine(Level::Error, "Creating OSKLogGenerator2 object with %p", static_cast<const void*>(classIndex.get()));
+    if (classIndex) {
+        logLine(Level::Error, "Creating OSKLogGenerator2 object with %p", static_cast<const void*>(classIndex.get()));
+    }
     return {std::move(classIndex)};
 }
 
 OSKLogGenerator2::OSKLogGenerator2(Announced announced, std::string name)
-    : pListName(std::move(name)), cIndex(std::move(announced.classIndex)) {
-    logLine(Level::Error, "Class Index: %ld", 1L);  // its owners: this generator alone
+    : OSKLogGenerator(announced.classIndex ? Built::Wholly : Built::Half),
+      pListName(std::move(name)),
+      cIndex(std::move(announced.classIndex)) {
+    if (cIndex) logLine(Level::Error, "Class Index: %ld", 1L);  // its owners: this generator alone
 }
 
 OSKLogGenerator2::~OSKLogGenerator2() {
@@ -51,7 +55,7 @@ void OSKLogGenerator2::updateState(Dictionary& state, ByteView data) {
 }
 
 void OSKLogGenerator2::updateWithData(ByteView data) {
-    if (data.size() < kMinimumMessageSize) return;
+    if (!cIndex || data.size() < kMinimumMessageSize) return;
     const ByteView packet = stripPrefix(data);
     const std::uint8_t type = packet.front();
     if (type != 1 && type < 255) {
@@ -72,23 +76,27 @@ void OSKLogGenerator2::updateWithData(ByteView data) {
 
 Value OSKLogGenerator2::getDisplayFromState(Dictionary& state) {
     if (const Value& display = state["Display"]) {
-        if (display.dictionary() != _boundDisplay.dictionary()) adoptDisplay(display);
+        if (cIndex && display.dictionary() != _boundDisplay.dictionary()) adoptDisplay(display);
         return display;
     }
     buildDisplay(state);
     return {};
 }
 
+bool OSKLogGenerator2::loadTemplate(Dictionary& state) const {
+    if (!cIndex) return false;
+    if (state["Template"].dictionary()) return true;
+    const Resources* resources = Environment::current().resources;
+    if (resources == nullptr) return false;
+    const Result<DictionaryRef> loaded = resources->dictionary(pListName);
+    if (loaded) state.set("Template", *loaded);
+    return static_cast<bool>(loaded);
+}
+
 void OSKLogGenerator2::buildDisplay(Dictionary& state) {
-    if (!state["Template"].dictionary()) {
-        const Resources* resources = Environment::current().resources;
-        Result<DictionaryRef> loaded =
-            resources != nullptr ? resources->dictionary(pListName) : Result<DictionaryRef>(Failure{"no resources"});
-        if (!loaded) {
-            logLine(Level::Error, "Cannot load template for display");
-            return;
-        }
-        state.set("Template", *loaded);
+    if (!loadTemplate(state)) {
+        logLine(Level::Error, "Cannot load template for display");
+        return;
     }
     logLine(Level::Warning, "Initialized class index: %p, Self: %p", static_cast<const void*>(cIndex.get()),
             static_cast<const void*>(this));
@@ -117,9 +125,14 @@ void OSKLogGenerator2::bindSections(const Value& node) {
     } else if (node.dictionary()) {
         for (const auto& [key, value] : *node.dictionary()) {
             bindSections(value);
-            if (Base* section = cIndex->getClass(key)) section->updateSectionRef(value);
+            bindSection(key, value);
         }
     }
+}
+
+void OSKLogGenerator2::bindSection(std::string_view name, const Value& displayPart) const {
+    Base* section = cIndex ? cIndex->getClass(name) : nullptr;
+    if (section != nullptr) section->updateSectionRef(displayPart);
 }
 
 Value OSKLogGenerator2::processTemplate(const Value& node) {
@@ -133,7 +146,7 @@ Value OSKLogGenerator2::processTemplate(const Value& node) {
         const DictionaryRef processed = Dictionary::make();
         for (const auto& [key, value] : *node.dictionary()) {
             Value part = processTemplate(value);
-            if (Base* section = cIndex->getClass(key)) section->updateSectionRef(part);
+            bindSection(key, part);
             processed->set(key, std::move(part));
         }
         return processed;
@@ -163,7 +176,7 @@ Value OSKLogGenerator2::generateLogUsingState(Dictionary& state) {
 DictionaryRef OSKLogGenerator2::getStartCommand() {
     const ArrayRef ordinary = Array::make();
     const ArrayRef extended = Array::make();
-    for (const std::string& key : cIndex->getAllLogCodes()) {
+    for (const std::string& key : cIndex ? cIndex->getAllLogCodes() : std::vector<std::string>()) {
         std::int64_t code = 0;
         std::from_chars(key.data(), key.data() + key.size(), code);
         if (code >= kExtendedLogCodes) {

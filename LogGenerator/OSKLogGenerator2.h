@@ -13,7 +13,8 @@ namespace kelvo {
 /// subscribed to its code. Subclasses choose the template's name and the class index.
 class OSKLogGenerator2 : public OSKLogGenerator {
 public:
-    /// `pListName` is the base name of a template resource of type "plist".
+    /// `pListName` is the base name of a template resource of type "plist". Without a class index the generator stays
+    /// half built: it has no template, decodes nothing and only collects the raw records.
     OSKLogGenerator2(std::string pListName, std::unique_ptr<ClassIndex> cIndexObj);
     ~OSKLogGenerator2() override;
 
@@ -38,9 +39,11 @@ private:
     static Announced announce(std::unique_ptr<ClassIndex> classIndex);
     OSKLogGenerator2(Announced announced, std::string pListName);
 
+    bool loadTemplate(Dictionary& state) const;
     void buildDisplay(Dictionary& state);
     void adoptDisplay(const Value& display);
     void bindSections(const Value& node);
+    void bindSection(std::string_view name, const Value& displayPart) const;
 
     std::string pListName;
     std::unique_ptr<ClassIndex> cIndex;

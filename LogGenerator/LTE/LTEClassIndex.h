@@ -4,7 +4,13 @@
 #include "LogGenerator/GSMUMTS/PDPContextList.h"
 #include "LogGenerator/GSMUMTS/SimInfo.h"
 #include "LogGenerator/LTE/ConnectedModeMeasurementMisc.h"
+#include "LogGenerator/LTE/DetectedCells.h"
 #include "LogGenerator/LTE/LTEServingCellInfo.h"
+#include "LogGenerator/LTE/MeasuredNeighborCells.h"
+#include "LogGenerator/LTE/NeighborCellsList.h"
+#include "LogGenerator/LTE/NeighborMeasurementMisc.h"
+#include "LogGenerator/LTE/ReselectionCandidatesList.h"
+#include "LogGenerator/LTE/ReselectionCandidatesMisc.h"
 #include "LogGenerator/LTE/ServingCellMeasurement.h"
 
 namespace kelvo {
@@ -17,7 +23,13 @@ public:
 private:
     LTEServingCellInfo objLTEServingCellInfo{classDict, codeDictionary};
     ConnectedModeMeasurementMisc objConnectedModeMeasurementMisc{classDict, codeDictionary};
+    MeasuredNeighborCells objMeasuredNeighborCells{classDict, codeDictionary};
+    DetectedCells objDetectedCells{classDict, codeDictionary};
     ServingCellMeasurement objServingCellMeasurement{classDict, codeDictionary};
+    NeighborMeasurementMisc objNeighborMeasurementMisc{classDict, codeDictionary};
+    NeighborCellsList objNeighborCellsList{classDict, codeDictionary};
+    ReselectionCandidatesMisc objReselectionCandidatesMisc{classDict, codeDictionary};
+    ReselectionCandidatesList objReselectionCandidatesList{classDict, codeDictionary};
     SimInfo objSimInfo{classDict, codeDictionary};
     PDPContextList objPDPContextList{classDict, codeDictionary};
 };

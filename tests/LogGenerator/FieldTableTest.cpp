@@ -114,6 +114,29 @@ TEST(FieldTable, PrintsRealNumbersOutsideTheNumberLineAsPrintfDoes) {
     EXPECT_EQ(text, "-inf dB");
 }
 
+TEST(FieldTable, TellsTheNumberBehindARealValue) {
+    EXPECT_DOUBLE_EQ(linear(0.25, -140.0, "%4.2f dBm").real(2), -139.5);
+    EXPECT_DOUBLE_EQ(linear(0.334, -63.248, "%.2f dBm").real(1), -62.914);
+    EXPECT_TRUE(linear(0.25, -140.0, "%4.2f dBm").isReal());
+    EXPECT_TRUE(linear(0.334, -63.248, "%.2f dBm").isReal());
+    EXPECT_FALSE(decimal.isReal());
+    EXPECT_FALSE(whole(2, -140, "%d dBm").isReal());
+}
+
+TEST(FieldTable, LeavesAKeyOutAtOneValueAlone) {
+    static constexpr ValueTable kStatus({{0, "A"}, {1, "B"}}, "Unknown");
+    static constexpr auto kCell = entry(1, {{0, u8, "Status", label(kStatus).absentAt(3)}});
+    const DictionaryRef shown = Dictionary::make();
+    const auto show = [&](std::uint8_t raw) {
+        showFields(*shown, RecordView(ByteView(&raw, 1)), 0, kCell.fields);
+        return (*shown)["Status"];
+    };
+    EXPECT_EQ(show(1), Value("B"));
+    EXPECT_EQ(show(3), Value());
+    EXPECT_TRUE(shown->empty());
+    EXPECT_EQ(show(2), Value("Unknown"));
+}
+
 TEST(FieldTable, DoesNotMakeUpRowsBeyondTheEnd) {
     static constexpr auto kCell = entry(4, {{0, u16, "ID", decimal}, {2, u16, "Level", decimal}});
     const Bytes bytes = {0xEE, 1, 0, 2, 0, 3, 0};  // one whole entry and half of the next

@@ -6,7 +6,6 @@
 
 #include "platform/DirectoryResources.h"
 #include "platform/Environment.h"
-#include "platform/TelephonyConstants.h"
 #include "tests/support/Record.h"
 #include "tests/support/RecordingLog.h"
 
@@ -14,6 +13,7 @@ namespace kelvo {
 namespace {
 
 using test::Record;
+using test::RecordingLog;
 
 std::set<std::int64_t> numbers(const Value& array) {
     std::set<std::int64_t> numbers;
@@ -25,7 +25,7 @@ std::set<std::int64_t> numbers(const Value& array) {
 class LTE : public testing::Test {
 protected:
     const DirectoryResources resources{KELVO_RESOURCE_DIR};
-    test::RecordingLog log;
+    RecordingLog log;
     Environment::Scope environment{{.log = &log, .resources = &resources}};
 };
 
@@ -46,7 +46,7 @@ TEST_F(LTE, ShowsARecordOnItsScreen) {
 
 TEST_F(LTE, SaysThatItIsCreatedAndDestructed) {
     { const LTELogGenerator generator; }
-    EXPECT_EQ(log.lines().front(), test::RecordingLog::Line(3, "Creating LTELogGenerator object"));
+    EXPECT_EQ(log.lines().front(), RecordingLog::Line(3, "Creating LTELogGenerator object"));
     const auto& lines = log.lines();
     EXPECT_EQ(lines[lines.size() - 2].second.find("LTELogGenerator is destructed 0x"), 0U);
     EXPECT_EQ(lines[lines.size() - 2].first, 4);
@@ -66,14 +66,75 @@ TEST_F(LTE, SaysOnStandardOutputThatItsSectionsGo) {
     std::free(text);
 }
 
-TEST_F(LTE, AsksForTheCodesOfItsSections) {
+class LTEScreens : public testing::Test {
+protected:
+    LTEScreens() { generator.getDisplayFromState(state); }
+
+    const DictionaryRef& screen(const char* name) { return (*state["Display"].dictionary())[name].dictionary(); }
+    const ArrayRef& rows(const char* name) { return (*state["Display"].dictionary())[name].array(); }
+    void feed(const Record& record) { generator.updateState(state, record.bytes()); }
+
+    DirectoryResources resources{KELVO_RESOURCE_DIR};
+    RecordingLog log;
+    Environment::Scope environment{{.log = &log, .resources = &resources}};
+    Dictionary state;
     LTELogGenerator generator;
+};
+
+constexpr const char* kValueScreens[] = {
+    "Serving Cell Info",     "Serving Cell Measurements", "Connected mode LTE Intra-frequency Measurement",
+    "Neighbor Measurements", "Reselection Candidates",    "SIM Info"};
+constexpr const char* kListScreens[] = {"Measured Neighbor Cells", "Detected Cells", "Neighbor Cells List",
+                                        "Reselection Candidates List", "PDP Context Info"};
+
+TEST_F(LTEScreens, HaveAPlaceForEverySection) {
+    for (const char* name : kValueScreens) EXPECT_TRUE(screen(name)) << name;
+    for (const char* name : kListScreens) EXPECT_TRUE(rows(name)) << name;
+}
+
+TEST_F(LTEScreens, HaveAPlaceForEveryValueOfTheOrdinaryRecords) {
+    std::size_t before = 0;
+    for (const char* name : kValueScreens) before += screen(name)->size();
+    for (const LogCode code : {0xB0C2, 0xB0C1, 0xB179, 0xB17F, 0xB180, 0xB186}) feed(Record(code, 60));
+    std::size_t after = 0;
+    for (const char* name : kValueScreens) {
+        after += screen(name)->size();
+        if (std::string_view(name) == "SIM Info") continue;
+        for (const auto& [key, value] : *screen(name)) EXPECT_NE(value, Value("–")) << name << ": " << key;
+    }
+    EXPECT_EQ(after, before);
+}
+
+TEST_F(LTEScreens, OfferARecordToItsSectionsInOrder) {
+    log.clear();
+    feed(Record(0xB179, 47).u8(27, 2).u8(28, 3).u16(29, 301).u16(41, 11));
+    EXPECT_EQ(log.lines(), (std::vector<RecordingLog::Line>{{4, "Connected mode LTE Intra-frequency Measurement"},
+                                                            {4, "Measured Neighbor Cells"},
+                                                            {4, "Detected Cells"}}));
+    EXPECT_EQ((*(*rows("Measured Neighbor Cells"))[0].dictionary())["Physical Cell ID"], Value("301"));
+    EXPECT_EQ((*(*rows("Detected Cells"))[0].dictionary())["Physical Cell ID"], Value("11"));
+
+    log.clear();
+    feed(Record(0xB180, 20));
+    feed(Record(0xB186, 20));
+    EXPECT_EQ(log.lines(), (std::vector<RecordingLog::Line>{{4, "Neighbor Measurements"},
+                                                            {4, "Neighbor Cells List"},
+                                                            {4, "Reselection Candidates"},
+                                                            {4, "Reselection Candidates List"}}));
+}
+
+TEST_F(LTEScreens, ChangeNothingForAConnectedModeRecordThatIsOneByteShort) {
+    const Value before = state["Display"].copy();
+    feed(Record(0xB179, 28).u8(17, 9).u8(27, 2));
+    EXPECT_EQ(state["Display"], before);
+}
+
+TEST_F(LTEScreens, AskForTheRecordsTheyShow) {
     const DictionaryRef command = generator.getStartCommand();
     EXPECT_EQ((*command)["SetState"], Value("Streaming"));
-    for (std::int64_t code : {0xB0C2, 0xB0C1, 0xB179, 0xB17F}) {
-        EXPECT_TRUE(numbers((*command)["SetOskraLogCodes"]).contains(code)) << code;
-    }
-    EXPECT_TRUE(numbers((*command)["SetPlExtraCodes"]).contains(1));
+    EXPECT_EQ(numbers((*command)["SetOskraLogCodes"]),
+              (std::set<std::int64_t>{0xB0C2, 0xB0C1, 0xB179, 0xB17F, 0xB180, 0xB186}));
+    EXPECT_EQ(numbers((*command)["SetPlExtraCodes"]), (std::set<std::int64_t>{0, 1, 2}));
 }
 
 }  // namespace

@@ -1,0 +1,19 @@
+#pragma once
+
+#include <array>
+
+#include "LogGenerator/Base.h"
+
+namespace kelvo {
+
+/// The neighbours measured in idle mode, one row a cell; a record states 1 to 32 of them.
+class NeighborCellsList final : public Section<NeighborCellsList> {
+public:
+    static constexpr std::string_view kSectionName = "Neighbor Cells List";
+    static constexpr std::array<LogCode, 1> kLogCodes = {0xB180};
+
+    using Section::Section;
+    void updateWithData(ByteView data, LogCode logCode) override;
+};
+
+}  // namespace kelvo

@@ -1,0 +1,51 @@
+#include "LogGenerator/UTRAN/RRC_State.h"
+
+#include "platform/Environment.h"
+
+namespace kelvo {
+
+namespace {
+
+constexpr std::int64_t kUnknownMode = 255;
+
+// clang-format off
+constexpr ValueTable kMode({
+    { 0, "Disconnected"  },
+    { 1, "Connecting"    },
+    { 2, "Cell Fach"     },
+    { 3, "Cell DCH"      },
+    { 4, "Cell PCH"      },
+    { 5, "Cell URA PCH"  },
+}, "Unknown RRC Mode");
+// clang-format on
+
+/// "{State = Cell DCH; Other = 1}"; a value that is no text is named by its kind.
+std::string describe(const Dictionary& values) {
+    std::string text = "{";
+    for (const auto& [key, value] : values) {
+        if (text.size() > 1) text += "; ";
+        text += key + " = ";
+        text += value.string() != nullptr ? std::string_view(*value.string()) : kindName(value.kind());
+    }
+    return text + "}";
+}
+
+}  // namespace
+
+void RRC_State::updateWithData(ByteView data, LogCode logCode) {
+    logLine(Level::Warning, "RRC Info");
+    if (logCode != 0xD0E0) return;
+    if (data.size() < 15) {  // intended: said, and decoded all the same
+        logLine(Level::Warning, "LogCode_0xD0E0 is length is %ld expected size %ld", data.size(), 15L);
+    }
+    const RecordView record(data);
+    const std::int64_t mode = record.read(13, u8) == 1 ? record.read(14, u8) : kUnknownMode;
+    std::string name;
+    print(name, mode, label(kMode));
+    if (values()) values()->set("State", name);
+    if (!logWants(Level::Warning)) return;
+    const std::string shown = values() ? describe(*values()) : "(none)";
+    logLine(Level::Warning, "Display Dict = %s, rrc mode = %d %s", shown, mode, name);
+}
+
+}  // namespace kelvo

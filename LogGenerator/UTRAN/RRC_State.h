@@ -1,0 +1,19 @@
+#pragma once
+
+#include <array>
+
+#include "LogGenerator/Base.h"
+
+namespace kelvo {
+
+/// The state of the radio resource control connection (3GPP TS 25.331).
+class RRC_State final : public Section<RRC_State> {
+public:
+    static constexpr std::string_view kSectionName = "RRC Info";
+    static constexpr std::array<LogCode, 1> kLogCodes = {0xD0E0};
+
+    using Section::Section;
+    void updateWithData(ByteView data, LogCode logCode) override;
+};
+
+}  // namespace kelvo

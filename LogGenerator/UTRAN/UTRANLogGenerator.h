@@ -1,0 +1,22 @@
+#pragma once
+
+#include <optional>
+
+#include "LogGenerator/OSKLogGenerator2.h"
+
+namespace kelvo {
+
+/// The generator of UTRAN modems: the sections of UTRANClassIndex fill the first template among the resources whose
+/// whole path, directories included, contains "UTRAN" in any case. Without such a template it stays half built: nothing
+/// is logged, and it decodes nothing.
+class UTRANLogGenerator final : public OSKLogGenerator2 {
+public:
+    UTRANLogGenerator();
+
+    static std::unique_ptr<LogGenerator> generator() { return std::make_unique<UTRANLogGenerator>(); }
+
+private:
+    explicit UTRANLogGenerator(const std::optional<std::string>& templateName);
+};
+
+}  // namespace kelvo

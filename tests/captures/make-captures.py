@@ -113,3 +113,28 @@ write("cdma-evdo.pcap", "cdma", [
            (133, "B", 6), (184, "H", 777)),
     record(0x1183, 49, (36, "B", 1)),
 ])
+
+
+def neighbour(uarfcn, cell, level, status, joint):
+    return uarfcn | cell << 14 | level << 21 | status << 29 | joint << 31
+
+
+write("utran-cells.pcap", "utran", [
+    record(0xD0E0, 15, (13, "B", 1), (14, "B", 3)),
+    record(0xD0E2, 26, (14, "B", 2), (15, "B", 9), (17, "H", 10054), (19, "H", 10055), (21, "I", 0xFFFFFFFE), (25, "B", 1)),
+    record(0xD00A, 200, (16, "B", 2 << 1), (168, "I", neighbour(10054, 77, 128, 2, 1)),
+           (184, "I", neighbour(10063, 12, 0, 3, 0))),
+    record(0xD00E, 25, (16, "B", 1), (17, "H", 42)),
+    record(0xD00C, 365, (14, "H", 1 << 12 | 2 << 6), (17, "B", 5), (18, "B", 6), (19, "B", 7), (20, "B", 8),
+           (357, "B", 3), (358, "B", 4), (359, "B", 10), (364, "B", 15)),
+    record(0xD00A, 20),
+])
+plist = lte.plistlib
+write("ifx-tree.pcap", "ifx", [
+    plist.dumps({"Serving": {"Cell": "old"}}),
+    plist.dumps({
+        "Serving": {"Cell": {"ARFCN": "975"}},
+        "Neighbours": ["left out", {"ARFCN": "512", "RSSI": "-71"}, {"ARFCN": "700"}],
+        "Registration": {"MCC": "262", "MNC": "01"},
+    }, fmt=plist.FMT_BINARY, sort_keys=False),
+])

@@ -116,6 +116,18 @@ TEST_F(DecodeCommand, ATruncatedCaptureEndsInAFailureAndNoHalfAnswer) {
     EXPECT_EQ(std::count(done.errors.begin(), done.errors.end(), '\n'), 1);
 }
 
+TEST_F(DecodeCommand, TellsWhichRecordEndsTheProgramAndWhy) {
+    const auto message = [](std::string_view text) { return Bytes(text.begin(), text.end()); };
+    const std::string file = capture(Technology::IFX, {message("<plist><string>fine</string></plist>"),
+                                                       message("<plist><array><string/><true/></array></plist>")});
+    const Finished done = kelvoctl({"decode", "--json", "--log", file});
+    EXPECT_EQ(done.status, 1);
+    EXPECT_EQ(done.output, "");
+    EXPECT_EQ(done.errors.find("kelvoctl: packet 2 of " + file + " ends the program: "), 0U);
+    EXPECT_NE(done.errors.find("Unknown object of type"), std::string::npos);
+    EXPECT_EQ(std::count(done.errors.begin(), done.errors.end(), '\n'), 1);
+}
+
 TEST_F(DecodeCommand, RefusesWhatItDoesNotKnow) {
     const std::string file = capture(Technology::LTE, {});
     expectFailure(kelvoctl({"decode", "--technology", "5g", file}),

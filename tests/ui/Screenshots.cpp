@@ -2,6 +2,7 @@
 // kelvo_screenshots DIRECTORY [WIDTH HEIGHT]
 #include <QDir>
 #include <QGuiApplication>
+#include <QTest>
 #include <cstdio>
 #include <cstdlib>
 
@@ -60,6 +61,7 @@ public:
 private:
     void shoot(Scene& scene, const char* name) {
         scene.settle();
+        QTest::qWait(400);  // until what fades has faded
         const QString file =
             QStringLiteral("%1/%2-%3.png").arg(_directory, QLatin1String(name), _dark ? "dark" : "light");
         if (!scene.view().grabWindow().save(file)) std::fprintf(stderr, "cannot write %s\n", qPrintable(file));

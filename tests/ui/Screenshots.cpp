@@ -39,6 +39,8 @@ Value readings() {
                                               {"Num of Consecutive DRX Cycles of S < 0", "0"},
                                               {"Measurement Rules", "Intra-frequency and inter-frequency, always"},
                                               {"Version", "1"}})},
+        {"Connected mode LTE Intra-frequency Measurement",
+         leaves({{"Serving Filtered RSRP", "-95.31 dBm"}, {"Serving Filtered RSRQ", "-9.50 dB"}})},
         {"Measured Neighbor Cells",
          Array::make({"", neighbor("302", "-101.25 dBm", "-12.50 dB"), neighbor("417", "-104.00 dBm", "-13.25 dB"),
                       neighbor("88", "-110.50 dBm", "-16.00 dB")})},

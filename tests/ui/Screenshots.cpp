@@ -2,6 +2,7 @@
 // kelvo_screenshots DIRECTORY [WIDTH HEIGHT]
 #include <QDir>
 #include <QGuiApplication>
+#include <QTest>
 #include <cstdio>
 #include <cstdlib>
 
@@ -38,6 +39,8 @@ Value readings() {
                                               {"Num of Consecutive DRX Cycles of S < 0", "0"},
                                               {"Measurement Rules", "Intra-frequency and inter-frequency, always"},
                                               {"Version", "1"}})},
+        {"Connected mode LTE Intra-frequency Measurement",
+         leaves({{"Serving Filtered RSRP", "-95.31 dBm"}, {"Serving Filtered RSRQ", "-9.50 dB"}})},
         {"Measured Neighbor Cells",
          Array::make({"", neighbor("302", "-101.25 dBm", "-12.50 dB"), neighbor("417", "-104.00 dBm", "-13.25 dB"),
                       neighbor("88", "-110.50 dBm", "-16.00 dB")})},
@@ -60,6 +63,7 @@ public:
 private:
     void shoot(Scene& scene, const char* name) {
         scene.settle();
+        QTest::qWait(400);  // until what fades has faded
         const QString file =
             QStringLiteral("%1/%2-%3.png").arg(_directory, QLatin1String(name), _dark ? "dark" : "light");
         if (!scene.view().grabWindow().save(file)) std::fprintf(stderr, "cannot write %s\n", qPrintable(file));

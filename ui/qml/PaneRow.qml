@@ -62,9 +62,11 @@ KelvoCell {
             Text {
                 x: row.keyFrame.x
                 y: row.keyFrame.y
-                width: row.keyFrame.width
+                // A name that no strip can scroll ends before the arrow.
+                width: strip.interactive ? row.keyFrame.width : Math.min(row.keyFrame.width, strip.width - x)
                 height: row.keyFrame.height
                 text: row.key
+                elide: Text.ElideRight
                 textFormat: Text.PlainText
                 color: Theme.text
                 font { pixelSize: 15; bold: true }

@@ -166,11 +166,18 @@ bool KelvoModel::startStreaming() {
 }
 
 void KelvoModel::refresh() {
-    if (_sendPort && _recvPort && !_sendPort->isValid()) _recvPort->invalidate();  // whose callback restarts
-    if (!_updated) return;
-    _updated = false;
-    _nodes.reset();
-    _nodesByPath.clear();
+    bool lost = false;
+    if (_sendPort && _recvPort && !_sendPort->isValid()) {
+        _recvPort->invalidate();  // whose callback restarts
+        lost = !isConnected();
+    }
+    if (!_updated && !lost) return;
+    if (_updated) {
+        _updated = false;
+        _nodes.reset();
+        _nodesByPath.clear();
+    }
+    // A lost connection is told even when nothing new has come: the screens must not pass for current.
     _services.queue.post(whileAlive([this] { _services.updateViewControllerFromModel(); }));
 }
 

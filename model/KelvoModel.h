@@ -26,7 +26,7 @@ public:
         MainQueue& queue;
         MessagePorts& ports;
         TelephonyClient& telephony;
-        /// Runs on the main queue when a tick found new data.
+        /// Runs on the main queue when a tick found new data, or the connection lost and not there again.
         std::function<void()> updateViewControllerFromModel;
         /// The application's port name; another program that watches beside it brings its own.
         std::string portName = kLogChannelPortName;

@@ -144,9 +144,22 @@ TEST_F(KelvoModelTest, RestartsAtTheTickAfterTheServiceHasDied) {
     EXPECT_EQ(errors().back(), "Starting the display update timer");
     deliver(servingCell(301));
     queue.advance(2s - 1ns);
-    EXPECT_EQ(updates, 0);
+    EXPECT_EQ(updates, 1);  // of the loss
     queue.advance(1ns);
-    EXPECT_EQ(updates, 1);
+    EXPECT_EQ(updates, 2);
+}
+
+TEST_F(KelvoModelTest, TellsOfALostConnectionAlsoWhenNothingNewHasCome) {
+    startLte();
+    deliver(servingCell(301));
+    queue.advance(2s);
+    const NodeRef shownBefore = model->topLevelNodes();
+    ports.killPeer();
+    queue.advance(2s);
+    EXPECT_EQ(updates, 2);
+    EXPECT_EQ(model->topLevelNodes(), shownBefore);
+    queue.advance(60s);
+    EXPECT_EQ(updates, 2);
 }
 
 TEST_F(KelvoModelTest, RestartsAtOnceWhenAnotherServiceIsThere) {

@@ -10,12 +10,13 @@
 
 namespace kelvo::bench {
 
-/// Messages per second on the road into the display, `messages` in turn; the log is thrown away. The history takes its
-/// snapshots outside the measurement, often enough that the raw log does not grow without end.
+/// Messages per second on the road into the display, `messages` in turn, with log lines going to `log` or, without one,
+/// thrown away. The history takes its snapshots outside the measurement, often enough that the raw log does not grow
+/// without end.
 template <class Generator>
-void decode(benchmark::State& state, const std::vector<Bytes>& messages) {
+void decodeLogging(benchmark::State& state, SystemLog* log, const std::vector<Bytes>& messages) {
     const DirectoryResources resources(KELVO_RESOURCE_DIR);
-    const Environment::Scope environment({.resources = &resources});
+    const Environment::Scope environment({.log = log, .resources = &resources});
     Dictionary display;
     Generator generator;
     std::size_t next = 0;
@@ -32,6 +33,11 @@ void decode(benchmark::State& state, const std::vector<Bytes>& messages) {
         }
     }
     state.SetItemsProcessed(state.iterations());
+}
+
+template <class Generator>
+void decode(benchmark::State& state, const std::vector<Bytes>& messages) {
+    decodeLogging<Generator>(state, nullptr, messages);
 }
 
 }  // namespace kelvo::bench

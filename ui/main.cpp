@@ -1,6 +1,10 @@
+#include <fmt/format.h>
+
 #include <QGuiApplication>
 #include <csignal>
 #include <cstdio>
+#include <cstdlib>
+#include <exception>
 
 #include "platform/DirectoryResources.h"
 #include "platform/Environment.h"
@@ -14,8 +18,11 @@
 #include "ui/KelvoApp.h"
 #include "ui/QuickWindow.h"
 
-int main(int argc, char** argv) {
-    using namespace kelvo;
+namespace {
+
+using namespace kelvo;
+
+int runApplication(int argc, char** argv) {
     QuickWindow::chooseSceneGraph();
     QGuiApplication application(argc, argv);
     QGuiApplication::setApplicationName(QStringLiteral("kelvo"));
@@ -38,4 +45,17 @@ int main(int argc, char** argv) {
     QObject::connect(&application, &QGuiApplication::aboutToQuit, &app, &KelvoApp::applicationWillTerminate);
     const UnixSignals endings({SIGINT, SIGTERM, SIGHUP}, [](int) { QGuiApplication::quit(); });
     return QGuiApplication::exec();
+}
+
+}  // namespace
+
+int main(int argc, char** argv) {
+    // A failure that ends the program still leaves through every destructor: the log is written out, the ports are
+    // given up, and what happened is the last line on standard error.
+    try {
+        return runApplication(argc, argv);
+    } catch (const std::exception& failure) {
+        fmt::print(stderr, "kelvo: {}\n", failure.what());
+        return EXIT_FAILURE;
+    }
 }

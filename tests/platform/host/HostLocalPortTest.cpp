@@ -267,6 +267,9 @@ TEST_F(HostLocalPortTest, RefusesMoreThan64SendersWithOneLineAndServesTheOthers)
 }
 
 TEST_F(HostLocalPortTest, WaitsWithoutSpinningWhenDescriptorsRunOut) {
+#ifdef __SANITIZE_ADDRESS__
+    GTEST_SKIP() << "the sanitizers look at objects through a pipe, which needs descriptors itself";
+#endif
     openRecorder();
     rlimit before{};
     ASSERT_EQ(::getrlimit(RLIMIT_NOFILE, &before), 0);

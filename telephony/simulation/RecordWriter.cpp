@@ -1,0 +1,54 @@
+#include "telephony/simulation/RecordWriter.h"
+
+#include <algorithm>
+
+#include "platform/PropertyList.h"
+
+namespace kelvo::simulation {
+namespace {
+
+constexpr std::uint8_t kPrefixMark = 0x81;
+constexpr std::uint32_t kExtended = 0xff0000;
+// Every drive begins on 2026-03-02 at 09:00:00 UTC. The modem counts CDMA system time (3GPP2 C.S0005): units of 1.25 ms
+// since 1980-01-06, here in the upper 48 bits.
+constexpr std::uint64_t kStartSeconds = 1'772'442'000 - 315'964'800;
+constexpr std::uint64_t kUnitsPerSecond = 800;
+constexpr std::uint64_t kNanosecondsPerUnit = 1'250'000;
+
+std::uint64_t modemTime(Time time) {
+    return (kStartSeconds * kUnitsPerSecond + static_cast<std::uint64_t>(time.count()) / kNanosecondsPerUnit) << 16;
+}
+
+}  // namespace
+
+RecordWriter::RecordWriter(std::uint32_t code, Time time, std::size_t length)
+    : _bytes(kPrefix + std::max(length, kHeader)) {
+    _bytes[0] = kPrefixMark;
+    u8(0, code >= kExtended ? 255 : 1).u16(3, code).put(5, modemTime(time), 8);
+}
+
+RecordWriter& RecordWriter::bytes(std::size_t at, ByteView value) {
+    if (_bytes.size() < kPrefix + at + value.size()) _bytes.resize(kPrefix + at + value.size());
+    std::ranges::copy(value, _bytes.begin() + static_cast<std::ptrdiff_t>(kPrefix + at));
+    return *this;
+}
+
+RecordWriter& RecordWriter::put(std::size_t at, std::uint64_t value, int width) {
+    std::uint8_t little[8];
+    for (int i = 0; i < width; ++i) little[i] = static_cast<std::uint8_t>(value >> (8 * i));
+    return bytes(at, ByteView(little, static_cast<std::size_t>(width)));
+}
+
+Bytes RecordWriter::finish() const {
+    RecordWriter whole = *this;
+    whole.u16(1, size() - 1);  // counts from offset 1
+    return std::move(whole._bytes);
+}
+
+Bytes propertyListRecord(std::uint32_t code, Time time, const Value& payload) {
+    RecordWriter record(code, time);
+    if (const auto encoded = writeXmlPropertyList(payload)) record.bytes(RecordWriter::kHeader, *encoded);
+    return record.finish();
+}
+
+}  // namespace kelvo::simulation

@@ -1,0 +1,102 @@
+#pragma once
+
+#include <charconv>
+#include <cstdlib>
+#include <limits>
+#include <memory>
+#include <string>
+#include <string_view>
+#include <vector>
+
+#include "LogGenerator/LogGenerator.h"
+#include "platform/DirectoryResources.h"
+#include "platform/Environment.h"
+#include "platform/Technology.h"
+#include "telephony/simulation/Simulation.h"
+#include "tests/support/RecordingLog.h"
+
+namespace kelvo::test {
+
+/// A simulated modem's log, played message by message into the generator of its family; what the application would
+/// show of it can be read at each moment.
+class Played {
+public:
+    explicit Played(simulation::Simulation& modem)
+        : _modem(modem), _generator(LogGenerator::generatorFromTechnology(namesOf(modem.technology()).identifier)) {}
+
+    /// Feeds the next message. Its log code, 0xff0000 and more for an extended record.
+    std::uint32_t next() {
+        const auto message = _modem.next();
+        _time = message.time;
+        _generator->updateState(_state, message.bytes);
+        const auto& bytes = message.bytes;
+        if (bytes.size() < 2 + 13 || bytes[0] != 0x81) return 0;
+        return (bytes[5] | bytes[6] << 8U) | (bytes[2] == 255 ? 0xff0000U : 0U);
+    }
+    simulation::Time time() const { return _time; }
+
+    /// What stands at a path below the display, such as "Neighbors/0/Cell ID": keys as they are shown (without what a
+    /// sorted key has before its ";"), rows by number. None when there is nothing.
+    const Value* at(std::string_view path) {
+        _display = display();
+        const Value* here = &_display;
+        while (here != nullptr && !path.empty()) {
+            const auto end = path.find('/');
+            here = below(*here, path.substr(0, end));
+            path = end == std::string_view::npos ? std::string_view() : path.substr(end + 1);
+        }
+        return here;
+    }
+    /// The text shown there; "(absent)" when there is none.
+    std::string text(std::string_view path) {
+        const Value* value = at(path);
+        return value != nullptr && value->string() != nullptr ? *value->string() : "(absent)";
+    }
+    /// The number that the text there begins with; not a number when there is no text.
+    double number(std::string_view path) {
+        const Value* value = at(path);
+        return value != nullptr && value->string() != nullptr ? std::strtod(value->string()->c_str(), nullptr)
+                                                              : std::numeric_limits<double>::quiet_NaN();
+    }
+    /// How many rows the list there has.
+    std::size_t rows(std::string_view path) {
+        const Value* value = at(path);
+        return value != nullptr && value->array() ? value->array()->size() : 0;
+    }
+
+    /// The lines of the log that tell of something wrong, as an application's log would have them.
+    const std::vector<RecordingLog::Line>& log() const { return _log.lines(); }
+    void clearLog() { _log.clear(); }
+    /// A rebuild of the display, as the refresh has it.
+    Value refresh() { return _generator->generateLogUsingState(_state); }
+
+private:
+    Value display() {
+        const Value* value = _state.find("Display");
+        return value != nullptr ? *value : Value();
+    }
+    static const Value* below(const Value& value, std::string_view name) {
+        if (value.array()) {
+            std::size_t index = 0;
+            std::from_chars(name.data(), name.data() + name.size(), index);
+            return index < value.array()->size() ? &(*value.array())[index] : nullptr;
+        }
+        if (!value.dictionary()) return nullptr;
+        for (const auto& [key, entry] : *value.dictionary()) {
+            const std::string_view shown = std::string_view(key).substr(std::string_view(key).find(';') + 1);
+            if (shown == name) return &entry;
+        }
+        return nullptr;
+    }
+
+    RecordingLog _log;
+    DirectoryResources _resources{KELVO_RESOURCE_DIR};
+    Environment::Scope _environment{{.log = &_log, .resources = &_resources}};
+    simulation::Simulation& _modem;
+    std::unique_ptr<LogGenerator> _generator;
+    Dictionary _state;
+    Value _display;
+    simulation::Time _time{0};
+};
+
+}  // namespace kelvo::test

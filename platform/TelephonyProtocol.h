@@ -7,10 +7,18 @@
 ///     request  { "CreateLogChannel": <name of the client's local port> }
 ///     answer   { "Error": n, "ErrorDomain": n, "PortName": <name of the service's port> }
 /// Error and ErrorDomain are 0, and PortName is there, when the channel exists.
+///
+/// And how anybody asks what it does:
+///     request  { "GetStatus": "GetStatus" }
+///     answer   { "Source": text, "Technology": its name, "Records": number of all so far,
+///                "Codes": [ { "Code": log code (none: without one), "Records": n, "PerSecond": real }, … ],
+///                "Clients": [ { "Name": of the local port, "Streaming": boolean, "Delivered": n, "Waiting": n,
+///                               "Dropped": n }, … ] }
 namespace kelvo {
 
 inline constexpr std::string_view kPLTelephonyServicePort = "com.zorvik.TelephonyService";
 inline constexpr std::string_view kPLCreateLogChannel = "CreateLogChannel";
+inline constexpr std::string_view kPLGetStatus = "GetStatus";
 inline constexpr std::string_view kPLError = "Error";
 inline constexpr std::string_view kPLErrorDomain = "ErrorDomain";
 inline constexpr std::string_view kPLPortName = "PortName";

@@ -13,6 +13,7 @@ void ClientQueue::push(ByteView record) {
     while (_records.size() > _limits.records || _bytes > _limits.bytes) {
         pop();
         ++_lost;
+        ++_lostInAll;
     }
 }
 

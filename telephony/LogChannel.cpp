@@ -62,6 +62,7 @@ bool LogChannel::take(ByteView record) {
 // False when the client has to read first; then flush() goes on once it has.
 bool LogChannel::send(ByteView record) {
     const auto sent = _client->request(0, record, {}, std::nullopt);
+    if (sent) ++_delivered;
     if (sent || sent.error() == RemotePort::Error::Invalid) return true;  // a client that has gone reports itself
     if (sent.error() == RemotePort::Error::TooLong) {
         logLine(Level::Error, "Dropped a record of %d bytes: it is too long", record.size());

@@ -40,6 +40,11 @@ public:
     /// Delivers a record; false when the client did not ask for it.
     bool take(ByteView record);
 
+    bool isStreaming() const { return _streaming; }
+    std::size_t delivered() const { return _delivered; }        ///< records that are on their way to the client
+    std::size_t waiting() const { return _queue.size(); }       ///< records that the client must make room for first
+    std::size_t dropped() const { return _queue.lostInAll(); }  ///< records that it was too slow for
+
 private:
     Bytes handle(std::int32_t id, ByteView message);
     Bytes refuse(const std::string& reason);
@@ -55,6 +60,7 @@ private:
     RecordFilter _filter;
     ClientQueue _queue;
     bool _streaming = false;
+    std::size_t _delivered = 0;
 };
 
 }  // namespace kelvo

@@ -13,12 +13,16 @@ bool contains(const std::shared_ptr<const RecordFilter::Codes>& codes, LogCode c
 
 }  // namespace
 
+std::optional<LogCode> codeOf(ByteView record) {
+    const ByteView packet = stripPrefix(record);
+    if (packet.size() < kEndOfCode) return std::nullopt;
+    return logCode(packet.data());
+}
+
 bool RecordFilter::passes(ByteView record) const {
     if (_everything) return true;
-    const ByteView packet = stripPrefix(record);
-    if (packet.size() < kEndOfCode) return false;
-    const LogCode code = logCode(packet.data());
-    return contains(code >= kExtendedLogCodes ? _extended : _ordinary, code);
+    const auto code = codeOf(record);
+    return code && contains(*code >= kExtendedLogCodes ? _extended : _ordinary, *code);
 }
 
 }  // namespace kelvo

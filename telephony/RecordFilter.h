@@ -3,10 +3,15 @@
 #include <bitset>
 #include <cstdint>
 #include <memory>
+#include <optional>
 
+#include "LogGenerator/LogCode.h"
 #include "platform/Bytes.h"
 
 namespace kelvo {
+
+/// The log code of a record as the service words it; none when it is too short to hold one.
+std::optional<LogCode> codeOf(ByteView record);
 
 /// Which records a client asked for. Nothing passes until it asked.
 class RecordFilter {

@@ -1,5 +1,7 @@
 #pragma once
 
+#include <string>
+
 #include "platform/Bytes.h"
 #include "platform/Technology.h"
 
@@ -23,6 +25,8 @@ public:
     virtual ~RecordSource() = default;
 
     virtual Technology technology() const = 0;
+    /// What it is, for people: "the capture drive.pcap".
+    virtual std::string description() const = 0;
     /// Gives records to `sink`, which outlives the source's work, from now on. Called once, when the first client
     /// streams.
     virtual void start(RecordSink& sink) = 0;

@@ -18,7 +18,12 @@ std::string checkSpeed(const std::string& text) {
     return fmt::format("{} is neither \"max\" nor a number above 0 and up to {:.0f}", text, kFastest);
 }
 
-std::optional<double> speedOf(const std::string& text) {
+std::string checkTechnology(const std::string& word) {
+    if (technologyBy(&TechnologyNames::word, std::string_view(word))) return {};
+    return fmt::format("{} is none of ifx, gsm, cdma, lte, utran", word);
+}
+
+PacedSource::Speed speedOf(const std::string& text) {
     return text == "max" ? std::nullopt : std::optional(std::stod(text));
 }
 
@@ -26,22 +31,38 @@ std::optional<double> speedOf(const std::string& text) {
 
 ParsedOptions parseServiceOptions(int argc, const char* const* argv) {
     ServiceOptions options;
-    std::string file;
+    std::string word;
     std::string speed = "1";
-    CLI::App app("Telephony service: gives Kelvo the log of a baseband modem, replayed from a capture.",
+    CLI::App app("Telephony service: gives Kelvo the log of a baseband modem, replayed from a capture or simulated.",
                  "kelvo-telephonyd");
     app.footer(
         "A capture is a pcap file whose link type names the technology: 147 IFX, 148 GSM/UMTS, 149 CDMA, 150 LTE,\n"
         "151 UTRAN. The replay starts with the first client and keeps the time between packets; pauses of more than\n"
-        "five seconds last five. After the last packet the service stays; SIGINT or SIGTERM ends it. It logs to\n"
-        "standard error in a terminal and to the system log otherwise.");
-    app.add_option("--replay", file, "The capture to replay")->required()->type_name("FILE");
-    app.add_flag("--loop", options.replayOptions.loop, "Start again after the last packet");
-    app.add_option("--speed", speed,
-                   "So many times faster than it was, or \"max\": as fast as the quickest client reads")
-        ->type_name("X|max")
-        ->check(checkSpeed)
-        ->capture_default_str();
+        "five seconds last five. After the last packet the service stays; SIGINT or SIGTERM ends it.\n"
+        "A simulated modem drives through a town without end; the same seed drives the same way, byte for byte.\n"
+        "The service logs to standard error in a terminal and to the system log otherwise.");
+    auto* source = app.add_option_group("source", "Where the records come from; one of them");
+    auto* replay = source->add_option("--replay", options.replay, "The capture to replay")->type_name("FILE");
+    auto* simulate = source->add_option("--simulate", word, "The modem to simulate")
+                         ->type_name("ifx|gsm|cdma|lte|utran")
+                         ->check(checkTechnology);
+    auto* status = source->add_flag("--status", options.status,
+                                    "Tell what the service that runs is doing, and end: its source, records per\n"
+                                    "second by log code, clients and the records they were too slow for");
+    source->require_option(1);
+    auto* loop = app.add_flag("--loop", options.loop, "Start the capture again after its last packet");
+    auto* seed = app.add_option("--seed", options.seed, "Which drive to simulate")->capture_default_str();
+    auto* pace = app.add_option("--speed", speed,
+                                "So many times faster than it was, or \"max\": as fast as the quickest client reads")
+                     ->type_name("X|max")
+                     ->check(checkSpeed)
+                     ->capture_default_str();
+    auto* record =
+        app.add_option("--record", options.record, "Write every record that a client takes to this capture as well")
+            ->type_name("FILE");
+    loop->needs(replay);
+    seed->needs(simulate);
+    for (auto* option : {pace, record}) option->excludes(status);
     try {
         app.parse(argc, argv);
     } catch (const CLI::CallForHelp&) {
@@ -51,8 +72,8 @@ ParsedOptions parseServiceOptions(int argc, const char* const* argv) {
         fmt::print(stderr, "kelvo-telephonyd: {}\n", error.what());
         return {std::nullopt, 1};
     }
-    options.replay = file;
-    options.replayOptions.speed = speedOf(speed);
+    if (simulate->count() > 0) options.simulate = *technologyBy(&TechnologyNames::word, std::string_view(word));
+    options.speed = speedOf(speed);
     return {options, 0};
 }
 

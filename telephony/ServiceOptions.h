@@ -1,16 +1,22 @@
 #pragma once
 
+#include <cstdint>
 #include <filesystem>
 #include <optional>
 
-#include "telephony/ReplaySource.h"
+#include "telephony/PacedSource.h"
 
 namespace kelvo {
 
 /// What the command line of the service asks for.
 struct ServiceOptions {
-    std::filesystem::path replay;  ///< the capture
-    ReplaySource::Options replayOptions;
+    bool status = false;           ///< ask the service that runs, instead of being one
+    std::filesystem::path replay;  ///< a capture; empty: a simulation
+    bool loop = false;
+    Technology simulate = Technology::LTE;
+    std::uint64_t seed = 1;
+    PacedSource::Speed speed = 1.0;
+    std::filesystem::path record;  ///< empty: nothing is recorded
 };
 
 /// Options to work with, or the status to exit with at once.

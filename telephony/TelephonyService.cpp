@@ -11,13 +11,28 @@
 namespace kelvo {
 namespace {
 
-// The local port's name in a request for a log channel; none when it is no such request.
-std::optional<std::string> parseRequest(std::int32_t id, ByteView message) {
-    if (id != 0) return std::nullopt;
+// The text of a request's only entry, `key`; none when it is another request.
+std::optional<std::string> parseRequest(ByteView message, std::string_view key) {
     const auto read = readPropertyList(message);
     if (!read || !read->dictionary() || read->dictionary()->size() != 1) return std::nullopt;
-    const std::string* name = (*read->dictionary())[kPLCreateLogChannel].string();
-    return name != nullptr ? std::optional(*name) : std::nullopt;
+    const std::string* text = (*read->dictionary())[key].string();
+    return text != nullptr ? std::optional(*text) : std::nullopt;
+}
+
+Value describe(const RecordRates::Rate& rate) {
+    const auto entry =
+        Dictionary::make({{"Records", static_cast<std::int64_t>(rate.records)}, {"PerSecond", rate.perSecond}});
+    if (rate.code) entry->set("Code", std::int64_t{*rate.code});
+    return entry;
+}
+
+Value describe(const LogChannel& channel) {
+    const auto number = [](std::size_t count) { return static_cast<std::int64_t>(count); };
+    return Dictionary::make({{"Name", channel.clientName()},
+                             {"Streaming", channel.isStreaming()},
+                             {"Delivered", number(channel.delivered())},
+                             {"Waiting", number(channel.waiting())},
+                             {"Dropped", number(channel.dropped())}});
 }
 
 Bytes refuse(long error, const char* reason) {
@@ -27,8 +42,8 @@ Bytes refuse(long error, const char* reason) {
 
 }  // namespace
 
-TelephonyService::TelephonyService(MessagePorts& ports, RecordSource& source, Limits limits)
-    : _ports(ports), _source(source), _limits(limits) {}
+TelephonyService::TelephonyService(MessagePorts& ports, RecordSource& source, Limits limits, SteadyTime now)
+    : _ports(ports), _source(source), _limits(limits), _rates(std::move(now)) {}
 
 std::optional<Failure> TelephonyService::open() {
     auto made = _ports.createLocal(kPLTelephonyServicePort,
@@ -41,8 +56,27 @@ std::optional<Failure> TelephonyService::open() {
 }
 
 Bytes TelephonyService::handle(std::int32_t id, ByteView message) {
-    const auto clientName = parseRequest(id, message);
-    return clientName ? createLogChannel(*clientName) : refuse(kPLErrorBadRequest, "the request is not understood");
+    if (id == 0) {
+        if (const auto clientName = parseRequest(message, kPLCreateLogChannel)) return createLogChannel(*clientName);
+        if (parseRequest(message, kPLGetStatus)) return status();
+    }
+    return refuse(kPLErrorBadRequest, "the request is not understood");
+}
+
+Bytes TelephonyService::status() const {
+    const auto codes = Array::make({});
+    std::uint64_t records = 0;
+    for (const RecordRates::Rate& rate : _rates.rates()) {
+        codes->append(describe(rate));
+        records += rate.records;
+    }
+    const auto clients = Array::make({});
+    for (const LogChannel& channel : _channels) clients->append(describe(channel));
+    return encodeAnswer({{"Source", _source.description()},
+                         {"Technology", namesOf(_source.technology()).name},
+                         {"Records", static_cast<std::int64_t>(records)},
+                         {"Codes", codes},
+                         {"Clients", clients}});
 }
 
 Bytes TelephonyService::createLogChannel(const std::string& clientName) {
@@ -69,6 +103,7 @@ bool TelephonyService::hasRoomFor(const std::string& clientName) const {
 }
 
 bool TelephonyService::take(ByteView record) {
+    _rates.count(_source.technology() == Technology::IFX ? std::nullopt : codeOf(record));
     bool taken = false;
     for (LogChannel& channel : _channels) taken |= channel.take(record);
     return taken;

@@ -7,6 +7,7 @@
 
 #include "platform/MessagePorts.h"
 #include "telephony/LogChannel.h"
+#include "telephony/RecordRates.h"
 #include "telephony/RecordSource.h"
 
 namespace kelvo {
@@ -22,7 +23,7 @@ public:
         ClientQueue::Limits queue{};        ///< of every client
     };
 
-    TelephonyService(MessagePorts& ports, RecordSource& source, Limits limits);
+    TelephonyService(MessagePorts& ports, RecordSource& source, Limits limits, SteadyTime now = steadyNow);
     TelephonyService(MessagePorts& ports, RecordSource& source) : TelephonyService(ports, source, Limits()) {}
 
     /// Makes the control port; says why when it cannot be had.
@@ -32,6 +33,7 @@ public:
 
 private:
     Bytes handle(std::int32_t id, ByteView message);
+    Bytes status() const;
     Bytes createLogChannel(const std::string& clientName);
     bool hasRoomFor(const std::string& clientName) const;
 
@@ -44,6 +46,7 @@ private:
     MessagePorts& _ports;
     RecordSource& _source;
     const Limits _limits;
+    RecordRates _rates;
     std::unique_ptr<LocalPort> _controlPort;
     std::list<LogChannel> _channels;
     unsigned _channelsMade = 0;

@@ -7,7 +7,9 @@
 
 namespace kelvo::simulation {
 
-/// Time since the drive began.
+/// When every drive begins: 2026-03-02 at 09:00:00 UTC.
+inline constexpr std::chrono::sys_seconds kDriveStart{std::chrono::seconds(1'772'442'000)};
+/// Time since then.
 using Time = std::chrono::nanoseconds;
 
 constexpr double seconds(Time time) { return std::chrono::duration<double>(time).count(); }

@@ -9,14 +9,12 @@ namespace {
 
 constexpr std::uint8_t kPrefixMark = 0x81;
 constexpr std::uint32_t kExtended = 0xff0000;
-// Every drive begins on 2026-03-02 at 09:00:00 UTC. The modem counts CDMA system time (3GPP2 C.S0005): units of 1.25 ms
-// since 1980-01-06, here in the upper 48 bits.
-constexpr std::uint64_t kStartSeconds = 1'772'442'000 - 315'964'800;
-constexpr std::uint64_t kUnitsPerSecond = 800;
-constexpr std::uint64_t kNanosecondsPerUnit = 1'250'000;
+// The modem counts CDMA system time (3GPP2 C.S0005): units of 1.25 ms since 1980-01-06, here in the upper 48 bits.
+constexpr std::chrono::sys_seconds kEpoch{std::chrono::seconds(315'964'800)};
+using ModemUnits = std::chrono::duration<std::uint64_t, std::ratio<1, 800>>;
 
 std::uint64_t modemTime(Time time) {
-    return (kStartSeconds * kUnitsPerSecond + static_cast<std::uint64_t>(time.count()) / kNanosecondsPerUnit) << 16;
+    return std::chrono::duration_cast<ModemUnits>(kDriveStart - kEpoch + time).count() << 16;
 }
 
 }  // namespace

@@ -31,9 +31,10 @@ protected:
         process.setProcessEnvironment(environment);
         process.setProgram(KELVO_TELEPHONYD);
     }
-    void startDaemon() {
+    void startDaemon() { startDaemon({"--replay", QString::fromStdString(_capture), "--speed", "max"}); }
+    void startDaemon(const QStringList& arguments) {
         prepare(_daemon, _temporary.path());
-        _daemon.setArguments({"--replay", QString::fromStdString(_capture), "--speed", "max"});
+        _daemon.setArguments(arguments);
         _daemon.start();
         ASSERT_TRUE(runUntil([&] { return (_connection = _client.createServerConnection({})) != nullptr; }));
     }
@@ -120,6 +121,24 @@ TEST_F(DaemonTest, RefusesToRunTwice) {
     ASSERT_TRUE(_daemon.waitForFinished(10'000));
 }
 
+TEST_F(DaemonTest, TellsItsStatusToWhoeverAsks) {
+    startDaemon({"--simulate", "lte", "--seed", "7"});
+    const auto [status, error] = run({"--status"});
+    EXPECT_EQ(status, 0) << error;
+    EXPECT_EQ(_output,
+              "Source      a simulated LTE modem, seed 7\n"
+              "Technology  LTE\n"
+              "Records     0\n"
+              "\n"
+              "  Log code   per second        in all\n"
+              "  none\n"
+              "\n"
+              "Clients\n"
+              "  none\n");
+    _daemon.terminate();
+    ASSERT_TRUE(_daemon.waitForFinished(10'000));
+}
+
 TEST_F(DaemonTest, SaysInOneLineWhatIsWrongWithItsCommandLine) {
     const QString capture = QString::fromStdString(_capture);
     const QString missing = QString::fromStdString(_temporary.path() / "missing");
@@ -127,7 +146,12 @@ TEST_F(DaemonTest, SaysInOneLineWhatIsWrongWithItsCommandLine) {
          {QStringList{}, QStringList{"--replay"}, QStringList{"--replay", missing},
           QStringList{"--replay", capture, "--speed", "0"}, QStringList{"--replay", capture, "--speed", "-1"},
           QStringList{"--replay", capture, "--speed", "fast"}, QStringList{"--replay", capture, "--speed", "inf"},
-          QStringList{"--replay", capture, "more"}, QStringList{"--replay", "/proc/self/mem"}}) {
+          QStringList{"--replay", capture, "more"}, QStringList{"--simulate", "nmt"},
+          QStringList{"--simulate", "lte", "--replay", capture}, QStringList{"--replay", capture, "--seed", "1"},
+          QStringList{"--simulate", "lte", "--loop"}, QStringList{"--simulate", "lte", "--seed", "-1"},
+          QStringList{"--simulate", "lte", "--record", "/nowhere/at.all"}, QStringList{"--status"},
+          QStringList{"--status", "--record", "x"}, QStringList{"--status", "--simulate", "lte"},
+          QStringList{"--replay", "/proc/self/mem"}}) {
         const auto [status, error] = run(arguments);
         EXPECT_EQ(status, 1);
         EXPECT_EQ(std::count(error.begin(), error.end(), '\n'), 1) << error;
@@ -139,5 +163,6 @@ TEST_F(DaemonTest, HelpsOnStandardOutput) {
     const auto [status, error] = run({"--help"});
     EXPECT_EQ(status, 0);
     EXPECT_EQ(error, "");
-    for (const char* word : {"--replay", "--loop", "--speed"}) EXPECT_NE(_output.find(word), std::string::npos);
+    for (const char* word : {"--replay", "--loop", "--speed", "--simulate", "--seed", "--record", "--status"})
+        EXPECT_NE(_output.find(word), std::string::npos);
 }

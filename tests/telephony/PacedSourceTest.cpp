@@ -1,4 +1,4 @@
-#include "telephony/ReplaySource.h"
+#include "telephony/PacedSource.h"
 
 #include <gtest/gtest.h>
 
@@ -7,6 +7,7 @@
 #include <vector>
 
 #include "platform/Environment.h"
+#include "telephony/CaptureStream.h"
 #include "tests/support/EventLoop.h"
 #include "tests/support/ManualQueue.h"
 #include "tests/support/RecordingLog.h"
@@ -41,7 +42,7 @@ private:
 
 using Notes = std::vector<std::string>;
 
-class ReplaySourceTest : public testing::Test {
+class PacedSourceTest : public testing::Test {
 protected:
     // A capture of packets "a", "b", … taken at these times (milliseconds from some day on).
     void capture(const std::vector<int>& times, Technology technology = Technology::LTE) {
@@ -53,16 +54,23 @@ protected:
             ++text[0];
         }
     }
-    void open(ReplaySource::Options options = {}) {
-        auto opened = ReplaySource::open(_path, options, _queue, [this] { return _queue.now(); });
-        ASSERT_TRUE(opened) << opened.error().reason;
-        _source = std::move(opened).value();
+    struct Replay {
+        bool loop = false;
+        PacedSource::Speed speed = 1.0;
+    };
+    void open(Replay how) {
+        auto stream = CaptureStream::open(_path, how.loop);
+        ASSERT_TRUE(stream) << stream.error().reason;
+        _source = std::make_unique<PacedSource>(std::move(stream).value(), how.speed, _queue,
+                                                [this] { return _queue.now(); });
     }
-    void play(ReplaySource::Options options = {}) {
-        open(options);
+    void open() { open(Replay()); }
+    void play(Replay how) {
+        open(how);
         _source->start(_sink);
         _queue.run();
     }
+    void play() { play(Replay()); }
 
     test::TemporaryDirectory _temporary;
     std::filesystem::path _path = _temporary.path() / "test.pcap";
@@ -70,12 +78,12 @@ protected:
     NotingSink _sink{_queue};
     test::RecordingLog _log;
     Environment::Scope _scope{Environment{.log = &_log}};
-    std::unique_ptr<ReplaySource> _source;
+    std::unique_ptr<PacedSource> _source;
 };
 
 }  // namespace
 
-TEST_F(ReplaySourceTest, NamesTheTechnologyOfTheCapture) {
+TEST_F(PacedSourceTest, NamesTheTechnologyOfTheCapture) {
     for (const Technology technology : {Technology::IFX, Technology::GSM, Technology::CDMA, Technology::UTRAN}) {
         capture({}, technology);
         open();
@@ -83,7 +91,7 @@ TEST_F(ReplaySourceTest, NamesTheTechnologyOfTheCapture) {
     }
 }
 
-TEST_F(ReplaySourceTest, KeepsTheTimeBetweenPacketsFromTheStartOn) {
+TEST_F(PacedSourceTest, KeepsTheTimeBetweenPacketsFromTheStartOn) {
     capture({500, 500, 1500, 4000});
     open();
     _queue.advance(10s);
@@ -93,7 +101,7 @@ TEST_F(ReplaySourceTest, KeepsTheTimeBetweenPacketsFromTheStartOn) {
     EXPECT_EQ(_sink.notes, (Notes{"10000a", "10000b", "11000c", "13500d"}));
 }
 
-TEST_F(ReplaySourceTest, StaysSilentAfterTheLastPacket) {
+TEST_F(PacedSourceTest, StaysSilentAfterTheLastPacket) {
     capture({0, 10});
     play();
     _queue.advance(24h);
@@ -101,7 +109,7 @@ TEST_F(ReplaySourceTest, StaysSilentAfterTheLastPacket) {
     EXPECT_TRUE(_log.lines().empty());
 }
 
-TEST_F(ReplaySourceTest, MultipliesTheSpeed) {
+TEST_F(PacedSourceTest, MultipliesTheSpeed) {
     capture({0, 1000, 4000});
     play({.speed = 2.0});
     _queue.advance(10s);
@@ -114,14 +122,14 @@ TEST_F(ReplaySourceTest, MultipliesTheSpeed) {
                                   std::to_string(begin + 8000) + "c"}));
 }
 
-TEST_F(ReplaySourceTest, LoopsAfterTheMeanInterval) {
+TEST_F(PacedSourceTest, LoopsAfterTheMeanInterval) {
     capture({0, 100, 400});  // mean 200 ms
     play({.loop = true});
     _queue.advance(1200ms);
     EXPECT_EQ(_sink.notes, (Notes{"0a", "100b", "400c", "600a", "700b", "1000c", "1200a"}));
 }
 
-TEST_F(ReplaySourceTest, LoopsASinglePacketOnceASecondAndNoneNever) {
+TEST_F(PacedSourceTest, LoopsASinglePacketOnceASecondAndNoneNever) {
     capture({0});
     play({.loop = true});
     _queue.advance(2s);
@@ -132,21 +140,21 @@ TEST_F(ReplaySourceTest, LoopsASinglePacketOnceASecondAndNoneNever) {
     EXPECT_EQ(_sink.notes.size(), 3U);
 }
 
-TEST_F(ReplaySourceTest, LoopsWithoutSpinningWhenAllPacketsHaveOneTime) {
+TEST_F(PacedSourceTest, LoopsWithoutSpinningWhenAllPacketsHaveOneTime) {
     capture({0, 0});
     play({.loop = true});
     _queue.advance(20ms);
     EXPECT_EQ(_sink.notes, (Notes{"0a", "0b", "10a", "10b", "20a", "20b"}));
 }
 
-TEST_F(ReplaySourceTest, SendsAPacketThatIsOlderThanTheOneBeforeAtOnce) {
+TEST_F(PacedSourceTest, SendsAPacketThatIsOlderThanTheOneBeforeAtOnce) {
     capture({0, 1000, 300, 1200});
     play();
     _queue.advance(2s);
     EXPECT_EQ(_sink.notes, (Notes{"0a", "1000b", "1000c", "1200d"}));
 }
 
-TEST_F(ReplaySourceTest, ShortensLongPausesToFiveSecondsOfTheCapture) {
+TEST_F(PacedSourceTest, ShortensLongPausesToFiveSecondsOfTheCapture) {
     capture({0, 3'600'000, 3'604'000});
     play();
     _queue.advance(20s);
@@ -159,7 +167,7 @@ TEST_F(ReplaySourceTest, ShortensLongPausesToFiveSecondsOfTheCapture) {
                                   std::to_string(begin + 900) + "c"}));
 }
 
-TEST_F(ReplaySourceTest, GoesAsFastAsAHungryClientReads) {
+TEST_F(PacedSourceTest, GoesAsFastAsAHungryClientReads) {
     capture({0, 1000, 2000, 3000});
     _sink.appetite = 2;
     play({.speed = std::nullopt});
@@ -172,16 +180,18 @@ TEST_F(ReplaySourceTest, GoesAsFastAsAHungryClientReads) {
     EXPECT_EQ(_sink.notes, (Notes{"0a", "0b", "3600000c", "3600000d"}));
 }
 
-TEST_F(ReplaySourceTest, RestsBetweenPassesThatNobodyWantedAtFullSpeed) {
+TEST_F(PacedSourceTest, RestsWhenAThousandRecordsWereRefusedAtFullSpeed) {
     capture({0, 1});
     _sink.wanted = false;
     play({.loop = true, .speed = std::nullopt});
-    EXPECT_EQ(_sink.notes, (Notes{"0a", "0b"}));
-    _queue.advance(1s);
-    EXPECT_EQ(_sink.notes, (Notes{"0a", "0b", "1000a", "1000b"}));
+    EXPECT_EQ(_sink.notes.size(), 1024U);
+    _queue.advance(999ms);
+    EXPECT_EQ(_sink.notes.size(), 1024U);
+    _queue.advance(1ms);
+    EXPECT_EQ(_sink.notes.size(), 2048U);
 }
 
-TEST_F(ReplaySourceTest, LetsOtherWorkRunAmongManyPackets) {
+TEST_F(PacedSourceTest, LetsOtherWorkRunAmongManyPackets) {
     capture(std::vector<int>(1000, 0));
     open();
     _source->start(_sink);
@@ -192,7 +202,7 @@ TEST_F(ReplaySourceTest, LetsOtherWorkRunAmongManyPackets) {
     EXPECT_LE(before, 256U);
 }
 
-TEST_F(ReplaySourceTest, TellsOfADamagedCaptureOnceAndPlaysWhatIsWhole) {
+TEST_F(PacedSourceTest, TellsOfADamagedCaptureOnceAndPlaysWhatIsWhole) {
     capture({0, 100, 200});
     std::filesystem::resize_file(_path, std::filesystem::file_size(_path) - 1);
     play({.loop = true});
@@ -203,7 +213,7 @@ TEST_F(ReplaySourceTest, TellsOfADamagedCaptureOnceAndPlaysWhatIsWhole) {
     EXPECT_NE(_log.lines()[0].second.find("test.pcap"), std::string::npos);
 }
 
-TEST_F(ReplaySourceTest, EndsWhenTheCaptureIsGoneBeforeTheNextPass) {
+TEST_F(PacedSourceTest, EndsWhenTheCaptureIsGoneBeforeTheNextPass) {
     capture({0});
     play({.loop = true});
     EXPECT_EQ(_sink.notes.size(), 1U);
@@ -214,9 +224,9 @@ TEST_F(ReplaySourceTest, EndsWhenTheCaptureIsGoneBeforeTheNextPass) {
     EXPECT_EQ(_log.lines().size(), 1U);
 }
 
-TEST_F(ReplaySourceTest, RefusesFilesThatAreNoCapturesOfAModem) {
+TEST_F(PacedSourceTest, RefusesFilesThatAreNoCapturesOfAModem) {
     const auto reason = [&] {
-        const auto opened = ReplaySource::open(_path, {}, _queue, [] { return 0ns; });
+        const auto opened = CaptureStream::open(_path, false);
         return opened ? "opened" : opened.error().reason;
     };
     EXPECT_NE(reason().find("No such file"), std::string::npos);
@@ -230,10 +240,54 @@ TEST_F(ReplaySourceTest, RefusesFilesThatAreNoCapturesOfAModem) {
     EXPECT_EQ(reason(), _path.string() + ": its link type is none of a modem's log (147 to 151)");
 }
 
-TEST_F(ReplaySourceTest, LeavesNothingOnTheQueueThatOutlivesIt) {
+TEST_F(PacedSourceTest, LeavesNothingOnTheQueueThatOutlivesIt) {
     capture({0, 100});
     play();
     _source.reset();
     _queue.advance(1s);
     EXPECT_EQ(_sink.notes, Notes{"0a"});
+}
+
+namespace {
+
+// Everything that a capture holds, as "time in milliseconds since its first packet, text".
+Notes readCapture(const std::filesystem::path& path) {
+    auto reader = CaptureReader::open(path);
+    Notes notes;
+    std::optional<CaptureTime> first;
+    while (auto packet = *reader->next()) {
+        if (!first) first = packet->time;
+        notes.push_back(std::to_string((packet->time - *first) / 1ms) + std::string(textOf(packet->bytes)));
+    }
+    return notes;
+}
+
+}  // namespace
+
+TEST_F(PacedSourceTest, RecordsWhatAClientTakesWithItsTimeInTheStream) {
+    capture({0, 100, 400});
+    const auto recorded = _temporary.path() / "recorded.pcap";
+    open({.loop = true, .speed = 10.0});
+    _source->recordTo(CaptureWriter::create(recorded, Technology::LTE).value());
+    _source->start(_sink);
+    _queue.advance(25ms);
+    _sink.wanted = false;
+    _queue.advance(20ms);  // "c", which nobody takes
+    _sink.wanted = true;
+    _queue.advance(40ms);
+    EXPECT_EQ(readCapture(recorded), (Notes{"0a", "100b", "600a", "700b"}));
+    EXPECT_EQ(CaptureReader::open(recorded)->technology(), Technology::LTE);
+}
+
+TEST_F(PacedSourceTest, StreamsOnWhenTheRecordingFails) {
+    capture({0, 100});
+    open();
+    auto recording = CaptureWriter::create("/dev/full", Technology::LTE);
+    if (!recording) GTEST_SKIP() << "no full device on this machine";
+    _source->recordTo(std::move(recording).value());
+    _source->start(_sink);
+    _queue.advance(1s);
+    EXPECT_EQ(_sink.notes, (Notes{"0a", "100b"}));
+    ASSERT_EQ(_log.lines().size(), 1U);
+    EXPECT_EQ(_log.lines()[0].second.rfind("The recording ends here: /dev/full", 0), 0U);
 }

@@ -1,0 +1,71 @@
+#include "telephony/CaptureStream.h"
+
+#include <algorithm>
+#include <utility>
+
+#include "platform/Environment.h"
+
+namespace kelvo {
+namespace {
+
+using namespace std::chrono_literals;
+
+constexpr std::chrono::nanoseconds kLongestPause = 5s;
+
+}  // namespace
+
+Result<std::unique_ptr<CaptureStream>> CaptureStream::open(const std::filesystem::path& path, bool loop) {
+    auto reader = CaptureReader::open(path);
+    if (!reader) return reader.error();
+    const auto technology = reader->technology();
+    if (!technology) return Failure{path.string() + ": its link type is none of a modem's log (147 to 151)"};
+    return std::unique_ptr<CaptureStream>(new CaptureStream(path, std::move(reader).value(), *technology, loop));
+}
+
+std::optional<CapturePacket> CaptureStream::next() {
+    auto packet = readPacket();
+    if (!packet && _loop && _packets > 0 && beginNextPass()) packet = readPacket();
+    if (packet) packet->time = place(packet->time);
+    return packet;
+}
+
+std::optional<CapturePacket> CaptureStream::readPacket() {
+    auto read = _reader.next();
+    if (read) return *read;
+    if (!std::exchange(_toldFailure, true)) logLine(Level::Error, read.error().reason);
+    return std::nullopt;
+}
+
+bool CaptureStream::beginNextPass() {
+    auto reader = CaptureReader::open(_path);
+    if (!reader) {
+        logLine(Level::Error, reader.error().reason);
+        return false;
+    }
+    _reader = std::move(reader).value();
+    _now += typicalInterval();
+    _packets = 0;
+    _played = 0ns;
+    _firstPass = false;
+    return true;
+}
+
+CaptureTime CaptureStream::place(CaptureTime captured) {
+    if (_packets++ == 0) {
+        _last = captured;
+        if (_firstPass) _now = captured;
+        return _now;
+    }
+    const nanoseconds gap = std::clamp<nanoseconds>(captured - _last, 0ns, kLongestPause);
+    _last = std::max(_last, captured);
+    _played += gap;
+    return _now += gap;
+}
+
+std::chrono::nanoseconds CaptureStream::typicalInterval() const {
+    if (_packets < 2) return 1s;
+    const nanoseconds mean = _played / static_cast<std::int64_t>(_packets - 1);
+    return std::clamp<nanoseconds>(mean, 10ms, 1s);
+}
+
+}  // namespace kelvo

@@ -1,0 +1,25 @@
+#pragma once
+
+#include <memory>
+
+#include "telephony/RecordStream.h"
+#include "telephony/simulation/Simulation.h"
+
+namespace kelvo {
+
+/// The log of a simulated modem, without end. The same technology and seed give the same records at the same times.
+class SimulationStream final : public RecordStream {
+public:
+    SimulationStream(Technology technology, std::uint64_t seed);
+
+    Technology technology() const override { return _modem->technology(); }
+    std::string description() const override;
+    std::optional<CapturePacket> next() override;
+
+private:
+    const std::uint64_t _seed;
+    const std::unique_ptr<simulation::Simulation> _modem;
+    simulation::Simulation::Message _message;
+};
+
+}  // namespace kelvo

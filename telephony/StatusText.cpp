@@ -1,0 +1,54 @@
+#include "telephony/StatusText.h"
+
+#include <fmt/format.h>
+
+namespace kelvo {
+namespace {
+
+std::int64_t integerOf(const Dictionary& entry, std::string_view key) {
+    const Number* number = entry[key].number();
+    return number != nullptr ? number->integer() : 0;
+}
+
+std::string textOf(const Dictionary& entry, std::string_view key) {
+    const std::string* text = entry[key].string();
+    return text != nullptr ? *text : std::string("?");
+}
+
+std::string codeLine(const Dictionary& rate) {
+    const Number* code = rate["Code"].number();
+    const Number* perSecond = rate["PerSecond"].number();
+    return fmt::format("  {:<10}{:>11.1f}{:>14}\n", code != nullptr ? fmt::format("0x{:04x}", code->integer()) : "none",
+                       perSecond != nullptr ? perSecond->real() : 0, integerOf(rate, "Records"));
+}
+
+std::string clientLine(const Dictionary& client) {
+    const bool* streaming = client["Streaming"].boolean();
+    return fmt::format("  {}: {}, {} delivered, {} waiting, {} dropped\n", textOf(client, "Name"),
+                       streaming != nullptr && *streaming ? "streaming" : "not streaming yet",
+                       integerOf(client, "Delivered"), integerOf(client, "Waiting"), integerOf(client, "Dropped"));
+}
+
+// The lines of an array of dictionaries; "none" when it is empty.
+template <class Line>
+std::string linesOf(const ArrayRef& entries, Line line) {
+    std::string text;
+    for (const Value& entry : *entries)
+        if (entry.dictionary()) text += line(*entry.dictionary());
+    return text.empty() ? "  none\n" : text;
+}
+
+}  // namespace
+
+Result<std::string> statusText(const Value& answer) {
+    if (!answer.dictionary()) return Failure{"the answer is no dictionary"};
+    const Dictionary& status = *answer.dictionary();
+    const ArrayRef& codes = status["Codes"].array();
+    const ArrayRef& clients = status["Clients"].array();
+    if (!codes || !clients) return Failure{"the answer is no status"};
+    return fmt::format("Source      {}\nTechnology  {}\nRecords     {}\n\n  {:<10}{:>11}{:>14}\n{}\nClients\n{}",
+                       textOf(status, "Source"), textOf(status, "Technology"), integerOf(status, "Records"), "Log code",
+                       "per second", "in all", linesOf(codes, codeLine), linesOf(clients, clientLine));
+}
+
+}  // namespace kelvo

@@ -1,0 +1,39 @@
+#include "telephony/StatusText.h"
+
+#include <gtest/gtest.h>
+
+using namespace kelvo;
+
+TEST(StatusText, ListsCodesAndClients) {
+    const auto answer = Dictionary::make(
+        {{"Source", "the capture x.pcap"},
+         {"Technology", "GSM"},
+         {"Records", 1234},
+         {"Codes", Array::make({Dictionary::make({{"Records", 3}, {"PerSecond", 0.04}}),
+                                Dictionary::make({{"Code", 0x5134}, {"Records", 1200}, {"PerSecond", 19.96}}),
+                                Dictionary::make({{"Code", 0xFF0001}, {"Records", 31}, {"PerSecond", 0.5}})})},
+         {"Clients",
+          Array::make(
+              {Dictionary::make(
+                   {{"Name", "window"}, {"Streaming", true}, {"Delivered", 1200}, {"Waiting", 30}, {"Dropped", 4}}),
+               Dictionary::make(
+                   {{"Name", "other"}, {"Streaming", false}, {"Delivered", 0}, {"Waiting", 0}, {"Dropped", 0}})})}});
+    EXPECT_EQ(*statusText(answer),
+              "Source      the capture x.pcap\n"
+              "Technology  GSM\n"
+              "Records     1234\n"
+              "\n"
+              "  Log code   per second        in all\n"
+              "  none              0.0             3\n"
+              "  0x5134           20.0          1200\n"
+              "  0xff0001          0.5            31\n"
+              "\n"
+              "Clients\n"
+              "  window: streaming, 1200 delivered, 30 waiting, 4 dropped\n"
+              "  other: not streaming yet, 0 delivered, 0 waiting, 0 dropped\n");
+}
+
+TEST(StatusText, RefusesWhatIsNoStatus) {
+    EXPECT_FALSE(statusText(Value("text")));
+    EXPECT_FALSE(statusText(Dictionary::make({{"Error", 1}, {"ErrorDomain", 1}})));
+}

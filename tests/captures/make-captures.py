@@ -3,20 +3,14 @@
 
 Usage: make-captures.py        Writes them beside itself; twins_tests --rebless then writes their twins.
 """
-import importlib.util
 import pathlib
 import struct
+
+import lterecords as lte
 
 HERE = pathlib.Path(__file__).resolve().parent
 START = 1299230102  # 2011-03-04 09:15:02 UTC
 LINK_TYPES = {"ifx": 147, "gsm": 148, "cdma": 149, "lte": 150, "utran": 151}
-
-
-def load(path):
-    spec = importlib.util.spec_from_file_location("records", path)
-    module = importlib.util.module_from_spec(spec)
-    spec.loader.exec_module(module)
-    return module
 
 
 def write(name, technology, messages):
@@ -26,7 +20,6 @@ def write(name, technology, messages):
             out.write(struct.pack("<IIII", START + i, 0, len(message), len(message)) + message)
 
 
-lte = load(HERE / "../../resources/make-lte-capture.py")
 near, far, other = lte.CELLS[0], lte.CELLS[1], lte.CELLS[2]
 serving = lte.serving_cell(near)
 

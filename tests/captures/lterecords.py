@@ -1,20 +1,7 @@
-#!/usr/bin/env python3
-"""Makes lte.pcap, the LTE capture that ./run replays: a phone on a four-minute drive past six cells.
-
-Usage: make-lte-capture.py OUT.pcap        The same bytes every time.
-
-Levels follow a log-distance path loss (exponent 3.5) with slowly varying shadowing. The phone is idle for the first
-half and connected for the second; it changes to a neighbour that has been 3 dB stronger for two seconds.
-"""
-import math
+"""Builders of LTE records, for make-captures.py."""
 import plistlib
-import random
 import struct
-import sys
 
-LINKTYPE_LTE = 150
-START = 1299230102  # 2011-03-04 09:15:02 UTC
-SECONDS = 240
 # position in metres, physical cell id, cell identity, downlink EARFCN, resource blocks, tracking area, band
 CELLS = [
     (0, 301, 19467523, 5780, 50, 4566, 17),
@@ -24,7 +11,6 @@ CELLS = [
     (3100, 45, 19468036, 2075, 100, 4567, 4),
     (3900, 398, 19468291, 2075, 100, 4567, 4),
 ]
-rng = random.Random(4566)
 
 
 def packet(code, payload, kind=1):
@@ -47,18 +33,6 @@ def bits(*fields):
 
 def clamp(value, low, high):
     return max(low, min(high, int(round(value))))
-
-
-class Level:
-    """Received power of one cell: path loss plus shadowing that moves slowly."""
-
-    def __init__(self):
-        self.shadow = rng.gauss(0, 4)
-
-    def rsrp(self, metres):
-        self.shadow = 0.97 * self.shadow + rng.gauss(0, 1)
-        distance = math.hypot(metres, 60)
-        return -78 - 35 * math.log10(distance / 100) + self.shadow
 
 
 def serving_cell(cell):
@@ -141,47 +115,3 @@ CONTEXTS = extended(2, [
     {"APN": "ims", "Type": "IPv6", "Address": "2001:db8::17", "State": "Active"},
 ])
 
-
-def drive():
-    """Yields (seconds since the start, message)."""
-    levels = [Level() for _ in CELLS]
-    serving, stronger = 0, 0
-    yield 0.0, SIM
-    yield 0.1, CONTEXTS
-    yield 0.2, cell_array(CELLS[0])
-    yield 0.4, serving_cell(CELLS[0])
-    yield 0.5, antennas(2)
-    for tick in range(SECONDS * 2):
-        now = 1.0 + tick / 2
-        position = 4000 * tick / (SECONDS * 2)
-        rsrp = [level.rsrp(abs(position - cell[0])) for level, cell in zip(levels, CELLS)]
-        rsrq = [clamp(-6 - max(0, max(rsrp) - level) * 0.6 + rng.gauss(0, 0.4), -19, -4) for level in rsrp]
-        order = sorted(range(len(CELLS)), key=lambda i: -rsrp[i])
-        best = order[0]
-        stronger = stronger + 1 if best != serving and rsrp[best] > rsrp[serving] + 3 else 0
-        if stronger == 4:
-            serving, stronger = best, 0
-            yield now, serving_cell(CELLS[serving])
-            yield now + 0.02, antennas(2)
-            yield now + 0.05, cell_array(CELLS[serving])
-            yield now + 0.06, serving_cell(CELLS[serving])
-        others = [(CELLS[i], rsrp[i], rsrq[i]) for i in order if i != serving and CELLS[i][3] == CELLS[serving][3]]
-        if tick >= SECONDS:
-            yield now + 0.1, connected_measurement(CELLS[serving], rsrp[serving], rsrq[serving], tick * 500, others)
-        elif tick % 3 == 0:
-            yield now + 0.1, idle_measurement(CELLS[serving], rsrp[serving], rsrq[serving])
-            yield now + 0.15, idle_neighbours(CELLS[serving], others)
-            yield now + 0.2, candidates(CELLS[serving], others)
-
-
-def main():
-    with open(sys.argv[1], "wb") as out:
-        out.write(struct.pack("<IHHiIII", 0xA1B2C3D4, 2, 4, 0, 0, 262144, LINKTYPE_LTE))
-        for seconds, message in drive():
-            whole = int(seconds)
-            micros = int(round((seconds - whole) * 1e6))
-            out.write(struct.pack("<IIII", START + whole, micros, len(message), len(message)) + message)
-
-
-if __name__ == "__main__":
-    main()

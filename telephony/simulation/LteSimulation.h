@@ -16,8 +16,6 @@ public:
 
     Technology technology() const override { return Technology::LTE; }
     const LteModem& modem() const { return _modem; }
-    /// The bearers of this moment, as their record tells.
-    std::vector<PdpContext> contexts() const;
 
 private:
     void step() override;
@@ -25,6 +23,7 @@ private:
     void reportServingCell();
     void reportExtended();
     std::vector<MonitoredCell> monitoredCells() const;
+    std::vector<PdpContext> contexts() const;
 
     LteModem _modem;
 };

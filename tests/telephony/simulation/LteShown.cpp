@@ -81,6 +81,7 @@ void LteShown::servingMeasurement() {
         return dB ? std::to_string(*dB) + unit : "Not Present";
     };
     _section = "Serving Cell Measurements";
+    equals("Version", 1);
     equals("E-ARFCN", cell.carrier.downlink);
     equals("Physical Cell ID", cell.physicalId);
     equals("Serving Layer Priority", cell.priority);
@@ -102,6 +103,7 @@ void LteShown::servingMeasurement() {
 
 void LteShown::neighbourMeasurement() {
     _section = "Neighbor Measurements";
+    equals("Version", 1);
     equals("E-ARFCN", _modem.neighboursCarrier().downlink);
     equals("Qrxlevmin", std::to_string(_modem.neighboursMinimumLevel()) + " dBm");
     ASSERT_EQ(_played.rows("Neighbor Cells List"), _modem.neighbours().size());
@@ -125,6 +127,7 @@ void LteShown::neighbourMeasurement() {
 
 void LteShown::candidates() {
     _section = "Reselection Candidates";
+    equals("Version", 1);
     equals("Serving EARFCN", _modem.serving().carrier.downlink);
     equals("Serving Cell ID", _modem.serving().physicalId);
     const auto& shown = _modem.candidate();
@@ -161,8 +164,22 @@ void LteShown::simFiles() {
     char area[5];
     std::snprintf(area, sizeof area, "%04X", static_cast<unsigned>(_modem.registeredArea()));
     _section = "SIM Info";
-    equals("EF-ICCID", "8900101000000123456");
     equals("EF-LOCI", std::string("3A9C41D700F110") + area + "FF00");
+    const Value* files = _played.at("SIM Info");  // this key has the path's own sign in it
+    ASSERT_TRUE(files != nullptr && files->dictionary());
+    EXPECT_EQ((*files->dictionary())["EF-GPRS/PS-LOCI"], Value(std::string("C41B7E02A95D1300F110") + area + "0100"));
+    equals("EF-ICCID", "8900101000000123456");
+    equals("EF-MSISDN", "+0015550123");
+    equals("EF-3GPP MAIL BOX DIALING NUMBER", "+0015550100");
+    equals("EF-HPPLMN SEARCH PERIOD", "05");
+    equals("EF-ACCESS CONTROL CLASS", "0008");
+    equals("EF-ADMINISTRATIVE DATA", "00000102");
+    equals("EF-FPLMN", "00F120FFFFFFFFFFFFFFFFFF");
+    equals("EF-ACTING HPLMN", "00F110");
+    equals("EF-RAT MODE", "00");
+    equals("EF-PLMN NETWORK NAME", "Test Network");
+    equals("EF-OPERATOR PLMN LIST", "00F1100000FFFE01");
+    equals("EF-OPLMNAcT", "00F110C080");
 }
 
 void LteShown::monitoredCell() {
@@ -176,14 +193,16 @@ void LteShown::monitoredCell() {
 }
 
 void LteShown::contexts() {
-    EXPECT_EQ(_played.rows("PDP Context Info"), _modem.isOnCall() ? 3U : 2U);
-    const auto contexts = _simulation.contexts();
-    for (std::size_t i = 0; i < contexts.size(); ++i) {
+    // A call has a bearer of its own beside those for the internet and for signalling.
+    ASSERT_EQ(_played.rows("PDP Context Info"), _modem.isOnCall() ? 3U : 2U);
+    for (std::size_t i = 0; i < _played.rows("PDP Context Info"); ++i) {
         _section = "PDP Context Info/" + std::to_string(i);
-        equals("Context ID", contexts[i].id);
-        equals("APN", contexts[i].apn);
+        equals("Context ID", std::to_string(5 + i));
+        equals("APN", i == 0 ? "internet" : "ims");
         equals("State", "Active");
-        equals("Quality of Service", contexts[i].qos);
+        equals("Quality of Service", i == 0 ? "QCI 9" : i == 1 ? "QCI 5" : "QCI 1");
+        equals("PDP Type", i == 0 ? "IPv4v6" : i == 1 ? "IPv6" : "(absent)");
+        equals("PDP Address", i == 0 ? "10.20.30.40" : i == 1 ? "2001:db8:1::2" : "(absent)");
     }
 }
 

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "telephony/simulation/LteSimulation.h"
+#include "telephony/simulation/LTE/LteModem.h"
 #include "tests/telephony/simulation/Played.h"
 
 namespace kelvo::test {
@@ -9,8 +9,7 @@ namespace kelvo::test {
 /// failures. Knows the records that change the screens, by their log codes.
 class LteShown {
 public:
-    LteShown(Played& played, const simulation::LteSimulation& simulation)
-        : _played(played), _simulation(simulation), _modem(simulation.modem()) {}
+    LteShown(Played& played, const simulation::LteModem& modem) : _played(played), _modem(modem) {}
 
     void compare(std::uint32_t code);
 
@@ -33,7 +32,6 @@ private:
     void reads(const std::string& key, double truth, double step, const std::string& unit);
 
     Played& _played;
-    const simulation::LteSimulation& _simulation;
     const simulation::LteModem& _modem;
     std::string _section;
 };

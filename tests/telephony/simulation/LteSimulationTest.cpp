@@ -47,7 +47,7 @@ TEST(LteSimulation, GivesTheSameBytesForTheSameSeed) {
 TEST(LteSimulation, ShowsTheWorldItPlays) {
     LteSimulation modem(1);
     Played played(modem);
-    LteShown shown(played, modem);
+    LteShown shown(played, modem.modem());
     do {
         played.clearLog();
         const std::uint32_t code = played.next();

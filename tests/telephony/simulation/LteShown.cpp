@@ -1,0 +1,209 @@
+#include "tests/telephony/simulation/LteShown.h"
+
+#include <gtest/gtest.h>
+
+#include <cstdio>
+
+namespace kelvo::test {
+
+using namespace simulation;
+
+void LteShown::compare(std::uint32_t code) {
+    switch (code) {
+        case 0xB0C2: return servingCell();
+        case 0xB0C1: EXPECT_EQ(_played.number("Serving Cell Info/Num Tx Antennas"), _modem.serving().antennas); return;
+        case 0xB179: return connectedMeasurement();
+        case 0xB17F: return servingMeasurement();
+        case 0xB180: return neighbourMeasurement();
+        case 0xB186: return candidates();
+        case 0xFF0000: return simFiles();
+        case 0xFF0001: return monitoredCell();
+        case 0xFF0002: return contexts();
+        default: FAIL() << "a record that no screen asks for: " << code;
+    }
+}
+
+void LteShown::equals(const std::string& key, const std::string& text) {
+    EXPECT_EQ(at(key), text) << _section << "/" << key;
+}
+
+void LteShown::reads(const std::string& key, double truth, double step, const std::string& unit) {
+    const std::string path = _section + "/" + key;
+    EXPECT_NEAR(_played.number(path), truth, step / 2 + 0.00501) << path;  // two decimals are shown
+    EXPECT_TRUE(_played.text(path).ends_with(unit)) << path << ": " << _played.text(path);
+}
+
+void LteShown::servingCell() {
+    const LteCell& cell = _modem.serving();
+    const bool isWide = cell.carrier.downlink == 1300;
+    _section = "Serving Cell Info";
+    equals("Physical Cell ID", cell.physicalId);
+    equals("Cell Identity", cell.identity);
+    equals("Tracking Area Code", cell.trackingArea);
+    equals("Download Frequency", isWide ? "1300" : "300");
+    equals("Upload Frequency", isWide ? "19300" : "18300");
+    equals("Download Bandwidth", isWide ? "20 MHz" : "10 MHz");
+    equals("Upload Bandwidth", isWide ? "20 MHz" : "10 MHz");
+    equals("Freq Band Indicator", isWide ? "3" : "1");
+    equals("UARFCN", "(absent)");
+}
+
+void LteShown::connectedMeasurement() {
+    EXPECT_TRUE(_modem.isConnected());
+    _section = "Connected mode LTE Intra-frequency Measurement";
+    equals("E-ARFCN", _modem.serving().carrier.downlink);
+    equals("Serving Physical Cell ID", _modem.serving().physicalId);
+    equals("Subframe Number", _modem.subframe());
+    reads("Serving Filtered RSRP", _modem.reading().averageRsrp, 0.25, " dBm");
+    reads("Serving Filtered RSRQ", _modem.reading().averageRsrq, 0.125, " dB");
+
+    ASSERT_EQ(_played.rows("Measured Neighbor Cells"), _modem.neighbours().size());
+    for (std::size_t i = 0; i < _modem.neighbours().size(); ++i) {
+        const LteNeighbour& cell = _modem.neighbours()[i];
+        _section = "Measured Neighbor Cells/" + std::to_string(i);
+        equals("Physical Cell ID", cell.physicalId);
+        reads("Filtered RSRP", cell.reading.averageRsrp, 0.25, " dBm");
+        reads("Filtered RSRQ", cell.reading.averageRsrq, 0.125, " dB");
+    }
+    ASSERT_EQ(_played.rows("Detected Cells"), _modem.detected().size());
+    for (std::size_t i = 0; i < _modem.detected().size(); ++i) {
+        _section = "Detected Cells/" + std::to_string(i);
+        equals("Physical Cell ID", _modem.detected()[i]);
+    }
+}
+
+void LteShown::servingMeasurement() {
+    EXPECT_FALSE(_modem.isConnected());
+    const LteCell& cell = _modem.serving();
+    const LteReading& reading = _modem.reading();
+    const LteIdleState& idle = _modem.idle();
+    const auto thresholdText = [](const std::optional<int>& dB, const char* unit) {
+        return dB ? std::to_string(*dB) + unit : "Not Present";
+    };
+    _section = "Serving Cell Measurements";
+    equals("Version", 1);
+    equals("E-ARFCN", cell.carrier.downlink);
+    equals("Physical Cell ID", cell.physicalId);
+    equals("Serving Layer Priority", cell.priority);
+    reads("Measured RSRP", reading.rsrp, 0.25, " dBm");
+    reads("Average RSRP", reading.averageRsrp, 0.25, " dBm");
+    reads("Measured RSRQ", reading.rsrq, 0.25, " dB");
+    reads("Average RSRQ", reading.averageRsrq, 0.25, " dB");
+    reads("Measured RSSI", reading.rssi, 0.5, " dBm");
+    equals("Qrxlevmin", std::to_string(cell.minimumLevel) + " dBm");
+    equals("P_Max", thresholdText(cell.maximumPower, " dBm"));
+    equals("Max UE Tx Power", "23 dBm");
+    reads("Srxlev", idle.srxlev, 1, " dBm");
+    equals("Num of Consecutive DRX Cycles of S < 0", idle.failedCycles);
+    equals("S Intra Search", thresholdText(cell.searchIntra, " dB"));
+    equals("S Non Intra Search", thresholdText(cell.searchOther, " dBm"));
+    equals("Measurement Rules Updated", idle.rulesChanged ? "True" : "False");
+    equals("Measurement Rules", idle.rules);
+}
+
+void LteShown::neighbourMeasurement() {
+    _section = "Neighbor Measurements";
+    equals("Version", 1);
+    equals("E-ARFCN", _modem.neighboursCarrier().downlink);
+    equals("Qrxlevmin", std::to_string(_modem.neighboursMinimumLevel()) + " dBm");
+    ASSERT_EQ(_played.rows("Neighbor Cells List"), _modem.neighbours().size());
+    for (std::size_t i = 0; i < _modem.neighbours().size(); ++i) {
+        const LteNeighbour& cell = _modem.neighbours()[i];
+        _section = "Neighbor Cells List/" + std::to_string(i);
+        equals("Physical Cell ID", cell.physicalId);
+        reads("Measured RSSI", cell.reading.rssi, 0.5, " dBm");
+        reads("Measured RSRP", cell.reading.rsrp, 0.5, " dBm");
+        reads("Average RSRP", cell.reading.averageRsrp, 0.5, " dBm");
+        reads("Measured RSRQ", cell.reading.rsrq, 0.25, " dB");
+        reads("Average RSRQ", cell.reading.averageRsrq, 0.25, " dB");
+        reads("Srxlev", cell.srxlev, 1, " dBm");
+        equals("Frequency Offset", cell.frequencyError);
+        for (const char* antenna : {"Ant 0", "Ant 1"}) {
+            equals(std::string(antenna) + " Frame Offset", cell.frames);
+            equals(std::string(antenna) + " Sample Offset", cell.samples);
+        }
+    }
+}
+
+void LteShown::candidates() {
+    _section = "Reselection Candidates";
+    equals("Version", 1);
+    equals("Serving EARFCN", _modem.serving().carrier.downlink);
+    equals("Serving Cell ID", _modem.serving().physicalId);
+    const auto& shown = _modem.candidate();
+    ASSERT_EQ(_played.rows("Reselection Candidates List"), shown ? 1U : 0U);
+    if (shown) candidate(*shown);
+}
+
+void LteShown::candidate(const LteCandidate& candidate) {
+    _section = "Reselection Candidates List/0";
+    equals("Candidate Priority", candidate.priority);
+    switch (candidate.kind) {
+        case LteCandidate::Kind::Lte:
+            equals("Candidate RAT Type", "LTE");
+            equals("E ARFCN", candidate.channel);
+            return equals("Cell ID", candidate.code);
+        case LteCandidate::Kind::Utran:
+            equals("Candidate RAT Type", "UTRAN");
+            equals("U ARFCN", candidate.channel);
+            return equals("PSC", candidate.code);
+        case LteCandidate::Kind::Geran:
+            equals("Candidate RAT Type", "GERAN");
+            equals("ARFCN", candidate.channel);
+            equals("Band", candidate.band);
+            return equals("BSIC ID", candidate.code);
+        case LteCandidate::Kind::Cdma1x: equals("Candidate RAT Type", "CDMA1XRTT"); break;
+        case LteCandidate::Kind::Hrpd: equals("Candidate RAT Type", "CDMAHRPD"); break;
+    }
+    equals("Band", candidate.band);
+    equals("Channel", candidate.channel);
+    equals("Pilot", candidate.code);
+}
+
+void LteShown::simFiles() {
+    char area[5];
+    std::snprintf(area, sizeof area, "%04X", static_cast<unsigned>(_modem.registeredArea()));
+    _section = "SIM Info";
+    equals("EF-LOCI", std::string("3A9C41D700F110") + area + "FF00");
+    const Value* files = _played.at("SIM Info");  // this key has the path's own sign in it
+    ASSERT_TRUE(files != nullptr && files->dictionary());
+    EXPECT_EQ((*files->dictionary())["EF-GPRS/PS-LOCI"], Value(std::string("C41B7E02A95D1300F110") + area + "0100"));
+    equals("EF-ICCID", "8900101000000123456");
+    equals("EF-MSISDN", "+0015550123");
+    equals("EF-3GPP MAIL BOX DIALING NUMBER", "+0015550100");
+    equals("EF-HPPLMN SEARCH PERIOD", "05");
+    equals("EF-ACCESS CONTROL CLASS", "0008");
+    equals("EF-ADMINISTRATIVE DATA", "00000102");
+    equals("EF-FPLMN", "00F120FFFFFFFFFFFFFFFFFF");
+    equals("EF-ACTING HPLMN", "00F110");
+    equals("EF-RAT MODE", "00");
+    equals("EF-PLMN NETWORK NAME", "Test Network");
+    equals("EF-OPERATOR PLMN LIST", "00F1100000FFFE01");
+    equals("EF-OPLMNAcT", "00F110C080");
+}
+
+void LteShown::monitoredCell() {
+    const LteCell& cell = _modem.serving();
+    _section = "Serving Cell Info";
+    equals("Tracking Area Code", cell.trackingArea);
+    equals("Cell Identity", cell.identity);
+    equals("Physical Cell ID", cell.physicalId);
+    equals("Freq Band Indicator", cell.carrier.downlink == 1300 ? "3" : "1");
+    equals("UARFCN", cell.carrier.downlink);
+}
+
+void LteShown::contexts() {
+    // A call has a bearer of its own beside those for the internet and for signalling.
+    ASSERT_EQ(_played.rows("PDP Context Info"), _modem.isOnCall() ? 3U : 2U);
+    for (std::size_t i = 0; i < _played.rows("PDP Context Info"); ++i) {
+        _section = "PDP Context Info/" + std::to_string(i);
+        equals("Context ID", std::to_string(5 + i));
+        equals("APN", i == 0 ? "internet" : "ims");
+        equals("State", "Active");
+        equals("Quality of Service", i == 0 ? "QCI 9" : i == 1 ? "QCI 5" : "QCI 1");
+        equals("PDP Type", i == 0 ? "IPv4v6" : i == 1 ? "IPv6" : "(absent)");
+        equals("PDP Address", i == 0 ? "10.20.30.40" : i == 1 ? "2001:db8:1::2" : "(absent)");
+    }
+}
+
+}  // namespace kelvo::test

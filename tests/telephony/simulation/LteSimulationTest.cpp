@@ -1,0 +1,261 @@
+#include "telephony/simulation/LteSimulation.h"
+
+#include <gtest/gtest.h>
+
+#include <cmath>
+#include <cstdio>
+#include <map>
+#include <set>
+
+#include "tests/telephony/simulation/LteShown.h"
+#include "tests/telephony/simulation/Played.h"
+
+using namespace kelvo;
+using namespace kelvo::simulation;
+using namespace kelvo::test;
+using namespace std::chrono_literals;
+
+namespace {
+
+Bytes drive(std::uint64_t seed, Time until) {
+    LteSimulation modem(seed);
+    Bytes all;
+    for (auto message = modem.next(); message.time < until; message = modem.next()) {
+        all.insert(all.end(), message.bytes.begin(), message.bytes.end());
+    }
+    return all;
+}
+
+/// The lines of level 3, which tell of something wrong.
+std::vector<std::string> errors(const Played& played) {
+    std::vector<std::string> texts;
+    for (const auto& [level, text] : played.log()) {
+        if (level == 3) texts.push_back(text);
+    }
+    return texts;
+}
+
+bool between(double value, double low, double high) { return value >= low && value <= high; }
+
+}  // namespace
+
+TEST(LteSimulation, GivesTheSameBytesForTheSameSeed) {
+    EXPECT_EQ(drive(5, 60s), drive(5, 60s));
+    EXPECT_NE(drive(5, 60s), drive(6, 60s));
+}
+
+TEST(LteSimulation, ShowsTheWorldItPlays) {
+    LteSimulation modem(1);
+    Played played(modem);
+    LteShown shown(played, modem.modem());
+    do {
+        played.clearLog();
+        const std::uint32_t code = played.next();
+        shown.compare(code);
+        // Intended by the screen: antennas are shown, and their record is called unknown all the same.
+        const std::vector<std::string> allowed =
+            code == 0xB0C1 ? std::vector<std::string>{"Received an unknown log message: 45249"}
+                           : std::vector<std::string>();
+        EXPECT_EQ(errors(played), allowed);
+        ASSERT_FALSE(HasFailure()) << "after " << seconds(played.time()) << " s, record " << std::hex << code;
+    } while (played.time() < 10min);
+}
+
+TEST(LteSimulation, SendsEveryRecordThatTheApplicationAsksFor) {
+    LteSimulation modem(3);
+    std::map<std::uint32_t, int> counts;
+    Played played(modem);
+    while (played.time() < 10min) ++counts[played.next()];
+    EXPECT_TRUE(between(counts[0xB0C2], 120, 200)) << counts[0xB0C2];    // every 5 s and with each cell
+    EXPECT_TRUE(between(counts[0xB0C1], 10, 80)) << counts[0xB0C1];      // with each cell
+    EXPECT_TRUE(between(counts[0xB179], 1500, 4500)) << counts[0xB179];  // 10 a second while connected
+    EXPECT_TRUE(between(counts[0xB17F], 470, 1400)) << counts[0xB17F];   // 3 a second while idle
+    EXPECT_TRUE(between(counts[0xB180], 200, 1400)) << counts[0xB180];   // no more than that
+    EXPECT_EQ(counts[0xB186], counts[0xB17F]);
+    EXPECT_TRUE(between(counts[0xFF0000], 10, 60)) << counts[0xFF0000];   // every minute and with each area
+    EXPECT_TRUE(between(counts[0xFF0001], 30, 110)) << counts[0xFF0001];  // every 20 s and with each cell
+    EXPECT_TRUE(between(counts[0xFF0002], 20, 90)) << counts[0xFF0002];   // every 30 s and with each call
+}
+
+TEST(LteSimulation, FillsEveryScreenWithinTwoSeconds) {
+    LteSimulation modem(1);
+    Played played(modem);
+    std::set<std::string> filled;
+    while (played.time() < 2s) {
+        played.next();
+        for (const char* list : {"Measured Neighbor Cells", "Detected Cells", "Neighbor Cells List",
+                                 "Reselection Candidates List", "PDP Context Info"}) {
+            if (played.rows(list) > 0) filled.insert(list);
+        }
+    }
+    EXPECT_EQ(filled.size(), 5U);
+    for (const char* value :
+         {"Serving Cell Info/Cell Identity", "Serving Cell Info/Num Tx Antennas", "SIM Info/EF-ICCID",
+          "Serving Cell Measurements/Srxlev", "Neighbor Measurements/E-ARFCN", "Reselection Candidates/Serving Cell ID",
+          "Connected mode LTE Intra-frequency Measurement/Subframe Number"}) {
+        EXPECT_NE(played.text(value), "–") << value;
+    }
+}
+
+TEST(LteSimulation, HasALivelyFirstThreeMinutesInLittleSpace) {
+    LteSimulation modem(1);
+    Played played(modem);
+    std::set<std::string> seen;
+    int cells = 0;
+    std::size_t bytes = 0;
+    LteSimulation twin(1);
+    for (auto message = twin.next(); message.time < 3min; message = twin.next()) bytes += message.bytes.size() + 16;
+    while (played.time() < 3min) {
+        played.next();
+        if (modem.modem().hasChangedCell() && played.time() > 0s) ++cells;
+        for (const char* value :
+             {"Serving Cell Info/Download Bandwidth", "Serving Cell Measurements/S Intra Search",
+              "Serving Cell Measurements/P_Max", "Reselection Candidates List/0/Candidate RAT Type",
+              "Serving Cell Measurements/Measurement Rules Updated", "Serving Cell Info/Tracking Area Code"}) {
+            seen.insert(played.text(value));
+        }
+    }
+    EXPECT_GE(cells, 5);
+    for (const char* text : {"20 MHz", "10 MHz", "Not Present", "23 dBm", "50 dB", "True", "False", "LTE", "UTRAN",
+                             "GERAN", "CDMA1XRTT", "CDMAHRPD", "1041", "1042"}) {
+        EXPECT_TRUE(seen.contains(text)) << text;
+    }
+    EXPECT_LT(bytes, 180U * 1024) << "a capture's bytes, packet headers included";
+}
+
+TEST(LteSimulation, GoesOnlyToCellsThatItHasShownBeforeAndThatCameCloser) {
+    LteSimulation modem(2);
+    Played played(modem);
+    struct Sighting {
+        Time time;
+        double above;  // dB, of the serving cell
+    };
+    std::map<int, std::vector<Sighting>> sightings;
+    int changes = 0;
+    int rising = 0;
+    Time changed = 0s;
+    int serving = modem.modem().serving().physicalId;
+    while (played.time() < 10min) {
+        const auto code = played.next();
+        if (modem.modem().serving().physicalId != serving) {
+            serving = modem.modem().serving().physicalId;
+            const auto& history = sightings[serving];
+            ASSERT_FALSE(history.empty()) << serving;
+            EXPECT_LE(played.time() - history.back().time, 1s);
+            EXPECT_GT(history.back().above, 1);  // hysteresis, less what the last sample took
+            rising += history.back().above > history.front().above ? 1 : 0;
+            ++changes;
+            changed = played.time();
+            sightings.clear();
+        }
+        if (code != 0xB179 && code != 0xB180) continue;
+        const bool isConnected = code == 0xB179;
+        const std::string list = isConnected ? "Measured Neighbor Cells/" : "Neighbor Cells List/";
+        const std::string level = isConnected ? "/Filtered RSRP" : "/Average RSRP";
+        const double own =
+            played.number(isConnected ? "Connected mode LTE Intra-frequency Measurement/Serving Filtered RSRP"
+                                      : "Serving Cell Measurements/Average RSRP");
+        for (std::size_t i = 0; i < played.rows(list.substr(0, list.size() - 1)); ++i) {
+            const std::string row = list + std::to_string(i);
+            const int cell = static_cast<int>(played.number(row + "/Physical Cell ID"));
+            sightings[cell].push_back({played.time(), played.number(row + level) - own});
+        }
+    }
+    EXPECT_GE(changes, 15);
+    EXPECT_GE(rising, changes * 3 / 4) << changes;
+    EXPECT_LT(changed, 10min);
+}
+
+TEST(LteSimulation, RegistersSoonAfterTheAreaChanges) {
+    LteSimulation modem(4);
+    Played played(modem);
+    Time since = 0s;
+    int registrations = 0;
+    int last = modem.modem().registeredArea();
+    while (played.time() < 10min) {
+        played.next();
+        const LteModem& world = modem.modem();
+        if (world.serving().trackingArea == world.registeredArea() || world.hasChangedCell()) since = played.time();
+        ASSERT_LE(played.time() - since, 1s);
+        if (world.registeredArea() == last) continue;
+        last = world.registeredArea();
+        EXPECT_TRUE(world.isConnected());
+        ++registrations;
+    }
+    EXPECT_GE(registrations, 4);
+}
+
+TEST(LteSimulation, IsIdleAndConnectedByTurns) {
+    LteSimulation modem(2);
+    int phases = 0;
+    int messages = 0;
+    int calls = 0;
+    bool wasConnected = false;
+    Time connected = 0s;
+    Time last = 0s;
+    for (auto message = modem.next(); message.time < 10min; message = modem.next()) {
+        ++messages;
+        if (wasConnected) connected += message.time - last;
+        last = message.time;
+        if (modem.modem().isConnected() == wasConnected) continue;
+        wasConnected = !wasConnected;
+        ++phases;
+        calls += modem.modem().isOnCall() ? 1 : 0;
+    }
+    EXPECT_GE(phases, 30);
+    EXPECT_GE(calls, 4);
+    EXPECT_TRUE(between(seconds(connected) / 600, 0.25, 0.75)) << seconds(connected);
+    EXPECT_TRUE(between(messages / 600.0, 8, 40)) << messages;
+}
+
+TEST(LteSimulation, ReadsQualityAsLevelOverEverythingHeard) {
+    LteSimulation modem(7);
+    int readings = 0;
+    for (auto message = modem.next(); message.time < 2min; message = modem.next()) {
+        const LteReading& reading = modem.modem().reading();
+        const bool isAtTheEnd = reading.rsrq <= -19.5 || reading.rsrq >= -3 || reading.rsrp >= -44;
+        if (!modem.modem().hasMeasured() || isAtTheEnd) continue;
+        const double blocks = modem.modem().serving().carrier.downlink == 1300 ? 100 : 50;
+        EXPECT_NEAR(reading.rsrq, reading.rsrp + 10 * std::log10(blocks) - reading.rssi, 1e-9);
+        ++readings;
+    }
+    EXPECT_GT(readings, 500);
+}
+
+TEST(LteSimulation, KeepsTheLevelWhileThePhoneStands) {
+    LteSimulation modem(1);
+    const LteModem& world = modem.modem();
+    Time since = 0s;
+    double driven = -1;
+    double level = 0;
+    int steady = 0;
+    for (auto message = modem.next(); message.time < 10min; message = modem.next()) {
+        if (world.drive().driven() != driven || world.hasChangedCell()) {
+            since = message.time;
+            driven = world.drive().driven();
+            level = world.drive().received(world.servingIndex());
+            continue;
+        }
+        EXPECT_EQ(world.drive().received(world.servingIndex()), level);
+        if (message.time - since < 4s) continue;  // the average still remembers the road
+        EXPECT_NEAR(world.reading().averageRsrp, level - 10 * std::log10(12 * world.serving().carrier.resourceBlocks),
+                    3);
+        ++steady;
+    }
+    EXPECT_GT(steady, 100);
+}
+
+TEST(LteNetwork, NamesEveryCellByItself) {
+    Random random(1);
+    auto sectors = buildSectors({}, random);
+    const auto cells = nameLteCells(sectors, random);
+    std::set<int> physicalIds;
+    std::set<std::uint32_t> identities;
+    for (const LteCell& cell : cells) {
+        EXPECT_TRUE(between(cell.physicalId, 0, 503));
+        physicalIds.insert(cell.physicalId);
+        identities.insert(cell.identity);
+    }
+    EXPECT_EQ(physicalIds.size(), cells.size());
+    EXPECT_EQ(identities.size(), cells.size());
+}

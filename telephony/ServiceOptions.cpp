@@ -51,7 +51,10 @@ ParsedOptions parseServiceOptions(int argc, const char* const* argv) {
                                     "second by log code, clients and the records they were too slow for");
     source->require_option(1);
     auto* loop = app.add_flag("--loop", options.loop, "Start the capture again after its last packet");
-    auto* seed = app.add_option("--seed", options.seed, "Which drive to simulate")->capture_default_str();
+    auto* seed = app.add_option("--seed", options.seed, "Which drive to simulate")
+                     ->type_name("N")
+                     ->check(CLI::NonNegativeNumber)
+                     ->capture_default_str();
     auto* pace = app.add_option("--speed", speed,
                                 "So many times faster than it was, or \"max\": as fast as the quickest client reads")
                      ->type_name("X|max")

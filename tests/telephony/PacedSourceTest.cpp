@@ -9,6 +9,7 @@
 #include "platform/Environment.h"
 #include "telephony/CaptureStream.h"
 #include "tests/support/EventLoop.h"
+#include "tests/support/FileSizeLimit.h"
 #include "tests/support/ManualQueue.h"
 #include "tests/support/RecordingLog.h"
 #include "tests/support/TemporaryDirectory.h"
@@ -280,14 +281,18 @@ TEST_F(PacedSourceTest, RecordsWhatAClientTakesWithItsTimeInTheStream) {
 }
 
 TEST_F(PacedSourceTest, StreamsOnWhenTheRecordingFails) {
-    capture({0, 100});
+    capture({0, 100, 200});
+    const auto recorded = _temporary.path() / "recorded.pcap";
     open();
-    auto recording = CaptureWriter::create("/dev/full", Technology::LTE);
-    if (!recording) GTEST_SKIP() << "no full device on this machine";
-    _source->recordTo(std::move(recording).value());
-    _source->start(_sink);
-    _queue.advance(1s);
-    EXPECT_EQ(_sink.notes, (Notes{"0a", "100b"}));
+    _source->recordTo(CaptureWriter::create(recorded, Technology::LTE).value());
+    {
+        const test::FileSizeLimit full(24 + 16 + 1 + 10);  // the file's header and one packet, not two
+        _source->start(_sink);
+        _queue.advance(1s);
+    }
+    EXPECT_EQ(_sink.notes, (Notes{"0a", "100b", "200c"}));
+    EXPECT_EQ(readCapture(recorded), Notes{"0a"});
     ASSERT_EQ(_log.lines().size(), 1U);
-    EXPECT_EQ(_log.lines()[0].second.rfind("The recording ends here: /dev/full", 0), 0U);
+    EXPECT_EQ(_log.lines()[0].second,
+              "The recording ends here: " + recorded.string() + " cannot be written: File too large");
 }

@@ -1,11 +1,10 @@
 #include "platform/host/Capture.h"
 
 #include <gtest/gtest.h>
-#include <sys/resource.h>
 
-#include <csignal>
 
 #include "platform/MessagePorts.h"
+#include "tests/support/FileSizeLimit.h"
 #include "tests/support/TemporaryDirectory.h"
 
 namespace kelvo {
@@ -206,13 +205,10 @@ TEST_F(Capture, KeepsThePacketsBeforeTheOneThatDidNotFit) {
     EXPECT_FALSE(writer->append(CaptureTime(1s), Bytes{1, 2, 3}));
     const std::string before = contentsOf(path());
 
-    std::signal(SIGXFSZ, SIG_IGN);
-    rlimit limit{};
-    getrlimit(RLIMIT_FSIZE, &limit);
-    const rlimit small{before.size() + 20, limit.rlim_max};
-    setrlimit(RLIMIT_FSIZE, &small);
-    const auto failure = writer->append(CaptureTime(2s), Bytes(100));
-    setrlimit(RLIMIT_FSIZE, &limit);
+    const auto failure = [&] {
+        const test::FileSizeLimit full(before.size() + 20);
+        return writer->append(CaptureTime(2s), Bytes(100));
+    }();
 
     ASSERT_TRUE(failure);
     EXPECT_EQ(failure->reason, path() + " cannot be written: File too large");

@@ -1,0 +1,149 @@
+#include "telephony/simulation/ExtendedRecords.h"
+
+#include <cstdio>
+#include <string_view>
+
+#include "platform/TelephonyConstants.h"
+#include "telephony/simulation/RecordWriter.h"
+
+namespace kelvo::simulation {
+namespace {
+
+struct SimFile {
+    std::string_view key;
+    std::string SimFiles::*text;
+};
+struct CellValue {
+    std::string_view key;
+    std::optional<int> MonitoredCell::*number;
+};
+struct ContextText {
+    std::string_view key;
+    std::string PdpContext::*text;
+};
+
+// clang-format off
+constexpr SimFile kSimFiles[] = {
+    { "kSimFile_ICCID",    &SimFiles::iccid    },
+    { "kSimFile_MSISDN",   &SimFiles::msisdn   },
+    { "kSimFile_MBDN",     &SimFiles::mbdn     },
+    { "kSimFile_HPPLMN",   &SimFiles::hpplmn   },
+    { "kSimFile_LOCI",     &SimFiles::loci     },
+    { "kSimFile_PSLOCI",   &SimFiles::psloci   },
+    { "kSimFile_ACC",      &SimFiles::acc      },
+    { "kSimFile_AD",       &SimFiles::ad       },
+    { "kSimFile_FPLMN",    &SimFiles::fplmn    },
+    { "kSimFile_AHPLMN",   &SimFiles::ahplmn   },
+    { "kSimFile_RATMODE",  &SimFiles::ratMode  },
+    { "kSimFile_PNN",      &SimFiles::pnn      },
+    { "kSimFile_OPL",      &SimFiles::opl      },
+    { "kSimFile_OPLMNAcT", &SimFiles::oplmnAct },
+};
+
+constexpr CellValue kCellValues[] = {
+    { kPLCellMonitorMCC,      &MonitoredCell::mcc      },
+    { kPLCellMonitorMNC,      &MonitoredCell::mnc      },
+    { kPLCellMonitorLAC,      &MonitoredCell::lac      },
+    { kPLCellMonitorTAC,      &MonitoredCell::tac      },
+    { kPLCellMonitorCellId,   &MonitoredCell::cellId   },
+    { kPLCellMonitorPID,      &MonitoredCell::pid      },
+    { kPLCellMonitorARFCN,    &MonitoredCell::arfcn    },
+    { kPLCellMonitorUARFCN,   &MonitoredCell::uarfcn   },
+    { kPLCellMonitorSCN,      &MonitoredCell::scn      },
+    { kPLCellMonitorBandInfo, &MonitoredCell::bandInfo },
+    { kPLCellMonitorRSSI,     &MonitoredCell::rssi     },
+    { kPLCellMonitorRSCP,     &MonitoredCell::rscp     },
+    { kPLCellMonitorECN0,     &MonitoredCell::ecn0     },
+};
+
+constexpr ContextText kContextTexts[] = {
+    { "APN",                &PdpContext::apn     },
+    { "PDP Type",           &PdpContext::type    },
+    { "State",              &PdpContext::state   },
+    { "PDP Address",        &PdpContext::address },
+    { "Quality of Service", &PdpContext::qos     },
+};
+// clang-format on
+
+std::string_view nameOf(MonitoredCell::Technology technology) {
+    switch (technology) {
+        case MonitoredCell::Technology::GSM: return kPLCellMonitorRadioAccessTechnologyGSM;
+        case MonitoredCell::Technology::UMTS: return kPLCellMonitorRadioAccessTechnologyUMTS;
+        case MonitoredCell::Technology::UTRAN2: return kPLCellMonitorRadioAccessTechnologyUTRAN2;
+        case MonitoredCell::Technology::LTE: break;
+    }
+    return kPLCellMonitorRadioAccessTechnologyLTE;
+}
+
+Value dictionaryOf(const MonitoredCell& cell) {
+    const auto dictionary = Dictionary::make({
+        {kPLCellMonitorCellRadioAccessTechnology, nameOf(cell.technology)},
+        {kPLCellMonitorCellType, cell.isServing ? kPLCellMonitorCellTypeServing : kPLCellMonitorCellTypeNeighbor},
+    });
+    for (const auto& [key, number] : kCellValues) {
+        if (cell.*number) dictionary->set(key, *(cell.*number));
+    }
+    return dictionary;
+}
+
+Value dictionaryOf(const PdpContext& context) {
+    const auto dictionary = Dictionary::make({{"Context ID", std::to_string(context.id)}});
+    for (const auto& [key, text] : kContextTexts) {
+        if (!(context.*text).empty()) dictionary->set(key, context.*text);
+    }
+    return dictionary;
+}
+
+template <class Entry>
+Bytes arrayRecord(std::uint32_t code, std::span<const Entry> entries, Time time) {
+    const auto array = Array::make();
+    for (const Entry& entry : entries) array->append(dictionaryOf(entry));
+    return propertyListRecord(code, time, array);
+}
+
+std::string hexadecimal(int value, int digits) {
+    char text[12];
+    std::snprintf(text, sizeof text, "%0*X", digits, static_cast<unsigned>(value));
+    return text;
+}
+
+}  // namespace
+
+SimFiles testNetworkSim(int locationAreaCode, int routingAreaCode) {
+    const std::string plmn = "00F110";  // 001 01, digits swapped and filled as in 3GPP TS 24.008, 10.5.1.3
+    const std::string area = plmn + hexadecimal(locationAreaCode, 4);
+    return {
+        .iccid = "8900101000000123456",
+        .msisdn = "+0015550123",
+        .mbdn = "+0015550100",
+        .hpplmn = "05",
+        .loci = "3A9C41D7" + area + "FF00",  // TMSI, area, "updated"
+        .psloci = "C41B7E02A95D13" + area + hexadecimal(routingAreaCode, 2) + "00",
+        .acc = "0008",
+        .ad = "00000102",  // normal operation; MNC of 2 digits
+        .fplmn = "00F120FFFFFFFFFFFFFFFFFF",
+        .ahplmn = plmn,
+        .ratMode = "00",
+        .pnn = "Test Network",
+        .opl = plmn + "0000FFFE01",  // every area: the first name
+        .oplmnAct = plmn + "C080",   // UTRAN, E-UTRAN and GSM
+    };
+}
+
+Bytes simFilesRecord(const SimFiles& files, Time time) {
+    const auto dictionary = Dictionary::make();
+    for (const auto& [key, text] : kSimFiles) {
+        if (!(files.*text).empty()) dictionary->set(key, files.*text);
+    }
+    return propertyListRecord(0xff0000, time, dictionary);
+}
+
+Bytes cellInformationRecord(std::span<const MonitoredCell> cells, Time time) {
+    return arrayRecord(0xff0001, cells, time);
+}
+
+Bytes pdpContextsRecord(std::span<const PdpContext> contexts, Time time) {
+    return arrayRecord(0xff0002, contexts, time);
+}
+
+}  // namespace kelvo::simulation

@@ -1,0 +1,31 @@
+#pragma once
+
+#include <span>
+
+#include "platform/Bytes.h"
+#include "telephony/simulation/gsm/Registration.h"
+
+namespace kelvo::simulation::gsm {
+
+/// The network as its serving cell broadcasts it, and what the phone has of it.
+struct ServingNetwork {
+    Area area = {};
+    ServiceType service = ServiceType::None;
+    int operationMode = 0;  ///< 0 is mode I
+    bool operator==(const ServingNetwork&) const = default;
+};
+
+struct Plmn {
+    int mcc = 0;
+    int mnc = 0;
+    bool operator==(const Plmn&) const = default;
+};
+
+Bytes packetStateRecord(const Mobility& mobility, Time time);          // 0x7130
+Bytes circuitStateRecord(const Mobility& mobility, Time time);         // 0x7131
+Bytes registrationRecord(const Mobility& mobility, Time time);         // 0x7132
+Bytes servingNetworkRecord(const ServingNetwork& network, Time time);  // 0x7135
+/// At most one: the entries of more would lie over one another. 0x7150
+Bytes equivalentPlmnsRecord(std::span<const Plmn> plmns, Time time);
+
+}  // namespace kelvo::simulation::gsm

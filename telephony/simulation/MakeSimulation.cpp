@@ -1,11 +1,17 @@
 #include "telephony/simulation/MakeSimulation.h"
 
+#include "telephony/simulation/CdmaSimulation.h"
+#include "telephony/simulation/GsmSimulation.h"
 #include "telephony/simulation/LteSimulation.h"
 
 namespace kelvo::simulation {
 
-std::unique_ptr<Simulation> makeSimulation(Technology, std::uint64_t seed) {
-    return std::make_unique<LteSimulation>(seed);
+std::unique_ptr<Simulation> makeSimulation(Technology technology, std::uint64_t seed) {
+    switch (technology) {
+        case Technology::GSM: return std::make_unique<GsmSimulation>(seed);
+        case Technology::CDMA: return std::make_unique<CdmaSimulation>(seed);
+        default: return std::make_unique<LteSimulation>(seed);
+    }
 }
 
 }  // namespace kelvo::simulation

@@ -1,0 +1,121 @@
+#include "telephony/simulation/CDMA/EvdoModem.h"
+
+#include <algorithm>
+#include <utility>
+
+namespace kelvo::simulation {
+namespace {
+
+using namespace std::chrono_literals;
+
+// Pilot bursts go out with all of a sector's power. The carrier lies higher than the one that the drive was built for.
+const CdmaLoading kLoading{
+    .gain = pathLoss(1000, kOneXCarrier.downlinkMHz) - pathLoss(1000, kEvdoCarrier.downlinkMHz), .pilot = 1, .all = 1};
+constexpr double kTurnaround = -76;      // dB: mean output power is this less the input
+constexpr double kMostPower = 23;        // dBm
+constexpr double kLeastPower = -50;      // dBm
+constexpr double kSecondAntenna = -2.5;  // dB
+constexpr double kReadingNoise = 0.4;    // dB
+constexpr double kBestPilot = 0.97;      // of all that is received: echoes of the own sector disturb too
+constexpr std::size_t kFingers = 6;
+constexpr double kStrongestPath = 20;                        // dB: what a finger can tell
+constexpr double kFingerLock = -12;                          // dB; a weaker path has no finger
+constexpr std::array<double, 3> kEchoes{-1.0, -7.5, -14.0};  // dB: the paths of a pilot
+
+double carrierToInterference(double strength) {
+    const double part = std::min(toMilliwatts(strength), kBestPilot);
+    return toDecibels(part / (1 - part));
+}
+
+}  // namespace
+
+EvdoModem::EvdoModem(const CdmaNetwork& network, Random random)
+    : _network(network), _random(std::move(random)), _link(_random.split()) {}
+
+void EvdoModem::measure(const Drive& drive, Time duration, double demand) {
+    _air = listen(drive, kLoading, _random);
+    _status.rx0 = _air.total + kReadingNoise * _random.normal();
+    _status.rx1 = _air.total + kSecondAntenna + kReadingNoise * _random.normal();
+    const double closedLoop = kReadingNoise * 2 * _random.normal();
+    _status.tx = std::clamp(kTurnaround - _status.rx0 + closedLoop, kLeastPower, kMostPower);
+    readPilots();
+    placeFingers();
+    if (_status.state != EvdoState::Connected || _status.session != SessionState::Open) return;
+    _link.receive(carrierToInterference(_air.pilots[_pilots.reference()]), demand, duration);
+    _link.send(kMostPower - _status.tx, demand, duration);
+}
+
+void EvdoModem::step(Time now, bool available, bool browse) {
+    if (!available) {
+        begin(EvdoState::Inactive, now, 0ms);
+        _pilots.clear();
+    } else if (now >= _until) {
+        advance(now, browse);
+    }
+    if (_status.state == EvdoState::Connected) _pilots.update(_air, now);
+    const std::vector<std::size_t> before = std::exchange(_followed, _pilots.sectors());
+    readPilots();
+    if (_followed != before) placeFingers();
+}
+
+void EvdoModem::advance(Time now, bool browse) {
+    switch (_status.state) {
+        case EvdoState::Inactive: return begin(EvdoState::Acquisition, now, 400ms);
+        case EvdoState::Acquisition: _pilots.follow(_air.strongest()); return begin(EvdoState::Sync, now, 200ms);
+        case EvdoState::Sync: return begin(EvdoState::Idle, now, 100ms);
+        case EvdoState::Idle: return idle(now, browse);
+        case EvdoState::Access:
+            if (_status.session != SessionState::Open) setUpAddress();
+            return begin(EvdoState::Connected, now, 800ms);
+        case EvdoState::Connected:
+            _status.session = SessionState::Open;
+            if (browse) return;
+            _pilots.follow(_pilots.reference());
+            return begin(EvdoState::Idle, now, 0ms);
+    }
+}
+
+void EvdoModem::begin(EvdoState state, Time now, Time duration) {
+    _status.state = state;
+    _until = now + duration;
+}
+
+void EvdoModem::idle(Time now, bool browse) {
+    _pilots.reselect(_air, now);
+    const bool moved = static_cast<int>(_network.sectors[_pilots.reference()].zone) != _sessionZone;
+    if (moved || _status.session != SessionState::Open) _status.session = SessionState::AddressSetup;
+    if (browse || _status.session != SessionState::Open) begin(EvdoState::Access, now, 400ms);
+}
+
+/// The subnet gives a new address; a session that is new to all is negotiated by the phone, one that moved in by the
+/// network.
+void EvdoModem::setUpAddress() {
+    _status.session = _sessionZone < 0 ? SessionState::PhoneNegotiates : SessionState::NetworkNegotiates;
+    const std::size_t zone = _network.sectors[_pilots.reference()].zone;
+    _sessionZone = static_cast<int>(zone);
+    _status.colorCode = kCdmaZones[zone].colorCode;
+    _status.uati = static_cast<std::uint32_t>(_random.between(0, 0xFFFFFF));
+}
+
+void EvdoModem::readPilots() {
+    _status.active = _pilots.readings(_air, _network);
+    _status.servingPn = _pilots.empty() ? EvdoStatus::kNoPn : _network.sectors[_pilots.reference()].pn;
+}
+
+void EvdoModem::placeFingers() {
+    _status.fingers.clear();
+    for (const double echo : kEchoes) {
+        for (const PilotReading& pilot : _status.active) {
+            const double path = carrierToInterference(pilot.strength) + echo + rayleighFading(_random);
+            if (path < kFingerLock) {
+                _status.fingers.emplace_back();
+            } else {
+                _status.fingers.push_back({pilot.pn, std::min(path, kStrongestPath)});
+            }
+        }
+    }
+    if (_status.fingers.size() > kFingers) _status.fingers.resize(kFingers);
+    while (!_status.fingers.empty() && _status.fingers.back().pn == Finger::kFree) _status.fingers.pop_back();
+}
+
+}  // namespace kelvo::simulation

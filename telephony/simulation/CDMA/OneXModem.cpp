@@ -1,0 +1,116 @@
+#include "telephony/simulation/CDMA/OneXModem.h"
+
+#include <algorithm>
+#include <cmath>
+
+namespace kelvo::simulation {
+namespace {
+
+using namespace std::chrono_literals;
+
+constexpr CdmaLoading kLoading{.gain = 0, .pilot = 0.2, .all = 0.65};
+constexpr Time kSlotCycle = 2560ms;  // SLOT_CYCLE_INDEX 1
+constexpr Time kAwake = 480ms;       // of each cycle, for the paging slot and a look at the neighbours
+constexpr Time kOverhead = 300ms;
+constexpr Time kRegistration = 1200ms;
+constexpr Time kAccess = 600ms;
+constexpr double kTurnaround = -73;  // dB: mean output power is this less the input (3GPP2 C.S0011)
+constexpr double kMostPower = 24;    // dBm
+constexpr double kLeastPower = -50;
+constexpr double kSecondAntenna = -1.5;  // dB
+constexpr double kReadingNoise = 0.4;    // dB
+
+/// Frames lost by what all active pilots together are received with, in dB: power control holds 1 % until it cannot.
+double frameErrors(double strength) { return 0.01 + 0.6 / (1 + std::exp(strength + 13)); }
+
+}  // namespace
+
+OneXModem::OneXModem(const CdmaNetwork& network, Random random) : _network(network), _random(std::move(random)) {}
+
+bool OneXModem::isIdle() const {
+    return _status.state == OneXState::Sleep || (_status.state == OneXState::Paging && _task != Task::Access);
+}
+
+void OneXModem::measure(const Drive& drive) {
+    _air = listen(drive, kLoading, _random);
+    _status.rx0 = _air.total + kReadingNoise * _random.normal();
+    _status.rx1 = _air.total + kSecondAntenna + kReadingNoise * _random.normal();
+    const double closedLoop = kReadingNoise * 2 * _random.normal();
+    _status.tx = std::clamp(kTurnaround - _status.rx0 + closedLoop, kLeastPower, kMostPower);
+    readPilots();
+}
+
+void OneXModem::step(Time now, bool talk) {
+    if (_status.state == OneXState::Traffic) {
+        if (talk) {
+            _pilots.update(_air, now);
+        } else {
+            begin(OneXState::Initial, now, 100ms);
+            _pilots.clear();
+        }
+    } else if (now >= _until) {
+        if (isIdle() || _task == Task::Access) {
+            finishTask();
+            idle(now, talk);
+        } else {
+            powerUp(now);
+        }
+    }
+    readPilots();
+}
+
+void OneXModem::receiveFrame() {
+    double together = 0;
+    for (const PilotReading& pilot : _status.active) together += toMilliwatts(pilot.strength);
+    _status.frameErased = _random.chance(frameErrors(toDecibels(together)));
+}
+
+void OneXModem::begin(OneXState state, Time now, Time duration) {
+    _status.state = state;
+    _until = now + duration;
+}
+
+void OneXModem::begin(Task task, Time now, Time duration) {
+    _task = task;
+    begin(OneXState::Paging, now, duration);
+}
+
+void OneXModem::powerUp(Time now) {
+    switch (_status.state) {
+        case OneXState::Powerup: return begin(OneXState::Initial, now, 100ms);
+        case OneXState::Initial: return begin(OneXState::Acquisition, now, 200ms);
+        case OneXState::Acquisition: _pilots.follow(_air.strongest()); return begin(OneXState::Sync, now, 100ms);
+        case OneXState::Sync: return begin(OneXState::Slew, now, 60ms);
+        default: return begin(Task::Overhead, now, kOverhead);
+    }
+}
+
+void OneXModem::finishTask() {
+    switch (_task) {
+        case Task::None: break;
+        case Task::Overhead: _system = _network.systemOf(_pilots.reference()); break;
+        case Task::Registration:
+            _registeredZone = static_cast<int>(_network.sectors[_pilots.reference()].zone);
+            ++_registrations;
+            break;
+        case Task::Access: _status.state = OneXState::Traffic; break;
+    }
+    _task = Task::None;
+}
+
+void OneXModem::idle(Time now, bool talk) {
+    if (_status.state == OneXState::Traffic) return;
+    const CdmaSector& sector = _network.sectors[_pilots.reference()];
+    if (static_cast<int>(sector.zone) != _registeredZone) return begin(Task::Registration, now, kRegistration);
+    if (talk) return begin(Task::Access, now, kAccess);
+    const bool awake = now % kSlotCycle < kAwake;
+    _status.state = awake ? OneXState::Paging : OneXState::Sleep;
+    if (awake && _pilots.reselect(_air, now)) begin(Task::Overhead, now, kOverhead);
+}
+
+void OneXModem::readPilots() {
+    _status.active = _pilots.readings(_air, _network);
+    _status.referencePn = _pilots.empty() ? 0 : _network.sectors[_pilots.reference()].pn;
+}
+
+}  // namespace kelvo::simulation

@@ -1,0 +1,49 @@
+#pragma once
+
+#include "telephony/simulation/CDMA/PilotSet.h"
+
+namespace kelvo::simulation {
+
+/// The 1x half of the modem: finds the system, sleeps between its paging slots, hands off, registers, talks.
+class OneXModem {
+public:
+    OneXModem(const CdmaNetwork& network, Random random);
+
+    /// Reads the air; all of the status but its state is as read last.
+    void measure(const Drive& drive);
+    /// Moves on; `talk` while the user wants a call.
+    void step(Time now, bool talk);
+    /// The next traffic frame of 20 ms comes.
+    void receiveFrame();
+
+    const OneXStatus& status() const { return _status; }
+    /// Of the last sector whose overhead messages have been read.
+    const CdmaSystem& system() const { return _system; }
+    int registrations() const { return _registrations; }
+    /// The receiver is free for EV-DO.
+    bool isIdle() const;
+
+private:
+    /// What keeps an idle phone from sleeping.
+    enum class Task { None, Overhead, Registration, Access };
+
+    void begin(OneXState state, Time now, Time duration);
+    void begin(Task task, Time now, Time duration);
+    void powerUp(Time now);
+    void finishTask();
+    void idle(Time now, bool talk);
+    void readPilots();
+
+    const CdmaNetwork& _network;
+    Random _random;
+    CdmaAir _air;
+    PilotSet _pilots{kOneXRules};
+    OneXStatus _status;
+    CdmaSystem _system;
+    Task _task = Task::None;
+    Time _until = std::chrono::milliseconds(100);
+    int _registeredZone = -1;
+    int _registrations = 0;
+};
+
+}  // namespace kelvo::simulation

@@ -1,0 +1,88 @@
+#include "telephony/simulation/CdmaSimulation.h"
+
+#include <utility>
+#include <vector>
+
+#include "telephony/simulation/CDMA/CdmaRecords.h"
+
+namespace kelvo::simulation {
+namespace {
+
+using namespace std::chrono_literals;
+
+constexpr double kDriveRadius = 2000;  // metres
+constexpr Time kMeasurement = 100ms;
+
+/// True when `value` is not what was told last; tells it.
+template <class T>
+bool isNews(T& told, const T& value) {
+    return std::exchange(told, value) != value;
+}
+
+/// Who is in an active set, the one that is followed first.
+std::vector<int> members(int followed, const std::vector<PilotReading>& active) {
+    std::vector<int> members{followed};
+    for (const PilotReading& pilot : active) members.push_back(pilot.pn);
+    return members;
+}
+
+}  // namespace
+
+CdmaSimulation::CdmaSimulation(std::uint64_t seed) : CdmaSimulation(Random(seed)) {}
+
+CdmaSimulation::CdmaSimulation(Random random)
+    : _network(buildCdmaNetwork(random)),
+      _drive(_network.radio, Journey::through(kDriveRadius, random), random.split()),
+      _user(random.split()),
+      _oneX(_network, random.split()),
+      _evdo(_network, random.split()) {}
+
+void CdmaSimulation::step() {
+    const PhoneUser::Activity activity = _user.at(now());
+    if (isDue(kMeasurement)) {
+        _drive.moveTo(now());
+        _oneX.measure(_drive);
+        _evdo.measure(_drive, kMeasurement, _user.demand());
+    }
+    _oneX.step(now(), activity == PhoneUser::Activity::Talking);
+    _evdo.step(now(), _oneX.isIdle(), activity == PhoneUser::Activity::Browsing);
+    reportOneX();
+    reportEvdo();
+    reportPackets();
+}
+
+void CdmaSimulation::reportOneX() {
+    const OneXStatus& status = _oneX.status();
+    const bool traffic = status.state == OneXState::Traffic;
+    const bool moved = isNews(_toldOneXPilots, members(status.referencePn, status.active));
+    const bool changed = isNews(_toldOneX, status.state) || moved;
+    // An idle phone measures when it wakes, which is a change.
+    if (changed || (traffic && isDue(500ms))) emit(oneXStatusRecord(now(), status));
+    if (isNews(_toldSystem, _oneX.system()) || isDue(30s)) emit(systemRecord(now(), _oneX.system()));
+    if (traffic) _oneX.receiveFrame();
+    if (traffic && isDue(100ms)) emit(trafficFrameRecord(now(), status.frameErased));  // the log has each fifth
+}
+
+void CdmaSimulation::reportEvdo() {
+    const EvdoStatus& status = _evdo.status();
+    const bool connected = status.state == EvdoState::Connected;
+    const bool moved = isNews(_toldEvdoPilots, members(status.servingPn, status.active));
+    const bool negotiated = isNews(_toldSession, status.session);
+    const bool changed = isNews(_toldEvdo, status.state) || moved || negotiated;
+    if (changed || isDue(connected ? 1s : 2s, 200ms)) emit(evdoStatusRecord(now(), status));
+    const bool on = status.state != EvdoState::Inactive;
+    if (changed || (on && isDue(connected ? 500ms : 2s, 400ms))) emit(evdoPilotsRecord(now(), status.active));
+    if (changed || (on && isDue(connected ? 500ms : 2s, 300ms))) emit(fingersRecord(now(), status.fingers));
+}
+
+/// The first two records make the first rate; after that a link at rest is told of seldom.
+void CdmaSimulation::reportPackets() {
+    const PacketCounters& counters = _evdo.counters();
+    const bool first = now() == 500ms || now() == 1500ms;
+    const bool forward = isDue(2s, 500ms) && isNews(_toldForward, counters.forwardBits);
+    if (first || forward || isDue(10s, 500ms)) emit(forwardPacketsRecord(now(), counters));
+    const bool reverse = isDue(5s, 500ms) && isNews(_toldReverse, counters.reverseBits);
+    if (first || reverse || isDue(30s, 500ms)) emit(reversePacketsRecord(now(), counters));
+}
+
+}  // namespace kelvo::simulation

@@ -1,0 +1,244 @@
+#include "telephony/simulation/CdmaSimulation.h"
+
+#include <gtest/gtest.h>
+
+#include <algorithm>
+#include <map>
+#include <set>
+
+using namespace kelvo;
+using namespace kelvo::simulation;
+using namespace std::chrono_literals;
+
+namespace {
+
+std::uint32_t codeOf(const Bytes& message) { return message.at(5) | message.at(6) << 8U; }
+
+std::vector<Bytes> minuteOf(std::uint64_t seed) {
+    CdmaSimulation modem(seed);
+    std::vector<Bytes> messages;
+    for (auto message = modem.next(); message.time < 1min; message = modem.next()) messages.push_back(message.bytes);
+    return messages;
+}
+
+bool holds(const std::vector<PilotReading>& active, int pn) {
+    return std::ranges::find(active, pn, &PilotReading::pn) != active.end();
+}
+
+}  // namespace
+
+TEST(CdmaSimulation, GivesTheSameBytesForTheSameSeed) {
+    EXPECT_EQ(minuteOf(1), minuteOf(1));
+    EXPECT_NE(minuteOf(1), minuteOf(2));
+}
+
+TEST(CdmaSimulation, SendsEveryRecordAskedForAtItsRate) {
+    CdmaSimulation modem(1);
+    std::map<std::uint32_t, int> counts;
+    std::size_t bytes = 0;
+    for (auto message = modem.next(); message.time < 10min; message = modem.next()) {
+        ++counts[codeOf(message.bytes)];
+        bytes += message.bytes.size();
+    }
+    const std::map<std::uint32_t, std::pair<int, int>> expected{
+        {0x108A, {450, 1500}}, {0x1183, {400, 1000}}, {0x1192, {100, 300}}, {0x12B6, {450, 1500}},
+        {0x119C, {600, 1500}}, {0x119D, {900, 3000}}, {0x127E, {40, 120}},  {0x134F, {25, 100}},
+    };
+    for (const auto& [code, range] : expected) {
+        EXPECT_GE(counts[code], range.first) << std::hex << code;
+        EXPECT_LE(counts[code], range.second) << std::hex << code;
+    }
+    EXPECT_EQ(counts.size(), expected.size());
+    EXPECT_LT(bytes / 600, 1000U);  // a second
+}
+
+TEST(CdmaSimulation, HandsOffOnlyToPilotsOfTheActiveSetDuringACall) {
+    CdmaSimulation modem(1);
+    std::vector<PilotReading> before;
+    int reference = -1;
+    int handoffs = 0;
+    std::size_t most = 0;
+    for (auto message = modem.next(); message.time < 5min; message = modem.next()) {
+        const OneXStatus& status = modem.oneX().status();
+        if (status.state != OneXState::Traffic) {
+            reference = -1;
+        } else if (codeOf(message.bytes) == 0x119C) {
+            if (reference >= 0 && status.referencePn != reference) {
+                ++handoffs;
+                EXPECT_TRUE(holds(before, status.referencePn)) << status.referencePn;
+            }
+            EXPECT_TRUE(holds(status.active, status.referencePn));
+            reference = status.referencePn;
+            before = status.active;
+            most = std::max(most, status.active.size());
+        }
+    }
+    EXPECT_GE(handoffs, 3);
+    EXPECT_GE(most, 3U);
+}
+
+TEST(CdmaSimulation, MovesToClearlyStrongerPilotsWhenIdle) {
+    CdmaSimulation modem(1);
+    std::set<int> followed;
+    for (auto message = modem.next(); message.time < 3min; message = modem.next()) {
+        const OneXStatus& status = modem.oneX().status();
+        if (status.active.empty()) continue;
+        EXPECT_TRUE(status.state == OneXState::Traffic || status.active.size() == 1);
+        followed.insert(status.referencePn);
+    }
+    EXPECT_GE(followed.size(), 4U);
+}
+
+TEST(CdmaSimulation, RegistersWheneverTheSystemOrNetworkChanges) {
+    CdmaSimulation modem(3);
+    std::pair<int, int> area{0, 0};
+    int changes = 0;
+    int registrationsThen = 0;
+    Time changedAt{0};
+    for (auto message = modem.next(); message.time < 10min; message = modem.next()) {
+        const CdmaSystem& system = modem.oneX().system();
+        if (std::pair(system.sid, system.nid) != area) {
+            area = {system.sid, system.nid};
+            ++changes;
+            registrationsThen = modem.oneX().registrations();
+            changedAt = message.time;
+            EXPECT_EQ(modem.oneX().status().state, OneXState::Paging);  // awake for it
+        } else if (message.time > changedAt + 1300ms) {
+            EXPECT_EQ(modem.oneX().registrations(), registrationsThen + 1 - (changes == 0 ? 1 : 0));
+        }
+    }
+    EXPECT_GE(changes, 3);
+}
+
+TEST(CdmaSimulation, KeepsAnEvdoAddressOfTheSubnetItIsIn) {
+    CdmaSimulation modem(3);
+    std::map<int, std::set<std::uint32_t>> addresses;  // by colour code
+    Time settled{0};
+    for (auto message = modem.next(); message.time < 10min; message = modem.next()) {
+        const EvdoStatus& status = modem.evdo().status();
+        if (status.state != EvdoState::Idle || status.session != SessionState::Open) settled = message.time + 400ms;
+        if (message.time <= settled) continue;
+        const auto& sectors = modem.network().sectors;
+        const auto serving = std::ranges::find(sectors, status.servingPn, &CdmaSector::pn);
+        ASSERT_NE(serving, sectors.end());
+        EXPECT_EQ(status.colorCode, kCdmaZones[serving->zone].colorCode);
+        addresses[status.colorCode].insert(status.uati);
+    }
+    EXPECT_GE(addresses.size(), 2U);
+}
+
+TEST(CdmaSimulation, LeavesEvdoDuringCallsAndReturnsToIt) {
+    CdmaSimulation modem(1);
+    int calls = 0;
+    int connections = 0;
+    bool talked = false;
+    bool connected = false;
+    for (auto message = modem.next(); message.time < 5min; message = modem.next()) {
+        const bool talks = modem.oneX().status().state == OneXState::Traffic;
+        const EvdoStatus& evdo = modem.evdo().status();
+        if (talks) {
+            EXPECT_EQ(evdo.state, EvdoState::Inactive);
+            EXPECT_TRUE(evdo.active.empty() && evdo.fingers.empty());
+        }
+        calls += talks && !talked;
+        connections += evdo.state == EvdoState::Connected && !connected;
+        talked = talks;
+        connected = evdo.state == EvdoState::Connected;
+    }
+    EXPECT_GE(calls, 3);
+    EXPECT_GE(connections, 6);
+}
+
+TEST(CdmaSimulation, ReadsASteadyLevelWhileThePhoneStands) {
+    CdmaSimulation modem(1);
+    double driven = -1;
+    double least = 0;
+    double most = 0;
+    Time since{0};
+    int stops = 0;
+    for (auto message = modem.next(); message.time < 5min; message = modem.next()) {
+        const double level = modem.oneX().status().rx0;
+        if (modem.drive().driven() != driven) {
+            stops += message.time - since > 4s;
+            driven = modem.drive().driven();
+            since = message.time;
+            least = most = level;
+        }
+        least = std::min(least, level);
+        most = std::max(most, level);
+        EXPECT_LT(most - least, 4);  // the receiver's own noise
+    }
+    EXPECT_GE(stops, 1);
+}
+
+TEST(CdmaSimulation, GivesNoTwoSectorsOnePilotOffset) {
+    CdmaSimulation modem(5);
+    std::set<int> offsets;
+    for (const CdmaSector& sector : modem.network().sectors) {
+        EXPECT_TRUE(offsets.insert(sector.pn).second);
+        EXPECT_TRUE(sector.pn >= 0 && sector.pn < 512);
+    }
+}
+
+namespace {
+
+CdmaAir air(std::vector<double> pilots) { return {std::move(pilots), -70}; }
+
+}  // namespace
+
+TEST(PilotSet, AddsAPilotAboveTheAddThresholdAndDropsItAfterItsTimer) {
+    PilotSet pilots({.add = -14, .drop = -16, .dropTime = 4s, .compare = 2.5});
+    pilots.follow(0);
+    pilots.update(air({-6, -14.5}), 0s);
+    EXPECT_EQ(pilots.sectors(), (std::vector<std::size_t>{0}));
+    pilots.update(air({-6, -13.5}), 1s);
+    EXPECT_EQ(pilots.sectors(), (std::vector<std::size_t>{0, 1}));
+    pilots.update(air({-6, -17}), 2s);
+    pilots.update(air({-6, -15}), 5s);  // above the drop threshold: the timer ends
+    pilots.update(air({-6, -17}), 6s);
+    pilots.update(air({-6, -17}), 9s);
+    EXPECT_EQ(pilots.sectors().size(), 2U);
+    pilots.update(air({-6, -17}), 10s);
+    EXPECT_EQ(pilots.sectors(), (std::vector<std::size_t>{0}));
+}
+
+TEST(PilotSet, FollowsAMemberThatIsClearlyStronger) {
+    PilotSet pilots(kOneXRules);
+    pilots.follow(0);
+    pilots.update(air({-8, -7}), 0s);
+    pilots.update(air({-8, -7}), 1s);
+    EXPECT_EQ(pilots.reference(), 0U);
+    pilots.update(air({-11, -7}), 2s);
+    EXPECT_EQ(pilots.reference(), 1U);
+}
+
+TEST(PilotSet, ReplacesTheWeakestOfSixByOneThatBeatsIt) {
+    PilotSet pilots(kOneXRules);
+    pilots.follow(0);
+    pilots.update(air({-9, -10, -10, -10, -10, -12, -20}), 0s);
+    pilots.update(air({-9, -10, -10, -10, -10, -12, -10}), 1s);
+    EXPECT_EQ(pilots.sectors(), (std::vector<std::size_t>{0, 1, 2, 3, 4, 5}));
+    pilots.update(air({-9, -10, -10, -10, -10, -12, -9}), 2s);
+    EXPECT_EQ(pilots.sectors(), (std::vector<std::size_t>{0, 1, 2, 3, 4, 6}));
+}
+
+TEST(PilotSet, LeavesItsPilotWhenIdleForOneThatStaysStrongerOrAtOnceWhenItIsLost) {
+    PilotSet pilots(kOneXRules);
+    pilots.follow(0);
+    EXPECT_FALSE(pilots.reselect(air({-10, -6}), 0s));
+    EXPECT_TRUE(pilots.reselect(air({-10, -6}), 2s));
+    EXPECT_EQ(pilots.reference(), 1U);
+    EXPECT_FALSE(pilots.reselect(air({-10, -12}), 4s));
+    EXPECT_TRUE(pilots.reselect(air({-15, -17}), 6s));
+    EXPECT_EQ(pilots.reference(), 0U);
+}
+
+TEST(PacketLink, ReceivesMoreOnABetterLink) {
+    PacketLink poor{Random(1)};
+    PacketLink good{Random(1)};
+    poor.receive(-10, 1, 10s);
+    good.receive(10, 1, 10s);
+    // 76.8 and 2457.6 kbit/s, less what is lost or sent in small packets.
+    EXPECT_NEAR(static_cast<double>(poor.counters().forwardBits), 700e3, 70e3);
+    EXPECT_NEAR(static_cast<double>(good.counters().forwardBits), 24.3e6, 1e6);
+}

@@ -18,6 +18,29 @@ using test::runUntil;
 
 namespace {
 
+// A client that has a log channel, and reads what comes.
+struct Client {
+    Client(HostMessagePorts& ports, PLServerConnection& connection) {
+        local = ports
+                    .createLocal("client",
+                                 [this](std::int32_t, ByteView data) {
+                                     records.emplace_back(textOf(data));
+                                     return Bytes{};
+                                 })
+                    .port;
+        local->schedule();
+        remote = ports.openRemote(PLServerConnectionNetworkMonitorCreateLogChannel(connection, "client").portName);
+    }
+    void stream() const {
+        const auto start = writeXmlPropertyList(Dictionary::make({{"SetState", "Streaming"}}));
+        ASSERT_TRUE(remote->request(0, *start, 1s, std::nullopt));
+    }
+
+    std::vector<std::string> records;
+    std::unique_ptr<LocalPort> local;
+    std::unique_ptr<RemotePort> remote;
+};
+
 class DaemonTest : public testing::Test {
 protected:
     void SetUp() override {
@@ -37,6 +60,12 @@ protected:
         _daemon.setArguments(arguments);
         _daemon.start();
         ASSERT_TRUE(runUntil([&] { return (_connection = _client.createServerConnection({})) != nullptr; }));
+    }
+    void stopDaemon() {
+        _daemon.terminate();
+        ASSERT_TRUE(_daemon.waitForFinished(10'000));
+        EXPECT_EQ(_daemon.exitStatus(), QProcess::NormalExit);
+        EXPECT_EQ(_daemon.exitCode(), 0);
     }
     // Exit status and what stood on standard error.
     std::pair<int, std::string> run(const QStringList& arguments) {
@@ -63,35 +92,40 @@ protected:
 
 TEST_F(DaemonTest, ServesAClientFromFirstToLastWord) {
     startDaemon();
-    std::vector<std::string> records;
-    const auto local = _ports.createLocal("client", [&](std::int32_t, ByteView data) {
-        records.emplace_back(textOf(data));
-        return Bytes{};
-    });
-    local.port->schedule();
-    const PLLogChannel channel = PLServerConnectionNetworkMonitorCreateLogChannel(*_connection, "client");
-    ASSERT_EQ(channel.error.error, 0);
-    const auto remote = _ports.openRemote(channel.portName);
-    ASSERT_TRUE(remote);
+    Client client(_ports, *_connection);
+    ASSERT_TRUE(client.remote);
     const auto query = writeXmlPropertyList(Dictionary::make({{"GetTechnology", "GetTechnology"}}));
-    const auto answer = remote->request(0, *query, 1s, 1s);
+    const auto answer = client.remote->request(0, *query, 1s, 1s);
     ASSERT_TRUE(answer);
     EXPECT_EQ((*readPropertyList(*answer)->dictionary())["GetTechnology"], Value("kPLLogChannelTechnology_IFX"));
-    const auto start = writeXmlPropertyList(Dictionary::make({{"SetState", "Streaming"}}));
-    ASSERT_TRUE(remote->request(0, *start, 1s, std::nullopt));
-    ASSERT_TRUE(runUntil([&] { return records.size() == 3; }));
-    EXPECT_EQ(records, (std::vector<std::string>{"tree 0", "tree 1", "tree 2"}));
-    EXPECT_TRUE(remote->isValid());  // the channel stays after the last packet
+    client.stream();
+    ASSERT_TRUE(runUntil([&] { return client.records.size() == 3; }));
+    EXPECT_EQ(client.records, (std::vector<std::string>{"tree 0", "tree 1", "tree 2"}));
+    EXPECT_TRUE(client.remote->isValid());  // the channel stays after the last packet
 
-    _daemon.terminate();
-    ASSERT_TRUE(_daemon.waitForFinished(10'000));
-    EXPECT_EQ(_daemon.exitStatus(), QProcess::NormalExit);
-    EXPECT_EQ(_daemon.exitCode(), 0);
-    EXPECT_FALSE(remote->isValid());
+    stopDaemon();
+    EXPECT_FALSE(client.remote->isValid());
     std::vector<std::string> files;
     for (const auto& file : std::filesystem::directory_iterator(_directory)) files.push_back(file.path().filename());
     std::sort(files.begin(), files.end());
     EXPECT_EQ(files, (std::vector<std::string>{"client.lock", "client.port"}));
+}
+
+TEST_F(DaemonTest, RecordsWhatItStreams) {
+    const auto recorded = _temporary.path() / "recorded.pcap";
+    startDaemon(
+        {"--replay", QString::fromStdString(_capture), "--speed", "max", "--record", QString::fromStdString(recorded)});
+    Client client(_ports, *_connection);
+    ASSERT_TRUE(client.remote);
+    client.stream();
+    ASSERT_TRUE(runUntil([&] { return client.records.size() == 3; }));
+    stopDaemon();
+    auto capture = CaptureReader::open(recorded);
+    ASSERT_TRUE(capture);
+    EXPECT_EQ(capture->technology(), Technology::IFX);
+    std::vector<std::string> records;
+    while (const auto packet = *capture->next()) records.emplace_back(textOf(packet->bytes));
+    EXPECT_EQ(records, client.records);
 }
 
 TEST_F(DaemonTest, EndsCleanlyOnAnInterrupt) {
@@ -108,8 +142,7 @@ TEST_F(DaemonTest, IsStartedAgainAfterAViolentEnd) {
     ASSERT_TRUE(_daemon.waitForFinished(10'000));
     _connection.reset();
     startDaemon();
-    _daemon.terminate();
-    ASSERT_TRUE(_daemon.waitForFinished(10'000));
+    stopDaemon();
 }
 
 TEST_F(DaemonTest, RefusesToRunTwice) {
@@ -117,8 +150,7 @@ TEST_F(DaemonTest, RefusesToRunTwice) {
     const auto [status, error] = run({"--replay", QString::fromStdString(_capture)});
     EXPECT_EQ(status, 1);
     EXPECT_EQ(error, "kelvo-telephonyd: another telephony service is running\n");
-    _daemon.terminate();
-    ASSERT_TRUE(_daemon.waitForFinished(10'000));
+    stopDaemon();
 }
 
 TEST_F(DaemonTest, TellsItsStatusToWhoeverAsks) {
@@ -135,8 +167,7 @@ TEST_F(DaemonTest, TellsItsStatusToWhoeverAsks) {
               "\n"
               "Clients\n"
               "  none\n");
-    _daemon.terminate();
-    ASSERT_TRUE(_daemon.waitForFinished(10'000));
+    stopDaemon();
 }
 
 TEST_F(DaemonTest, SaysInOneLineWhatIsWrongWithItsCommandLine) {

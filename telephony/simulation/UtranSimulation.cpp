@@ -79,7 +79,7 @@ std::vector<MonitoredCell> UtranSimulation::monitoredCells() const {
 
 std::vector<PdpContext> UtranSimulation::contexts() const {
     std::vector<PdpContext> contexts;
-    for (const std::string apn : _modem.contexts()) {
+    for (const char* apn : _modem.contexts()) {
         const bool isFirst = contexts.empty();
         contexts.push_back({.id = isFirst ? 5 : 6,
                             .apn = apn,

@@ -19,7 +19,7 @@ int areaOf(const Sector& sector) { return kFirstArea + static_cast<int>(bearing(
 std::vector<LteCandidate> othersNear(int site, int sector) {
     using enum LteCandidate::Kind;
     std::vector<LteCandidate> others = {
-        {.kind = Utran, .priority = 4, .channel = 10'713, .code = 8 * (3 * site + sector) + 7},
+        {.kind = Utran, .priority = 4, .channel = 10'713, .code = (5 * (3 * site + sector) + 7) % 512},
         {.kind = Geran,
          .priority = 2,
          .channel = 512 + 9 * site + 3 * sector,

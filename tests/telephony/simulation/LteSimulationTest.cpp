@@ -255,6 +255,14 @@ TEST(LteNetwork, NamesEveryCellByItself) {
         EXPECT_TRUE(between(cell.physicalId, 0, 503));
         physicalIds.insert(cell.physicalId);
         identities.insert(cell.identity);
+        for (const LteCandidate& other : cell.others) {
+            const bool isUtran = other.kind == LteCandidate::Kind::Utran;
+            const bool isGeran = other.kind == LteCandidate::Kind::Geran;
+            // Scrambling codes and pilot offsets go up to 511, base station colours to 63.
+            EXPECT_TRUE(between(other.code, 0, isGeran ? 63 : 511)) << other.code;
+            EXPECT_TRUE(!isUtran || between(other.channel, 10'562, 10'838));  // band I
+            EXPECT_TRUE(!isGeran || between(other.channel, 512, 885));        // DCS 1800
+        }
     }
     EXPECT_EQ(physicalIds.size(), cells.size());
     EXPECT_EQ(identities.size(), cells.size());

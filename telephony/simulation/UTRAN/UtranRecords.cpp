@@ -1,0 +1,97 @@
+#include "telephony/simulation/UTRAN/UtranRecords.h"
+
+#include <algorithm>
+#include <cmath>
+
+#include "telephony/simulation/RecordWriter.h"
+
+namespace kelvo::simulation {
+namespace {
+
+int floorStep(double value, double lowest, double step, int last) {
+    return static_cast<int>(std::clamp(std::floor((value - lowest) / step) + 1, 0.0, static_cast<double>(last)));
+}
+
+}  // namespace
+
+int utranRscpLevel(double dBm) { return floorStep(dBm, -115, 1, 91); }
+
+int utranBlerLevel(double share) {
+    return share > 0 ? std::max(floorStep(std::log10(share), -4.03 - 0.065, 0.065, 63), 1) : 0;
+}
+
+int utranSirLevel(double dB) { return floorStep(dB, -11, 0.5, 63); }
+
+Bytes utranModeRecord(Time time, UtranMode mode) {
+    return RecordWriter(0xD0E0, time, 15)
+        .u8(13, 1)  // the mode is known
+        .u8(14, static_cast<std::uint64_t>(mode))
+        .finish();
+}
+
+Bytes utranServingCellRecord(Time time, const UtranModem& modem) {
+    const UtranCell& cell = modem.serving();
+    return RecordWriter(0xD0E2, time, 26)
+        .u8(14, cell.barredClasses)
+        .u8(15, cell.registrationArea)
+        .u16(17, cell.uarfcn)  // uplink
+        .u16(19, cell.uarfcn)  // downlink
+        .u32(21, cell.identity)
+        .u8(25, modem.isRegistered() ? 0 : 1)  // bit 0: emergency calls only
+        .finish();
+}
+
+Bytes utranCellsRecord(Time time, const UtranModem& modem) {
+    RecordWriter record(0xD00A, time, 168);
+    record.u8(16, modem.measurements().size() << 1);
+    for (const UtranMeasurement& measured : modem.measurements()) {
+        const UtranCell& cell = modem.cells()[measured.cell];
+        const std::size_t at = record.size();                                                      // 16 bytes a cell
+        record.u32(at, static_cast<std::uint32_t>(cell.uarfcn)                                     // bits  0-13
+                           | static_cast<std::uint32_t>(cell.parameterId) << 14                    // bits 14-20
+                           | static_cast<std::uint32_t>(utranRscpLevel(measured.rscp)) << 21       // bits 21-28
+                           | static_cast<std::uint32_t>(measured.set) << 29                        // bits 29-30
+                           | static_cast<std::uint32_t>(measured.isJointlyDetected ? 1 : 0) << 31  // bit  31
+        );
+        record.u32(at + 12, 0);
+    }
+    return record.finish();
+}
+
+Bytes utranGsmCellsRecord(Time time, const UtranModem& modem) {
+    RecordWriter record(0xD00E, time, 17);
+    record.u8(16, modem.gsmMeasurements().size());
+    for (const UtranGsmMeasurement& measured : modem.gsmMeasurements()) {
+        const UtranCell& cell = modem.cells()[measured.cell];
+        const std::size_t at = record.size();  // 8 bytes a cell
+        record
+            .u16(at, cell.gsmIdentity | (measured.isIdentified ? 1 << 15 : 0))  // bits 0-13; bit 14, the band: 1800
+            .u8(at + 2, cell.networkColour)
+            .u8(at + 3, cell.stationColour)
+            .u16(at + 4, cell.gsmChannel)
+            .i16(at + 6, measured.rssi);
+    }
+    return record.finish();
+}
+
+Bytes utranChannelsRecord(Time time, const UtranModem& modem) {
+    const auto& channels = modem.transportChannels();
+    const auto& composites = modem.composites();
+    RecordWriter record(0xD00C, time, 17);
+    record.u16(14, channels.size() << 6 | composites.size() << 12);
+    for (std::size_t i = 0; i < channels.size(); ++i) {
+        record.u8(17 + 2 * i, channels[i].id).u8(18 + 2 * i, utranBlerLevel(channels[i].blockErrors));
+    }
+    const std::size_t first = 289 + 34 * channels.size();
+    for (std::size_t i = 0; i < composites.size(); ++i) {
+        const std::size_t at = first + 8 * i;
+        record.u8(at, composites[i].id).u8(at + 1, composites[i].timeslots);
+        for (std::size_t slot = 0; slot < composites[i].sir.size(); ++slot) {
+            const auto& sir = composites[i].sir[slot];
+            record.u8(at + 2 + slot, sir ? utranSirLevel(*sir) : 0);
+        }
+    }
+    return record.finish();
+}
+
+}  // namespace kelvo::simulation

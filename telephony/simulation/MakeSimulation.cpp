@@ -3,6 +3,7 @@
 #include "telephony/simulation/CdmaSimulation.h"
 #include "telephony/simulation/GsmSimulation.h"
 #include "telephony/simulation/LteSimulation.h"
+#include "telephony/simulation/UtranSimulation.h"
 
 namespace kelvo::simulation {
 
@@ -10,6 +11,7 @@ std::unique_ptr<Simulation> makeSimulation(Technology technology, std::uint64_t 
     switch (technology) {
         case Technology::GSM: return std::make_unique<GsmSimulation>(seed);
         case Technology::CDMA: return std::make_unique<CdmaSimulation>(seed);
+        case Technology::UTRAN: return std::make_unique<UtranSimulation>(seed);
         default: return std::make_unique<LteSimulation>(seed);
     }
 }

@@ -2,6 +2,7 @@
 
 #include "telephony/simulation/CdmaSimulation.h"
 #include "telephony/simulation/GsmSimulation.h"
+#include "telephony/simulation/IfxSimulation.h"
 #include "telephony/simulation/LteSimulation.h"
 #include "telephony/simulation/UtranSimulation.h"
 
@@ -9,6 +10,7 @@ namespace kelvo::simulation {
 
 std::unique_ptr<Simulation> makeSimulation(Technology technology, std::uint64_t seed) {
     switch (technology) {
+        case Technology::IFX: return std::make_unique<IfxSimulation>(seed);
         case Technology::GSM: return std::make_unique<GsmSimulation>(seed);
         case Technology::CDMA: return std::make_unique<CdmaSimulation>(seed);
         case Technology::UTRAN: return std::make_unique<UtranSimulation>(seed);

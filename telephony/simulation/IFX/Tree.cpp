@@ -1,0 +1,114 @@
+#include "telephony/simulation/IFX/Tree.h"
+
+#include <fmt/format.h>
+
+#include <cmath>
+
+namespace kelvo::simulation::ifx {
+namespace {
+
+std::string number(long value) { return fmt::format("{}", value); }
+std::string dBm(double value) { return fmt::format("{} dBm", std::lround(value)); }
+std::string halfDecibels(double value) { return fmt::format("{:.1f} dB", std::round(value * 2) / 2); }
+
+// 3GPP TS 45.008, section 6.4: a cell needs -104 dBm, and the phone has all the power it may use.
+long pathLossCriterion(double rssi) { return std::lround(rssi) + 104; }
+
+Value gsmServing(const Status& status, const GsmCell& cell) {
+    return Dictionary::make({{"Technology", "GSM"},
+                             {"MCC", kMcc},
+                             {"MNC", kMnc},
+                             {"LAC", number(cell.area.lac)},
+                             {"CellId", number(cell.cellId)},
+                             {"BandInfo", "GSM 900"},
+                             {"ARFCN", number(cell.arfcn)},
+                             {"BSIC", number(cell.bsic)},
+                             {"RSSI", dBm(status.rssi)},
+                             {"C1", number(pathLossCriterion(status.rssi))}});
+}
+
+Value umtsServing(const Status& status, const UmtsCell& cell) {
+    return Dictionary::make({{"Technology", "UMTS"},
+                             {"MCC", kMcc},
+                             {"MNC", kMnc},
+                             {"LAC", number(cell.area.lac)},
+                             {"CellId", number(cell.cellId)},
+                             {"BandInfo", "UMTS 2100"},
+                             {"UARFCN", number(UmtsCell::kUarfcn)},
+                             {"SCN", number(cell.scramblingCode)},
+                             {"RSCP", dBm(status.rscp)},
+                             {"ECN0", halfDecibels(status.ecN0)}});
+}
+
+Value serving(const Status& status, const Network& network) {
+    switch (status.access) {
+        case RadioAccess::Gsm: return gsmServing(status, network.gsm[status.serving]);
+        case RadioAccess::Umts: return umtsServing(status, network.umts[status.serving]);
+        default: return "none";
+    }
+}
+
+Value gsmNeighbour(const GsmNeighbour& neighbour, const GsmCell& cell) {
+    const DictionaryRef entry = Dictionary::make({{"ARFCN", number(cell.arfcn)}});
+    if (neighbour.identified) entry->set("BSIC", number(cell.bsic));
+    if (neighbour.measured) entry->set("RSSI", dBm(neighbour.rssi));
+    return entry;
+}
+
+Value umtsNeighbour(const UmtsNeighbour& neighbour, const UmtsCell& cell) {
+    return Dictionary::make(
+        {{"SCN", number(cell.scramblingCode)}, {"RSCP", dBm(neighbour.rscp)}, {"ECN0", halfDecibels(neighbour.ecN0)}});
+}
+
+Value neighbours(const Status& status, const Network& network) {
+    // The header says how many follow.
+    const ArrayRef gsm = Array::make({number(static_cast<long>(status.gsm.size()))});
+    for (const GsmNeighbour& neighbour : status.gsm) {
+        gsm->append(gsmNeighbour(neighbour, network.gsm[neighbour.sector]));
+    }
+    const ArrayRef umts = Array::make({number(static_cast<long>(status.umts.size()))});
+    for (const UmtsNeighbour& neighbour : status.umts) {
+        umts->append(umtsNeighbour(neighbour, network.umts[neighbour.sector]));
+    }
+    return Dictionary::make({{"GSM", gsm}, {"UMTS", umts}});
+}
+
+Value registration(const Status& status) {
+    const bool first = status.registered == LocationArea{};
+    const bool registered = status.registration == Registration::Registered;
+    const DictionaryRef entry = Dictionary::make({{"State", registered ? "Registered" : "Updating"}});
+    if (status.registration == Registration::Searching) entry->set("State", "Searching");
+    if (first) return entry;
+    entry->set("MCC", kMcc);
+    entry->set("MNC", kMnc);
+    entry->set("LAC", number(status.registered.lac));
+    entry->set("RAC", number(status.registered.rac));
+    return entry;
+}
+
+Value connection(const Status& status) {
+    if (status.connection == Connection::Idle) return Dictionary::make({{"State", "Idle"}});
+    const bool call = status.connection == Connection::Call;
+    const bool gsm = status.access == RadioAccess::Gsm;
+    const DictionaryRef entry = Dictionary::make({{"State", call ? "Call" : "Packet transfer"}});
+    if (call) {
+        entry->set("Channel", gsm ? "TCH/F" : "DCH");
+    } else {
+        entry->set("Channel", gsm ? fmt::format("EGPRS MCS-{}", status.codingScheme) : "HS-DSCH");
+        entry->set("Throughput", fmt::format("{} kbit/s", std::lround(status.throughput)));
+    }
+    entry->set("Errors", fmt::format("{:.1f} %", status.errors * 100));
+    entry->set("TxPower", dBm(status.tx));
+    return entry;
+}
+
+}  // namespace
+
+Value monitorTree(const Status& status, const Network& network) {
+    return Dictionary::make({{"Serving", Dictionary::make({{"Cell", serving(status, network)}})},
+                             {"Neighbours", neighbours(status, network)},
+                             {"Registration", registration(status)},
+                             {"Connection", connection(status)}});
+}
+
+}  // namespace kelvo::simulation::ifx

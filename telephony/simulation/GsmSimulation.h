@@ -2,8 +2,8 @@
 
 #include <optional>
 
+#include "telephony/simulation/GSMUMTS/Reports.h"
 #include "telephony/simulation/Simulation.h"
-#include "telephony/simulation/gsm/Reports.h"
 
 namespace kelvo::simulation {
 

@@ -14,8 +14,9 @@ std::unique_ptr<Simulation> makeSimulation(Technology technology, std::uint64_t 
         case Technology::GSM: return std::make_unique<GsmSimulation>(seed);
         case Technology::CDMA: return std::make_unique<CdmaSimulation>(seed);
         case Technology::UTRAN: return std::make_unique<UtranSimulation>(seed);
-        default: return std::make_unique<LteSimulation>(seed);
+        case Technology::LTE: break;
     }
+    return std::make_unique<LteSimulation>(seed);
 }
 
 }  // namespace kelvo::simulation

@@ -1,4 +1,4 @@
-#include "telephony/simulation/gsm/Reports.h"
+#include "telephony/simulation/GSMUMTS/Reports.h"
 
 #include <algorithm>
 #include <cmath>
@@ -16,7 +16,7 @@ constexpr Time kSubFrame = std::chrono::milliseconds(2);
 constexpr Time kRadioFrame = std::chrono::milliseconds(10);
 constexpr int kSpeechChannel = 1;
 constexpr int kSignallingChannel = 24;
-constexpr int kSlots = 5;
+constexpr int kSlots = 3;
 
 GsmNeighbour gsmNeighbour(const World& world, std::size_t sector) {
     const GsmCell& cell = world.network.gsm[sector];
@@ -138,7 +138,7 @@ std::vector<SearchedCell> searchedCells(const World& world) {
         add(serving, CellSet::Active);
     }
     const int site = world.network.umtsSectors[serving].siteNumber;
-    for (const std::size_t sector : phone.umtsNeighbours(3)) {
+    for (const std::size_t sector : phone.umtsNeighbours(2)) {
         const bool isTold = world.network.umtsSectors[sector].siteNumber <= site + 6;  // far sites are not in its list
         add(sector, isTold ? CellSet::Monitored : CellSet::Detected);
     }
@@ -168,7 +168,7 @@ std::vector<MonitoredCell> monitoredCells(const World& world) {
     const bool isGsm = world.phone.rat() == Rat::GSM;
     std::vector<MonitoredCell> cells{servingCell(world)};
     auto neighbours = world.phone.gsmNeighbours();
-    neighbours.resize(std::min(neighbours.size(), std::size_t{2}));
+    neighbours.resize(std::min(neighbours.size(), std::size_t{isGsm ? 2U : 1U}));
     for (const std::size_t sector : neighbours) cells.push_back(monitoredGsmCell(world, sector));
     for (const std::size_t sector : world.phone.umtsNeighbours(isGsm ? 1 : 2)) {
         cells.push_back(monitoredUmtsCell(world, sector));

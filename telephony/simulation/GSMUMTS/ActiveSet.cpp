@@ -1,4 +1,4 @@
-#include "telephony/simulation/gsm/ActiveSet.h"
+#include "telephony/simulation/GSMUMTS/ActiveSet.h"
 
 #include <algorithm>
 

@@ -71,6 +71,6 @@ struct Network {
 };
 
 inline constexpr double kTownRadius = 2500;    // metres
-inline constexpr double kCentreRadius = 1300;  // metres: UMTS sites up to here
+inline constexpr double kCentreRadius = 1000;  // metres: UMTS sites up to here
 
 }  // namespace kelvo::simulation::gsm

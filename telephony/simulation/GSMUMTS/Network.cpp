@@ -1,4 +1,4 @@
-#include "telephony/simulation/gsm/Network.h"
+#include "telephony/simulation/GSMUMTS/Network.h"
 
 #include <algorithm>
 #include <array>
@@ -7,8 +7,8 @@
 namespace kelvo::simulation::gsm {
 namespace {
 
-constexpr TownPlan kGsmPlan{.radius = 3000, .siteDistance = 1000, .carrierMHz = 940, .power = 44};
-constexpr TownPlan kUmtsPlan{.radius = kCentreRadius, .siteDistance = 500, .carrierMHz = 2112.4, .power = 33};
+constexpr TownPlan kGsmPlan{.radius = 2700, .siteDistance = 750, .carrierMHz = 940, .power = 44};
+constexpr TownPlan kUmtsPlan{.radius = kCentreRadius, .siteDistance = 500, .carrierMHz = 2112.4, .power = 30};
 
 constexpr int kFirstBcch = 20;
 constexpr int kBcchCount = 24;
@@ -86,7 +86,7 @@ UmtsCell umtsCell(const Sector& sector, int index) {
             .scramblingCode = (index * 7 + 16) % 512,
             .area = area,
             .uraId = area.lac - 0x2100,
-            .hasTwoCarriers = sector.siteNumber % 2 == 0};
+            .hasTwoCarriers = sector.siteNumber % 3 == 0};
 }
 
 }  // namespace

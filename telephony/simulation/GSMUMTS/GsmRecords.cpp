@@ -1,4 +1,4 @@
-#include "telephony/simulation/gsm/GsmRecords.h"
+#include "telephony/simulation/GSMUMTS/GsmRecords.h"
 
 #include <algorithm>
 #include <cmath>

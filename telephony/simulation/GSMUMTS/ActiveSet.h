@@ -2,7 +2,7 @@
 
 #include <vector>
 
-#include "telephony/simulation/gsm/Air.h"
+#include "telephony/simulation/GSMUMTS/Air.h"
 
 namespace kelvo::simulation::gsm {
 

@@ -1,4 +1,4 @@
-#include "telephony/simulation/gsm/Registration.h"
+#include "telephony/simulation/GSMUMTS/Registration.h"
 
 namespace kelvo::simulation::gsm {
 namespace {

@@ -1,4 +1,4 @@
-#include "telephony/simulation/gsm/Air.h"
+#include "telephony/simulation/GSMUMTS/Air.h"
 
 #include <algorithm>
 #include <cmath>

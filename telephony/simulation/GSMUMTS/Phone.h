@@ -3,8 +3,8 @@
 #include <optional>
 #include <vector>
 
-#include "telephony/simulation/gsm/ActiveSet.h"
-#include "telephony/simulation/gsm/Registration.h"
+#include "telephony/simulation/GSMUMTS/ActiveSet.h"
+#include "telephony/simulation/GSMUMTS/Registration.h"
 
 namespace kelvo::simulation::gsm {
 
@@ -44,7 +44,7 @@ public:
 
     bool isCamped() const { return _isCamped; }
     Rat rat() const { return _rat; }
-    /// The serving cell's index in the layer of rat(); in soft handover the best cell's.
+    /// The serving cell's index in the layer of rat(); in soft handover that of a member.
     std::size_t serving() const { return _serving; }
     const Area& area() const;  ///< broadcast by the serving cell
     Use use() const { return _use; }
@@ -84,6 +84,7 @@ private:
     void followLink(Time now);
     void setLink(Link link, Time now);
     void follow(const Change& change, Time now);
+    double umtsQuality() const;  ///< Ec/No of the best cell in use, dB
     void rank();
     void leaveGsm(Time now);
     void moveWithinGsm(Time now);
@@ -114,7 +115,7 @@ private:
     HeldFor _gsmReselection{std::chrono::seconds(5)};  // TS 45.008, 6.6.2
     HeldFor _gsmHandover{std::chrono::milliseconds(1500)};
     HeldFor _umtsReselection{std::chrono::seconds(1)};  // Treselection
-    HeldFor _bestChange{std::chrono::milliseconds(320)};
+    HeldFor _bestChange{std::chrono::milliseconds(640)};
     HeldFor _toUmts{std::chrono::seconds(3)};
     HeldFor _toGsm{std::chrono::seconds(2)};
     HeldFor _toGsmHandover{std::chrono::milliseconds(640)};

@@ -2,7 +2,7 @@
 
 #include <vector>
 
-#include "telephony/simulation/gsm/Network.h"
+#include "telephony/simulation/GSMUMTS/Network.h"
 
 namespace kelvo::simulation::gsm {
 

@@ -6,7 +6,7 @@
 #include <vector>
 
 #include "platform/Bytes.h"
-#include "telephony/simulation/gsm/Phone.h"
+#include "telephony/simulation/GSMUMTS/Phone.h"
 
 namespace kelvo::simulation::gsm {
 

@@ -3,7 +3,7 @@
 #include <span>
 
 #include "platform/Bytes.h"
-#include "telephony/simulation/gsm/Phone.h"
+#include "telephony/simulation/GSMUMTS/Phone.h"
 
 namespace kelvo::simulation::gsm {
 

@@ -1,4 +1,4 @@
-#include "telephony/simulation/gsm/Phone.h"
+#include "telephony/simulation/GSMUMTS/Phone.h"
 
 #include <algorithm>
 #include <functional>
@@ -18,13 +18,14 @@ constexpr Time kReselection = 200ms;
 constexpr Time kInterRatChange = 300ms;
 
 constexpr double kRxLevAccessMin = -104;  // dBm
-constexpr double kCellReselectHysteresis = 6;
-constexpr double kHandoverMargin = 4;
+constexpr double kCellReselectHysteresis = 4;
+constexpr double kHandoverMargin = 3;
 constexpr double kQhyst = 4;
 constexpr double kQoffsetUmts = 2;
 constexpr double kQoffsetGsm = 7;
 constexpr double kQqualMin = -18;         // dB
 constexpr double kSsearchRat = 4;         // dB: GSM is measured below -14 dB
+constexpr double kBestHysteresis = 2;     // dB, event 1D
 constexpr double kCompressedBelow = -13;  // dB, event 2D: in a connection GSM is measured in gaps
 constexpr double kHandoverToGsm = -15;    // dB
 constexpr double kGsmGoodEnough = -95;    // dBm
@@ -177,10 +178,12 @@ double Phone::c1(std::size_t gsmSector) const { return _air.gsmLevel(gsmSector) 
 
 double Phone::c2(std::size_t gsmSector) const { return c1(gsmSector) + _network.gsm[gsmSector].reselectOffset; }
 
+double Phone::umtsQuality() const { return _air.ecNo(_link == Link::Open ? _activeSet.best(_air) : _serving); }
+
 void Phone::rank() {
     const bool isUmts = _rat == Rat::UMTS;
     const double measureBelow = _link == Link::Open ? kCompressedBelow : kQqualMin + kSsearchRat;
-    _isMeasuringGsm = isUmts && _air.ecNo(_serving) < measureBelow;
+    _isMeasuringGsm = isUmts && umtsQuality() < measureBelow;
 
     _rankedUmts.clear();
     if (isUmts) _rankedUmts.push_back({_serving, _air.rscp(_serving) + kQhyst});
@@ -229,7 +232,8 @@ void Phone::moveWithinUmts(Time now) {
     if (_link == Link::Open) {
         _activeSet.update(_air, now);
         const std::size_t best = _activeSet.best(_air);
-        if (_bestChange(best != _serving, best, now) || !_activeSet.contains(_serving)) _serving = best;
+        const bool isBetter = _air.ecNo(best) > _air.ecNo(_serving) + kBestHysteresis;
+        if (_bestChange(isBetter, best, now) || !_activeSet.contains(_serving)) _serving = best;
         return;
     }
     const std::size_t best = _rankedUmts.front().sector;
@@ -245,7 +249,7 @@ void Phone::leaveUmts(Time now) {
     }
     const std::size_t best = neighbours.front();
     if (_link == Link::Open) {
-        const bool isNeeded = _air.ecNo(_serving) < kHandoverToGsm && _air.gsmLevel(best) > kGsmGoodEnough;
+        const bool isNeeded = umtsQuality() < kHandoverToGsm && _air.gsmLevel(best) > kGsmGoodEnough;
         const RrState state = _use == Use::Voice ? RrState::W2gHandover : RrState::W2gCellChangeOrder;
         if (_toGsmHandover(isNeeded, 0, now)) _change = {Rat::GSM, best, state, now + kInterRatChange};
         return;

@@ -3,7 +3,7 @@
 #include <span>
 
 #include "platform/Bytes.h"
-#include "telephony/simulation/gsm/Registration.h"
+#include "telephony/simulation/GSMUMTS/Registration.h"
 
 namespace kelvo::simulation::gsm {
 

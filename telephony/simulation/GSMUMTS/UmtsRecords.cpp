@@ -1,4 +1,4 @@
-#include "telephony/simulation/gsm/UmtsRecords.h"
+#include "telephony/simulation/GSMUMTS/UmtsRecords.h"
 
 #include <algorithm>
 #include <cmath>

@@ -1,9 +1,9 @@
 #pragma once
 
 #include "telephony/simulation/ExtendedRecords.h"
-#include "telephony/simulation/gsm/GsmRecords.h"
-#include "telephony/simulation/gsm/MobilityRecords.h"
-#include "telephony/simulation/gsm/UmtsRecords.h"
+#include "telephony/simulation/GSMUMTS/GsmRecords.h"
+#include "telephony/simulation/GSMUMTS/MobilityRecords.h"
+#include "telephony/simulation/GSMUMTS/UmtsRecords.h"
 
 namespace kelvo::simulation::gsm {
 

@@ -1,4 +1,4 @@
-#include "telephony/simulation/gsm/MobilityRecords.h"
+#include "telephony/simulation/GSMUMTS/MobilityRecords.h"
 
 #include "telephony/simulation/RecordWriter.h"
 

@@ -1,0 +1,88 @@
+#pragma once
+
+#include <gtest/gtest.h>
+
+#include <map>
+#include <string>
+#include <vector>
+
+#include "telephony/simulation/GsmSimulation.h"
+#include "tests/telephony/simulation/Played.h"
+
+namespace kelvo::test {
+
+using namespace simulation;
+using namespace simulation::gsm;
+
+/// One message after another, each compared with the world at that moment.
+class GsmComparison {
+public:
+    using Labels = std::map<int, std::string>;
+
+    explicit GsmComparison(GsmSimulation& modem) : _modem(modem), _played(modem) {}
+
+    void next() {
+        const std::uint32_t code = _played.next();
+        SCOPED_TRACE(testing::Message() << "record 0x" << std::hex << code << " at " << std::dec
+                                        << seconds(_played.time()) << " s");
+        compare(code);
+    }
+    Played& played() { return _played; }
+
+private:
+    template <class State>
+    static std::string label(const Labels& labels, State state) {
+        const auto found = labels.find(static_cast<int>(state));
+        return found == labels.end() ? "(no label stated)" : found->second;
+    }
+
+    void compare(std::uint32_t code);
+    void compareMobility(std::uint32_t code);
+    void compareGsm(std::uint32_t code);
+    void compareGprs(std::uint32_t code);
+    void compareUmts(std::uint32_t code);
+
+    void servingNetwork();
+    void equivalents();
+    void gsmMeasurement();
+    void gsmNeighbours();
+    void rememberBsics();
+    void mobileAllocation();
+    void searcher();
+    void ranking();
+    void rankedUmts();
+    void rankedGsm();
+    void transmitPower();
+    void blockErrors();
+    void hsdpa();
+    void processes(const std::string& path, const std::vector<HarqProcess>& expected);
+    void sim();
+    void cells();
+    void umtsNeighboursOfArray();
+    void gsmNeighboursOfArray();
+    void contexts();
+
+    void shows(const std::string& path, const std::string& expected) {
+        EXPECT_EQ(_played.text(_group + path), expected) << path;
+    }
+    void shows(const std::string& path, int expected) { shows(path, std::to_string(expected)); }
+    void within(const std::string& path, double truth, double halfStep) {
+        EXPECT_NEAR(_played.number(_group + path), truth, halfStep + 1e-6) << path;
+    }
+    /// RXLEV r tells of -111 + r to -110 + r dBm; both ends are open.
+    void levelWithin(const std::string& path, double dBm) {
+        const double shown = _played.number(_group + path);
+        EXPECT_TRUE(shown == 0 || dBm >= shown - 111) << path << " shows " << shown << " for " << dBm;
+        EXPECT_TRUE(shown == 63 || dBm < shown - 110) << path << " shows " << shown << " for " << dBm;
+    }
+
+    const GsmCell& gsmCell() const { return _modem.network().gsm[_modem.phone().serving()]; }
+    const UmtsCell& umtsCell() const { return _modem.network().umts[_modem.phone().serving()]; }
+
+    GsmSimulation& _modem;
+    Played _played;
+    std::string _group;  // the screen that paths begin at
+    std::map<int, int> _bsics;
+};
+
+}  // namespace kelvo::test

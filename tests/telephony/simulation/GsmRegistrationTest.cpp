@@ -1,0 +1,109 @@
+#include <gtest/gtest.h>
+
+#include "telephony/simulation/GSMUMTS/Registration.h"
+#include "telephony/simulation/GSMUMTS/UmtsRecords.h"
+
+using namespace kelvo;
+using namespace kelvo::simulation::gsm;
+using namespace std::chrono_literals;
+
+namespace {
+
+constexpr Area kHome{0x1101, 1};
+constexpr Area kNext{0x1102, 1};
+constexpr Area kSameLocation{0x1101, 2};
+
+/// Registered in kHome, one second after the beginning.
+Registration settled() {
+    Registration registration;
+    registration.step({.area = kHome, .isLinkOpen = true}, 0ms);
+    registration.step({.area = kHome, .isLinkOpen = true}, 1s);
+    return registration;
+}
+
+}  // namespace
+
+TEST(Registration, SearchesUntilThereIsACell) {
+    Registration registration;
+    registration.step({}, 1s);
+    EXPECT_EQ(registration.mobility().registration, RegistrationState::AutomaticSearch);
+    EXPECT_EQ(registration.mobility().service, ServiceType::None);
+    EXPECT_FALSE(registration.wantsLink());
+}
+
+TEST(Registration, AsksForAConnectionAndTakesItsTimeOverIt) {
+    Registration registration;
+    registration.step({.area = kHome}, 0ms);
+    EXPECT_TRUE(registration.wantsLink());
+    EXPECT_EQ(registration.mobility().mm, MmState::WaitForRrConnectionLu);
+    EXPECT_EQ(registration.mobility().gmm, GmmState::RegisteredInitiated);
+    registration.step({.area = kHome, .isLinkOpen = true}, 200ms);
+    EXPECT_EQ(registration.mobility().mm, MmState::LocationUpdateInitiated);
+    EXPECT_EQ(registration.mobility().service, ServiceType::Limited);
+    registration.step({.area = kHome, .isLinkOpen = true}, 700ms);
+    EXPECT_EQ(registration.registered(), kHome);
+    EXPECT_EQ(registration.mobility().mm, MmState::Idle);
+    EXPECT_EQ(registration.mobility().service, ServiceType::CsAndPs);
+    EXPECT_FALSE(registration.wantsLink());
+}
+
+TEST(Registration, LeavesTheCircuitDomainAloneWhenOnlyTheRoutingAreaChanges) {
+    Registration registration = settled();
+    registration.step({.area = kSameLocation}, 2s);
+    EXPECT_EQ(registration.mobility().gmm, GmmState::RoutingAreaUpdateInitiated);
+    EXPECT_EQ(registration.mobility().gmmSub, GmmSubState::UpdateNeeded);
+    EXPECT_EQ(registration.mobility().mm, MmState::Idle);
+    EXPECT_TRUE(registration.mobility().isLocationUpdated);
+}
+
+TEST(Registration, WaitsForTheEndOfACall) {
+    Registration registration = settled();
+    registration.step({.area = kNext, .isLinkOpen = true, .use = Use::Voice}, 2s);
+    EXPECT_FALSE(registration.wantsLink());
+    EXPECT_EQ(registration.mobility().mm, MmState::ConnectionActive);
+    EXPECT_EQ(registration.mobility().mmSub, MmSubState::LocationUpdateNeeded);
+    registration.step({.area = kNext, .isLinkOpen = true}, 3s);
+    EXPECT_EQ(registration.mobility().mm, MmState::LocationUpdateInitiated);
+}
+
+TEST(Registration, GivesUpWhenThePhoneIsBackBeforeItBegan) {
+    Registration registration = settled();
+    registration.step({.area = kNext}, 2s);
+    registration.step({.area = kHome}, 3s);
+    EXPECT_FALSE(registration.wantsLink());
+    EXPECT_EQ(registration.mobility().mm, MmState::Idle);
+}
+
+TEST(Registration, SuspendsPacketDataDuringACallInGsmOnly) {
+    Registration registration = settled();
+    registration.step({.area = kHome, .isLinkOpen = true, .use = Use::Voice}, 2s);
+    EXPECT_EQ(registration.mobility().gmmSub, GmmSubState::Suspended);
+    EXPECT_EQ(registration.mobility().service, ServiceType::CsOnly);
+    registration.step({.area = kHome, .rat = Rat::UMTS, .isLinkOpen = true, .use = Use::Voice}, 3s);
+    EXPECT_EQ(registration.mobility().gmmSub, GmmSubState::NormalService);
+    EXPECT_EQ(registration.mobility().service, ServiceType::CsAndPs);
+}
+
+TEST(SearcherRecord, TellsTheSetOfEachCellAboveThirteenBitsOfItsCode) {
+    const SearchedCell cells[] = {{.scramblingCode = 0x1ab, .set = CellSet::Active, .ecNo = 0},
+                                  {.scramblingCode = 0x0cd, .set = CellSet::VirtualActive, .ecNo = -10}};
+    const Bytes message = searcherRecord(-70, cells, 0s);
+    const ByteView record = ByteView(message).subspan(2);
+    ASSERT_EQ(record.size(), 16U + 2 * 15 + 2 * 44);
+    EXPECT_EQ(record[13] | record[14] << 8, (-70 + 106) * 10 - 512 + 0x10000);
+    EXPECT_EQ(record[15], 2);
+    EXPECT_EQ(record[16 + 7], 0xab);
+    EXPECT_EQ(record[16 + 8], 0x01);
+    EXPECT_EQ(record[31 + 7], 0xcd);
+    EXPECT_EQ(record[31 + 8], 3 << 5);
+    EXPECT_EQ(record[46 + 34], 8);  // 524288, 0 dB
+    EXPECT_EQ(record[90 + 32] | record[90 + 33] << 8 | record[90 + 34] << 16, 52429);
+}
+
+TEST(TransmitPowerRecord, TellsAPowerThatLooksLikeOffAsItsNeighbour) {
+    const std::optional<double> slots[] = {-18.8, std::nullopt};
+    const Bytes message = transmitPowerRecord(slots, 0s);
+    EXPECT_EQ(message[2 + 14], 2);
+    EXPECT_EQ(message[2 + 16 + 4], 1);
+    EXPECT_EQ(message[2 + 30 + 4], 0);
+}

@@ -19,6 +19,7 @@ T.AbstractButton {
     Keys.onReturnPressed: clicked()
     Keys.onEnterPressed: clicked()
 
+    Accessible.ignored: !enabled
     Accessible.role: Accessible.Button
     Accessible.name: text
     Accessible.onPressAction: clicked()
@@ -62,7 +63,7 @@ T.AbstractButton {
             anchors.verticalCenter: parent.verticalCenter
             textFormat: Text.PlainText
             elide: Text.ElideRight
-            color: Theme.accent
+            color: content.enabled ? Theme.accent : Theme.secondaryText
             font.pixelSize: 16
         }
     }

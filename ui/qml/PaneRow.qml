@@ -6,6 +6,7 @@ KelvoCell {
     id: row
 
     required property int index
+    required property bool fresh
     required property KelvoPaneController pane
     readonly property bool marked: ListView.isCurrentItem && ListView.view.activeFocus
 
@@ -27,6 +28,7 @@ KelvoCell {
     }
     ListView.onReused: visible = true
 
+    Accessible.ignored: !enabled  // a screen that covers the pane covers it for a screen reader, too
     Accessible.role: Accessible.ListItem
     Accessible.name: accessibleName
     Accessible.focusable: true
@@ -35,7 +37,7 @@ KelvoCell {
 
     Rectangle {
         anchors.fill: parent
-        color: row.opens && (tap.pressed || row.pane.selectedRow === row.index) ? Theme.pressed : Theme.row
+        color: tap.pressed && row.opens || row.pane.selectedRow === row.index ? Theme.pressed : Theme.row
     }
 
     Item {
@@ -73,25 +75,21 @@ KelvoCell {
                 Accessible.ignored: true
             }
 
-            Text {
+            FigureText {
+                id: value
                 x: row.valueFrame.x
                 y: row.valueFrame.y
-                width: row.valueFrame.width
-                height: row.valueFrame.height
-                visible: text !== ""
                 text: row.shownValue
-                textFormat: Text.PlainText
                 color: Theme.secondaryText
                 font.pixelSize: 15
-                Accessible.ignored: true
             }
         }
 
-        // More lies to the right.
+        // More of the value lies to the right.
         Rectangle {
             anchors { right: parent.right; top: parent.top; bottom: parent.bottom; bottomMargin: 1 }
             width: 28
-            visible: strip.interactive && !strip.atXEnd
+            visible: strip.interactive && row.valueFrame.x + row.valueFrame.width - strip.contentX > strip.width
             gradient: Gradient {
                 orientation: Gradient.Horizontal
                 GradientStop { position: 0; color: Qt.rgba(Theme.row.r, Theme.row.g, Theme.row.b, 0) }
@@ -109,10 +107,8 @@ KelvoCell {
         color: Theme.secondaryText
     }
 
-    Rectangle {
+    Hairline {
         anchors { left: parent.left; leftMargin: 16; right: parent.right; bottom: parent.bottom }
-        height: 1
-        color: Theme.hairline
     }
 
     Rectangle {
@@ -121,6 +117,17 @@ KelvoCell {
         color: "transparent"
         radius: 6
         border { width: 2; color: Theme.accent }
+    }
+
+    // A value that changed stands out at once and calms down slowly.
+    states: State {
+        name: "fresh"
+        when: row.fresh
+        PropertyChanges { value.color: Theme.accent }
+    }
+    transitions: Transition {
+        from: "fresh"
+        ColorAnimation { duration: 400 }
     }
 
     TapHandler {

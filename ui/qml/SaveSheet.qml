@@ -51,11 +51,13 @@ FocusScope {
     Rectangle {
         id: panel
 
+        anchors.horizontalCenter: parent.horizontalCenter
         y: 24
-        width: parent.width
+        width: Math.min(parent.width, 640)
         height: parent.height
         radius: 14
         color: Theme.background
+        border { width: 1; color: Theme.hairline }
 
         MouseArea {
             anchors.fill: parent
@@ -63,7 +65,9 @@ FocusScope {
         }
 
         BarButton {
+            id: cancel
             anchors { left: parent.left; leftMargin: 4; top: parent.top; topMargin: 6 }
+            enabled: !sheet.saveView.saving
             text: qsTr("Cancel")
             onClicked: sheet.saveView.cancelPressed()
         }
@@ -71,13 +75,26 @@ FocusScope {
         Text {
             id: heading
             anchors { horizontalCenter: parent.horizontalCenter; top: parent.top; topMargin: 18 }
+            width: panel.width - 2 * Math.max(cancel.width, save.width) - 8
+            horizontalAlignment: Text.AlignHCenter
+            fontSizeMode: Text.HorizontalFit
+            minimumPixelSize: 13
+            elide: Text.ElideRight
             text: qsTr("Save Snapshot")
             color: Theme.text
             font { pixelSize: 17; bold: true }
         }
 
+        ActivityIndicator {
+            anchors { horizontalCenter: save.horizontalCenter; verticalCenter: save.verticalCenter }
+            running: sheet.saveView.saving
+            color: Theme.secondaryText
+        }
+
         BarButton {
+            id: save
             anchors { right: parent.right; rightMargin: 4; top: parent.top; topMargin: 6 }
+            visible: !sheet.saveView.saving
             text: qsTr("Save")
             strong: true
             onClicked: sheet.saveView.savePressed()
@@ -87,7 +104,7 @@ FocusScope {
             id: column
 
             anchors { top: parent.top; topMargin: 64; horizontalCenter: parent.horizontalCenter }
-            width: Math.min(parent.width, 640) - 32
+            width: parent.width - 32
             spacing: 8
 
             T.TextField {
@@ -104,6 +121,7 @@ FocusScope {
                 placeholderText: qsTr("Description")
                 font.pixelSize: 16
                 activeFocusOnTab: true
+                readOnly: sheet.saveView.saving
                 Accessible.name: placeholderText
                 onTextEdited: sheet.saveView.saveDescription = text
                 onAccepted: sheet.saveView.textFieldShouldReturn()

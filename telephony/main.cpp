@@ -8,6 +8,7 @@
 #include "platform/Environment.h"
 #include "platform/PropertyList.h"
 #include "platform/TelephonyProtocol.h"
+#include "platform/host/HostEventLoop.h"
 #include "platform/host/HostMainQueue.h"
 #include "platform/host/HostMessagePorts.h"
 #include "platform/host/HostSystemLog.h"
@@ -52,7 +53,7 @@ int serve(const ServiceOptions& options) {
     }
     logLine(Level::Notice, "Serving %s, the log of a modem that speaks %s", source.description(),
             namesOf(source.technology()).name);
-    return QCoreApplication::exec();
+    return HostEventLoop::run(QCoreApplication::exec);
 }
 
 int tellStatus() {

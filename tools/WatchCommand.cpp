@@ -14,6 +14,7 @@
 #include "model/KelvoModel.h"
 #include "platform/Environment.h"
 #include "platform/host/FdWatcher.h"
+#include "platform/host/HostEventLoop.h"
 #include "platform/host/HostMainQueue.h"
 #include "platform/host/HostMessagePorts.h"
 #include "platform/host/HostSystemLog.h"
@@ -154,7 +155,7 @@ void watch() {
     HostMessagePorts ports;
     HostTelephonyClient telephony(ports);
     const Watch watch(queue, ports, telephony, view);
-    QCoreApplication::exec();
+    HostEventLoop::run(QCoreApplication::exec);
 }
 
 }  // namespace

@@ -8,6 +8,7 @@
 
 #include "platform/DirectoryResources.h"
 #include "platform/Environment.h"
+#include "platform/host/HostEventLoop.h"
 #include "platform/host/HostMainQueue.h"
 #include "platform/host/HostMessagePorts.h"
 #include "platform/host/HostPaths.h"
@@ -42,9 +43,10 @@ int runApplication(int argc, char** argv) {
     app.applicationDidFinishLaunching();
 
     // Closing the window, Ctrl-C and a polite kill end the program the same way.
-    QObject::connect(&application, &QGuiApplication::aboutToQuit, &app, &KelvoApp::applicationWillTerminate);
+    QObject::connect(&application, &QGuiApplication::aboutToQuit, &app,
+                     [&app] { HostEventLoop::call([&app] { app.applicationWillTerminate(); }); });
     const UnixSignals endings({SIGINT, SIGTERM, SIGHUP}, [](int) { QGuiApplication::quit(); });
-    return QGuiApplication::exec();
+    return HostEventLoop::run(QGuiApplication::exec);
 }
 
 }  // namespace

@@ -2,11 +2,14 @@
 
 #include <QSocketNotifier>
 
+#include "platform/host/HostEventLoop.h"
+
 namespace kelvo {
 
 FdWatcher::FdWatcher(int fd, For purpose, std::function<void()> onReady)
     : _notifier(new QSocketNotifier(fd, purpose == For::Reading ? QSocketNotifier::Read : QSocketNotifier::Write)) {
-    QObject::connect(_notifier, &QSocketNotifier::activated, _notifier, [call = std::move(onReady)] { call(); });
+    QObject::connect(_notifier, &QSocketNotifier::activated, _notifier,
+                     [call = std::move(onReady)] { HostEventLoop::call(call); });
 }
 
 FdWatcher::~FdWatcher() {

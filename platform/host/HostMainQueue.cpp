@@ -4,6 +4,8 @@
 #include <algorithm>
 #include <limits>
 
+#include "platform/host/HostEventLoop.h"
+
 namespace kelvo {
 namespace {
 
@@ -22,7 +24,7 @@ Qt::TimerType typeFor(milliseconds time) {
 class HostTimer final : public RepeatingTimer {
 public:
     HostTimer(milliseconds interval, MainQueue::Task task) : _timer(new QTimer) {
-        QObject::connect(_timer, &QTimer::timeout, _timer, [run = std::move(task)] { run(); });
+        QObject::connect(_timer, &QTimer::timeout, _timer, [run = std::move(task)] { HostEventLoop::call(run); });
         _timer->setTimerType(typeFor(interval));
         _timer->start(interval);
     }
@@ -39,12 +41,12 @@ private:
 
 void HostMainQueue::post(Task task) {
     QMetaObject::invokeMethod(
-        &_context, [run = std::move(task)] { run(); }, Qt::QueuedConnection);
+        &_context, [run = std::move(task)] { HostEventLoop::call(run); }, Qt::QueuedConnection);
 }
 
 void HostMainQueue::postAfter(std::chrono::nanoseconds delay, Task task) {
     const milliseconds time = wholeMilliseconds(delay);
-    QTimer::singleShot(time, typeFor(time), &_context, [run = std::move(task)] { run(); });
+    QTimer::singleShot(time, typeFor(time), &_context, [run = std::move(task)] { HostEventLoop::call(run); });
 }
 
 std::unique_ptr<RepeatingTimer> HostMainQueue::repeat(std::chrono::nanoseconds interval, Task task) {

@@ -13,6 +13,7 @@
 #include "platform/Environment.h"
 #include "platform/PropertyList.h"
 #include "platform/host/HostPaths.h"
+#include "platform/host/SessionBus.h"
 
 namespace kelvo {
 namespace {
@@ -69,14 +70,6 @@ Result<bool> change(const std::filesystem::path& directory, std::string_view dom
     if (!preferences) return preferences.error();
     (*preferences)->set(key, value);
     return save(path, *preferences);
-}
-
-// Where the session bus is; empty where there is none. To ask for it by its kind would start one, or wait for one.
-QString sessionBusAddress() {
-    const QString address = qEnvironmentVariable("DBUS_SESSION_BUS_ADDRESS");
-    if (!address.isEmpty()) return address;
-    const QString socket = qEnvironmentVariable("XDG_RUNTIME_DIR") + "/bus";
-    return QFileInfo::exists(socket) ? "unix:path=" + socket : QString();
 }
 
 bool sendOn(QDBusConnection bus, const QDBusMessage& signal) {

@@ -11,6 +11,7 @@
 #include "platform/Environment.h"
 #include "platform/PropertyList.h"
 #include "tests/support/EventLoop.h"
+#include "tests/support/PrivateBus.h"
 #include "tests/support/RecordingLog.h"
 #include "tests/support/TemporaryDirectory.h"
 
@@ -123,14 +124,10 @@ TEST_F(HostPreferencesTest, WithABusThatDoesNotAnswerWritesOneLine) {
 }
 
 TEST_F(HostPreferencesTest, TellsTheChangeOnTheSessionBus) {
-    QProcess bus;
-    bus.start("dbus-daemon", {"--session", "--nofork", "--print-address"});
-    if (!bus.waitForStarted()) GTEST_SKIP() << "no bus is installed";
-    ASSERT_TRUE(test::runUntil([&] { return bus.canReadLine(); }));
-    const QByteArray address = bus.readLine().trimmed();
-    ::setenv("DBUS_SESSION_BUS_ADDRESS", address.constData(), 1);
+    const test::PrivateBus bus;
+    if (!bus) GTEST_SKIP() << "no bus is installed";
     QProcess monitor;
-    monitor.start("dbus-monitor", {"--address", address, "interface='com.zorvik.Preferences'"});
+    monitor.start("dbus-monitor", {"--address", bus.address(), "interface='com.zorvik.Preferences'"});
     ASSERT_TRUE(monitor.waitForStarted());
     QByteArray seen;
     ASSERT_TRUE(test::runUntil([&] {  // told until the monitor listens, too
@@ -141,9 +138,6 @@ TEST_F(HostPreferencesTest, TellsTheChangeOnTheSessionBus) {
     EXPECT_TRUE(seen.contains("path=/com/zorvik/Preferences; interface=com.zorvik.Preferences; member=Changed"));
     EXPECT_TRUE(seen.contains("string \"com.zorvik.dockmere\""));
     EXPECT_TRUE(_log.lines().empty());
-    ::unsetenv("DBUS_SESSION_BUS_ADDRESS");
-    for (QProcess* process : {&monitor, &bus}) {
-        process->kill();
-        process->waitForFinished();
-    }
+    monitor.kill();
+    monitor.waitForFinished();
 }

@@ -29,11 +29,21 @@ void ActivityIndicator::setRunning(bool running) {
 
 void ActivityIndicator::itemChange(ItemChange change, const ItemChangeData& data) {
     QQuickPaintedItem::itemChange(change, data);
+    if (change == ItemSceneChange) {
+        if (_watched) _watched->removeEventFilter(this);
+        _watched = data.window;
+        if (_watched) _watched->installEventFilter(this);
+    }
     if (change == ItemVisibleHasChanged || change == ItemSceneChange) turnWhileSeen();
 }
 
+bool ActivityIndicator::eventFilter(QObject* watched, QEvent* event) {
+    if (event->type() == QEvent::Expose) turnWhileSeen();  // a window that was put away, or is seen again
+    return QQuickPaintedItem::eventFilter(watched, event);
+}
+
 void ActivityIndicator::turnWhileSeen() {
-    if (_running && isVisible() && window() != nullptr) {
+    if (_running && isVisible() && _watched && _watched->isExposed()) {
         if (!_timer.isActive()) _timer.start(kStepMs, this);
     } else {
         _timer.stop();
@@ -43,7 +53,7 @@ void ActivityIndicator::turnWhileSeen() {
 void ActivityIndicator::timerEvent(QTimerEvent* event) {
     if (event->timerId() != _timer.timerId()) return QQuickPaintedItem::timerEvent(event);
     _step = (_step + 1) % kSpokes;
-    if (window()->isExposed()) update();
+    update();
 }
 
 void ActivityIndicator::paint(QPainter* painter) {

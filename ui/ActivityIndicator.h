@@ -3,12 +3,14 @@
 #include <QtQml/qqmlregistration.h>
 #include <QBasicTimer>
 #include <QColor>
+#include <QPointer>
 #include <QQuickPaintedItem>
 
 namespace kelvo {
 
-/// A small wheel of spokes that turns in steps while something is under way. Hidden when stopped, and then it costs
-/// nothing: no timer, no drawing. It moves in few steps a second because a modem may stay away for hours.
+/// A small wheel of spokes that turns in steps while something is under way. Hidden when stopped, and then, as
+/// in a window that nobody sees, it costs nothing: no timer, no drawing. It moves in few steps a second because a modem
+/// may stay away for hours.
 class ActivityIndicator : public QQuickPaintedItem {
     Q_OBJECT
     QML_ELEMENT
@@ -29,6 +31,7 @@ Q_SIGNALS:
 
 protected:
     void itemChange(ItemChange change, const ItemChangeData& data) override;
+    bool eventFilter(QObject* watched, QEvent* event) override;
     void timerEvent(QTimerEvent* event) override;
 
 private:
@@ -38,6 +41,7 @@ private:
     bool _running = false;
     int _step = 0;
     QBasicTimer _timer;
+    QPointer<QQuickWindow> _watched;
 };
 
 }  // namespace kelvo

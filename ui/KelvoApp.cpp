@@ -66,7 +66,7 @@ void KelvoApp::showSaveView() {
     if (_saveViewController || !_model) return;
     _saveViewController = std::make_unique<KelvoSaveViewController>(
         _model->getSaveContents(),
-        KelvoSaveViewController::Services{_services.queue, *this, _services.snapshotDirectory});
+        KelvoSaveViewController::Services{_services.queue, *this, _services.worker, _services.snapshotDirectory});
     Q_EMIT saveViewPresented(_saveViewController.get());
 }
 

@@ -36,6 +36,7 @@ public:
         MessagePorts& ports;
         TelephonyClient& telephony;
         Preferences& preferences;
+        Worker& worker;
         std::function<std::unique_ptr<Window>()> createWindow;
         /// A file or directory here permits saving.
         std::string saveMarkerPath = "/ZorvikInternal/Library/PreferenceBundles/Carrier Settings.bundle";
@@ -57,6 +58,7 @@ public:
     const QString& updateMessage() const { return _updateMessage; }
     void setUpdateMessage(const QString& message) { _updateMessage = message; }
     bool allowSaveButton() const override { return _allowSaveButton; }
+    MainQueue& queue() const override { return _services.queue; }
     void setAllowSaveButton(bool allow) { _allowSaveButton = allow; }
 
     void updateStatusForViewController(KelvoPaneController& pane);

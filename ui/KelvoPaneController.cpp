@@ -1,6 +1,8 @@
 #include "ui/KelvoPaneController.h"
 
+#include <QPointer>
 #include <algorithm>
+#include <utility>
 
 #include "ui/NavigationStack.h"
 #include "ui/ScreenHost.h"
@@ -41,43 +43,82 @@ void KelvoPaneController::setTitle() {
     Q_EMIT titleChanged();
 }
 
-void KelvoPaneController::reloadData(std::vector<Row> rows) {
-    const auto same = [](const Row& a, const Row& b) { return a.isSameChild(b); };
-    const auto head = std::mismatch(_rows.begin(), _rows.end(), rows.begin(), rows.end(), same);
-    const auto tail = std::mismatch(_rows.rbegin(), std::make_reverse_iterator(head.first), rows.rbegin(),
-                                    std::make_reverse_iterator(head.second), same);
-    const auto first = static_cast<std::size_t>(head.first - _rows.begin());
-    const auto last = static_cast<std::size_t>(tail.first.base() - _rows.begin());
-    const auto count = static_cast<std::size_t>(tail.second.base() - head.second);
-    replaceRows(first, last, rows, count);
-    updateValues(0, first, rows.data());
-    updateValues(first + count, _rows.size(), rows.data());
+// Only what differs is told: rows that stay keep their place, their highlight and the finger on them. Children that
+// swapped places are taken out and put in again.
+void KelvoPaneController::reloadData(const std::vector<Row>& rows) {
+    std::size_t at = 0;
+    while (at < _rows.size() || at < rows.size()) {
+        if (at < _rows.size() && at < rows.size() && _rows[at].isSameChild(rows[at])) {
+            ++at;
+        } else if (const std::size_t gone = leadingWithout(_rows, rows, at); gone > 0) {
+            removeRows(at, gone);
+        } else if (const std::size_t come = leadingWithout(rows, _rows, at); come > 0) {
+            insertRows(at, come, rows);
+            at += come;
+        } else {
+            removeRows(at, 1);
+        }
+    }
+    updateValues(rows);
 }
 
-void KelvoPaneController::replaceRows(std::size_t first, std::size_t last, const std::vector<Row>& rows,
-                                      std::size_t count) {
-    const auto at = static_cast<std::ptrdiff_t>(first);
-    if (first < last) {
-        beginRemoveRows({}, static_cast<int>(first), static_cast<int>(last) - 1);
-        _rows.erase(_rows.begin() + at, _rows.begin() + static_cast<std::ptrdiff_t>(last));
-        endRemoveRows();
-    }
-    if (count > 0) {
-        const auto source = rows.begin() + at;
-        beginInsertRows({}, static_cast<int>(first), static_cast<int>(first + count) - 1);
-        _rows.insert(_rows.begin() + at, source, source + static_cast<std::ptrdiff_t>(count));
-        endInsertRows();
-    }
-    if (first < last || count > 0) selectRow(-1);
+std::size_t KelvoPaneController::leadingWithout(const std::vector<Row>& rows, const std::vector<Row>& others,
+                                                std::size_t from) {
+    const auto first = static_cast<std::ptrdiff_t>(from);
+    const auto isAmongOthers = [&](const Row& row) {
+        return from < others.size() && std::any_of(others.begin() + first, others.end(),
+                                                   [&](const Row& other) { return other.isSameChild(row); });
+    };
+    if (from >= rows.size()) return 0;
+    return static_cast<std::size_t>(std::find_if(rows.begin() + first, rows.end(), isAmongOthers) - rows.begin() -
+                                    first);
 }
 
-void KelvoPaneController::updateValues(std::size_t first, std::size_t last, const Row* rows) {
-    for (std::size_t row = first; row < last; ++row) {
-        if (_rows[row].value == rows[row].value) continue;
-        _rows[row].value = rows[row].value;
-        const QModelIndex changed = index(static_cast<int>(row));
-        Q_EMIT dataChanged(changed, changed, {ValueRole});
+void KelvoPaneController::removeRows(std::size_t first, std::size_t count) {
+    if (count == 0) return;
+    const int from = static_cast<int>(first);
+    const int to = static_cast<int>(first + count);
+    beginRemoveRows({}, from, to - 1);
+    _rows.erase(_rows.begin() + from, _rows.begin() + to);
+    endRemoveRows();
+    if (_selectedRow >= from) selectRow(_selectedRow < to ? -1 : _selectedRow - (to - from));
+}
+
+void KelvoPaneController::insertRows(std::size_t first, std::size_t count, const std::vector<Row>& rows) {
+    if (count == 0) return;
+    const int from = static_cast<int>(first);
+    const int to = static_cast<int>(first + count);
+    beginInsertRows({}, from, to - 1);
+    _rows.insert(_rows.begin() + from, rows.begin() + from, rows.begin() + to);
+    endInsertRows();
+    if (_selectedRow >= from) selectRow(_selectedRow + (to - from));
+}
+
+void KelvoPaneController::updateValues(const std::vector<Row>& rows) {
+    bool anyFresh = false;
+    for (std::size_t row = 0; row < _rows.size(); ++row) {
+        const bool fresh = _rows[row].value != rows[row].value;
+        update(row, rows[row].value, fresh);
+        anyFresh = anyFresh || fresh;
     }
+    ++_reloads;
+    if (!anyFresh) return;
+    _host.queue().postAfter(kFreshTime, [this, pane = QPointer(this), reload = _reloads] {
+        if (pane && reload == _reloads) letFreshRowsAge();
+    });
+}
+
+void KelvoPaneController::letFreshRowsAge() {
+    for (std::size_t row = 0; row < _rows.size(); ++row) update(row, _rows[row].value, false);
+}
+
+void KelvoPaneController::update(std::size_t row, const QString& value, bool fresh) {
+    QList<int> changed;
+    if (std::exchange(_rows[row].value, value) != value) changed.append(ValueRole);
+    if (std::exchange(_rows[row].fresh, fresh) != fresh) changed.append(FreshRole);
+    if (changed.isEmpty()) return;
+    const QModelIndex at = index(static_cast<int>(row));
+    Q_EMIT dataChanged(at, at, changed);
 }
 
 void KelvoPaneController::setStatus(const QString& status, bool isLoading) {
@@ -145,12 +186,13 @@ QVariant KelvoPaneController::data(const QModelIndex& index, int role) const {
         case KeyRole: return row.key;
         case ValueRole: return row.value;
         case OpensRole: return row.opens;
+        case FreshRole: return row.fresh;
         default: return {};
     }
 }
 
 QHash<int, QByteArray> KelvoPaneController::roleNames() const {
-    return {{KeyRole, "key"}, {ValueRole, "value"}, {OpensRole, "opens"}};
+    return {{KeyRole, "key"}, {ValueRole, "value"}, {OpensRole, "opens"}, {FreshRole, "fresh"}};
 }
 
 }  // namespace kelvo

@@ -3,6 +3,7 @@
 #include <QtQml/qqmlregistration.h>
 #include <QAbstractListModel>
 #include <QString>
+#include <chrono>
 #include <vector>
 
 #include "model/KelvoModelNode.h"
@@ -35,7 +36,10 @@ class KelvoPaneController : public QAbstractListModel {
     Q_PROPERTY(bool loading READ isLoading NOTIFY toolbarChanged)
     Q_PROPERTY(bool offersSave READ offersSave NOTIFY toolbarChanged)
 public:
-    enum Role { KeyRole = Qt::UserRole + 1, ValueRole, OpensRole };  // in QML: key, value, opens
+    enum Role { KeyRole = Qt::UserRole + 1, ValueRole, OpensRole, FreshRole };  // in QML: key, value, opens, fresh
+
+    /// How long a row whose value changed in a reload stays fresh, so that the eye finds it.
+    static constexpr std::chrono::milliseconds kFreshTime{900};
 
     /// A pane for `node`, which may be none, at `path`, which never changes. `host` outlives the pane.
     KelvoPaneController(NodeRef node, std::string path, ScreenHost& host);
@@ -80,15 +84,21 @@ private:
         QString key;
         QString value;
         bool opens;
+        bool fresh = false;
         bool isSameChild(const Row& other) const { return key == other.key && opens == other.opens; }
     };
     static std::vector<Row> rowsOf(const NodeRef& node);
 
     void setTitle();
     void createToolbarItems();
-    void reloadData(std::vector<Row> rows);
-    void replaceRows(std::size_t first, std::size_t last, const std::vector<Row>& rows, std::size_t count);
-    void updateValues(std::size_t first, std::size_t last, const Row* rows);
+    void reloadData(const std::vector<Row>& rows);
+    /// How many of `rows` in a row, from index `from` on, are not among `others` from there on.
+    static std::size_t leadingWithout(const std::vector<Row>& rows, const std::vector<Row>& others, std::size_t from);
+    void removeRows(std::size_t first, std::size_t count);
+    void insertRows(std::size_t first, std::size_t count, const std::vector<Row>& rows);
+    void updateValues(const std::vector<Row>& rows);
+    void update(std::size_t row, const QString& value, bool fresh);
+    void letFreshRowsAge();
     void selectRow(int row);
 
     NodeRef _nodes;
@@ -101,6 +111,7 @@ private:
     QString _backTitle;
     int _selectedRow = -1;
     std::vector<Row> _rows;
+    int _reloads = 0;
     std::vector<ToolbarItem> _toolbarItems;
 };
 

@@ -21,25 +21,39 @@ void KelvoSaveViewController::setSaveDescription(const QString& text) {
 }
 
 void KelvoSaveViewController::savePressed() {
+    if (_saving) return;
     QGuiApplication::inputMethod()->commit();  // what is still being composed belongs to the description
+    _saving = true;
+    Q_EMIT savingChanged();
     writeSnapshot();
-    close();
 }
 
 void KelvoSaveViewController::writeSnapshot() {
     const std::string path = Snapshot::pathInDirectory(_services.snapshotDirectory, clock().now());
-    const Result<Bytes> bytes = Snapshot{_timeStamp, _saveHistory, _saveDescription}.propertyList();
-    if (bytes && !writeFileInPlace(path, *bytes)) return;
-    logLine(Level::Error, "Unable to write snapshot to %s", path);
-    _services.host.showAlert(QStringLiteral("File Error"), QStringLiteral("Unable to write file to disk"),
-                             QStringLiteral("Close"));
+    const auto written = std::make_shared<bool>(false);
+    const auto write = [written, path, snapshot = Snapshot{_timeStamp, _saveHistory, _saveDescription}] {
+        const Result<Bytes> bytes = snapshot.propertyList();
+        *written = bytes && !writeFileInPlace(path, *bytes);
+    };
+    const auto finish = [written, path, services = _services, alive = std::weak_ptr(_alive)] {
+        if (!*written) logLine(Level::Error, "Unable to write snapshot to %s", path);
+        if (alive.expired()) return;  // the program has ended over it
+        if (!*written) {
+            services.host.showAlert(QStringLiteral("File Error"), QStringLiteral("Unable to write file to disk"),
+                                    QStringLiteral("Close"));
+        }
+        close(services);
+    };
+    _services.worker.run(write, finish);
 }
 
-void KelvoSaveViewController::cancelPressed() { close(); }
+void KelvoSaveViewController::cancelPressed() {
+    if (!_saving) close(_services);
+}
 
 // Later, so that the button's own action has returned before its screen goes.
-void KelvoSaveViewController::close() {
-    _services.queue.post([&host = _services.host] { host.closeSaveView(); });
+void KelvoSaveViewController::close(const Services& services) {
+    services.queue.post([&host = services.host] { host.closeSaveView(); });
 }
 
 void KelvoSaveViewController::backgroundTouched() { Q_EMIT resignFirstResponder(); }

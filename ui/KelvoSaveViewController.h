@@ -3,12 +3,14 @@
 #include <QtQml/qqmlregistration.h>
 #include <QAbstractListModel>
 #include <QString>
+#include <memory>
 #include <optional>
 #include <string>
 
 #include "platform/Clock.h"
 #include "platform/MainQueue.h"
 #include "platform/Value.h"
+#include "platform/Worker.h"
 
 namespace kelvo {
 
@@ -22,6 +24,7 @@ class KelvoSaveViewController : public QAbstractListModel {
     QML_ELEMENT
     QML_UNCREATABLE("The application makes its save screen")
     Q_PROPERTY(QString saveDescription READ saveDescription WRITE setSaveDescription NOTIFY saveDescriptionChanged)
+    Q_PROPERTY(bool saving READ isSaving NOTIFY savingChanged)
 public:
     enum Role { DescriptionRole = Qt::UserRole + 1 };  // in QML: description
 
@@ -31,6 +34,7 @@ public:
     struct Services {
         MainQueue& queue;
         ScreenHost& host;
+        Worker& worker;                 ///< writes the file
         std::string snapshotDirectory;  ///< not created when it is missing
     };
 
@@ -42,8 +46,11 @@ public:
     void setSaveDescription(const QString& text);
     void clearSaveDescription() { _saveDescription.reset(); }
 
-    Q_INVOKABLE void savePressed();    ///< writes the snapshot file, then closes; a failure is logged and alerted
+    /// Writes the snapshot file beside the main queue, then closes; a failure is logged and alerted. Until it is
+    /// written the screen stays and takes neither Save nor Cancel.
+    Q_INVOKABLE void savePressed();
     Q_INVOKABLE void cancelPressed();  ///< closes without writing
+    bool isSaving() const { return _saving; }
     Q_INVOKABLE void backgroundTouched();
     Q_INVOKABLE void didSelectRow(int row);
     Q_INVOKABLE bool textFieldShouldReturn();  ///< always true
@@ -54,16 +61,19 @@ public:
 
 Q_SIGNALS:
     void saveDescriptionChanged();
+    void savingChanged();
     void resignFirstResponder();  ///< the text field gives the keyboard up
 
 private:
     void writeSnapshot();
-    void close();
+    static void close(const Services& services);
 
     const Clock::TimePoint _timeStamp;
     const ArrayRef _saveHistory;
     std::optional<std::string> _saveDescription = "";
     const Services _services;
+    bool _saving = false;
+    const std::shared_ptr<bool> _alive = std::make_shared<bool>();  // the work may outlive the screen
 };
 
 }  // namespace kelvo

@@ -2,6 +2,8 @@
 
 #include <QString>
 
+#include "platform/MainQueue.h"
+
 namespace kelvo {
 
 /// What a screen may ask of the application that shows it. Main thread only.
@@ -9,6 +11,7 @@ class ScreenHost {
 public:
     virtual ~ScreenHost() = default;
 
+    virtual MainQueue& queue() const = 0;
     /// Whether panes offer to save; decided once, at launch.
     virtual bool allowSaveButton() const = 0;
     /// Presents the save screen over the panes; does nothing while one is there.

@@ -5,7 +5,8 @@
 
 namespace kelvo {
 
-/// Measures row texts in the bold 15-point font; points are device-independent pixels.
+/// Measures row texts in the bold 15-point font, every digit as wide as the widest; points are device-independent
+/// pixels.
 class TextMeasure {
 public:
     virtual ~TextMeasure() = default;

@@ -8,6 +8,14 @@ namespace kelvo {
 
 Theme::Theme(QObject* parent) : QObject(parent), _dark(systemIsDark()) { qGuiApp->installEventFilter(this); }
 
+void Theme::follow(std::optional<bool> dark) {
+    if (!dark) return QGuiApplication::setPalette(QPalette());
+    QGuiApplication::setPalette(*dark ? QPalette(Qt::white, QColor(0x202020), Qt::white, Qt::black, Qt::gray, Qt::white,
+                                                 Qt::white, Qt::black, QColor(0x202020))
+                                      : QPalette(Qt::black, QColor(0xefefef), Qt::white, Qt::darkGray, Qt::gray,
+                                                 Qt::black, Qt::white, Qt::white, QColor(0xefefef)));
+}
+
 bool Theme::systemIsDark() {
     const QPalette palette = QGuiApplication::palette();
     return palette.color(QPalette::Window).lightness() < palette.color(QPalette::WindowText).lightness();

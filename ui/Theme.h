@@ -3,10 +3,12 @@
 #include <QtQml/qqmlregistration.h>
 #include <QColor>
 #include <QObject>
+#include <optional>
 
 namespace kelvo {
 
-/// The colours and sizes of the screens. Light or dark follows the system's palette, while the program runs as well.
+/// The colours of the screens. Light or dark follows what the desktop asks for, else the system's palette; while the
+/// program runs as well.
 class Theme : public QObject {
     Q_OBJECT
     QML_ELEMENT
@@ -24,6 +26,9 @@ class Theme : public QObject {
     Q_PROPERTY(QColor shade READ shade NOTIFY changed)
 public:
     explicit Theme(QObject* parent = nullptr);
+
+    /// The desktop asks for dark or light; without a value the system's palette decides again.
+    static void follow(std::optional<bool> dark);
 
     bool isDark() const { return _dark; }
     QColor background() const;     ///< behind the rows

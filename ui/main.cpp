@@ -5,9 +5,11 @@
 #include <cstdio>
 #include <cstdlib>
 #include <exception>
+#include <optional>
 
 #include "platform/DirectoryResources.h"
 #include "platform/Environment.h"
+#include "platform/host/HostColorScheme.h"
 #include "platform/host/HostEventLoop.h"
 #include "platform/host/HostMainQueue.h"
 #include "platform/host/HostMessagePorts.h"
@@ -15,13 +17,20 @@
 #include "platform/host/HostPreferences.h"
 #include "platform/host/HostSystemLog.h"
 #include "platform/host/HostTelephonyClient.h"
+#include "platform/host/HostWorker.h"
 #include "platform/host/UnixSignals.h"
 #include "ui/KelvoApp.h"
 #include "ui/QuickWindow.h"
+#include "ui/Theme.h"
 
 namespace {
 
 using namespace kelvo;
+
+void followDesktop(HostColorScheme::Scheme scheme) {
+    const bool decided = scheme != HostColorScheme::Scheme::NoPreference;
+    Theme::follow(decided ? std::optional(scheme == HostColorScheme::Scheme::Dark) : std::nullopt);
+}
 
 int runApplication(int argc, char** argv) {
     QuickWindow::chooseSceneGraph();
@@ -30,6 +39,7 @@ int runApplication(int argc, char** argv) {
     QGuiApplication::setApplicationDisplayName(QStringLiteral("Kelvo"));
     QGuiApplication::setDesktopFileName(QStringLiteral("org.kelvo.Kelvo"));
 
+    const HostColorScheme colors(followDesktop);  // early: the answer comes before the first frame
     HostSystemLog log("kelvo");
     const DirectoryResources resources(HostPaths::resourcesDirectory());
     const Environment::Scope environment(
@@ -39,7 +49,8 @@ int runApplication(int argc, char** argv) {
     HostMessagePorts ports;
     HostTelephonyClient telephony(ports);
     HostPreferences preferences;
-    KelvoApp app({queue, ports, telephony, preferences, [] { return std::make_unique<QuickWindow>(); }});
+    HostWorker worker;
+    KelvoApp app({queue, ports, telephony, preferences, worker, [] { return std::make_unique<QuickWindow>(); }});
     app.applicationDidFinishLaunching();
 
     // Closing the window, Ctrl-C and a polite kill end the program the same way.

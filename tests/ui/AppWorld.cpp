@@ -19,6 +19,7 @@ KelvoApp::Services AppWorld::services() {
             ports,
             telephony,
             preferences,
+            worker,
             [this] { return std::make_unique<FakeWindow>(events); },
             markerPath().string(),
             snapshotDirectory().string()};

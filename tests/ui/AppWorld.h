@@ -11,6 +11,7 @@
 #include "tests/support/FakeTelephony.h"
 #include "tests/support/ManualClock.h"
 #include "tests/support/ManualQueue.h"
+#include "tests/support/ManualWorker.h"
 #include "tests/support/RecordingLog.h"
 #include "tests/ui/FakeWindow.h"
 #include "ui/KelvoApp.h"
@@ -57,6 +58,7 @@ public:
     FakeTelephony telephony;
     Events events;
     FakePreferences preferences{events};
+    ManualWorker worker;
 };
 
 /// A tree of two sections with two leaves each and a list of `cells` cells.

@@ -1,5 +1,6 @@
 #pragma once
 
+#include "tests/support/ManualQueue.h"
 #include "ui/ScreenHost.h"
 
 namespace kelvo::test {
@@ -7,6 +8,7 @@ namespace kelvo::test {
 /// An application that only notes what its screens ask of it.
 class FakeHost final : public ScreenHost {
 public:
+    MainQueue& queue() const override { return tasks; }
     bool allowSaveButton() const override { return savingAllowed; }
     void showSaveView() override { ++saveViewsShown; }
     void closeSaveView() override { ++saveViewsClosed; }
@@ -14,6 +16,7 @@ public:
         alerts.append(title + QLatin1Char('|') + message + QLatin1Char('|') + button);
     }
 
+    mutable ManualQueue tasks;
     bool savingAllowed = false;
     int saveViewsShown = 0;
     int saveViewsClosed = 0;

@@ -282,7 +282,7 @@ TEST_F(App, OpensTheSaveScreenEvenBeforeThereIsAModem) {
 }
 
 TEST_F(App, LooksForTheMarkerAndSavesWhereTheInstallationPutsThem) {
-    const KelvoApp::Services services{world.queue, world.ports, world.telephony, world.preferences, {}};
+    const KelvoApp::Services services{world.queue, world.ports, world.telephony, world.preferences, world.worker, {}};
     EXPECT_EQ(services.saveMarkerPath, "/ZorvikInternal/Library/PreferenceBundles/Carrier Settings.bundle");
     EXPECT_EQ(services.snapshotDirectory, "/var/mobile/Library/Logs/Quillet");
 }

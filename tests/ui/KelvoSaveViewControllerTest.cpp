@@ -11,6 +11,7 @@
 #include "platform/PropertyList.h"
 #include "tests/support/ManualClock.h"
 #include "tests/support/ManualQueue.h"
+#include "tests/support/ManualWorker.h"
 #include "tests/support/RecordingLog.h"
 #include "tests/ui/AppWorld.h"
 #include "tests/ui/FakeHost.h"
@@ -24,7 +25,7 @@ class SaveScreen : public testing::Test {
 protected:
     KelvoSaveViewController& open(const ArrayRef& history) {
         screen = std::make_unique<KelvoSaveViewController>(
-            history, KelvoSaveViewController::Services{queue, host, folder.path.string()});
+            history, KelvoSaveViewController::Services{queue, host, worker, folder.path.string()});
         return *screen;
     }
     static ArrayRef twoEntries() {
@@ -51,6 +52,7 @@ protected:
     test::RecordingLog log;
     Environment::Scope environment{{.log = &log, .clock = &clock}};
     test::ManualQueue queue;
+    test::ManualWorker worker;
     test::FakeHost host;
     test::TemporaryDirectory folder;
     std::unique_ptr<KelvoSaveViewController> screen;
@@ -154,6 +156,42 @@ TEST_F(SaveScreen, ClosesOnlyOnceItsButtonHasReturned) {
     EXPECT_EQ(host.saveViewsClosed, 0);
     queue.run();
     EXPECT_EQ(host.saveViewsClosed, 1);
+}
+
+TEST_F(SaveScreen, StaysAsItIsUntilTheFileIsWritten) {
+    worker.held = true;
+    KelvoSaveViewController& save = open(twoEntries());
+    const QSignalSpy changes(&save, &KelvoSaveViewController::savingChanged);
+    save.setSaveDescription(QStringLiteral("at the door"));
+    save.savePressed();
+    EXPECT_TRUE(save.isSaving());
+    EXPECT_EQ(changes.count(), 1);
+    save.setSaveDescription(QStringLiteral("too late"));
+    save.savePressed();
+    save.cancelPressed();
+    queue.run();
+    EXPECT_EQ(host.saveViewsClosed, 0);
+    EXPECT_EQ(files(), 0);
+
+    clock.advance(9s);  // the file keeps the second in which Save was pressed
+    worker.finish();
+    EXPECT_EQ(host.saveViewsClosed, 0);
+    queue.run();
+    EXPECT_EQ(host.saveViewsClosed, 1);
+    ASSERT_EQ(files(), 1);
+    EXPECT_EQ((*contents(pathAt(1299230102)).dictionary())["Description"], Value("at the door"));
+}
+
+TEST_F(SaveScreen, LogsAFailureThatComesAfterItHasGoneAndAsksNobody) {
+    worker.held = true;
+    open(twoEntries()).savePressed();
+    screen.reset();
+    std::filesystem::remove(folder.path);
+    worker.finish();
+    queue.run();
+    EXPECT_EQ(log.lines().size(), 1U);
+    EXPECT_TRUE(host.alerts.isEmpty());
+    EXPECT_EQ(host.saveViewsClosed, 0);
 }
 
 TEST_F(SaveScreen, WritesNothingWhenItIsCancelled) {

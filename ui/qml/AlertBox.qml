@@ -59,10 +59,8 @@ FocusScope {
                 color: Theme.secondaryText
                 font.pixelSize: 14
             }
-            Rectangle {
+            Hairline {
                 width: parent.width
-                height: 1
-                color: Theme.hairline
             }
             Item {
                 width: parent.width

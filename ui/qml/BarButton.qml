@@ -62,7 +62,7 @@ T.AbstractButton {
             anchors.verticalCenter: parent.verticalCenter
             textFormat: Text.PlainText
             elide: Text.ElideRight
-            color: Theme.accent
+            color: content.enabled ? Theme.accent : Theme.secondaryText
             font.pixelSize: 16
         }
     }

@@ -31,11 +31,9 @@ Item {
         color: Theme.accent
     }
 
-    Rectangle {
+    Hairline {
         anchors { left: parent.left; leftMargin: 14; right: parent.right; top: parent.top }
         visible: row.index > 0
-        height: 1
-        color: Theme.hairline
     }
 
     TapHandler {

@@ -31,6 +31,7 @@ FocusScope {
         activeFocusOnTab: true
         currentIndex: -1  // nothing is marked until a key is pressed
         highlightMoveDuration: 0
+        maximumFlickVelocity: 6000
         reuseItems: true
         model: page.pane
         delegate: PaneRow {
@@ -46,6 +47,18 @@ FocusScope {
         Keys.onEnterPressed: page.pane.didSelectRow(currentIndex)
         Keys.onSpacePressed: page.pane.didSelectRow(currentIndex)
         Keys.onPressed: event => {
+            const page = Math.max(1, Math.floor(height / 50) - 1);
+            const jumps = {
+                [Qt.Key_Home]: -count,
+                [Qt.Key_End]: count,
+                [Qt.Key_PageUp]: -page,
+                [Qt.Key_PageDown]: page
+            };
+            if (event.key in jumps) {
+                currentIndex = Math.max(0, Math.min(count - 1, currentIndex + jumps[event.key]));
+                event.accepted = true;
+                return;
+            }
             const row = currentItem as PaneRow;
             const plain = row && !(event.modifiers & Qt.AltModifier);
             if (plain && event.key === Qt.Key_Right)

@@ -6,6 +6,7 @@ KelvoCell {
     id: row
 
     required property int index
+    required property bool fresh
     required property KelvoPaneController pane
     readonly property bool marked: ListView.isCurrentItem && ListView.view.activeFocus
 
@@ -35,7 +36,7 @@ KelvoCell {
 
     Rectangle {
         anchors.fill: parent
-        color: row.opens && (tap.pressed || row.pane.selectedRow === row.index) ? Theme.pressed : Theme.row
+        color: tap.pressed && row.opens || row.pane.selectedRow === row.index ? Theme.pressed : Theme.row
     }
 
     Item {
@@ -73,17 +74,12 @@ KelvoCell {
                 Accessible.ignored: true
             }
 
-            Text {
+            FigureText {
                 x: row.valueFrame.x
                 y: row.valueFrame.y
-                width: row.valueFrame.width
-                height: row.valueFrame.height
-                visible: text !== ""
                 text: row.shownValue
-                textFormat: Text.PlainText
-                color: Theme.secondaryText
+                color: row.fresh ? Theme.accent : Theme.secondaryText
                 font.pixelSize: 15
-                Accessible.ignored: true
             }
         }
 
@@ -109,10 +105,8 @@ KelvoCell {
         color: Theme.secondaryText
     }
 
-    Rectangle {
+    Hairline {
         anchors { left: parent.left; leftMargin: 16; right: parent.right; bottom: parent.bottom }
-        height: 1
-        color: Theme.hairline
     }
 
     Rectangle {

@@ -64,6 +64,7 @@ FocusScope {
 
         BarButton {
             anchors { left: parent.left; leftMargin: 4; top: parent.top; topMargin: 6 }
+            enabled: !sheet.saveView.saving
             text: qsTr("Cancel")
             onClicked: sheet.saveView.cancelPressed()
         }
@@ -76,8 +77,16 @@ FocusScope {
             font { pixelSize: 17; bold: true }
         }
 
+        ActivityIndicator {
+            anchors { horizontalCenter: save.horizontalCenter; verticalCenter: save.verticalCenter }
+            running: sheet.saveView.saving
+            color: Theme.secondaryText
+        }
+
         BarButton {
+            id: save
             anchors { right: parent.right; rightMargin: 4; top: parent.top; topMargin: 6 }
+            visible: !sheet.saveView.saving
             text: qsTr("Save")
             strong: true
             onClicked: sheet.saveView.savePressed()
@@ -104,6 +113,7 @@ FocusScope {
                 placeholderText: qsTr("Description")
                 font.pixelSize: 16
                 activeFocusOnTab: true
+                readOnly: sheet.saveView.saving
                 Accessible.name: placeholderText
                 onTextEdited: sheet.saveView.saveDescription = text
                 onAccepted: sheet.saveView.textFieldShouldReturn()

@@ -51,6 +51,13 @@ FocusScope {
         Component.onCompleted: show(screen.application.navigation.rootViewController, false)
     }
 
+    // The mouse's button for the way back.
+    TapHandler {
+        acceptedButtons: Qt.BackButton
+        enabled: stack.enabled
+        onTapped: screen.application.navigation.popViewController()
+    }
+
     Component {
         id: page
         PanePage {

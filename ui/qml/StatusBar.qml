@@ -10,10 +10,8 @@ Rectangle {
     height: 50
     color: Theme.bar
 
-    Rectangle {
+    Hairline {
         anchors { left: parent.left; right: parent.right; top: parent.top }
-        height: 1
-        color: Theme.hairline
     }
 
     ActivityIndicator {
@@ -23,13 +21,11 @@ Rectangle {
         color: Theme.secondaryText
     }
 
-    Text {
+    FigureText {
         anchors.verticalCenter: parent.verticalCenter
         x: indicator.running ? 44 : 16
-        width: Math.min(implicitWidth, bar.width - x - (save.visible ? save.width + 4 : 16))
+        maximumWidth: bar.width - x - (save.visible ? save.width + 4 : 16)
         text: bar.pane.status
-        textFormat: Text.PlainText
-        elide: Text.ElideRight
         color: Theme.text
         font.pixelSize: 14
         Accessible.role: Accessible.StaticText

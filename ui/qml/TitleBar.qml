@@ -16,9 +16,9 @@ Rectangle {
     BarButton {
         id: backButton
 
-        // A title that needs the room leaves the way back its arrow alone.
+        // A title that needs the room first becomes smaller, and then leaves the way back its arrow alone.
         readonly property real named: Math.min(implicitWidth, bar.width / 3)
-        readonly property bool roomForName: named + 20 + title.implicitWidth <= bar.width - 16
+        readonly property bool roomForName: x + named + 4 + title.implicitWidth * 14 / 17 <= bar.width - 16
 
         anchors { left: parent.left; leftMargin: 4; verticalCenter: parent.verticalCenter }
         width: roomForName ? named : 40
@@ -43,15 +43,15 @@ Rectangle {
         text: bar.title
         textFormat: Text.PlainText
         elide: Text.ElideRight
+        fontSizeMode: Text.HorizontalFit
+        minimumPixelSize: 14
         color: Theme.text
         font { pixelSize: 17; bold: true }
         Accessible.role: Accessible.Heading
         Accessible.name: text
     }
 
-    Rectangle {
+    Hairline {
         anchors { left: parent.left; right: parent.right; bottom: parent.bottom }
-        height: 1
-        color: Theme.hairline
     }
 }

@@ -96,25 +96,24 @@ void KelvoPaneController::insertRows(std::size_t first, std::size_t count, const
 
 void KelvoPaneController::updateValues(const std::vector<Row>& rows) {
     bool anyFresh = false;
-    for (std::size_t row = 0; row < _rows.size(); ++row) {
-        const bool fresh = _rows[row].value != rows[row].value;
-        update(row, rows[row].value, fresh);
-        anyFresh = anyFresh || fresh;
+    for (std::size_t at = 0; at < _rows.size(); ++at) {
+        const bool changed = _rows[at].value != rows[at].value;
+        _rows[at].value = rows[at].value;
+        setFresh(at, changed, changed ? QList<int>{ValueRole} : QList<int>());
+        anyFresh = anyFresh || changed;
     }
     ++_reloads;
     if (!anyFresh) return;
-    _host.queue().postAfter(kFreshTime, [this, pane = QPointer(this), reload = _reloads] {
-        if (pane && reload == _reloads) letFreshRowsAge();
+    _host.queue().postAfter(kFreshTime, [pane = QPointer(this), reload = _reloads] {
+        if (pane && pane->_reloads == reload) pane->letFreshRowsAge();
     });
 }
 
 void KelvoPaneController::letFreshRowsAge() {
-    for (std::size_t row = 0; row < _rows.size(); ++row) update(row, _rows[row].value, false);
+    for (std::size_t at = 0; at < _rows.size(); ++at) setFresh(at, false, {});
 }
 
-void KelvoPaneController::update(std::size_t row, const QString& value, bool fresh) {
-    QList<int> changed;
-    if (std::exchange(_rows[row].value, value) != value) changed.append(ValueRole);
+void KelvoPaneController::setFresh(std::size_t row, bool fresh, QList<int> changed) {
     if (std::exchange(_rows[row].fresh, fresh) != fresh) changed.append(FreshRole);
     if (changed.isEmpty()) return;
     const QModelIndex at = index(static_cast<int>(row));

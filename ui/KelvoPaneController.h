@@ -2,6 +2,7 @@
 
 #include <QtQml/qqmlregistration.h>
 #include <QAbstractListModel>
+#include <QList>
 #include <QString>
 #include <chrono>
 #include <vector>
@@ -97,7 +98,8 @@ private:
     void removeRows(std::size_t first, std::size_t count);
     void insertRows(std::size_t first, std::size_t count, const std::vector<Row>& rows);
     void updateValues(const std::vector<Row>& rows);
-    void update(std::size_t row, const QString& value, bool fresh);
+    /// Tells that a row has changed in the roles `changed`, and in its freshness when that does.
+    void setFresh(std::size_t row, bool fresh, QList<int> changed);
     void letFreshRowsAge();
     void selectRow(int row);
 

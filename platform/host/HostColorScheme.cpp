@@ -30,6 +30,7 @@ HostColorScheme::HostColorScheme(std::function<void(Scheme)> told) : _told(std::
     if (address.isEmpty()) return;
     _bus = QDBusConnection::connectToBus(address, kConnection);
     if (!_bus->isConnected()) return;
+    qRegisterMetaType<QDBusVariant>();  // else the slot's signature would not be known yet, and never be called
     // Changes first, so that none is missed between the answer and the subscription.
     _bus->connect(kPortal, kPath, kSettings, "SettingChanged", {kGroup, kKey}, QString(), this,
                   SLOT(settingChanged(QString, QString, QDBusVariant)));

@@ -12,6 +12,7 @@
 namespace kelvo {
 namespace {
 
+using namespace std::chrono_literals;
 using Kind = ToolbarItem::Kind;
 
 NodeRef treeOf(const Value& display) {
@@ -41,6 +42,15 @@ protected:
                             (opens ? ">" : "=" + text(KelvoPaneController::ValueRole)));
         }
         return texts;
+    }
+    static std::vector<std::string> fresh(const KelvoPaneController& pane) {
+        std::vector<std::string> keys;
+        for (int row = 0; row < pane.rowCount(); ++row) {
+            const QModelIndex at = pane.index(row);
+            if (pane.data(at, KelvoPaneController::FreshRole).toBool())
+                keys.push_back(pane.data(at, KelvoPaneController::KeyRole).toString().toStdString());
+        }
+        return keys;
     }
     static std::vector<Kind> toolbar(const KelvoPaneController& pane) {
         std::vector<Kind> kinds;
@@ -169,6 +179,67 @@ TEST_F(Pane, ChangesOnlyTheValuesThatDiffer) {
     EXPECT_EQ(changed[0][0].toModelIndex().row(), 1);
     EXPECT_EQ(inserted.count() + removed.count(), 0);
     EXPECT_EQ(rows(pane), (Rows{"A=1", "B=5", "C=3"}));
+}
+
+TEST_F(Pane, CallsAChangedValueFreshForAMoment) {
+    KelvoPaneController& pane = paneOf(Dictionary::make({{"A", "1"}, {"B", "2"}, {"C", "3"}}));
+    EXPECT_EQ(fresh(pane), Rows{});
+    pane.reloadWithNode(treeOf(Dictionary::make({{"A", "1"}, {"B", "5"}, {"C", "3"}, {"D", "new"}})));
+    EXPECT_EQ(fresh(pane), Rows{"B"});
+    host.tasks.advance(899ms);
+    EXPECT_EQ(fresh(pane), Rows{"B"});
+    host.tasks.advance(1ms);
+    EXPECT_EQ(fresh(pane), Rows{});
+    EXPECT_EQ(rows(pane), (Rows{"A=1", "B=5", "C=3", "D=new"}));
+}
+
+TEST_F(Pane, GivesEveryReloadItsOwnMoment) {
+    KelvoPaneController& pane = paneOf(Dictionary::make({{"A", "1"}, {"B", "2"}}));
+    pane.reloadWithNode(treeOf(Dictionary::make({{"A", "3"}, {"B", "2"}})));
+    host.tasks.advance(500ms);
+    pane.reloadWithNode(treeOf(Dictionary::make({{"A", "3"}, {"B", "4"}})));
+    EXPECT_EQ(fresh(pane), Rows{"B"});
+    host.tasks.advance(500ms);
+    EXPECT_EQ(fresh(pane), Rows{"B"});
+    host.tasks.advance(400ms);
+    EXPECT_EQ(fresh(pane), Rows{});
+}
+
+TEST_F(Pane, MayGoWhileAValueIsFresh) {
+    paneOf(Dictionary::make({{"A", "1"}})).reloadWithNode(treeOf(Dictionary::make({{"A", "2"}})));
+    tester.reset();
+    stack.reset();
+    host.tasks.advance(1s);
+}
+
+TEST_F(Pane, KeepsTheHighlightOnItsRowWhenOthersComeAndGo) {
+    KelvoPaneController& pane = paneOf(Dictionary::make({{"A", "1"}, {"Cells", branch()}, {"Z", "2"}}));
+    pane.didSelectRow(1);
+    pane.reloadWithNode(treeOf(Dictionary::make({{"A", "1"}, {"B", "1"}, {"Cells", branch()}, {"Z", "2"}})));
+    EXPECT_EQ(pane.selectedRow(), 2);
+    pane.reloadWithNode(treeOf(Dictionary::make({{"Cells", branch()}, {"Y", "1"}, {"Z", "2"}})));
+    EXPECT_EQ(pane.selectedRow(), 0);
+    pane.reloadWithNode(treeOf(Dictionary::make({{"Y", "1"}, {"Z", "2"}})));
+    EXPECT_EQ(pane.selectedRow(), -1);
+}
+
+TEST_F(Pane, ChangesRowsInSeveralPlacesAndLeavesThoseBetweenAlone) {
+    KelvoPaneController& pane = paneOf(Dictionary::make({{"A", "1"}, {"B", "2"}, {"C", "3"}, {"D", "4"}, {"E", "5"}}));
+    const QPersistentModelIndex kept(pane.index(2));
+    const QSignalSpy inserted(&pane, &QAbstractItemModel::rowsInserted);
+    const QSignalSpy removed(&pane, &QAbstractItemModel::rowsRemoved);
+    pane.reloadWithNode(treeOf(Dictionary::make({{"X", "0"}, {"A", "1"}, {"C", "3"}, {"E", "5"}, {"Y", "6"}})));
+    EXPECT_EQ(rows(pane), (Rows{"X=0", "A=1", "C=3", "E=5", "Y=6"}));
+    EXPECT_EQ(kept.row(), 2);
+    EXPECT_EQ(kept.data(KelvoPaneController::KeyRole).toString(), QStringLiteral("C"));
+    EXPECT_EQ(inserted.count(), 2);
+    EXPECT_EQ(removed.count(), 2);
+}
+
+TEST_F(Pane, FollowsChildrenThatChangePlaces) {
+    KelvoPaneController& pane = paneOf(Dictionary::make({{"A", "1"}, {"B", "2"}, {"C", "3"}}));
+    pane.reloadWithNode(treeOf(Dictionary::make({{"C", "3"}, {"A", "1"}, {"B", "9"}})));
+    EXPECT_EQ(rows(pane), (Rows{"C=3", "A=1", "B=9"}));
 }
 
 TEST_F(Pane, InsertsAndRemovesOnlyWhatCameAndWent) {

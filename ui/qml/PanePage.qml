@@ -70,6 +70,7 @@ FocusScope {
         T.ScrollIndicator.vertical: T.ScrollIndicator {
             id: indicator
             implicitWidth: 7
+            Accessible.ignored: true
             contentItem: Rectangle {
                 implicitWidth: 3
                 radius: 1.5
@@ -91,6 +92,8 @@ FocusScope {
         wrapMode: Text.Wrap
         color: Theme.secondaryText
         font.pixelSize: 15
+        Accessible.role: Accessible.StaticText
+        Accessible.name: text
     }
 
     TitleBar {

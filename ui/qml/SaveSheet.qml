@@ -51,8 +51,9 @@ FocusScope {
     Rectangle {
         id: panel
 
+        anchors.horizontalCenter: parent.horizontalCenter
         y: 24
-        width: parent.width
+        width: Math.min(parent.width, 640)
         height: parent.height
         radius: 14
         color: Theme.background
@@ -96,7 +97,7 @@ FocusScope {
             id: column
 
             anchors { top: parent.top; topMargin: 64; horizontalCenter: parent.horizontalCenter }
-            width: Math.min(parent.width, 640) - 32
+            width: parent.width - 32
             spacing: 8
 
             T.TextField {

@@ -51,6 +51,11 @@ FocusScope {
         Component.onCompleted: show(screen.application.navigation.rootViewController, false)
     }
 
+    Shortcut {
+        sequences: [StandardKey.Quit]
+        onActivated: screen.Window.window.close()
+    }
+
     // The mouse's button for the way back.
     TapHandler {
         acceptedButtons: Qt.BackButton

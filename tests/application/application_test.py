@@ -44,9 +44,10 @@ class ApplicationTest(unittest.TestCase):
         self.quits(window, application)
 
     def waits_for_a_service(self):
-        application, window = self.session.start_application()
+        application, window = self.session.start_application(internal=False)
         window.wait("Waiting for the modem")
-        window.wait("Connecting")
+        window.wait(lambda text: text.startswith("Connecting"))
+        self.assertIsNone(window.find("Save"))
         application.terminate()
         self.assertEqual(application.wait(), 0)
 

@@ -219,10 +219,10 @@ class Window:
         self._tool("mousemove", *middle, "click", 1)
 
     def key(self, *names):
-        self._tool("key", "--window", self._id, *names)
+        self._tool("key", *names)
 
     def type(self, text):
-        self._tool("type", "--window", self._id, text)
+        self._tool("type", text)
 
     def picture(self, path):
         self._desktop.run("import", "-window", self._id, path)

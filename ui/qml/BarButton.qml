@@ -19,6 +19,7 @@ T.AbstractButton {
     Keys.onReturnPressed: clicked()
     Keys.onEnterPressed: clicked()
 
+    Accessible.ignored: !enabled
     Accessible.role: Accessible.Button
     Accessible.name: text
     Accessible.onPressAction: clicked()

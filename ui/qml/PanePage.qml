@@ -40,6 +40,7 @@ FocusScope {
             onTouched: list.currentIndex = -1
         }
 
+        Accessible.ignored: !enabled
         Accessible.role: Accessible.List
         Accessible.name: page.pane.title
 
@@ -92,6 +93,7 @@ FocusScope {
         wrapMode: Text.Wrap
         color: Theme.secondaryText
         font.pixelSize: 15
+        Accessible.ignored: !enabled
         Accessible.role: Accessible.StaticText
         Accessible.name: text
     }

@@ -28,6 +28,7 @@ KelvoCell {
     }
     ListView.onReused: visible = true
 
+    Accessible.ignored: !enabled  // a screen that covers the pane covers it for a screen reader, too
     Accessible.role: Accessible.ListItem
     Accessible.name: accessibleName
     Accessible.focusable: true

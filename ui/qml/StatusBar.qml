@@ -28,6 +28,7 @@ Rectangle {
         text: bar.pane.status
         color: Theme.text
         font.pixelSize: 14
+        Accessible.ignored: !enabled
         Accessible.role: Accessible.StaticText
         Accessible.name: text
         Behavior on x {

@@ -47,6 +47,7 @@ Rectangle {
         minimumPixelSize: 14
         color: Theme.text
         font { pixelSize: 17; bold: true }
+        Accessible.ignored: !enabled
         Accessible.role: Accessible.Heading
         Accessible.name: text
     }

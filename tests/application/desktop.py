@@ -1,6 +1,6 @@
 """A desktop of its own for programs under test: an X server without a screen, a session bus with the portal that tells
 the colour scheme, and eyes and hands: what a window shows is read as a screen reader reads it, and typed and clicked
-into as a person does. Nothing of the user's session is touched. Needs the packages of the group "check-window"."""
+into as a person does. Nothing of the user's session is touched. Needs the packages of the groups "internal" and "window"."""
 import os
 import shutil
 import subprocess
@@ -97,8 +97,9 @@ class Desktop:
 
     def _start_screen(self, size):
         reading, writing = os.pipe()
-        self.start("Xvfb", "-displayfd", str(writing), "-nolisten", "tcp", "-screen", "0", f"{size[0]}x{size[1]}x24",
-                   pass_fds=[writing])
+        # Without -noreset the server starts anew whenever its only client leaves, and turns the next one away.
+        self.start("Xvfb", "-displayfd", str(writing), "-noreset", "-nolisten", "tcp",
+                   "-screen", "0", f"{size[0]}x{size[1]}x24", pass_fds=[writing])
         os.close(writing)
         with os.fdopen(reading) as display:
             self.environment["DISPLAY"] = ":" + display.readline().strip()

@@ -52,7 +52,7 @@ FocusScope {
     }
 
     Shortcut {
-        sequences: [StandardKey.Quit]
+        sequence: "Ctrl+Q"
         onActivated: screen.Window.window.close()
     }
 

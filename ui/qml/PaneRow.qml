@@ -76,10 +76,11 @@ KelvoCell {
             }
 
             FigureText {
+                id: value
                 x: row.valueFrame.x
                 y: row.valueFrame.y
                 text: row.shownValue
-                color: row.fresh ? Theme.accent : Theme.secondaryText
+                color: Theme.secondaryText
                 font.pixelSize: 15
             }
         }
@@ -116,6 +117,17 @@ KelvoCell {
         color: "transparent"
         radius: 6
         border { width: 2; color: Theme.accent }
+    }
+
+    // A value that changed stands out at once and calms down slowly.
+    states: State {
+        name: "fresh"
+        when: row.fresh
+        PropertyChanges { value.color: Theme.accent }
+    }
+    transitions: Transition {
+        from: "fresh"
+        ColorAnimation { duration: 400 }
     }
 
     TapHandler {

@@ -85,11 +85,11 @@ KelvoCell {
             }
         }
 
-        // More lies to the right.
+        // More of the value lies to the right.
         Rectangle {
             anchors { right: parent.right; top: parent.top; bottom: parent.bottom; bottomMargin: 1 }
             width: 28
-            visible: strip.interactive && !strip.atXEnd
+            visible: strip.interactive && row.valueFrame.x + row.valueFrame.width - strip.contentX > strip.width
             gradient: Gradient {
                 orientation: Gradient.Horizontal
                 GradientStop { position: 0; color: Qt.rgba(Theme.row.r, Theme.row.g, Theme.row.b, 0) }

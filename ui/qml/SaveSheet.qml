@@ -57,6 +57,7 @@ FocusScope {
         height: parent.height
         radius: 14
         color: Theme.background
+        border { width: 1 / Screen.devicePixelRatio; color: Theme.hairline }
 
         MouseArea {
             anchors.fill: parent
@@ -64,6 +65,7 @@ FocusScope {
         }
 
         BarButton {
+            id: cancel
             anchors { left: parent.left; leftMargin: 4; top: parent.top; topMargin: 6 }
             enabled: !sheet.saveView.saving
             text: qsTr("Cancel")
@@ -73,6 +75,11 @@ FocusScope {
         Text {
             id: heading
             anchors { horizontalCenter: parent.horizontalCenter; top: parent.top; topMargin: 18 }
+            width: panel.width - 2 * Math.max(cancel.width, save.width) - 8
+            horizontalAlignment: Text.AlignHCenter
+            fontSizeMode: Text.HorizontalFit
+            minimumPixelSize: 13
+            elide: Text.ElideRight
             text: qsTr("Save Snapshot")
             color: Theme.text
             font { pixelSize: 17; bold: true }

@@ -1,6 +1,7 @@
 """A desktop of its own for programs under test: an X server without a screen, a session bus with the portal that tells
 the colour scheme, and eyes and hands: what a window shows is read as a screen reader reads it, and typed and clicked
-into as a person does. Nothing of the user's session is touched. Needs the packages of the groups "internal" and "window"."""
+into as a person does. Nothing of the user's session is touched. Needs the packages of the groups "internal"
+and "window"."""
 import os
 import shutil
 import subprocess
@@ -73,7 +74,8 @@ class Desktop:
         self.directory = Path(tempfile.mkdtemp(prefix="kelvo-desktop-"))
         self._programs = []
         self.environment = {
-            name: value for name, value in os.environ.items() if not name.startswith(("QT_", "DBUS_", "XDG_", "WAYLAND_"))
+            name: value for name, value in os.environ.items()
+            if not name.startswith(("QT_", "DBUS_", "XDG_", "WAYLAND_"))
         }
         for name in ("RUNTIME_DIR", "CONFIG_HOME", "DATA_HOME", "CACHE_HOME", "STATE_HOME"):
             path = self.directory / name.lower()

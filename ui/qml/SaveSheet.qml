@@ -57,7 +57,7 @@ FocusScope {
         height: parent.height
         radius: 14
         color: Theme.background
-        border { width: 1 / Screen.devicePixelRatio; color: Theme.hairline }
+        border { width: 1; color: Theme.hairline }
 
         MouseArea {
             anchors.fill: parent

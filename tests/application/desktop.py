@@ -15,7 +15,7 @@ from jeepney.bus_messages import message_bus
 from jeepney.io.blocking import open_dbus_connection
 
 PROGRAMS = ("Xvfb", "dbus-daemon", "/usr/libexec/at-spi-bus-launcher", "xdotool", "import", "bwrap")
-PATIENCE = 15  # seconds; every wait ends as soon as its condition holds
+PATIENCE = 30  # seconds; every wait ends as soon as its condition holds
 
 
 def missing_programs():

@@ -1,6 +1,10 @@
 #include "LogGenerator/CellInfo.h"
 
+#include <algorithm>
+
+#include "LogGenerator/Base.h"
 #include "LogGenerator/Framing.h"
+#include "LogGenerator/RowWriter.h"
 #include "platform/Environment.h"
 #include "platform/PropertyList.h"
 #include "platform/TelephonyConstants.h"
@@ -12,6 +16,19 @@ Value payloadPropertyList(ByteView packet) {
     return value ? *value : Value();
 }
 
+// Up to five sections read one record, and a phone that stays where it is sends the same array again and again: the
+// last one is kept with its bytes.
+Value cellInfo(ByteView packet) {
+    thread_local Bytes lastPayload;
+    thread_local Value lastValue;
+    const ByteView payload = payloadOf(packet);
+    if (!lastValue || !std::ranges::equal(payload, lastPayload)) {
+        lastValue = payloadPropertyList(packet);
+        lastPayload.assign(payload.begin(), payload.end());
+    }
+    return lastValue;
+}
+
 ArrayRef cellsOf(const Value& payload) {
     if (!payload) {
         logLine(Level::Error, "Cell Info Array data could not be constructed");
@@ -21,15 +38,16 @@ ArrayRef cellsOf(const Value& payload) {
     return payload.array() ? payload.array() : Array::make();
 }
 
-ArrayRef cellInfoArray(ByteView packet) { return cellsOf(payloadPropertyList(packet)); }
+ArrayRef cellInfoArray(ByteView packet) { return cellsOf(cellInfo(packet)); }
 
 bool isCell(const Value& cell, std::string_view technology, std::string_view cellType) {
-    const auto says = [&](std::string_view key, std::string_view expected) {
+    static constexpr Key kTechnology(kPLCellMonitorCellRadioAccessTechnology);
+    static constexpr Key kType(kPLCellMonitorCellType);
+    const auto says = [&](Key key, std::string_view expected) {
         const std::string* text = (*cell.dictionary())[key].string();
         return text != nullptr && *text == expected;
     };
-    return cell.dictionary() && says(kPLCellMonitorCellRadioAccessTechnology, technology) &&
-           says(kPLCellMonitorCellType, cellType);
+    return cell.dictionary() && says(kTechnology, technology) && says(kType, cellType);
 }
 
 const Dictionary* firstCell(const Array& cells, std::string_view technology, std::string_view cellType) {
@@ -39,16 +57,28 @@ const Dictionary* firstCell(const Array& cells, std::string_view technology, std
     return nullptr;
 }
 
-void showCell(Dictionary& shown, const Dictionary& cell, std::span<const CellField> fields) {
+namespace {
+
+/// The values of a cell, each with its field; what is no 32-bit integer has its line on the log instead.
+template <class Show>
+void eachValue(const Dictionary& cell, std::span<const CellField> fields, Show show) {
     for (const CellField& field : fields) {
         const Number* number = cell[field.cellKey].number();
         const auto value = number != nullptr ? number->int32() : std::nullopt;
         if (value) {
-            print(shown.slot(field.displayKey).text(), *value, field.shown);
+            show(field, *value);
         } else if (field.failure != nullptr) {
             logLine(Level::Error, field.failure);
         }
     }
+}
+
+}  // namespace
+
+void showCell(Dictionary& shown, const Dictionary& cell, std::span<const CellField> fields) {
+    eachValue(cell, fields, [&](const CellField& field, std::int32_t value) {
+        showValue(shown.slot(field.displayKey), value, field.shown);
+    });
 }
 
 void showServingCell(const DictionaryRef& shown, ByteView packet, std::string_view technology,
@@ -58,16 +88,20 @@ void showServingCell(const DictionaryRef& shown, ByteView packet, std::string_vi
     if (serving != nullptr && shown) showCell(*shown, *serving, fields);
 }
 
-std::vector<Value> neighborRows(const Array& cells, std::string_view technology, std::span<const CellField> fields) {
-    std::vector<Value> rows;
-    for (const Value& cell : cells) {
+void showNeighbors(const ArrayRef& list, ByteView packet, std::string_view technology,
+                   std::span<const CellField> fields) {
+    const Value payload = cellInfo(packet);
+    if (!payload) Base::clearElementsInArray(list);  // before the error is told
+    const ArrayRef cells = cellsOf(payload);
+    if (!cells) return;
+    RowWriter rows(list);
+    for (const Value& cell : *cells) {
         if (!isCell(cell, technology, kPLCellMonitorCellTypeNeighbor)) continue;
-        const DictionaryRef row = Dictionary::make();
-        row->reserve(fields.size());
-        showCell(*row, *cell.dictionary(), fields);
-        rows.emplace_back(row);
+        Dictionary::Rewrite row = rows.next();
+        eachValue(*cell.dictionary(), fields, [&](const CellField& field, std::int32_t value) {
+            showValue(row.next(field.displayKey), value, field.shown);
+        });
     }
-    return rows;
 }
 
 }  // namespace kelvo

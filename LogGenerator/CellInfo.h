@@ -2,7 +2,6 @@
 
 #include <span>
 #include <string_view>
-#include <vector>
 
 #include "LogGenerator/FieldTable.h"
 #include "platform/Bytes.h"
@@ -15,11 +14,15 @@ namespace kelvo {
 /// The property list behind a packet's 13-byte header, in any encoding; none when it does not parse.
 Value payloadPropertyList(ByteView packet);
 
-/// The cell-information array in a payload. One that did not parse gives none and two error lines; one that parsed to
-/// something else than an array holds no cells.
+/// The property list of a cell-information packet; none when it does not parse. It is shared by all who read one
+/// record, and not to be changed.
+Value cellInfo(ByteView packet);
+
+/// The cell-information array in such a property list. One that did not parse gives none and two error lines; one that
+/// parsed to something else than an array holds no cells.
 ArrayRef cellsOf(const Value& payload);
 
-/// The cell-information array of a packet: `cellsOf` its payload.
+/// The cell-information array of a packet: `cellsOf` its `cellInfo`.
 ArrayRef cellInfoArray(ByteView packet);
 
 /// Whether `cell` is a dictionary that says both `technology` and `cellType`.
@@ -30,14 +33,14 @@ const Dictionary* firstCell(const Array& cells, std::string_view technology, std
 
 /// One number of a cell and where it is shown.
 struct CellField {
-    std::string_view cellKey;
+    Key cellKey;
     Key displayKey;
     /// The error line when the cell lacks it or it is no 32-bit integer; null when another field has said so.
     const char* failure;
     Shown shown = decimal;
 };
 
-/// Shows each field in order; one that fails leaves its display key as it was.
+/// Shows each field in order; one that fails leaves its display key as it was. The fields are static data.
 void showCell(Dictionary& shown, const Dictionary& cell, std::span<const CellField> fields);
 
 /// Shows the first serving cell of `technology` in a packet's cell-information array; without one, or with nowhere to
@@ -45,7 +48,9 @@ void showCell(Dictionary& shown, const Dictionary& cell, std::span<const CellFie
 void showServingCell(const DictionaryRef& shown, ByteView packet, std::string_view technology,
                      std::span<const CellField> fields);
 
-/// One row for each neighbour cell of `technology`, in the array's order. A field that fails is missing in its row.
-std::vector<Value> neighborRows(const Array& cells, std::string_view technology, std::span<const CellField> fields);
+/// Makes `list` hold one row for each neighbour cell of `technology` in a packet's cell-information array, in the
+/// array's order; none when there is no array. A field that fails is missing in its row.
+void showNeighbors(const ArrayRef& list, ByteView packet, std::string_view technology,
+                   std::span<const CellField> fields);
 
 }  // namespace kelvo

@@ -1,9 +1,12 @@
 #include "LogGenerator/FieldTable.h"
 
 #include <algorithm>
+#include <bit>
 #include <charconv>
 #include <cmath>
 #include <cstring>
+
+#include "LogGenerator/RowWriter.h"
 
 namespace kelvo {
 
@@ -66,23 +69,24 @@ void printInteger(std::string& text, std::int64_t value, const NumberFormat& for
     printBetween(text, format, value < 0, [value](Line& line) { line.appendNumber(value); });
 }
 
-/// Two decimals of a number of eighths. 1/8 is 12.5 hundredths; the half goes to the even neighbour, as printf rounds.
+/// The decimals of 0 to 7 eighths. With two of them 1/8 is 12.5 hundredths; the half goes to the even neighbour, as
+/// printf rounds, and never past the next whole number.
+constexpr std::string_view kHundredths[] = {"00", "12", "25", "38", "50", "62", "75", "88"};
+constexpr std::string_view kThousandths[] = {"000", "125", "250", "375", "500", "625", "750", "875"};
+
+/// A number of eighths with two or more decimals.
 void printEighths(std::string& text, std::int64_t eighths, const NumberFormat& format) {
-    const std::uint64_t magnitude = static_cast<std::uint64_t>(eighths < 0 ? -eighths : eighths);
-    const std::uint64_t doubled = magnitude * 25;  // twice the hundredths
-    std::uint64_t hundredths = doubled / 2;
-    if (doubled % 2 == 1 && hundredths % 2 == 1) ++hundredths;
+    const auto magnitude = static_cast<std::uint64_t>(eighths < 0 ? -eighths : eighths);
     printBetween(text, format, eighths < 0, [&](Line& line) {
         if (eighths < 0) line.append('-');
-        line.appendNumber(hundredths / 100);
-        const std::uint64_t rest = hundredths % 100;
+        line.appendNumber(magnitude / 8);
         line.append('.');
-        line.append(static_cast<char>('0' + rest / 10));
-        line.append(static_cast<char>('0' + rest % 10));
+        line.append(format.precision == 2 ? kHundredths[magnitude % 8] : kThousandths[magnitude % 8]);
+        for (int i = 3; i < format.precision; ++i) line.append('0');
     });
 }
 
-void printLabel(std::string& text, std::int64_t raw, const Shown& shown) {
+void printLabel(std::string& text, std::int64_t raw, const Shown& shown, const NumberFormat& fallback) {
     const auto value = static_cast<std::uint32_t>(raw);
     if (value < shown.rows.size() && shown.rows[value].raw == value) {  // a table without gaps
         text.assign(shown.rows[value].text);
@@ -94,12 +98,14 @@ void printLabel(std::string& text, std::int64_t raw, const Shown& shown) {
             return;
         }
     }
-    printInteger(text, raw, shown.format);
+    printInteger(text, raw, fallback);
 }
 
 }  // namespace
 
-void print(std::string& text, std::int64_t raw, const Shown& shown) {
+void print(std::string& text, std::int64_t raw, const Shown& shown) { print(text, raw, shown, shown.format); }
+
+void print(std::string& text, std::int64_t raw, const Shown& shown, const NumberFormat& format) {
     if (raw == shown.exception) {
         text.assign(shown.exceptionText);
         return;
@@ -107,12 +113,14 @@ void print(std::string& text, std::int64_t raw, const Shown& shown) {
     switch (shown.how) {
         case Shown::How::Nothing: break;
         case Shown::How::Decimal:
-        case Shown::How::Unsigned: printInteger(text, raw, shown.format); break;
-        case Shown::How::Signed32: printInteger(text, static_cast<std::int32_t>(raw), shown.format); break;
-        case Shown::How::Label: printLabel(text, raw, shown); break;
-        case Shown::How::Linear: print(text, shown.real(raw), shown.format); break;
-        case Shown::How::Eighths: printEighths(text, raw * shown.factor + shown.summand, shown.format); break;
-        case Shown::How::Whole: printInteger(text, raw * shown.factor + shown.summand, shown.format); break;
+        case Shown::How::Unsigned: printInteger(text, raw, format); break;
+        case Shown::How::Signed32: printInteger(text, static_cast<std::int32_t>(raw), format); break;
+        case Shown::How::Label: printLabel(text, raw, shown, format); break;
+        case Shown::How::Linear: print(text, shown.real(raw), format); break;
+        case Shown::How::Eighths:
+            if (format.precision < 2) return print(text, shown.real(raw), format);
+            return printEighths(text, raw * shown.factor + shown.summand, format);
+        case Shown::How::Whole: printInteger(text, raw * shown.factor + shown.summand, format); break;
     }
 }
 
@@ -121,27 +129,55 @@ void print(std::string& text, double value, const NumberFormat& format) {
                  [&](Line& line) { line.appendNumber(value, std::chars_format::fixed, format.precision); });
 }
 
+void showValue(Value& value, std::int64_t raw, const Shown& shown) {
+    value.set({.raw = raw, .how = &shown, .print = [](std::string& text, std::int64_t number, const void* how) {
+                   print(text, number, *static_cast<const Shown*>(how));
+               }});
+}
+
+void showReal(Value& value, double number, const NumberFormat& format) {
+    value.set({.raw = std::bit_cast<std::int64_t>(number),
+               .how = &format,
+               .print = [](std::string& text, std::int64_t bits, const void* how) {
+                   print(text, std::bit_cast<double>(bits), *static_cast<const NumberFormat*>(how));
+               }});
+}
+
 void showFields(Dictionary& shown, RecordView record, std::size_t base, std::span<const Field> fields) {
+    std::size_t next = 0;
     for (const Field& field : fields) {
         const std::int64_t raw = record.read(base + field.at, field.raw);
         if (field.shown.leavesOut(raw)) {
             shown.remove(field.key);
         } else {
-            print(shown.slot(field.key).text(), raw, field.shown);
+            showValue(shown.slot(field.key, next), raw, field.shown);
         }
     }
 }
 
-std::vector<Value> rowsOf(ByteView data, const RecordEntries& entries, std::span<const Field> fields) {
-    std::vector<Value> rows;
-    const RecordView record(data);
-    for (std::size_t i = 0; i < entries.count() && entries.offsetOf(i) < data.size(); ++i) {
-        const DictionaryRef row = Dictionary::make();
-        row->reserve(fields.size());
-        showFields(*row, record, entries.offsetOf(i), fields);
-        rows.emplace_back(row);
+void showFields(Dictionary::Rewrite& row, RecordView record, std::size_t base, std::span<const Field> fields) {
+    for (const Field& field : fields) {
+        const std::int64_t raw = record.read(base + field.at, field.raw);
+        if (!field.shown.leavesOut(raw)) showValue(row.next(field.key), raw, field.shown);
     }
-    return rows;
+}
+
+void showValues(const ArrayRef& values, RecordView record, const RecordEntries& entries, Raw raw, const Shown& shown) {
+    const ArrayLock::Held held;
+    values->resize(entries.count());
+    for (std::size_t i = 0; i < entries.count(); ++i) {
+        showValue((*values)[i], record.read(entries.offsetOf(i), raw), shown);
+    }
+}
+
+void showRows(const ArrayRef& list, ByteView data, const RecordEntries& entries, std::span<const Field> fields) {
+    RowWriter rows(list);
+    const RecordView record(data);
+    const RecordEntries present = entries.within(data.size());
+    for (std::size_t i = 0; i < present.count(); ++i) {
+        Dictionary::Rewrite row = rows.next();
+        showFields(row, record, present.offsetOf(i), fields);
+    }
 }
 
 }  // namespace kelvo

@@ -17,6 +17,9 @@
 /// The words in which record layouts are written, one field a line: where it lies, how it is stored, the display key,
 /// how it is shown. What cannot be right does not compile: a field past the record's minimum length, a key twice, 32
 /// bits without a word on their sign, a format that these tables do not print.
+///
+/// A record leaves raw values on the display, each with the table line that prints it when the display is read: tables
+/// are static data.
 namespace kelvo {
 
 /// One row of a value table.
@@ -81,8 +84,6 @@ inline constexpr Shown asUnsigned{.how = Shown::How::Unsigned, .format = "%u"};
 
 /// Printed in base 16, as the format's "%x" says.
 constexpr Shown hexadecimal(const char* format) { return {.how = Shown::How::Unsigned, .format = format}; }
-/// One text whatever the value is.
-constexpr Shown fixedText(const char* text) { return {.how = Shown::How::Decimal, .format = text}; }
 
 /// The value's name.
 template <std::size_t N>
@@ -105,8 +106,8 @@ constexpr Shown linear(double scale, double offset, const char* format) {
     Shown shown{.how = Shown::How::Linear, .format = format, .scale = scale, .offset = offset};
     const auto factor = static_cast<int>(scale * 8);
     const auto summand = static_cast<int>(offset * 8);
-    // Steps of an eighth with two decimals, the common case, print exactly from whole numbers.
-    if (factor == scale * 8 && summand == offset * 8 && shown.format.precision == 2) {
+    // Steps of an eighth, the common case, print exactly from whole numbers.
+    if (factor == scale * 8 && summand == offset * 8 && shown.format.precision >= 2) {
         shown.how = Shown::How::Eighths;
         shown.factor = factor;
         shown.summand = summand;
@@ -167,20 +168,35 @@ consteval Layout<N> entry(std::size_t size, const Field (&fields)[N]) {
 
 /// Writes `raw` to `text` in the way `shown` says.
 void print(std::string& text, std::int64_t raw, const Shown& shown);
+/// The same in another format.
+void print(std::string& text, std::int64_t raw, const Shown& shown, const NumberFormat& format);
 /// Writes a real number to `text`; infinities and not-a-number as printf writes them.
 void print(std::string& text, double value, const NumberFormat& format);
 
-/// Shows fields in their order; `base` is the offset from which theirs count.
-void showFields(Dictionary& shown, RecordView record, std::size_t base, std::span<const Field> fields);
+/// Makes `value` the text that `print` writes, once somebody reads it. `shown` is part of a table: static data.
+void showValue(Value& value, std::int64_t raw, const Shown& shown);
+void showValue(Value& value, std::int64_t raw, Shown&& shown) = delete;
 
-/// One dictionary for each entry of a list, in record order. Entries that lie wholly beyond the record's end are not
-/// made up.
-std::vector<Value> rowsOf(ByteView data, const RecordEntries& entries, std::span<const Field> fields);
+/// Makes `value` the text of a real number, once somebody reads it. `format` is static data.
+void showReal(Value& value, double number, const NumberFormat& format);
+void showReal(Value& value, double number, NumberFormat&& format) = delete;
+
+/// Shows fields in their order; `base` is the offset from which theirs count. Keys that stand already keep their place.
+void showFields(Dictionary& shown, RecordView record, std::size_t base, std::span<const Field> fields);
+/// Shows fields as the next entries of a row.
+void showFields(Dictionary::Rewrite& row, RecordView record, std::size_t base, std::span<const Field> fields);
+
+/// Makes `values` hold one text for each entry, as `raw` lies at the entry's start.
+void showValues(const ArrayRef& values, RecordView record, const RecordEntries& entries, Raw raw, const Shown& shown);
+
+/// Makes `list` hold one row for each entry, in record order. Entries that lie wholly beyond the record's end are not
+/// made up. A null list is ignored.
+void showRows(const ArrayRef& list, ByteView data, const RecordEntries& entries, std::span<const Field> fields);
 
 /// The same, for entries that follow one another without gaps from `start` on.
 template <std::size_t N>
-std::vector<Value> rows(ByteView data, std::size_t start, std::size_t count, const Layout<N>& layout) {
-    return rowsOf(data, RecordEntries(start, layout.size, count), layout.fields);
+void showRows(const ArrayRef& list, ByteView data, std::size_t start, std::size_t count, const Layout<N>& layout) {
+    showRows(list, data, RecordEntries(start, layout.size, count), layout.fields);
 }
 
 }  // namespace kelvo

@@ -41,7 +41,7 @@ void LogGenerator::updateHistoryInState(Dictionary& state) {
     // The list of pairs ends at the first value that is absent: without a "DisplayState" the snapshot is empty.
     const DictionaryRef snapshot = Dictionary::make();
     bool complete = true;
-    for (const char* key : {"DisplayState", "Display", "ExtraInfo"}) {
+    for (const Key key : {Key("DisplayState"), Key("Display"), Key("ExtraInfo")}) {
         const Value& value = state[key];
         complete = complete && static_cast<bool>(value);
         if (complete) snapshot->set(key, value.copy());

@@ -6,7 +6,7 @@
 namespace kelvo {
 
 /// A printf format with one conversion, taken apart at compile time: "%d", "%+d", "%u", "%06x", "%4.2f" and so on, with
-/// text around it.
+/// text around it; a percent sign may follow the number directly.
 struct NumberFormat {
     std::string_view before;
     std::string_view after;
@@ -38,7 +38,9 @@ struct NumberFormat {
         }
         if (zeros && conversion != 'x') throw "zeros before a sign are not printed here";
         after = text.substr(i + 1);
-        if (after.find('%') != std::string_view::npos) throw "one conversion a format";
+        const bool isPercent = after.starts_with("%%");  // stands for one
+        if (isPercent) after.remove_prefix(1);
+        if (after.find('%', isPercent ? 1 : 0) != std::string_view::npos) throw "one conversion a format";
     }
 };
 

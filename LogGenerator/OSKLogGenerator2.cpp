@@ -1,6 +1,5 @@
 #include "LogGenerator/OSKLogGenerator2.h"
 
-#include <algorithm>
 #include <charconv>
 #include <set>
 #include <stdexcept>
@@ -13,13 +12,21 @@ namespace kelvo {
 
 namespace {
 
-void collectKeys(const Value& node, std::set<std::string_view>& keys) {
+constexpr Key kDisplay("Display");
+
+using Parts = std::vector<std::pair<Base*, const Value*>>;
+
+/// The sections' parts of a display. What a section shows belongs to it, whatever its keys are called.
+void collectParts(const Value& node, const ClassIndex& sections, Parts& parts) {
     if (node.array()) {
-        for (const Value& element : *node.array()) collectKeys(element, keys);
+        for (const Value& element : *node.array()) collectParts(element, sections, parts);
     } else if (node.dictionary()) {
         for (const auto& [key, value] : *node.dictionary()) {
-            keys.insert(key);
-            collectKeys(value, keys);
+            if (Base* section = sections.getClass(key)) {
+                parts.emplace_back(section, &value);
+            } else {
+                collectParts(value, sections, parts);
+            }
         }
     }
 }
@@ -49,7 +56,7 @@ OSKLogGenerator2::~OSKLogGenerator2() {
 }
 
 void OSKLogGenerator2::updateState(Dictionary& state, ByteView data) {
-    getDisplayFromState(state);
+    prepareDisplay(state);
     updateWithData(data);
     _binData.insert(_binData.end(), data.begin(), data.end());
 }
@@ -75,12 +82,16 @@ void OSKLogGenerator2::updateWithData(ByteView data) {
 }
 
 Value OSKLogGenerator2::getDisplayFromState(Dictionary& state) {
-    if (const Value& display = state["Display"]) {
+    return prepareDisplay(state) ? state[kDisplay] : Value();
+}
+
+bool OSKLogGenerator2::prepareDisplay(Dictionary& state) {
+    if (const Value& display = state[kDisplay]) {
         if (cIndex && display.dictionary() != _boundDisplay.dictionary()) adoptDisplay(display);
-        return display;
+        return true;
     }
     buildDisplay(state);
-    return {};
+    return false;
 }
 
 bool OSKLogGenerator2::loadTemplate(Dictionary& state) const {
@@ -103,7 +114,7 @@ void OSKLogGenerator2::buildDisplay(Dictionary& state) {
     cIndex->status();
     _boundDisplay = processTemplate(state["Template"]);
     printDict(_boundDisplay);
-    state.set("Display", _boundDisplay);
+    state.set(kDisplay, _boundDisplay);
     state.set("ExtraInfo", Dictionary::make());
 }
 
@@ -111,23 +122,12 @@ void OSKLogGenerator2::buildDisplay(Dictionary& state) {
 // technology stays as it is.
 void OSKLogGenerator2::adoptDisplay(const Value& display) {
     _boundDisplay = display;
-    std::set<std::string_view> keys;
-    collectKeys(display, keys);
-    const std::vector<std::string_view> names = cIndex->getAllNames();
-    if (std::all_of(names.begin(), names.end(), [&](std::string_view name) { return keys.contains(name); })) {
-        bindSections(display);
-    }
-}
-
-void OSKLogGenerator2::bindSections(const Value& node) {
-    if (node.array()) {
-        for (const Value& element : *node.array()) bindSections(element);
-    } else if (node.dictionary()) {
-        for (const auto& [key, value] : *node.dictionary()) {
-            bindSections(value);
-            bindSection(key, value);
-        }
-    }
+    Parts parts;
+    collectParts(display, *cIndex, parts);
+    std::set<Base*> placed;
+    for (const auto& [section, part] : parts) placed.insert(section);
+    if (placed.size() < cIndex->getAllNames().size()) return;
+    for (const auto& [section, part] : parts) section->updateSectionRef(*part);
 }
 
 void OSKLogGenerator2::bindSection(std::string_view name, const Value& displayPart) const {

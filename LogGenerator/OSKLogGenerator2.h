@@ -39,10 +39,11 @@ private:
     static Announced announce(std::unique_ptr<ClassIndex> classIndex);
     OSKLogGenerator2(Announced announced, std::string pListName);
 
+    /// Makes sure that the state has a display and the sections their parts of it; false when it had none.
+    bool prepareDisplay(Dictionary& state);
     bool loadTemplate(Dictionary& state) const;
     void buildDisplay(Dictionary& state);
     void adoptDisplay(const Value& display);
-    void bindSections(const Value& node);
     void bindSection(std::string_view name, const Value& displayPart) const;
 
     std::string pListName;

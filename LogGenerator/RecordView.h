@@ -1,5 +1,6 @@
 #pragma once
 
+#include <algorithm>
 #include <cstddef>
 #include <cstdint>
 
@@ -43,26 +44,29 @@ public:
 
     /// The number at offset `at`; a value of 32 unsigned bits is never negative.
     std::int64_t read(std::size_t at, Raw raw) const {
-        std::uint32_t word = 0;
-        if (at <= _record.size() && _record.size() - at >= raw.bytes) {
-            for (std::size_t i = 0; i < raw.bytes; ++i) word |= byteOf(_record[at + i], i, raw);
-        } else {
-            for (std::size_t i = 0; i < raw.bytes; ++i) {
-                if (at + i < _record.size()) word |= byteOf(_record[at + i], i, raw);
-            }
-        }
-        const int width = raw.bitWidth();
-        word >>= raw.lowBit;
-        if (width < 32) word &= (std::uint32_t{1} << width) - 1;
-        if (!raw.isSigned) return word;
-        const int unused = 32 - width;
-        return static_cast<std::int32_t>(word << unused) >> unused;
+        std::uint32_t word = wordAt(at);
+        if (raw.isBigEndian) word = swapped(word) >> (32 - 8 * raw.bytes);
+        const int unused = 32 - raw.bitWidth();
+        word = word >> raw.lowBit << unused;  // the number's bits alone, at the upper end
+        return raw.isSigned ? std::int64_t{static_cast<std::int32_t>(word) >> unused} : std::int64_t{word >> unused};
     }
 
 private:
-    static std::uint32_t byteOf(std::uint8_t byte, std::size_t index, Raw raw) {
-        const std::size_t place = raw.isBigEndian ? raw.bytes - 1U - index : index;
-        return std::uint32_t{byte} << (8 * place);
+    std::uint32_t wordAt(std::size_t at) const {
+        if (_record.size() < 4 || at > _record.size() - 4) return lastWordAt(at);
+        const std::uint8_t* bytes = _record.data() + at;
+        return bytes[0] | std::uint32_t{bytes[1]} << 8 | std::uint32_t{bytes[2]} << 16 | std::uint32_t{bytes[3]} << 24;
+    }
+    std::uint32_t lastWordAt(std::size_t at) const {
+        std::uint32_t word = 0;
+        for (std::size_t i = 0; i < 4; ++i) {
+            // `at` may be so large that the sum wraps.
+            if (at < _record.size() && i < _record.size() - at) word |= std::uint32_t{_record[at + i]} << (8 * i);
+        }
+        return word;
+    }
+    static constexpr std::uint32_t swapped(std::uint32_t word) {
+        return word >> 24 | (word >> 8 & 0xFF00) | (word & 0xFF00) << 8 | word << 24;
     }
 
     ByteView _record;
@@ -77,6 +81,11 @@ public:
         : _start(start), _stride(stride), _count(count) {}
 
     std::size_t count() const { return _count; }
+    /// The entries that begin inside a record of `size` bytes.
+    RecordEntries within(std::size_t size) const {
+        const std::size_t room = size > _start ? (size - _start + _stride - 1) / _stride : 0;
+        return {_start, _stride, std::min(_count, room)};
+    }
     /// The offset of entry `index`; throws ArrayOutOfBoundsException when the count does not cover it.
     std::size_t offsetOf(std::size_t index) const {
         if (index >= _count) throw ArrayOutOfBoundsException();

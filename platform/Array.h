@@ -28,6 +28,8 @@ public:
     void clear() { _elements.clear(); }
     /// Removes `count` elements from the front; `count` is at most `size()`.
     void removeFirst(std::size_t count);
+    /// Removes elements at the end, or appends none values, until there are `size`.
+    void resize(std::size_t size) { _elements.resize(size); }
 
     ArrayRef copy() const;  ///< deep
     friend bool operator==(const Array& a, const Array& b);

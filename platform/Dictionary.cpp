@@ -11,16 +11,16 @@ DictionaryRef Dictionary::make(std::initializer_list<std::pair<std::string_view,
 }
 
 std::size_t Dictionary::indexOf(Key key) const {
-    if (_index) {
-        const auto [first, last] = _index->equal_range(key.hash());
-        const auto at =
-            std::find_if(first, last, [&](const auto& hit) { return _entries[hit.second].key == key.text(); });
-        return at != last ? at->second : kNotFound;
-    }
+    if (_index) return indexOfIndexed(key);
     for (std::size_t i = 0; i < _hashes.size(); ++i) {
-        if (_hashes[i] == key.hash() && _entries[i].key == key.text()) return i;
+        if (isAt(i, key)) return i;
     }
     return kNotFound;
+}
+
+std::size_t Dictionary::indexOfIndexed(Key key) const {
+    const auto at = _index->find(key.text());
+    return at != _index->end() ? at->second : kNotFound;
 }
 
 const Value* Dictionary::find(Key key) const {
@@ -35,11 +35,21 @@ const Value& Dictionary::operator[](Key key) const {
 }
 
 Value& Dictionary::slot(Key key) {
-    if (const std::size_t index = indexOf(key); index != kNotFound) return _entries[index].value;
+    const std::size_t index = indexOf(key);
+    return index != kNotFound ? _entries[index].value : append(key);
+}
+
+Value& Dictionary::slotElsewhere(Key key, std::size_t& next) {
+    const std::size_t index = indexOf(key);
+    next = (index != kNotFound ? index : _entries.size()) + 1;
+    return index != kNotFound ? _entries[index].value : append(key);
+}
+
+Value& Dictionary::append(Key key) {
     _entries.push_back({std::string(key.text()), Value()});
     _hashes.push_back(key.hash());
     if (_index) {
-        _index->emplace(key.hash(), _entries.size() - 1);
+        _index->emplace(key.text(), _entries.size() - 1);
     } else if (_entries.size() > kScanLimit) {
         buildIndex();
     }
@@ -55,10 +65,13 @@ bool Dictionary::remove(Key key) {
     return true;
 }
 
-void Dictionary::clear() {
-    _entries.clear();
-    _hashes.clear();
-    _index.reset();
+void Dictionary::clear() { truncate(0); }
+
+void Dictionary::truncate(std::size_t size) {
+    if (size == _hashes.size()) return;
+    _entries.erase(_entries.begin() + static_cast<std::ptrdiff_t>(size), _entries.end());
+    _hashes.resize(size);
+    if (_index) buildIndex();
 }
 
 void Dictionary::reserve(std::size_t entries) {
@@ -67,9 +80,10 @@ void Dictionary::reserve(std::size_t entries) {
 }
 
 void Dictionary::buildIndex() {
+    _index.reset();
+    if (_entries.size() <= kScanLimit) return;
     _index = std::make_unique<Index>();
-    _index->reserve(_entries.size());
-    for (std::size_t i = 0; i < _hashes.size(); ++i) _index->emplace(_hashes[i], i);
+    for (std::size_t i = 0; i < _entries.size(); ++i) _index->emplace(_entries[i].key, i);
 }
 
 DictionaryRef Dictionary::copy() const {

@@ -30,6 +30,9 @@ std::optional<std::int32_t> Number::int32() const {
     return static_cast<std::int32_t>(value);
 }
 
+constinit const ArrayRef Value::kNoArray;
+constinit const DictionaryRef Value::kNoDictionary;
+
 Value::Value(ArrayRef array) {
     if (array) _content = std::move(array);
 }
@@ -43,21 +46,15 @@ const Bytes* Value::data() const {
     return shared != nullptr ? shared->get() : nullptr;
 }
 
-const ArrayRef& Value::array() const {
-    static const ArrayRef kNone;
-    const auto* array = std::get_if<ArrayRef>(&_content);
-    return array != nullptr ? *array : kNone;
-}
-
-const DictionaryRef& Value::dictionary() const {
-    static const DictionaryRef kNone;
-    const auto* dictionary = std::get_if<DictionaryRef>(&_content);
-    return dictionary != nullptr ? *dictionary : kNone;
-}
-
 std::string& Value::text() {
+    if (_content.index() == kUnwritten) write();
     if (auto* text = std::get_if<std::string>(&_content)) return *text;
     return _content.emplace<std::string>();
+}
+
+void Value::write() const {
+    const UnwrittenText waiting = std::get<UnwrittenText>(_content);
+    waiting.print(_content.emplace<std::string>(), waiting.raw, waiting.how);
 }
 
 Value Value::copy() const {
@@ -69,11 +66,16 @@ Value Value::copy() const {
 bool operator==(const Value& a, const Value& b) {
     if (a.kind() != b.kind()) return false;
     switch (a.kind()) {
+        case Value::Kind::None: return true;
+        case Value::Kind::String: return *a.string() == *b.string();
         case Value::Kind::Data: return *a.data() == *b.data();
         case Value::Kind::Array: return *a.array() == *b.array();
         case Value::Kind::Dictionary: return *a.dictionary() == *b.dictionary();
-        default: return a._content == b._content;
+        case Value::Kind::Number: return *a.number() == *b.number();
+        case Value::Kind::Boolean: return *a.boolean() == *b.boolean();
+        case Value::Kind::Date: return *a.date() == *b.date();
     }
+    return false;
 }
 
 std::string_view kindName(Value::Kind kind) {

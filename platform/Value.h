@@ -38,9 +38,22 @@ private:
 /// A property-list date; milliseconds since 1970-01-01 00:00 UTC.
 using Date = std::chrono::sys_time<std::chrono::milliseconds>;
 
+/// A text that nobody has read yet, so that it need not be written: what `print` makes of `raw`, as `how` says. `how`
+/// is static data; it outlives every value.
+struct UnwrittenText {
+    using Print = void (*)(std::string& text, std::int64_t raw, const void* how);
+
+    std::int64_t raw;
+    const void* how;
+    Print print;
+};
+
 /// One property-list value: none, or one of the seven kinds.
 /// Strings, numbers, booleans, data and dates are values. Arrays and dictionaries are shared objects with identity:
 /// copying the Value shares them, `copy()` makes new ones all the way down.
+///
+/// A display changes far more often than it is read. A string may therefore wait as an UnwrittenText; the first look at
+/// it writes it, which makes reading a value a matter for the thread that owns it.
 class Value {
 public:
     enum class Kind { None, String, Number, Boolean, Data, Date, Array, Dictionary };
@@ -61,21 +74,40 @@ public:
     template <class T>
     Value(T*) = delete;  // keeps a stray pointer from becoming a boolean
 
-    Kind kind() const { return static_cast<Kind>(_content.index()); }
+    Kind kind() const { return _content.index() != kUnwritten ? static_cast<Kind>(_content.index()) : Kind::String; }
     explicit operator bool() const { return kind() != Kind::None; }
 
     // Access by kind: null (or none) when the value is of another kind.
-    const std::string* string() const { return std::get_if<std::string>(&_content); }
+    // A text stands where it is until the value is written.
+    const std::string* string() const {
+        if (_content.index() == kUnwritten) write();
+        return std::get_if<std::string>(&_content);
+    }
     const kelvo::Number* number() const { return std::get_if<kelvo::Number>(&_content); }
     const bool* boolean() const { return std::get_if<bool>(&_content); }
     const Bytes* data() const;
     const kelvo::Date* date() const { return std::get_if<kelvo::Date>(&_content); }
-    const ArrayRef& array() const;
-    const DictionaryRef& dictionary() const;
+    const ArrayRef& array() const {
+        const auto* array = std::get_if<ArrayRef>(&_content);
+        return array != nullptr ? *array : kNoArray;
+    }
+    const DictionaryRef& dictionary() const {
+        const auto* dictionary = std::get_if<DictionaryRef>(&_content);
+        return dictionary != nullptr ? *dictionary : kNoDictionary;
+    }
 
     /// Makes the value a string, whatever it was, and hands out its text for writing. A value that is a string already
     /// keeps its storage, so that writing a text of similar length does not allocate.
     std::string& text();
+
+    /// Makes the value a string, whatever it was, whose text is written when somebody asks for it.
+    void set(const UnwrittenText& text) {
+        if (auto* waiting = std::get_if<UnwrittenText>(&_content)) {
+            *waiting = text;
+        } else {
+            _content = text;
+        }
+    }
 
     /// A deep copy: new arrays and dictionaries all the way down. Data is immutable and stays shared.
     Value copy() const;
@@ -84,9 +116,16 @@ public:
     friend bool operator==(const Value& a, const Value& b);
 
 private:
-    std::variant<std::monostate, std::string, kelvo::Number, bool, std::shared_ptr<const Bytes>, kelvo::Date, ArrayRef,
-                 DictionaryRef>
-        _content;
+    static constexpr std::size_t kUnwritten = 8;  // index of UnwrittenText, behind those of the kinds
+
+    static const ArrayRef kNoArray;
+    static const DictionaryRef kNoDictionary;
+
+    void write() const;
+
+    mutable std::variant<std::monostate, std::string, kelvo::Number, bool, std::shared_ptr<const Bytes>, kelvo::Date,
+                         ArrayRef, DictionaryRef, UnwrittenText>
+        _content;  // changes under a reader when an unwritten text is written
 };
 
 /// The kind's name for messages: "string", "dictionary", …

@@ -8,6 +8,8 @@ namespace kelvo {
 
 namespace {
 
+constexpr NumberFormat kReferencePilotLevel = "(ref pilot) %+.2f dB";
+
 /// What the levels of one active set are measured against.
 struct Scale {
     double normaliser;
@@ -39,7 +41,7 @@ DictionaryRef C2K1xActiveSet(RecordView record, std::size_t base) {
     for (std::size_t i = 0; i < count && entries.offsetOf(i) < record.size(); ++i) {
         const std::int64_t pn = record.read(entries.offsetOf(i), u16);
         const double level = scale.decibels(record.read(entries.offsetOf(i) + 12 + 4 * extras, u16));
-        pilots.add(i, pn, level, pn == reference ? "(ref pilot) %+.2f dB" : kC2KPilotLevel);
+        pilots.add(i, pn, level, pn == reference ? kReferencePilotLevel : kC2KPilotLevel);
     }
     return pilots.rows();
 }

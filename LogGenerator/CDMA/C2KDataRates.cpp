@@ -36,6 +36,8 @@ constexpr std::array<std::uint16_t, 12> kReverseBits = {  // of a packet, by rat
     128, 256, 512, 768, 1024, 1536, 2048, 3072, 4096, 6144, 8192, 12288,
 };
 
+constexpr NumberFormat kRate = "%.2f kbps";
+
 /// Where one link keeps its values.
 struct Link {
     Key shown, seq, sent, seq1, sent1, seq2, sent2;
@@ -68,7 +70,7 @@ std::int64_t reverseBits(RecordView record) {
 
 void showRate(std::int64_t bits, std::int32_t steps, Key shown, const DictionaryRef& lookup) {
     Value rate;
-    print(rate.text(), static_cast<double>(bits) / (steps * 1024.0), "%.2f kbps");
+    showReal(rate, static_cast<double>(bits) / (steps * 1024.0), kRate);
     C2KStoreDisplayValue(shown, rate, lookup);
 }
 

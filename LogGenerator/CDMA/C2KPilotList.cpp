@@ -9,7 +9,7 @@ namespace kelvo {
 C2KPilotList::C2KPilotList(std::size_t pilots) { _rows->reserve(1 + pilots); }
 
 void C2KPilotList::add(std::size_t position, std::int64_t pn, double level, const NumberFormat& format) {
-    print(_rows->slot(fmt::format("{};{}", position, pn)).text(), level, format);
+    showReal(_rows->slot(fmt::format("{};{}", position, pn)), level, format);
 }
 
 Value C2KPilotList::rowsOrNone() const {

@@ -18,8 +18,9 @@ public:
     /// An empty list with room for `pilots` rows.
     explicit C2KPilotList(std::size_t pilots);
 
-    /// Adds the pilot at `position` (from 0) of the record; `level` is in dB and may be infinite.
+    /// Adds the pilot at `position` (from 0) of the record; `level` is in dB and may be infinite, `format` static data.
     void add(std::size_t position, std::int64_t pn, double level, const NumberFormat& format = kC2KPilotLevel);
+    void add(std::size_t position, std::int64_t pn, double level, NumberFormat&& format) = delete;
     const DictionaryRef& rows() const { return _rows; }
     /// The rows, or the text "(none)" when there are none.
     Value rowsOrNone() const;

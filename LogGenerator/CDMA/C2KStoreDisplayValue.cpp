@@ -20,7 +20,7 @@ void C2KStoreDisplayValue(Key lookupKey, const Value& value, const DictionaryRef
 void C2KStoreFields(RecordView record, std::size_t base, std::span<const Field> fields, const DictionaryRef& lookup) {
     Value value;
     for (const Field& field : fields) {
-        print(value.text(), record.read(base + field.at, field.raw), field.shown);
+        showValue(value, record.read(base + field.at, field.raw), field.shown);
         C2KStoreDisplayValue(field.key, value, lookup);
     }
 }

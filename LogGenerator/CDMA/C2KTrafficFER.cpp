@@ -11,6 +11,9 @@ namespace {
 
 constexpr std::size_t kMinimum = 17;
 constexpr Key kTrafficFER("TrafficFER");
+constexpr Key kShownKey("k1xTrafficFER");
+constexpr NumberFormat kRate = "%.02f%%";
+constexpr NumberFormat kOldRate = "%.02f%% (old)";
 
 /// In single precision, as the filter has always run: one frame in 64 counts.
 float filtered(bool erased, const Number* previous) {
@@ -19,8 +22,10 @@ float filtered(bool erased, const Number* previous) {
     return rate;
 }
 
-void show(const char* format, double rate, const DictionaryRef& lookup) {
-    C2KStoreDisplayValue("k1xTrafficFER", fmt::sprintf(format, 100 * rate), lookup);
+void show(const NumberFormat& format, double rate, const DictionaryRef& lookup) {
+    Value shown;
+    showReal(shown, 100 * rate, format);
+    C2KStoreDisplayValue(kShownKey, shown, lookup);
 }
 
 }  // namespace
@@ -39,13 +44,13 @@ void decodeTrafficFER(ByteView packet, Dictionary& state, const DictionaryRef& l
     const bool erased = RecordView(packet).read(*demodulation + 24, u8) != 0;
     const double rate = filtered(erased, state[kTrafficFER].number());
     state.set(kTrafficFER, rate);
-    show("%.02f%%", rate, lookup);
+    show(kRate, rate, lookup);
 }
 
 void endTrafficFER(Dictionary& state, const DictionaryRef& lookup) {
     const Number* rate = state[kTrafficFER].number();
     if (rate == nullptr) return;
-    show("%.02f%% (old)", rate->real(), lookup);
+    show(kOldRate, rate->real(), lookup);
     state.remove(kTrafficFER);
 }
 

@@ -1,5 +1,6 @@
 #include "LogGenerator/GSMUMTS/ActiveSet.h"
 
+#include "LogGenerator/RowWriter.h"
 #include "platform/Environment.h"
 
 namespace kelvo {
@@ -16,6 +17,8 @@ constexpr auto kCell = entry(kCellSize, {
 // clang-format on
 constexpr Raw kSetType = u16.bits(13, 15);  // at 7 as well; 0 is the active set
 constexpr Shown kDecibel = whole(1, 0, "%d dB");
+constexpr Key kRSCP("RSCP");
+constexpr Key kEnergyPerChip("Energy Per Chip");
 
 /// The cell's energy in dB: the first of its three measurements that is there.
 std::int64_t energyOf(RecordView record, std::size_t measurement) {
@@ -32,27 +35,23 @@ void ActiveSet::updateWithData(ByteView data, LogCode logCode) {
     logLine(Level::Warning, "ActiveSet");
     if (logCode != 0x417a) return reportUnknown(logCode);
     if (data.size() < 16) return;
-    clearElementsInArray(list());
-    const auto count = static_cast<std::size_t>(RecordView(data).read(15, u8));
-    if (count > 0) replaceArray(list(), activeCells(data, count));
+    showActiveCells(data, static_cast<std::size_t>(RecordView(data).read(15, u8)));
 }
 
-std::vector<Value> ActiveSet::activeCells(ByteView data, std::size_t count) {
+void ActiveSet::showActiveCells(ByteView data, std::size_t count) const {
     const RecordView record(data);
     const std::int64_t rssi = (record.read(13, i16) + 512) / 10 - 106;
-    const RecordEntries cells(16, kCellSize, count);
+    const RecordEntries cells = RecordEntries(16, kCellSize, count).within(data.size());
     const RecordEntries measurements(16 + kCellSize * count, kMeasurementSize, count);
-    std::vector<Value> active;
-    for (std::size_t i = 0; i < count && cells.offsetOf(i) < data.size(); ++i) {
+    RowWriter rows(list());
+    for (std::size_t i = 0; i < cells.count(); ++i) {
         if (record.read(cells.offsetOf(i) + 7, kSetType) != 0) continue;
         const std::int64_t energy = energyOf(record, measurements.offsetOf(i));
-        const DictionaryRef cell = Dictionary::make();
-        showFields(*cell, record, cells.offsetOf(i), kCell.fields);
-        print(cell->slot("RSCP").text(), rssi + energy, kDecibel);
-        print(cell->slot("Energy Per Chip").text(), energy, kDecibel);
-        active.emplace_back(cell);
+        Dictionary::Rewrite cell = rows.next();
+        showFields(cell, record, cells.offsetOf(i), kCell.fields);
+        showValue(cell.next(kRSCP), rssi + energy, kDecibel);
+        showValue(cell.next(kEnergyPerChip), energy, kDecibel);
     }
-    return active;
 }
 
 }  // namespace kelvo

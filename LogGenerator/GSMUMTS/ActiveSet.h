@@ -16,7 +16,7 @@ public:
     void updateWithData(ByteView data, LogCode logCode) override;
 
 private:
-    static std::vector<Value> activeCells(ByteView data, std::size_t count);
+    void showActiveCells(ByteView data, std::size_t count) const;
 };
 
 }  // namespace kelvo

@@ -1,5 +1,6 @@
 #include "LogGenerator/GSMUMTS/BLER.h"
 
+#include "LogGenerator/RowWriter.h"
 #include "platform/Environment.h"
 
 namespace kelvo {
@@ -25,7 +26,7 @@ void BLER::updateWithData(ByteView data, LogCode logCode) {
     if (logCode != 0x4116) return reportUnknown(logCode);
     if (!show(data, kWindow) || !values()) return;
     const auto count = static_cast<std::size_t>(RecordView(data).read(13, u8));
-    values()->set("Transport Channels", std::make_shared<Array>(rows(data, 16, count, kChannel)));
+    showRows(ownArray(values()->slot("Transport Channels")), data, 16, count, kChannel);
 }
 
 }  // namespace kelvo

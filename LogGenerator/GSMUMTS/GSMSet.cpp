@@ -21,9 +21,8 @@ void GSMSet::updateWithData(ByteView data, LogCode logCode) {
     logLine(Level::Warning, "GSMSet");
     if (logCode != 0x4005) return reportUnknown(logCode);
     if (data.size() < 15) return;
-    clearElementsInArray(list());
     const auto count = static_cast<std::size_t>(RecordView(data).read(14, u8));
-    if (count > 0) replaceArray(list(), rows(data, 15, count, kCell));  // intended: at 15 as the UMTS entries are
+    showRows(list(), data, 15, count, kCell);  // intended: at 15 as the UMTS entries are
 }
 
 }  // namespace kelvo

@@ -1,5 +1,6 @@
 #include "LogGenerator/GSMUMTS/HSDPAInformation.h"
 
+#include "LogGenerator/RowWriter.h"
 #include "platform/Environment.h"
 
 namespace kelvo {
@@ -42,7 +43,7 @@ void HSDPAInformation::updateWithData(ByteView data, LogCode logCode) {
 
 void HSDPAInformation::showProcesses(Key key, ByteView data, std::size_t start, std::size_t count) {
     if (count == 0 || !values()) return;
-    values()->set(key, std::make_shared<Array>(rows(data, start, count, kProcess)));
+    showRows(ownArray(values()->slot(key)), data, start, count, kProcess);
 }
 
 }  // namespace kelvo

@@ -1,5 +1,6 @@
 #include "LogGenerator/GSMUMTS/MobileAllocation.h"
 
+#include "LogGenerator/RowWriter.h"
 #include "platform/Environment.h"
 
 namespace kelvo {
@@ -20,13 +21,7 @@ void MobileAllocation::updateWithData(ByteView data, LogCode logCode) {
     if (!show(data, kSequence) || !values()) return;
     const RecordView record(data);
     const RecordEntries entries(15, 2, static_cast<std::size_t>(record.read(14, u8)));
-    const ArrayRef channels = Array::make();
-    for (std::size_t i = 0; i < entries.count() && entries.offsetOf(i) < data.size(); ++i) {
-        Value channel;
-        print(channel.text(), record.read(entries.offsetOf(i), u16), decimal);
-        channels->append(std::move(channel));
-    }
-    values()->set("ARFCNs", channels);
+    showValues(ownArray(values()->slot("ARFCNs")), record, entries.within(data.size()), u16, decimal);
 }
 
 }  // namespace kelvo

@@ -1,6 +1,7 @@
 #include "LogGenerator/GSMUMTS/NeighboringCells.h"
 
 #include "LogGenerator/CellInfo.h"
+#include "LogGenerator/RowWriter.h"
 #include "platform/Environment.h"
 #include "platform/TelephonyConstants.h"
 
@@ -37,8 +38,9 @@ void NeighboringCells::keepIdentities(ByteView data) {
     if (data.size() < 15) return;
     arfcnToBsic.clear();
     const RecordView record(data);
-    const RecordEntries entries(15, 4, static_cast<std::size_t>(record.read(14, u8)));
-    for (std::size_t i = 0; i < entries.count() && entries.offsetOf(i) < data.size(); ++i) {
+    const auto count = static_cast<std::size_t>(record.read(14, u8));
+    const RecordEntries entries = RecordEntries(15, 4, count).within(data.size());
+    for (std::size_t i = 0; i < entries.count(); ++i) {
         const std::size_t at = entries.offsetOf(i);
         arfcnToBsic[record.read(at, u16)] = record.read(at + 2, u8);
     }
@@ -46,24 +48,20 @@ void NeighboringCells::keepIdentities(ByteView data) {
 
 void NeighboringCells::showMeasurements(ByteView data) {
     if (data.size() < 29) return;
-    clearElementsInArray(list());
     const RecordView record(data);
-    const RecordEntries entries(29, kCell.size, static_cast<std::size_t>(record.read(28, u8)));
-    if (entries.count() == 0) return;
-    std::vector<Value> cells = rowsOf(data, entries, kCell.fields);
-    for (std::size_t i = 0; i < cells.size(); ++i) {
+    const auto count = static_cast<std::size_t>(record.read(28, u8));
+    const RecordEntries entries = RecordEntries(29, kCell.size, count).within(data.size());
+    RowWriter rows(list());
+    for (std::size_t i = 0; i < entries.count(); ++i) {
+        Dictionary::Rewrite cell = rows.next();
+        showFields(cell, record, entries.offsetOf(i), kCell.fields);
         const auto bsic = arfcnToBsic.find(record.read(entries.offsetOf(i), u16));
-        if (bsic == arfcnToBsic.end()) continue;
-        print(cells[i].dictionary()->slot("BSIC").text(), bsic->second, decimal);
+        if (bsic != arfcnToBsic.end()) showValue(cell.next("BSIC"), bsic->second, decimal);
     }
-    replaceArray(list(), std::move(cells));
 }
 
 void NeighboringCells::showCellArray(ByteView data) {
-    const Value payload = payloadPropertyList(data);
-    clearElementsInArray(list());
-    const ArrayRef cells = cellsOf(payload);
-    if (cells) replaceArray(list(), neighborRows(*cells, kPLCellMonitorRadioAccessTechnologyGSM, kNeighbor));
+    showNeighbors(list(), data, kPLCellMonitorRadioAccessTechnologyGSM, kNeighbor);
 }
 
 }  // namespace kelvo

@@ -39,16 +39,12 @@ void UMTSSet::updateWithData(ByteView data, LogCode logCode) {
 
 void UMTSSet::showRanking(ByteView data) {
     if (data.size() < 15) return;
-    clearElementsInArray(list());
     const auto count = static_cast<std::size_t>(RecordView(data).read(13, u8));
-    if (count > 0) replaceArray(list(), rows(data, 15, count, kCell));
+    showRows(list(), data, 15, count, kCell);
 }
 
 void UMTSSet::showCellArray(ByteView data) {
-    const Value payload = payloadPropertyList(data);
-    clearElementsInArray(list());
-    const ArrayRef cells = cellsOf(payload);
-    if (cells) replaceArray(list(), neighborRows(*cells, kPLCellMonitorRadioAccessTechnologyUMTS, kNeighbor));
+    showNeighbors(list(), data, kPLCellMonitorRadioAccessTechnologyUMTS, kNeighbor);
 }
 
 }  // namespace kelvo

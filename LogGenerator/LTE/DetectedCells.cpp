@@ -18,11 +18,10 @@ void DetectedCells::updateWithData(ByteView data, LogCode logCode) {
     logLine(Level::Warning, "Detected Cells");
     if (logCode != 0xB179) return reportUnknown(logCode);
     if (data.size() < 29) return;
-    clearElementsInArray(list());
     const RecordView record(data);
     const auto measured = static_cast<std::size_t>(record.read(27, u8));
     const auto detected = static_cast<std::size_t>(record.read(28, u8));
-    replaceArray(list(), rows(data, 29 + 6 * measured, detected, kCell));  // they follow the measured cells
+    showRows(list(), data, 29 + 6 * measured, detected, kCell);  // they follow the measured cells
 }
 
 }  // namespace kelvo

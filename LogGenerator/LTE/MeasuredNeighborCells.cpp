@@ -20,9 +20,8 @@ void MeasuredNeighborCells::updateWithData(ByteView data, LogCode logCode) {
     logLine(Level::Warning, "Measured Neighbor Cells");
     if (logCode != 0xB179) return reportUnknown(logCode);
     if (data.size() < 29) return;
-    clearElementsInArray(list());
     const auto measured = static_cast<std::size_t>(RecordView(data).read(27, u8));
-    replaceArray(list(), rows(data, 29, measured, kCell));
+    showRows(list(), data, 29, measured, kCell);
 }
 
 }  // namespace kelvo

@@ -23,16 +23,23 @@ constexpr auto kCell = entry(20, {
 });
 // clang-format on
 
+constexpr NumberFormat kCellLine("Physical Cell ID: %d\n");
+constexpr NumberFormat kLevelLine("Measured RSSI: %lf\n");  // intended: this text for all five levels
+
+// Half a hundred lines a record: they are printed as the tables print, not by logLine.
 void reportCells(ByteView data, const RecordEntries& cells) {
     logLine(Level::Warning, "Number of neighboring cells being reported: %d\n", cells.count());
     const RecordView record(data);
-    for (std::size_t i = 0; i < cells.count() && cells.offsetOf(i) < data.size(); ++i) {
-        const std::size_t cell = cells.offsetOf(i);
-        logLine(Level::Warning, "Physical Cell ID: %d\n", record.read(cell, kCell.fields[0].raw));
+    const RecordEntries present = cells.within(data.size());
+    std::string line;
+    for (std::size_t i = 0; i < present.count(); ++i) {
+        const std::size_t cell = present.offsetOf(i);
+        print(line, record.read(cell, kCell.fields[0].raw), kCell.fields[0].shown, kCellLine);
+        logLine(Level::Warning, line);
         for (const Field& field : kCell.fields) {
             if (!field.shown.isReal()) continue;
-            const double value = field.shown.real(record.read(cell + field.at, field.raw));
-            logLine(Level::Warning, "Measured RSSI: %lf\n", value);  // intended: this text for all five levels
+            print(line, record.read(cell + field.at, field.raw), field.shown, kLevelLine);
+            logLine(Level::Warning, line);
         }
     }
 }
@@ -43,11 +50,10 @@ void NeighborCellsList::updateWithData(ByteView data, LogCode logCode) {
     logLine(Level::Warning, "Neighbor Cells List");
     if (logCode != 0xB180) return reportUnknown(logCode);
     if (data.size() < 21) return;
-    clearElementsInArray(list());
     const auto count = static_cast<std::size_t>(RecordView(data).read(19, u16.bits(6, 10)) + 1);
     const RecordEntries cells(21, kCell.size, count);
     if (logWants(Level::Warning)) reportCells(data, cells);
-    replaceArray(list(), rowsOf(data, cells, kCell.fields));
+    showRows(list(), data, cells, kCell.fields);
 }
 
 }  // namespace kelvo

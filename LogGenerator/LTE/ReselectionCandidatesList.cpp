@@ -1,5 +1,6 @@
 #include "LogGenerator/LTE/ReselectionCandidatesList.h"
 
+#include "LogGenerator/RowWriter.h"
 #include "platform/Environment.h"
 
 namespace kelvo {
@@ -62,16 +63,16 @@ void ReselectionCandidatesList::updateWithData(ByteView data, LogCode logCode) {
     logLine(Level::Warning, "Reselection Candidates List");
     if (logCode != 0xB186) return reportUnknown(logCode);
     if (data.size() < 21) return;
-    clearElementsInArray(list());
     const RecordView record(data);
     const auto count = static_cast<std::size_t>(record.read(19, u8));  // the low byte alone of a 16-bit count
-    const RecordEntries candidates(21, kStride, count);
-    std::vector<Value> shown = rowsOf(data, candidates, kCandidate.fields);
-    for (std::size_t i = 0; i < shown.size(); ++i) {
+    const RecordEntries candidates = RecordEntries(21, kStride, count).within(data.size());
+    RowWriter rows(list());
+    for (std::size_t i = 0; i < candidates.count(); ++i) {
         const std::size_t at = candidates.offsetOf(i);
-        showFields(*shown[i].dictionary(), record, at, fieldsOfTechnology(record.read(at + 2, u16)));
+        Dictionary::Rewrite row = rows.next();
+        showFields(row, record, at, kCandidate.fields);
+        showFields(row, record, at, fieldsOfTechnology(record.read(at + 2, u16)));
     }
-    replaceArray(list(), std::move(shown));
 }
 
 }  // namespace kelvo

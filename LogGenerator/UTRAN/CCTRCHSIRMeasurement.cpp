@@ -1,5 +1,6 @@
 #include "LogGenerator/UTRAN/CCTRCHSIRMeasurement.h"
 
+#include "LogGenerator/RowWriter.h"
 #include "platform/Environment.h"
 
 namespace kelvo {
@@ -13,32 +14,24 @@ constexpr auto kChannel = entry(8, {
 });
 // clang-format on
 
-/// The values of the six timeslots behind a channel's two bytes.
-ArrayRef timeslots(RecordView record, std::size_t channel) {
-    const ArrayRef values = Array::make();
-    for (std::size_t i = 0; i < 6; ++i) {
-        std::string text;
-        print(text, record.read(channel + 2 + i, u8), decimal);
-        values->append(std::move(text));
-    }
-    return values;
-}
-
 }  // namespace
 
 void CCTRCHSIRMeasurement::updateWithData(ByteView data, LogCode logCode) {
     logLine(Level::Warning, "CCTRCH SIR Measurement");
     if (logCode != 0xD00C || data.size() < 17) return;
-    clearElementsInArray(list());
     const RecordView record(data);
     const auto transportChannels = static_cast<std::size_t>(record.read(14, u16.bits(6, 11)));
     const auto count = static_cast<std::size_t>(record.read(14, u16.bits(12, 15)));
-    const RecordEntries channels(289 + 34 * transportChannels, kChannel.size, count);
-    std::vector<Value> shown = rowsOf(data, channels, kChannel.fields);
-    for (std::size_t i = 0; i < shown.size(); ++i) {
-        shown[i].dictionary()->set("SIR", timeslots(record, channels.offsetOf(i)));
+    const RecordEntries channels =
+        RecordEntries(289 + 34 * transportChannels, kChannel.size, count).within(data.size());
+    RowWriter rows(list());
+    for (std::size_t i = 0; i < channels.count(); ++i) {
+        const std::size_t at = channels.offsetOf(i);
+        Dictionary::Rewrite row = rows.next();
+        showFields(row, record, at, kChannel.fields);
+        const RecordEntries timeslots(at + 2, 1, 6);
+        showValues(ownArray(row.next("SIR")), record, timeslots, u8, decimal);
     }
-    replaceArray(list(), std::move(shown));
 }
 
 }  // namespace kelvo

@@ -27,9 +27,10 @@ void GSMNeighbhorMeasurements::updateWithData(ByteView data, LogCode logCode) {
     neighbors(data);  // intended: the rows are made and never handed to the list, which stays empty
 }
 
-std::vector<Value> GSMNeighbhorMeasurements::neighbors(ByteView data) {
-    const auto count = static_cast<std::size_t>(RecordView(data).read(16, u8));
-    return rows(data, 17, count, kNeighbor);
+ArrayRef GSMNeighbhorMeasurements::neighbors(ByteView data) {
+    const ArrayRef cells = Array::make();
+    showRows(cells, data, 17, static_cast<std::size_t>(RecordView(data).read(16, u8)), kNeighbor);
+    return cells;
 }
 
 }  // namespace kelvo

@@ -16,7 +16,7 @@ public:
     void updateWithData(ByteView data, LogCode logCode) override;
 
     /// One row for each cell that a record of at least 17 bytes reports.
-    static std::vector<Value> neighbors(ByteView data);
+    static ArrayRef neighbors(ByteView data);
 };
 
 }  // namespace kelvo

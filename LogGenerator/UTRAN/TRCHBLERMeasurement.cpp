@@ -18,9 +18,8 @@ constexpr auto kChannel = entry(2, {
 void TRCHBLERMeasurement::updateWithData(ByteView data, LogCode logCode) {
     logLine(Level::Notice, "TRCH BLER Measurement");
     if (logCode != 0xD00C || data.size() < 17) return;
-    clearElementsInArray(list());
     const auto transportChannels = static_cast<std::size_t>(RecordView(data).read(14, u16.bits(6, 11)));
-    replaceArray(list(), rows(data, 17, transportChannels, kChannel));
+    showRows(list(), data, 17, transportChannels, kChannel);
 }
 
 }  // namespace kelvo

@@ -37,7 +37,7 @@ void UTRANServingCellInfo::updateWithData(ByteView data, LogCode logCode) {
 }
 
 void UTRANServingCellInfo::showCellArray(ByteView data) {
-    const Value payload = payloadPropertyList(data);
+    const Value payload = cellInfo(data);
     if (!payload.array() || !values()) return;
     for (const Value& cell : *payload.array()) {  // every serving cell; the last one shows
         if (isCell(cell, kPLCellMonitorRadioAccessTechnologyUTRAN2, kPLCellMonitorCellTypeServing)) {

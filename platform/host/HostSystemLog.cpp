@@ -1,7 +1,5 @@
 #include "platform/host/HostSystemLog.h"
 
-#include <spdlog/async.h>
-#include <spdlog/async_logger.h>
 #include <spdlog/sinks/base_sink.h>
 #include <spdlog/sinks/stdout_sinks.h>
 #include <syslog.h>
@@ -58,50 +56,29 @@ std::shared_ptr<spdlog::sinks::sink> sinkFor(HostSystemLog::To destination, cons
 HostSystemLog::HostSystemLog(const std::string& program, To destination)
     : HostSystemLog(sinkFor(destination, program)) {}
 
-// Writes lines on, and after an overflow how many were lost.
-class HostSystemLog::CountingSink final : public spdlog::sinks::base_sink<OneThread> {
-public:
-    CountingSink(std::shared_ptr<spdlog::sinks::sink> destination, spdlog::details::thread_pool& worker)
-        : _destination(std::move(destination)), _worker(worker) {}
-
-    void tellLost(std::size_t lost) {
-        if (lost == _told) return;
-        const std::string text = fmt::format("{} log lines were lost", lost - _told);
-        _destination->log(spdlog::details::log_msg("", spdlog::level::err, text));
-        _told = lost;
-    }
-
-private:
-    void sink_it_(const spdlog::details::log_msg& line) override {
-        _destination->log(line);
-        if (_worker.queue_size() == 0) tellLost(_worker.overrun_counter());
-    }
-    void flush_() override { _destination->flush(); }
-
-    const std::shared_ptr<spdlog::sinks::sink> _destination;
-    spdlog::details::thread_pool& _worker;  // used by its own thread only, which ends first
-    std::size_t _told = 0;
-};
-
 HostSystemLog::HostSystemLog(std::shared_ptr<spdlog::sinks::sink> destination, std::size_t queueLength)
-    : _worker(std::make_shared<spdlog::details::thread_pool>(queueLength, 1)),
-      _sink(std::make_shared<CountingSink>(std::move(destination), *_worker)),
-      _logger(
-          std::make_shared<spdlog::async_logger>("", _sink, _worker, spdlog::async_overflow_policy::overrun_oldest)) {
-    _logger->set_level(spdlog::level::info);
-}
+    : _destination(std::move(destination)), _queue(queueLength), _writer([this] { writeOut(); }) {}
 
 HostSystemLog::~HostSystemLog() {
-    const std::size_t lost = _worker->overrun_counter();
-    _worker.reset();  // writes what waits, then ends the thread
-    _sink->tellLost(lost);
+    _queue.close();
+    _writer.join();
 }
-
-bool HostSystemLog::wants(Level level) const { return _logger->should_log(levelFor(level)); }
 
 void HostSystemLog::write(Level level, std::string_view text) {
     while (!text.empty() && (text.back() == '\n' || text.back() == '\r')) text.remove_suffix(1);
-    _logger->log(levelFor(level), spdlog::string_view_t(text.data(), text.size()));
+    _queue.add(level, text);
+}
+
+void HostSystemLog::writeOut() {
+    const auto writeLine = [this](Level level, std::string_view text) {
+        _destination->log(
+            spdlog::details::log_msg("", levelFor(level), spdlog::string_view_t(text.data(), text.size())));
+    };
+    LineQueue::Batch batch;
+    while (_queue.take(batch)) {
+        batch.forEach(writeLine);
+        if (batch.lost() > 0) writeLine(Level::Error, fmt::format("{} log lines were lost", batch.lost()));
+    }
 }
 
 }  // namespace kelvo

@@ -5,19 +5,17 @@
 #include <cstddef>
 #include <memory>
 #include <string>
+#include <thread>
 
 #include "platform/SystemLog.h"
-
-namespace spdlog::details {
-class thread_pool;
-}
+#include "platform/host/LineQueue.h"
 
 namespace kelvo {
 
-/// The system log on a thread of its own: taking a line never waits for whoever writes it out. Lines wait in a queue;
-/// in an overflow the oldest go, and one line tells how many once the queue is empty again. Destruction writes
-/// everything that still waits. Lines go to syslog where the system has one, and to standard error elsewhere or when a
-/// terminal is there to read it.
+/// The system log on a thread of its own: taking a line never waits for whoever writes it out. Lines wait in a queue,
+/// a few milliseconds even when nothing is in their way; in an overflow the oldest go, and one line tells how many once
+/// the queue is empty again. Destruction writes everything that still waits. Lines go to syslog where the system has
+/// one, and to standard error elsewhere or when a terminal is there to read it.
 class HostSystemLog final : public SystemLog {
 public:
     static constexpr std::size_t kQueueLength = 8192;  // lines
@@ -30,15 +28,15 @@ public:
     explicit HostSystemLog(std::shared_ptr<spdlog::sinks::sink> destination, std::size_t queueLength = kQueueLength);
     ~HostSystemLog() override;
 
-    bool wants(Level level) const override;
+    bool wants(Level) const override { return true; }
     void write(Level level, std::string_view text) override;
 
 private:
-    class CountingSink;
+    void writeOut();
 
-    std::shared_ptr<spdlog::details::thread_pool> _worker;
-    std::shared_ptr<CountingSink> _sink;
-    std::shared_ptr<spdlog::logger> _logger;
+    const std::shared_ptr<spdlog::sinks::sink> _destination;
+    LineQueue _queue;
+    std::thread _writer;
 };
 
 }  // namespace kelvo

@@ -210,6 +210,25 @@ TEST_F(TemplateGenerator, TakesOverTheDisplayOfItsPredecessor) {
     EXPECT_EQ(cellShows("45250"), "40");
 }
 
+TEST_F(TemplateGenerator, TakesNothingInsideASectionForAnothersPart) {
+    const DictionaryRef likeASection = Dictionary::make();
+    const DictionaryRef power = Dictionary::make();
+    state.set("Display", Dictionary::make({{"Power", power},
+                                           {"Broken", Array::make()},
+                                           {"Cell", Dictionary::make({{"Power", likeASection}})}}));
+    generator.updateState(state, Record(0xB0C2, 38).bytes());
+    EXPECT_EQ(*(*power)["45250"].string(), "38");
+    EXPECT_TRUE(likeASection->empty());
+}
+
+TEST_F(TemplateGenerator, DoesNotCountAKeyInsideASectionAsAPlace) {
+    const DictionaryRef foreign = Dictionary::make(
+        {{"Broken", Array::make()}, {"Cell", Dictionary::make({{"Power", Dictionary::make()}, {"45250", "kept"}})}});
+    state.set("Display", foreign);
+    generator.updateState(state, Record(0xB0C2, 38).bytes());
+    EXPECT_EQ(*(*(*foreign)["Cell"].dictionary())["45250"].string(), "kept");
+}
+
 TEST_F(TemplateGenerator, LeavesTheDisplayOfAnotherTechnologyAlone) {
     const DictionaryRef foreign = Dictionary::make({{"Cell", Dictionary::make({{"45250", "kept"}})}});
     state.set("Display", foreign);

@@ -3,6 +3,8 @@
 #include <gtest/gtest.h>
 
 #include <limits>
+#include <unordered_map>
+#include <vector>
 
 namespace kelvo {
 namespace {
@@ -50,6 +52,104 @@ TEST(Number, FitsThirtyTwoBitsOnlyWhenNothingIsLost) {
     EXPECT_EQ(Number(3.5).int32(), std::nullopt);
     EXPECT_EQ(Number(std::numeric_limits<double>::quiet_NaN()).int32(), std::nullopt);
     EXPECT_EQ(Number(1e300).int32(), std::nullopt);
+}
+
+/// 2 to the power of `doublings` keys that all have one hash: a text and another that leads the hash to the same place
+/// are interchangeable at the front of any key.
+std::vector<std::string> keysOfOneHash(int doublings) {
+    std::vector<std::string> keys = {""};
+    for (int i = 0; i < doublings; ++i) {
+        std::unordered_map<std::uint32_t, std::string> seen;
+        std::string tail[2];
+        for (std::uint32_t candidate = 0; tail[0].empty(); ++candidate) {
+            tail[1] = std::to_string(candidate) + ".";
+            const auto [before, isNew] = seen.try_emplace(Key(keys.front() + tail[1]).hash(), tail[1]);
+            if (!isNew) tail[0] = before->second;
+        }
+        const std::size_t count = keys.size();
+        for (std::size_t k = 0; k < count; ++k) keys.push_back(keys[k] + tail[1]);
+        for (std::size_t k = 0; k < count; ++k) keys[k] += tail[0];
+    }
+    return keys;
+}
+
+TEST(Dictionary, FindsItsKeysFastAlsoWhenTheyAllHaveOneHash) {
+    const std::vector<std::string> keys = keysOfOneHash(12);  // compared in pairs, they would be compared eight million times
+    Dictionary large;
+    for (const std::string& key : keys) large.set(key, key);
+    ASSERT_EQ(large.size(), keys.size());
+    for (const std::string& key : keys) {
+        ASSERT_EQ(Key(key).hash(), Key(keys.front()).hash());
+        ASSERT_EQ(*large[key].string(), key);
+    }
+}
+
+TEST(Dictionary, RewritesItsEntriesInTheirPlaces) {
+    const DictionaryRef row = Dictionary::make({{"a", "1"}, {"b", "2"}, {"c", "3"}});
+    const Value* second = row->find("b");
+    {
+        Dictionary::Rewrite rewrite(*row);
+        rewrite.next("a") = "4";
+        rewrite.next("b") = "5";
+    }
+    EXPECT_EQ(row->find("b"), second);
+    EXPECT_EQ(row->size(), 2U);
+    {
+        Dictionary::Rewrite rewrite(*row);
+        rewrite.next("b") = "6";
+        rewrite.next("a") = "7";
+    }
+    std::string order;
+    for (const auto& entry : *row) order += entry.key + *entry.value.string();
+    EXPECT_EQ(order, "b6a7");
+}
+
+TEST(Dictionary, RewritesALargeOneIntoASmallOneAndBack) {
+    Dictionary large;
+    const auto rewrite = [&](int entries) {
+        Dictionary::Rewrite rewrite(large);
+        for (int i = 0; i < entries; ++i) rewrite.next(std::to_string(i)) = i;
+    };
+    for (const int entries : {100, 10, 50}) {
+        rewrite(entries);
+        EXPECT_EQ(large.size(), static_cast<std::size_t>(entries));
+        for (int i = 0; i < 100; ++i) EXPECT_EQ(large.find(std::to_string(i)) != nullptr, i < entries) << i;
+    }
+}
+
+/// Prints the number, and counts how often it did.
+void printAndCount(std::string& text, std::int64_t raw, const void* how) {
+    text = std::to_string(raw);
+    ++**static_cast<int* const*>(how);
+}
+
+TEST(Value, WritesATextWhenItIsReadAndOnce) {
+    static int prints;
+    static int* const kCounter = &prints;
+    prints = 0;
+    Value value = "before";
+    for (int raw = 0; raw < 10; ++raw) value.set({.raw = raw, .how = &kCounter, .print = printAndCount});
+    EXPECT_EQ(value.kind(), Value::Kind::String);
+    EXPECT_TRUE(value);
+    EXPECT_EQ(prints, 0);
+    EXPECT_EQ(*value.string(), "9");
+    EXPECT_EQ(*value.string(), "9");
+    EXPECT_EQ(prints, 1);
+}
+
+TEST(Value, IsAStringLikeAnyOtherWhileItsTextIsUnwritten) {
+    static int prints;
+    static int* const kCounter = &prints;
+    Value value;
+    value.set({.raw = 7, .how = &kCounter, .print = printAndCount});
+    const Value copy = value.copy();
+    value = "later";
+    EXPECT_EQ(copy, Value("7"));
+    EXPECT_EQ(copy.number(), nullptr);
+    Value text = copy;
+    text.set({.raw = 8, .how = &kCounter, .print = printAndCount});
+    text.text() += " dB";
+    EXPECT_EQ(text, Value("8 dB"));
 }
 
 TEST(Value, BecomesAStringWhateverItWas) {

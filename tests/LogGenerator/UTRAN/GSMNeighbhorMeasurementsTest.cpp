@@ -41,7 +41,8 @@ TEST(GSMNeighbhorMeasurements, KeepsTheListWhenARecordIsShortOrOfAnotherCode) {
 
 TEST(GSMNeighbhorMeasurements, ReadsOneRowACell) {
     const Record record = twoNeighbors();
-    const std::vector<Value> rows = GSMNeighbhorMeasurements::neighbors(record.bytes());
+    const ArrayRef made = GSMNeighbhorMeasurements::neighbors(record.bytes());
+    const Array& rows = *made;
     ASSERT_EQ(rows.size(), 2U);
     EXPECT_EQ(rows[0], Value(Dictionary::make({{"Cell ID", "10000"},
                                                {"Band Indicator", "1"},
@@ -57,7 +58,7 @@ TEST(GSMNeighbhorMeasurements, ReadsOneRowACell) {
 
 TEST(GSMNeighbhorMeasurements, ReadsNoRowBeyondTheEnd) {
     const Record record = Record(0xD00E, 26).u8(16, 255);
-    EXPECT_EQ(GSMNeighbhorMeasurements::neighbors(record.bytes()).size(), 2U);
+    EXPECT_EQ(GSMNeighbhorMeasurements::neighbors(record.bytes())->size(), 2U);
 }
 
 }  // namespace

@@ -1,0 +1,50 @@
+// What the application does every two seconds when records came: from the generator's display to the tree that the
+// screens show, with all values new.
+
+#include <benchmark/benchmark.h>
+
+#include "bench/Families.h"
+#include "model/KelvoModelNode.h"
+#include "platform/DirectoryResources.h"
+#include "platform/Environment.h"
+
+namespace kelvo {
+namespace {
+
+void rebuild(benchmark::State& state, std::string_view technology, const std::vector<Bytes>& messages) {
+    const DirectoryResources resources(KELVO_RESOURCE_DIR);
+    const Environment::Scope environment({.resources = &resources});
+    const auto generator = LogGenerator::generatorFromTechnology(technology);
+    Dictionary kept;
+    NodeRef tree;
+    NodesByPath nodes;
+    for (auto _ : state) {
+        state.PauseTiming();
+        for (const Bytes& message : messages) generator->updateState(kept, message);
+        state.ResumeTiming();
+        tree.reset();  // of the rebuild before
+        nodes.clear();
+        tree = KelvoModelNode::makeTreeFromObject(generator->generateLogUsingState(kept), nodes);
+    }
+    state.counters["nodes"] = static_cast<double>(nodes.size());
+}
+
+void addAll() {
+    const auto add = [](const std::string& name, std::string_view technology, const std::vector<Bytes>& messages) {
+        const auto run = [=](benchmark::State& state) { rebuild(state, technology, messages); };
+        benchmark::RegisterBenchmark(name.c_str(), run)->Unit(benchmark::kMicrosecond);
+    };
+    add("GSM/UMTS, every list filled", bench::gsmFamily().technology, bench::fullestGSMScreen());
+    for (const auto& family : {bench::gsmFamily(), bench::lteFamily(), bench::cdmaFamily(), bench::utranFamily()}) {
+        add(family.name, family.technology, family.traffic.front().messages);
+    }
+}
+
+}  // namespace
+}  // namespace kelvo
+
+int main(int argc, char** argv) {
+    benchmark::Initialize(&argc, argv);
+    kelvo::addAll();
+    benchmark::RunSpecifiedBenchmarks();
+}

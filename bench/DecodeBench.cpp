@@ -74,7 +74,7 @@ void add(const std::string& name, const Receivers& receivers) {
     for (const bool logs : {false, true}) {
         const auto run = [=](benchmark::State& state) {
             std::deque<Receiver> made;
-            for (const auto& [technology, messages] : receivers) made.push_back({technology, messages});
+            for (const auto& [technology, messages] : receivers) made.emplace_back(technology, messages);
             decode(state, logs, made);
         };
         auto* added = benchmark::RegisterBenchmark((name + (logs ? " / log" : " / nowhere")).c_str(), run);

@@ -11,6 +11,14 @@
 namespace kelvo {
 namespace {
 
+std::size_t countOf(const KelvoModelNode& node) {
+    std::size_t count = 1;
+    for (std::size_t i = 0; node.childNodes() != nullptr && i < node.childNodes()->size(); ++i) {
+        count += countOf(*(*node.childNodes())[i]);
+    }
+    return count;
+}
+
 void rebuild(benchmark::State& state, std::string_view technology, const std::vector<Bytes>& messages) {
     const DirectoryResources resources(KELVO_RESOURCE_DIR);
     const Environment::Scope environment({.resources = &resources});
@@ -26,7 +34,7 @@ void rebuild(benchmark::State& state, std::string_view technology, const std::ve
         nodes.clear();
         tree = KelvoModelNode::makeTreeFromObject(generator->generateLogUsingState(kept), nodes);
     }
-    state.counters["nodes"] = static_cast<double>(nodes.size());
+    state.counters["nodes"] = static_cast<double>(countOf(*tree));
 }
 
 void addAll() {

@@ -194,8 +194,7 @@ NodeRef KelvoModel::topLevelNodes() {
 
 NodeRef KelvoModel::nodeAtPath(const std::string& path) {
     if (!_nodes) topLevelNodes();
-    const auto found = _nodesByPath.find(path);
-    return found != _nodesByPath.end() ? found->second : nullptr;
+    return _nodesByPath.find(path);
 }
 
 void KelvoModel::updateWithData(ByteView data) {

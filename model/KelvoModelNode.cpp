@@ -25,19 +25,10 @@ std::string_view nameOfSortedKey(std::string_view key) {
     return twoParts ? key.substr(separator + 1) : key;
 }
 
-/// One walk over a display object. The path of the node being built is one buffer that grows and shrinks on the way.
+/// One walk over a display object.
 class TreeBuilder {
 public:
-    explicit TreeBuilder(NodesByPath& nodesByPath) : _nodesByPath(nodesByPath) {}
-
-    NodeRef build(std::string_view name, const Value& object) {
-        NodeRef node = makeNode(std::string(name), object);
-        _nodesByPath.insert_or_assign(_path, node);
-        return node;
-    }
-
-private:
-    NodeRef makeNode(std::string name, const Value& object) {
+    NodeRef build(std::string name, const Value& object) {
         if (const std::string* text = object.string()) {
             return std::make_shared<KelvoModelLeafNode>(std::move(name), *text);
         }
@@ -51,6 +42,7 @@ private:
         return std::make_shared<KelvoModelTreeNode>(std::move(name), std::move(children));
     }
 
+private:
     KelvoModelNode::Children childrenOf(const Dictionary& dictionary) {
         KelvoModelNode::Children children;
         children.reserve(dictionary.size());
@@ -67,7 +59,7 @@ private:
     }
 
     void appendEntry(KelvoModelNode::Children& children, std::string_view name, const Dictionary::Entry& entry) {
-        if (entry.key != "_sorted" && entry.value) children.push_back(buildChild(name, entry.value));
+        if (entry.key != "_sorted" && entry.value) children.push_back(build(std::string(name), entry.value));
     }
 
     KelvoModelNode::Children childrenOf(const Array& array) {
@@ -76,29 +68,42 @@ private:
         std::optional<ArrayLock::Held> lock;
         if (_openArrays++ == 0) lock.emplace();
         children.reserve(array.size());
-        for (const Value& element : array) children.push_back(buildChild(std::to_string(children.size()), element));
+        for (const Value& element : array) children.push_back(build(std::to_string(children.size()), element));
         --_openArrays;
         return children;
     }
 
-    NodeRef buildChild(std::string_view name, const Value& object) {
-        const std::size_t parentLength = _path.size();
-        appendToPath(_path, name);
-        NodeRef child = build(name, object);
-        _path.resize(parentLength);
-        return child;
-    }
-
-    NodesByPath& _nodesByPath;
-    std::string _path = "/";
     int _depth = 0;
     int _openArrays = 0;
 };
 
+/// The last node at `wanted`, in the order in which nodes are finished, of those from `node` down, which is at `path`.
+const NodeRef* findLast(const NodeRef& node, std::string& path, std::string_view wanted) {
+    static const KelvoModelNode::Children kNone;
+    if (!wanted.starts_with(path)) return nullptr;  // paths grow on their way down
+    if (path == wanted) return &node;
+    const KelvoModelNode::Children& children = node->childNodes() != nullptr ? *node->childNodes() : kNone;
+    const std::size_t length = path.size();
+    for (auto child = children.rbegin(); child != children.rend(); ++child) {
+        appendToPath(path, (*child)->displayName());
+        const NodeRef* found = findLast(*child, path, wanted);
+        path.resize(length);
+        if (found != nullptr) return found;
+    }
+    return nullptr;
+}
+
 }  // namespace
 
+NodeRef NodesByPath::find(std::string_view path) const {
+    std::string at = "/";
+    const NodeRef* found = _root ? findLast(_root, at, path) : nullptr;
+    return found != nullptr ? *found : nullptr;
+}
+
 NodeRef KelvoModelNode::makeTreeFromObject(const Value& object, NodesByPath& nodesByPath) {
-    return TreeBuilder(nodesByPath).build("Kelvo", object);
+    nodesByPath._root = TreeBuilder().build("Kelvo", object);
+    return nodesByPath._root;
 }
 
 std::string pathByAppending(std::string_view parent, std::string_view name) {

@@ -3,7 +3,6 @@
 #include <memory>
 #include <string>
 #include <string_view>
-#include <unordered_map>
 #include <vector>
 
 #include "platform/PropertyList.h"
@@ -13,7 +12,20 @@ namespace kelvo {
 
 class KelvoModelNode;
 using NodeRef = std::shared_ptr<const KelvoModelNode>;
-using NodesByPath = std::unordered_map<std::string, NodeRef>;
+
+/// The nodes of a tree by their paths. Paths are made when one is looked for: a screen looks for its own alone, and the
+/// tree is built anew every two seconds.
+class NodesByPath {
+public:
+    /// The node at `path`; null when there is none.
+    NodeRef find(std::string_view path) const;
+    void clear() { _root.reset(); }
+
+private:
+    friend class KelvoModelNode;
+
+    NodeRef _root;
+};
 
 /// One named node of the display tree. Immutable once built; panes hold on to nodes of an older tree while they need
 /// them.
@@ -32,9 +44,10 @@ public:
     /// The value shown; null for an inner node.
     virtual const std::string* value() const { return nullptr; }
 
-    /// Builds the tree of a display object: root "Kelvo" at "/". Every node is stored in `nodesByPath` under its path;
-    /// of two nodes with one path the later stays, and a parent is stored after its children. A dictionary or an array
-    /// nested deeper than `kMaxDepth` is shown as "(unknown)", so that no tree can exhaust the stack.
+    /// Builds the tree of a display object: root "Kelvo" at "/". Every node is found in `nodesByPath`, which forgets
+    /// other trees, under its path; of two nodes with one path the later is found, and a parent is later than its
+    /// children. A dictionary or an array nested deeper than `kMaxDepth` is shown as "(unknown)", so that no tree can
+    /// exhaust the stack.
     static NodeRef makeTreeFromObject(const Value& object, NodesByPath& nodesByPath);
 
     /// How many dictionaries and arrays may stand inside one another; no property list that is read nests deeper.

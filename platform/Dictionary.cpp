@@ -88,8 +88,10 @@ void Dictionary::buildIndex() {
 
 DictionaryRef Dictionary::copy() const {
     auto copy = std::make_shared<Dictionary>();
-    copy->_entries.reserve(size());
-    for (const auto& [key, value] : _entries) copy->_entries.push_back({key, value.copy()});
+    copy->_entries = _entries;
+    for (Entry& entry : copy->_entries) {
+        if (entry.value.array() || entry.value.dictionary()) entry.value = entry.value.copy();
+    }
     copy->_hashes = _hashes;
     if (_index) copy->_index = std::make_unique<Index>(*_index);
     return copy;

@@ -25,7 +25,10 @@ protected:
         nodes.clear();
         return outline(*KelvoModelNode::makeTreeFromObject(object, nodes));
     }
-    std::string at(const std::string& path) { return nodes.contains(path) ? outline(*nodes.at(path)) : "(no node)"; }
+    std::string at(const std::string& path) {
+        const NodeRef node = nodes.find(path);
+        return node ? outline(*node) : "(no node)";
+    }
 
     NodesByPath nodes;
 };
@@ -40,8 +43,8 @@ TEST_F(DisplayTree, ShowsAStringAsALeafAndADictionaryInItsOwnOrder) {
 
 TEST_F(DisplayTree, GivesALeafNoChildrenAndAnInnerNodeNoValue) {
     treeOf(Dictionary::make({{"a", "1"}}));
-    EXPECT_EQ(nodes.at("/")->value(), nullptr);
-    EXPECT_EQ(nodes.at("/a")->childNodes(), nullptr);
+    EXPECT_EQ(nodes.find("/")->value(), nullptr);
+    EXPECT_EQ(nodes.find("/a")->childNodes(), nullptr);
 }
 
 TEST_F(DisplayTree, ShowsWhatIsNeitherTextNorContainerAsUnknown) {
@@ -89,7 +92,10 @@ TEST_F(DisplayTree, NumbersTheElementsOfAnArray) {
 TEST_F(DisplayTree, FindsEveryNodeUnderItsPath) {
     treeOf(Dictionary::make({{"Serving Cell", Dictionary::make({{"_sorted", ""}, {"02;RSCP", "-90"}})},
                              {"Active Set", Array::make({Dictionary::make({{"PSC", "7"}})})}}));
-    EXPECT_EQ(nodes.size(), 6U);
+    EXPECT_EQ(at("/Serving"), "(no node)");
+    EXPECT_EQ(at("/Serving Cell/"), "(no node)");
+    EXPECT_EQ(at("Serving Cell"), "(no node)");
+    EXPECT_EQ(at(""), "(no node)");
     EXPECT_EQ(at("/"), "Kelvo[Serving Cell[RSCP=-90],Active Set[0[PSC=7]]]");
     EXPECT_EQ(at("/Serving Cell"), "Serving Cell[RSCP=-90]");
     EXPECT_EQ(at("/Serving Cell/RSCP"), "RSCP=-90");
@@ -171,7 +177,6 @@ TEST_P(DeepDisplay, IsShownWholeAsFarAsPropertyListsReach) {
     int levels = 0;
     EXPECT_EQ(innermostValue(KelvoModelNode::makeTreeFromObject(nest.outermost(), nodes), levels), "end");
     EXPECT_EQ(levels, 512);
-    EXPECT_EQ(nodes.size(), 513U);
 }
 
 TEST_P(DeepDisplay, EndsInAnUnknownLeafBeyond) {

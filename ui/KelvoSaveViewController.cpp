@@ -29,7 +29,7 @@ void KelvoSaveViewController::savePressed() {
 void KelvoSaveViewController::writeSnapshot() {
     const std::string path = Snapshot::pathInDirectory(_services.snapshotDirectory, clock().now());
     const Result<Bytes> bytes = Snapshot{_timeStamp, _saveHistory, _saveDescription}.propertyList();
-    if (bytes && !writeFileInPlace(path, *bytes)) return;
+    if (bytes && !writeFileInPlace(path, *bytes, WriteOver::OwnFile)) return;
     logLine(Level::Error, "Unable to write snapshot to %s", path);
     _services.host.showAlert(QStringLiteral("File Error"), QStringLiteral("Unable to write file to disk"),
                              QStringLiteral("Close"));

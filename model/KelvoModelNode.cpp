@@ -31,6 +31,8 @@ public:
     explicit TreeBuilder(NodesByPath& nodesByPath) : _nodesByPath(nodesByPath) {}
 
     NodeRef build(std::string_view name, const Value& object) {
+        if (_path.size() > _pathBytesLeft) return makeNode(std::string(name), Value());
+        _pathBytesLeft -= _path.size();
         NodeRef node = makeNode(std::string(name), object);
         _nodesByPath.insert_or_assign(_path, node);
         return node;
@@ -91,6 +93,7 @@ private:
 
     NodesByPath& _nodesByPath;
     std::string _path = "/";
+    std::size_t _pathBytesLeft = KelvoModelNode::kMaxPathBytes;
     int _depth = 0;
     int _openArrays = 0;
 };

@@ -1,9 +1,10 @@
 #pragma once
 
+#include <cstddef>
+#include <map>
 #include <memory>
 #include <string>
 #include <string_view>
-#include <unordered_map>
 #include <vector>
 
 #include "platform/PropertyList.h"
@@ -13,7 +14,7 @@ namespace kelvo {
 
 class KelvoModelNode;
 using NodeRef = std::shared_ptr<const KelvoModelNode>;
-using NodesByPath = std::unordered_map<std::string, NodeRef>;
+using NodesByPath = std::map<std::string, NodeRef>;  // ordered: no keys of a modem's make it slow
 
 /// One named node of the display tree. Immutable once built; panes hold on to nodes of an older tree while they need
 /// them.
@@ -34,11 +35,13 @@ public:
 
     /// Builds the tree of a display object: root "Kelvo" at "/". Every node is stored in `nodesByPath` under its path;
     /// of two nodes with one path the later stays, and a parent is stored after its children. A dictionary or an array
-    /// nested deeper than `kMaxDepth` is shown as "(unknown)", so that no tree can exhaust the stack.
+    /// nested deeper than `kMaxDepth` is shown as "(unknown)", so that no tree can exhaust the stack; so is everything,
+    /// and without a path, once the paths take `kMaxPathBytes` together, so that none can exhaust the memory.
     static NodeRef makeTreeFromObject(const Value& object, NodesByPath& nodesByPath);
 
     /// How many dictionaries and arrays may stand inside one another; no property list that is read nests deeper.
     static constexpr int kMaxDepth = kMaxPropertyListDepth;
+    static constexpr std::size_t kMaxPathBytes = std::size_t{32} << 20;
 
 private:
     std::string _name;

@@ -1,8 +1,21 @@
 #include "platform/Dictionary.h"
 
 #include <algorithm>
+#include <random>
 
 namespace kelvo {
+
+namespace {
+
+/// A hash that nobody outside this process can foresee.
+std::uint32_t secretHash(std::string_view text) {
+    static const std::uint32_t kSecret = std::random_device()();
+    std::uint32_t hash = kSecret;
+    for (const char c : text) hash = (hash ^ static_cast<std::uint8_t>(c)) * 16777619U;
+    return hash;
+}
+
+}  // namespace
 
 DictionaryRef Dictionary::make(std::initializer_list<std::pair<std::string_view, Value>> entries) {
     auto dictionary = std::make_shared<Dictionary>();
@@ -12,7 +25,7 @@ DictionaryRef Dictionary::make(std::initializer_list<std::pair<std::string_view,
 
 std::size_t Dictionary::indexOf(Key key) const {
     if (_index) {
-        const auto [first, last] = _index->equal_range(key.hash());
+        const auto [first, last] = _index->equal_range(indexHash(key));
         const auto at =
             std::find_if(first, last, [&](const auto& hit) { return _entries[hit.second].key == key.text(); });
         return at != last ? at->second : kNotFound;
@@ -21,6 +34,11 @@ std::size_t Dictionary::indexOf(Key key) const {
         if (_hashes[i] == key.hash() && _entries[i].key == key.text()) return i;
     }
     return kNotFound;
+}
+
+// Keys that share the public hash would make every look-up a walk over all of them.
+std::uint32_t Dictionary::indexHash(Key key) const {
+    return _entries.size() > kTrustLimit ? secretHash(key.text()) : key.hash();
 }
 
 const Value* Dictionary::find(Key key) const {
@@ -38,10 +56,11 @@ Value& Dictionary::slot(Key key) {
     if (const std::size_t index = indexOf(key); index != kNotFound) return _entries[index].value;
     _entries.push_back({std::string(key.text()), Value()});
     _hashes.push_back(key.hash());
-    if (_index) {
-        _index->emplace(key.hash(), _entries.size() - 1);
-    } else if (_entries.size() > kScanLimit) {
+    const std::size_t size = _entries.size();
+    if (size == kScanLimit + 1 || size == kTrustLimit + 1) {
         buildIndex();
+    } else if (_index) {
+        _index->emplace(indexHash(key), size - 1);
     }
     return _entries.back().value;
 }
@@ -69,7 +88,7 @@ void Dictionary::reserve(std::size_t entries) {
 void Dictionary::buildIndex() {
     _index = std::make_unique<Index>();
     _index->reserve(_entries.size());
-    for (std::size_t i = 0; i < _hashes.size(); ++i) _index->emplace(_hashes[i], i);
+    for (std::size_t i = 0; i < _entries.size(); ++i) _index->emplace(indexHash(_entries[i].key), i);
 }
 
 DictionaryRef Dictionary::copy() const {

@@ -51,15 +51,17 @@ public:
 
 private:
     static constexpr std::size_t kNotFound = static_cast<std::size_t>(-1);
-    static constexpr std::size_t kScanLimit = 32;  ///< up to here comparing hashes in a row beats any index
+    static constexpr std::size_t kScanLimit = 32;     ///< up to here comparing hashes in a row beats any index
+    static constexpr std::size_t kTrustLimit = 1024;  ///< from here on keys may have been made to share one hash
 
     std::size_t indexOf(Key key) const;
+    std::uint32_t indexHash(Key key) const;
     void buildIndex();
 
     std::vector<Entry> _entries;
     std::vector<std::uint32_t> _hashes;  // of the entries' keys, side by side
     using Index = std::unordered_multimap<std::uint32_t, std::size_t>;
-    std::unique_ptr<Index> _index;  // hash to position, once past kScanLimit
+    std::unique_ptr<Index> _index;  // indexHash to position, once past kScanLimit
 };
 
 }  // namespace kelvo

@@ -127,6 +127,26 @@ TEST_F(DisplayTree, ReplacesWhatThePathsHeldBefore) {
     EXPECT_EQ(at("/a"), "a=2");
 }
 
+/// Long names inside one another over many short ones: paths a thousand times as long as the display.
+TEST_F(DisplayTree, BoundsThePathsThatLongNamesWouldGive) {
+    const DictionaryRef leaves = Dictionary::make();
+    for (int i = 0; i < 3000; ++i) leaves->set(std::to_string(i), "v");
+    Value display = leaves;
+    for (int i = 0; i < 60; ++i) display = Dictionary::make({{std::string(1000, 'k'), display}});
+    KelvoModelNode::makeTreeFromObject(display, nodes);
+    std::size_t bytes = 0;
+    for (const auto& [path, node] : nodes) bytes += path.size();
+    EXPECT_LE(bytes, KelvoModelNode::kMaxPathBytes);
+    EXPECT_GT(bytes, KelvoModelNode::kMaxPathBytes / 2);
+}
+
+TEST_F(DisplayTree, ShowsWhatIsBeyondThePathsLimitAsUnknown) {
+    const std::string half(KelvoModelNode::kMaxPathBytes / 2, 'h');
+    EXPECT_EQ(treeOf(Dictionary::make({{half, "1"}, {half + "2", "2"}, {"a", Dictionary::make({{"b", "3"}})}})),
+              "Kelvo[" + half + "=1," + half + "2=(unknown),a[b=3]]");
+    EXPECT_EQ(nodes.size(), 4U);
+}
+
 TEST(DisplayPath, SeparatesComponentsByOneSlash) {
     EXPECT_EQ(pathByAppending("/", "A"), "/A");
     EXPECT_EQ(pathByAppending("/A", "B"), "/A/B");

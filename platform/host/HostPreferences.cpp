@@ -1,11 +1,13 @@
 #include "platform/host/HostPreferences.h"
 
+#include <unistd.h>
 #include <QDBusConnection>
 #include <QDBusMessage>
 #include <QDir>
 #include <QFile>
 #include <QFileInfo>
 #include <QSaveFile>
+
 #include <algorithm>
 #include <cctype>
 #include <string>
@@ -76,7 +78,8 @@ QString sessionBusAddress() {
     const QString address = qEnvironmentVariable("DBUS_SESSION_BUS_ADDRESS");
     if (!address.isEmpty()) return address;
     const QString socket = qEnvironmentVariable("XDG_RUNTIME_DIR") + "/bus";
-    return QFileInfo::exists(socket) ? "unix:path=" + socket : QString();
+    const QFileInfo bus(socket);  // of this user: after a change of user the directory may be somebody else's
+    return bus.exists() && bus.ownerId() == ::geteuid() ? "unix:path=" + socket : QString();
 }
 
 bool sendOn(QDBusConnection bus, const QDBusMessage& signal) {

@@ -7,6 +7,10 @@
 #include <syslog.h>
 #include <unistd.h>
 
+#include <algorithm>
+
+#include "platform/Utf8.h"
+
 namespace kelvo {
 namespace {
 
@@ -101,6 +105,9 @@ bool HostSystemLog::wants(Level level) const { return _logger->should_log(levelF
 
 void HostSystemLog::write(Level level, std::string_view text) {
     while (!text.empty() && (text.back() == '\n' || text.back() == '\r')) text.remove_suffix(1);
+    const bool plain = std::all_of(text.begin(), text.end(), [](char c) { return c >= 0x20 && c < 0x7f; });
+    const std::string cleaned = plain ? std::string() : printable(text);
+    if (!plain) text = cleaned;
     _logger->log(levelFor(level), spdlog::string_view_t(text.data(), text.size()));
 }
 

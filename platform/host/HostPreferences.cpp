@@ -6,6 +6,7 @@
 #include <QFile>
 #include <QFileInfo>
 #include <QSaveFile>
+
 #include <algorithm>
 #include <cctype>
 #include <string>

@@ -133,6 +133,7 @@ TEST_F(DisplayTree, ReplacesWhatThePathsHeldBefore) {
     EXPECT_EQ(at("/a"), "a=2");
 }
 
+/// Long names inside one another over many short ones: paths a thousand times as long as the display.
 TEST(DisplayPath, SeparatesComponentsByOneSlash) {
     EXPECT_EQ(pathByAppending("/", "A"), "/A");
     EXPECT_EQ(pathByAppending("/A", "B"), "/A/B");

@@ -109,5 +109,5 @@ if __name__ == "__main__":
         print("skipped:", ", ".join(missing), "not installed")
         sys.exit(77)
     ApplicationTest.programs = sys.argv[1]
-    ApplicationTest.source = source_options(sys.argv[2:])
+    ApplicationTest.source = [*source_options(sys.argv[2:]), "--speed", "5"]  # every refresh finds new readings
     unittest.main(argv=sys.argv[:1])

@@ -59,9 +59,12 @@ Value& Dictionary::append(Key key) {
 bool Dictionary::remove(Key key) {
     const std::size_t index = indexOf(key);
     if (index == kNotFound) return false;
+    if (_index) {
+        _index->erase(_index->find(key.text()));
+        for (auto& [text, position] : *_index) position -= position > index ? 1 : 0;
+    }
     _entries.erase(_entries.begin() + static_cast<std::ptrdiff_t>(index));
     _hashes.erase(_hashes.begin() + static_cast<std::ptrdiff_t>(index));
-    if (_index) buildIndex();  // positions behind the removed entry have moved
     return true;
 }
 

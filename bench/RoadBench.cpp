@@ -5,6 +5,7 @@
 
 #include <fmt/format.h>
 #include <stdlib.h>
+#include <sys/resource.h>
 #include <sys/wait.h>
 #include <unistd.h>
 
@@ -110,6 +111,16 @@ private:
     steady_clock::time_point _last;
 };
 
+// Of this process, for each of `records`.
+double processorMicroseconds(std::uint32_t records) {
+    rusage usage{};
+    ::getrusage(RUSAGE_SELF, &usage);
+    const auto microseconds = [](timeval time) {
+        return static_cast<double>(time.tv_sec) * 1e6 + static_cast<double>(time.tv_usec);
+    };
+    return (microseconds(usage.ru_utime) + microseconds(usage.ru_stime)) / records;
+}
+
 // The client's side: until nothing has come for half a second.
 int receive(const std::filesystem::path& directory, const Run& run, int number) {
     int argc = 0;
@@ -144,8 +155,9 @@ int receive(const std::filesystem::path& directory, const Run& run, int number) 
         if (ports.isQuiet()) QCoreApplication::quit();
     });
     QCoreApplication::exec();
-    fmt::print("{}: {:.0f} records/s, {} of {} lost\n", run.name, ports.received() / ports.seconds(),
-               run.records - ports.received(), run.records);
+    fmt::print("{}: {:.0f} records/s, {} of {} lost; {:.2f} µs of the client's processor a record\n", run.name,
+               ports.received() / ports.seconds(), run.records - ports.received(), run.records,
+               processorMicroseconds(run.records));
     return 0;
 }
 
@@ -161,7 +173,9 @@ int serve(const std::filesystem::path& directory, const Run& run) {
         seen = seen || service.channelCount() > 0;
         if (seen && service.channelCount() == 0) QCoreApplication::quit();
     });
-    return QCoreApplication::exec();
+    const int status = QCoreApplication::exec();
+    fmt::print("{}, service: {:.2f} µs of processor a record\n", run.name, processorMicroseconds(run.records));
+    return status;
 }
 
 template <class Work>

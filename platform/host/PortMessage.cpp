@@ -47,12 +47,12 @@ bool isPeerThere(int fd) {
 }
 
 PortReader::Outcome PortReader::read(int fd) {
-    _buffer.resize(kMaxMessageSize);
-    iovec parts[] = {{&_header, sizeof _header}, {_buffer.data(), _buffer.size()}};
+    _buffer.resize(sizeof(PortHeader) + kMaxMessageSize);
     while (true) {
+        iovec whole{_buffer.data(), _buffer.size()};
         msghdr message{};
-        message.msg_iov = parts;
-        message.msg_iovlen = 2;
+        message.msg_iov = &whole;
+        message.msg_iovlen = 1;
         const ssize_t received = ::recvmsg(fd, &message, MSG_DONTWAIT | MSG_CMSG_CLOEXEC);
         // A peer that left with our messages unread is told once; what it sent before can still be read.
         if (received < 0 && (errno == EINTR || errno == ECONNRESET)) continue;
@@ -64,18 +64,14 @@ PortReader::Outcome PortReader::read(int fd) {
 
 PortReader::Outcome PortReader::check(std::size_t received, bool truncated) {
     if (truncated) return refuse("it is too long");
-    if (received < sizeof _header) return refuse("it is shorter than a header");
-    if (_header.magic != PortHeader::kMagic || _header.reserved != 0) return refuse("it has an unknown format");
-    if (_header.kind != PortHeader::Message && _header.kind != PortHeader::Reply)
-        return refuse("it is of unknown kind");
-    if ((_header.flags & ~PortHeader::WantsReply) != 0) return refuse("it has unknown flags");
-    if (_header.length != received - sizeof _header) return refuse("its length is wrong");
-    _data = ByteView(_buffer).first(_header.length);
+    const auto datagram = parsePortDatagram(ByteView(_buffer).first(received));
+    if (!datagram) return refuse(datagram.error());
+    _datagram = *datagram;
     return Outcome::Message;
 }
 
 PortReader::Outcome PortReader::refuse(const char* problem) {
-    _data = {};
+    _datagram = {};
     _problem = problem;
     return Outcome::Garbage;
 }

@@ -1,27 +1,11 @@
 #pragma once
 
 #include <chrono>
-#include <cstdint>
 
 #include "platform/Bytes.h"
+#include "platform/host/PortDatagram.h"
 
 namespace kelvo {
-
-/// What stands before the data of every datagram between two ports, in the machine's byte order: both ends run on it.
-struct PortHeader {
-    static constexpr std::uint32_t kMagic = 0x314B'4C56;  ///< the format and its version
-    enum Kind : std::uint8_t { Message = 1, Reply = 2 };
-    enum Flags : std::uint8_t { NoFlags = 0, WantsReply = 1 };
-
-    std::uint32_t magic = kMagic;
-    std::uint8_t kind = Message;
-    std::uint8_t flags = NoFlags;
-    std::uint16_t reserved = 0;
-    std::int32_t id = 0;
-    std::uint32_t sequence = 0;  ///< the sender counts its requests; a reply carries the number of its request
-    std::uint32_t length = 0;    ///< bytes of data that follow: the rest of the datagram
-};
-static_assert(sizeof(PortHeader) == 20);
 
 enum class PortSent { Sent, WouldBlock, Gone };
 
@@ -47,17 +31,16 @@ public:
     /// Takes one datagram off the socket; never blocks.
     Outcome read(int fd);
 
-    const PortHeader& header() const { return _header; }
-    ByteView data() const { return _data; }
+    const PortHeader& header() const { return _datagram.header; }
+    ByteView data() const { return _datagram.data; }
     const char* problem() const { return _problem; }
 
 private:
     Outcome check(std::size_t received, bool truncated);
     Outcome refuse(const char* problem);
 
-    PortHeader _header;
     Bytes _buffer;  // made at the first read
-    ByteView _data;
+    PortDatagram _datagram;
     const char* _problem = "";
 };
 

@@ -4,6 +4,7 @@
 #include <cstdint>
 
 #include "LogGenerator/LogGenerator.h"
+#include "model/KelvoModelNode.h"
 #include "platform/DirectoryResources.h"
 #include "platform/Environment.h"
 
@@ -27,6 +28,12 @@ void forEachMessage(ByteView data, Each each) {
     }
 }
 
+/// What the screens ask for at a refresh: the display, its history kept on the way, as a tree.
+inline void rebuildDisplay(LogGenerator& generator, Dictionary& state) {
+    NodesByPath nodesByPath;
+    KelvoModelNode::makeTreeFromObject(generator.generateLogUsingState(state), nodesByPath);
+}
+
 /// Feeds the messages to a new generator on a new state, with a rebuild of the display after every fourth and the saved
 /// contents at the end.
 template <class Generator>
@@ -40,9 +47,9 @@ void decode(ByteView data) {
     forEachMessage(data, [&](ByteView message) {
         const Bytes exact(message.begin(), message.end());  // so that a read past its end is seen
         generator.updateState(state, exact);
-        if (++messages % 4 == 0) generator.generateLogUsingState(state);
+        if (++messages % 4 == 0) rebuildDisplay(generator, state);
     });
-    generator.generateLogUsingState(state);
+    rebuildDisplay(generator, state);
     generator.getSaveContentsFromState(state);
 }
 

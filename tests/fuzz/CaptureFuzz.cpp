@@ -1,0 +1,39 @@
+// Any bytes may come as a capture file; the packets that are read can be written, and read back the same.
+
+#include "platform/host/Capture.h"
+
+#include <vector>
+
+#include "platform/MessagePorts.h"
+#include "tests/fuzz/InMemoryFile.h"
+#include "tests/fuzz/PropertyListRoundTrip.h"
+
+namespace {
+
+using namespace kelvo;
+
+std::vector<Bytes> readAll(const std::string& path) {
+    std::vector<Bytes> packets;
+    auto reader = CaptureReader::open(path);
+    if (!reader) return packets;
+    reader->technology();
+    while (true) {
+        const auto packet = reader->next();
+        if (!packet || !*packet) return packets;
+        fuzz::require((*packet)->bytes.size() <= kMaxMessageSize, "a packet longer than any message");
+        packets.emplace_back((*packet)->bytes.begin(), (*packet)->bytes.end());
+    }
+}
+
+}  // namespace
+
+extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size) {
+    const std::vector<Bytes> packets = readAll(fuzz::InMemoryFile({data, size}).path());
+    if (packets.empty()) return 0;
+    const fuzz::InMemoryFile copy{ByteView()};
+    auto writer = CaptureWriter::create(copy.path(), Technology::LTE);
+    fuzz::require(static_cast<bool>(writer), "no copy can be made");
+    for (const Bytes& packet : packets) fuzz::require(!writer->append({}, packet), "a packet cannot be written");
+    fuzz::require(readAll(copy.path()) == packets, "what was written reads back as something else");
+    return 0;
+}

@@ -1,0 +1,48 @@
+// Any bytes may come as a snapshot file; what is read can be listed, shown and turned into a capture, and none of its
+// texts reaches a terminal with a control character.
+
+#include "platform/Technology.h"
+#include "tests/fuzz/InMemoryFile.h"
+#include "tests/fuzz/PropertyListRoundTrip.h"
+#include "tools/CommandFailure.h"
+#include "tools/DisplayJson.h"
+#include "tools/DisplayText.h"
+#include "tools/SnapshotCapture.h"
+#include "tools/SnapshotFile.h"
+
+namespace {
+
+using namespace kelvo;
+
+void requireOneLine(const std::string& text) {
+    for (const char c : text) fuzz::require(static_cast<unsigned char>(c) >= 0x20 && c != 0x7f, "a control character");
+}
+
+void show(const SnapshotFile::Entry& entry) {
+    requireOneLine(printable(entry.description.value_or("")));
+    requireOneLine(printable(entry.date.value_or("")));
+    if (!entry.display) return;
+    for (const char c : displayText(entry.display))
+        fuzz::require(static_cast<unsigned char>(c) >= 0x20 || c == '\n', "a control character in the display");
+    printedJson(jsonFrom(entry.display));
+}
+
+void makeCapture(SnapshotFile& snapshot, Technology technology) {
+    const fuzz::InMemoryFile capture{ByteView()};
+    try {
+        writeSnapshotCapture(snapshot, technology, capture.path(), snapshot.odd);
+    } catch (const CommandFailure&) {
+        // it holds no records
+    }
+}
+
+}  // namespace
+
+extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size) {
+    auto snapshot = SnapshotFile::read(fuzz::InMemoryFile({data, size}).path());
+    if (!snapshot) return 0;
+    for (const SnapshotFile::Entry& entry : snapshot->entries) show(entry);
+    makeCapture(*snapshot, Technology::LTE);
+    makeCapture(*snapshot, Technology::IFX);
+    return 0;
+}

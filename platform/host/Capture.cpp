@@ -1,5 +1,6 @@
 #include "platform/host/Capture.h"
 
+#include <fcntl.h>
 #include <fmt/format.h>
 #include <pcap/pcap.h>
 #include <unistd.h>
@@ -76,7 +77,8 @@ void CaptureWriter::DumperCloser::operator()(pcap_dumper* dumper) const { pcap_d
 
 Result<CaptureWriter> CaptureWriter::create(const std::filesystem::path& path, Technology technology) {
     std::string name = path.string();
-    std::FILE* file = std::fopen(name.c_str(), "wb");
+    const int fd = ::open(name.c_str(), O_WRONLY | O_CREAT | O_TRUNC | O_CLOEXEC, S_IRUSR | S_IWUSR);
+    std::FILE* file = fd < 0 ? nullptr : ::fdopen(fd, "wb");
     if (file == nullptr) return Failure{fmt::format("{} cannot be created: {}", name, errorText(errno))};
     std::setvbuf(file, nullptr, _IONBF, 0);  // a full disk shows at the packet that no longer fits, not at the end
     detail::PcapHandle handle(pcap_open_dead(namesOf(technology).linkType, static_cast<int>(kMaxMessageSize)));

@@ -59,7 +59,7 @@ private:
 /// Moves, never copies. Any thread, one at a time. A failure's reason names the file.
 class CaptureWriter {
 public:
-    /// Creates the file, or empties the one that is there, and writes its header.
+    /// Creates the file, for this user alone (mode 0600), or empties the one that is there, and writes its header.
     static Result<CaptureWriter> create(const std::filesystem::path& path, Technology technology);
     CaptureWriter(CaptureWriter&&) noexcept = default;
     CaptureWriter& operator=(CaptureWriter&&) noexcept = default;

@@ -2,6 +2,9 @@
 
 #include <fmt/printf.h>
 
+#include <algorithm>
+#include <utility>
+
 #include "LogGenerator/DLFVersionReport.h"
 #include "platform/Environment.h"
 
@@ -61,7 +64,16 @@ ArrayRef OSKLogGenerator::getSaveContentsFromState(Dictionary& state) {
     return contents;
 }
 
+void OSKLogGenerator::keepRaw(ByteView record) {
+    if (record.size() > _rawLogLimit - std::min(_rawLogLimit, _binData.size())) {
+        ++_notKept;
+        return;
+    }
+    _binData.insert(_binData.end(), record.begin(), record.end());
+}
+
 void OSKLogGenerator::moveBinDataInto(Dictionary& state) {
+    if (_notKept > 0) logLine(Level::Error, "The raw log was full: it lacks %d records", std::exchange(_notKept, 0));
     state.set("DisplayState", std::move(_binData));
     _binData = Bytes();
 }

@@ -2,6 +2,7 @@
 
 #include <cstddef>
 #include <cstdint>
+#include <limits>
 #include <optional>
 #include <string_view>
 
@@ -15,6 +16,7 @@ class OSKLogGenerator : public LogGenerator {
 public:
     /// The history's snapshots, followed, when a DLF could be made, by a dictionary with "Description" and "DLF".
     ArrayRef getSaveContentsFromState(Dictionary& state) override;
+    void limitRawLog(std::size_t bytes) override { _rawLogLimit = bytes; }
 
     /// One version report followed by the raw records of the history, oldest first; none after one log line.
     static std::optional<Bytes> generateDlfFromState(const Dictionary& state);
@@ -22,10 +24,16 @@ public:
 protected:
     using LogGenerator::LogGenerator;
 
+    /// Collects a record, unless it no longer fits.
+    void keepRaw(ByteView record);
     /// Moves the collected records into the state's "DisplayState" and begins anew.
     void moveBinDataInto(Dictionary& state);
 
     Bytes _binData;  ///< the raw records since the display was last rebuilt
+
+private:
+    std::size_t _rawLogLimit = std::numeric_limits<std::size_t>::max();
+    std::size_t _notKept = 0;  // records since the display was last rebuilt
 };
 
 }  // namespace kelvo

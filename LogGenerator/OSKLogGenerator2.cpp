@@ -58,7 +58,7 @@ OSKLogGenerator2::~OSKLogGenerator2() {
 void OSKLogGenerator2::updateState(Dictionary& state, ByteView data) {
     prepareDisplay(state);
     updateWithData(data);
-    _binData.insert(_binData.end(), data.begin(), data.end());
+    keepRaw(data);
 }
 
 void OSKLogGenerator2::updateWithData(ByteView data) {

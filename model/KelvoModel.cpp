@@ -12,6 +12,7 @@ namespace {
 constexpr std::int32_t kMessageId = 0;  // of every message on the log channel, in both directions
 constexpr auto kSendLimit = 1s;
 constexpr auto kReplyLimit = 1s;
+constexpr std::size_t kRawLogLimit = std::size_t{4} * 1024 * 1024;  // many times what a modem says in two seconds
 
 Result<Bytes> technologyQuery() { return writeXmlPropertyList(Dictionary::make({{"GetTechnology", "GetTechnology"}})); }
 
@@ -124,6 +125,7 @@ void KelvoModel::chooseGenerator(const Value& answer) {
     if (_logGenerator) _replacedGenerators.push_back(std::move(_logGenerator));
     const std::string* identifier = technology->string();
     _logGenerator = identifier != nullptr ? LogGenerator::generatorFromTechnology(*identifier) : nullptr;
+    if (_logGenerator) _logGenerator->limitRawLog(kRawLogLimit);
     logLine(Level::Error, "Got log generated: %p", addressOf(_logGenerator));
 }
 

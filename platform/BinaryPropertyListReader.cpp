@@ -2,6 +2,7 @@
 
 #include <fmt/format.h>
 
+#include <algorithm>
 #include <bit>
 #include <cmath>
 #include <limits>
@@ -19,9 +20,12 @@ namespace {
 constexpr std::size_t kHeaderSize = 8;
 constexpr std::size_t kTrailerSize = 32;
 
-// What references to shared objects may add to a document's own objects and bytes.
-constexpr std::size_t kSpareObjects = 1'000'000;
-constexpr std::size_t kSpareBytes = std::size_t{64} << 20;
+// What references to shared objects may add to a document's own size: enough for one that shares every key and text,
+// and far from what a small message would need to exhaust the memory.
+constexpr std::size_t kSpareObjects = 65'536;
+constexpr std::size_t kSpareBytes = std::size_t{1} << 20;
+constexpr std::size_t kSpareFactor = 64;  // bytes for each of a document's own
+constexpr std::size_t kMostSpareBytes = std::size_t{64} << 20;
 
 class BinaryReader {
 public:
@@ -63,8 +67,8 @@ private:
         _root = root;
         _count = count;
         _open.resize(count);
-        _objectsLeft = count + kSpareObjects;
-        _bytesLeft = _data.size() + kSpareBytes;
+        _objectsLeft = _data.size() + kSpareObjects;
+        _bytesLeft = _data.size() + std::min(kMostSpareBytes, kSpareBytes + kSpareFactor * _data.size());
         return true;
     }
 

@@ -107,7 +107,7 @@ void C2KLogGenerator::updateFromLog(ByteView data, const DictionaryRef& usingLoo
     const auto decoder = std::ranges::find(kDecoders, code, &Decoder::code);
     if (decoder == kDecoders.end()) return;
     decoder->decode(packet, usingState, usingLookup);
-    _binData.insert(_binData.end(), packet.begin(), packet.end());
+    keepRaw(packet);
 }
 
 Value C2KLogGenerator::generateLogUsingState(Dictionary& state) {

@@ -150,6 +150,22 @@ TEST_F(TemplateGenerator, StartsTheRawLogAnewAtEveryRebuild) {
     EXPECT_EQ(state["History"].array()->size(), 2U);
 }
 
+TEST_F(TemplateGenerator, DecodesWhatItsRawLogHasNoRoomForAndCountsIt) {
+    generator.limitRawLog(100);
+    for (int i = 0; i < 4; ++i) generator.updateState(state, Record(0xB0C2, 38).bytes());
+    generator.updateState(state, Record(0xB0C2, 24).bytes());  // this one fits
+    generator.updateState(state, Record(0xB0C2, 39).bytes());
+    EXPECT_EQ(cellShows("45250"), "39");
+    generator.generateLogUsingState(state);
+    EXPECT_EQ(state["DisplayState"].data()->size(), 100U);
+    EXPECT_TRUE(logged(3, "The raw log was full: it lacks 3 records"));
+    log.clear();
+    generator.updateState(state, Record(0xB0C2, 38).bytes());
+    generator.generateLogUsingState(state);
+    EXPECT_EQ(state["DisplayState"].data()->size(), 38U);
+    EXPECT_FALSE(logged(3, "The raw log was full: it lacks 3 records"));
+}
+
 TEST_F(TemplateGenerator, LeavesTheTemplateItselfUntouched) {
     generator.updateState(state, Record(0xB0C2, 38).bytes());
     const Value& placeholder =

@@ -229,6 +229,27 @@ TEST_F(KelvoModelTest, RefreshesOnWhateverTheServerConnectionAnnounces) {
     EXPECT_EQ(updates, 2);
 }
 
+TEST_F(KelvoModelTest, KeepsItsMemoryWithinBoundsUnderAFlood) {
+    startLte();
+    const Bytes longest = test::Record(0xB0C2, kMaxMessageSize).u16(14, 7).bytes();
+    for (int refresh = 0; refresh < 7; ++refresh) {
+        for (int i = 0; i < 100; ++i) deliver(longest);  // 13 megabytes
+        queue.advance(2s);
+        model->topLevelNodes();
+    }
+    deliver(servingCell(302));
+    queue.advance(2s);
+    EXPECT_EQ(shown(), "302");
+    std::size_t kept = 0;
+    const ArrayRef contents = model->getSaveContents();
+    for (const Value& entry : *contents) {
+        const Value& raw = (*entry.dictionary())["DisplayState"];
+        if (raw.data() != nullptr) kept += raw.data()->size();
+    }
+    EXPECT_LE(kept, 5U * 4 * 1024 * 1024);
+    EXPECT_GT(kept, 4U * 3 * 1024 * 1024);
+}
+
 TEST_F(KelvoModelTest, EndsQuietlyAndLeavesNothingBehind) {
     startLte();
     deliver(servingCell(301));

@@ -1,14 +1,13 @@
 #include "model/Snapshot.h"
 
 #include <gtest/gtest.h>
-#include <signal.h>
-#include <sys/resource.h>
 #include <sys/stat.h>
 #include <unistd.h>
 
 #include <cerrno>
 #include <cstring>
 
+#include "tests/support/FileSizeLimit.h"
 #include "tests/support/TemporaryDirectory.h"
 
 namespace kelvo {
@@ -23,24 +22,6 @@ struct WriteFileInPlace : testing::Test {
 
     test::TemporaryDirectory directory;
     const std::string path = directory.file("a.kelvo");
-};
-
-/// Files of this process can only grow to a few bytes for as long as it lives: as on a disk with little room.
-class SmallFiles {
-public:
-    explicit SmallFiles(rlim_t bytes) : _handler(::signal(SIGXFSZ, SIG_IGN)) {
-        ::getrlimit(RLIMIT_FSIZE, &_before);
-        const rlimit small{bytes, _before.rlim_max};
-        ::setrlimit(RLIMIT_FSIZE, &small);
-    }
-    ~SmallFiles() {
-        ::setrlimit(RLIMIT_FSIZE, &_before);
-        ::signal(SIGXFSZ, _handler);
-    }
-
-private:
-    rlimit _before{};
-    void (*_handler)(int);
 };
 
 TEST_F(WriteFileInPlace, MakesAFileThatNobodyElseCanRead) {
@@ -58,7 +39,7 @@ TEST_F(WriteFileInPlace, MakesAFileThatNobodyElseCanRead) {
 
 TEST_F(WriteFileInPlace, LeavesNoHalfFileOnAFullDisk) {
     {
-        const SmallFiles small(10);
+        const test::FileSizeLimit full(10);
         EXPECT_EQ(failure(path, "more than ten bytes"), "File too large");
     }
     EXPECT_FALSE(exists(path));
@@ -67,7 +48,7 @@ TEST_F(WriteFileInPlace, LeavesNoHalfFileOnAFullDisk) {
 TEST_F(WriteFileInPlace, LeavesNoHalfFileInPlaceOfAnEarlierOne) {
     ASSERT_EQ(failure(path, "earlier"), "");
     {
-        const SmallFiles small(10);
+        const test::FileSizeLimit full(10);
         EXPECT_EQ(failure(path, "more than ten bytes"), "File too large");
     }
     EXPECT_FALSE(exists(path));

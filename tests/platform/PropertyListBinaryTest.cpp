@@ -158,6 +158,11 @@ TEST(BinaryPropertyListReader, ReplacesWhatIsNoText) {
     EXPECT_EQ(value({"\x61\xD8\x3D"s}), Value("\xEF\xBF\xBD"));        // high surrogate at the end
 }
 
+TEST(BinaryPropertyListReader, ReadsKeysThatAreNotAscii) {
+    const Value read = value({"\xD2\x01\x02\x03\x03"s, "\x61\x00\xE9"s, "\x52\xC3\xA8"s, "\x09"s});
+    EXPECT_EQ(read, Value(Dictionary::make({{"é", true}, {"è", true}})));
+}
+
 TEST(BinaryPropertyListReader, LastOfTwoEqualKeysWins) {
     EXPECT_EQ(value({"\xD2\x01\x02\x03\x04"s,
                      "\x51"
@@ -306,6 +311,37 @@ TEST(BinaryPropertyListReader, StopsTextAndDataThatMultiplyByReferences) {
         document.referenceSize = 2;
         EXPECT_EQ(reasonFor(document.bytes()), "shared objects that multiply beyond measure at offset 20012");
     }
+}
+
+// A hundred bytes that stand for as many thousand values, and twelve kilobytes that stand for megabytes of text.
+TEST(BinaryPropertyListReader, LetsASmallDocumentGrowToAFewMegabytesOnly) {
+    std::vector<std::string> doubling;
+    for (char i = 1; i <= 16; ++i) doubling.push_back("\xA2"s + i + i);
+    doubling.push_back("\xA0");
+    EXPECT_EQ(reasonFor(Document{doubling}.bytes()).substr(0, 42), "shared objects that multiply beyond measur");
+
+    std::string many = "\xAF\x11\x30\x00"s + std::string(12'288, '\x01');
+    Document text{{many, "\x5F\x11\x04\x00"s + std::string(1024, 'x')}};
+    text.offsetSize = 2;
+    EXPECT_EQ(reasonFor(text.bytes()).substr(0, 42), "shared objects that multiply beyond measur");
+}
+
+TEST(BinaryPropertyListReader, LeavesRoomForTheSharingOfEveryKey) {
+    std::string rows = "\xAF\x11\x07\xD0"s;  // 2,000 rows that all name their one column by the same object
+    std::vector<std::string> objects = {"",
+                                        "\x5F\x10\x20"
+                                        "a column with a long name indeed",
+                                        "\x09"};
+    for (std::uint64_t i = 0; i < 2000; ++i) {
+        appendBigEndian(rows, objects.size(), 2);
+        objects.push_back("\xD1\x00\x01\x00\x02"s);
+    }
+    objects[0] = rows;
+    Document document{objects};
+    document.offsetSize = document.referenceSize = 2;
+    const Result<Value> result = read(document.bytes());
+    ASSERT_TRUE(result) << result.error().reason;
+    EXPECT_EQ((*(*result->array())[1999].dictionary())["a column with a long name indeed"], Value(true));
 }
 
 TEST(BinaryPropertyListReader, ReadsALargeDocumentWithoutSharing) {

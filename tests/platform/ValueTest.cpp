@@ -2,7 +2,9 @@
 
 #include <gtest/gtest.h>
 
+#include <algorithm>
 #include <limits>
+#include <string>
 #include <unordered_map>
 #include <vector>
 
@@ -25,6 +27,59 @@ TEST(Dictionary, FindsEveryKeyOfALargeOneAlsoAfterRemovals) {
     for (int i = 0; i < 1000; i += 2) EXPECT_TRUE(large.remove(std::to_string(i)));
     for (int i = 0; i < 1000; ++i) EXPECT_EQ(large.find(std::to_string(i)) != nullptr, i % 2 == 1) << i;
     EXPECT_EQ(large["999"].number()->integer(), 999);
+}
+
+/// Texts of six characters that leave an FNV-1a hash as it is at its start, so that every row of them has one hash:
+/// found by going three characters forward and three back.
+std::vector<std::string> textsThatLeaveTheHashAlone() {
+    constexpr std::uint32_t kStart = 2166136261;
+    constexpr std::uint32_t kPrime = 16777619;
+    constexpr std::uint32_t kInverse = 899433627;
+    std::unordered_multimap<std::uint32_t, std::string> halves;
+    std::vector<std::string> texts;
+    for (std::uint32_t i = 0; i < 1 << 19; ++i) {
+        const std::string half{static_cast<char>(i), static_cast<char>(i >> 8), static_cast<char>(i >> 16)};
+        std::uint32_t hash = kStart;
+        for (const char c : half) hash = (hash ^ static_cast<std::uint8_t>(c)) * kPrime;
+        halves.emplace(hash, half);
+    }
+    for (std::uint32_t i = 0; i < 1 << 19; ++i) {
+        const std::string half{static_cast<char>(i), static_cast<char>(i >> 8), static_cast<char>(i >> 16)};
+        std::uint32_t hash = kStart;
+        for (auto c = half.rbegin(); c != half.rend(); ++c) hash = (hash * kInverse) ^ static_cast<std::uint8_t>(*c);
+        const auto [first, last] = halves.equal_range(hash);
+        for (auto hit = first; hit != last; ++hit) texts.push_back(hit->second + half);
+    }
+    return texts;
+}
+
+// Compared one by one, these keys would take minutes.
+TEST(Dictionary, IsNotSlowedDownByKeysMadeToShareOneHash) {
+    const std::vector<std::string> parts = textsThatLeaveTheHashAlone();
+    std::vector<std::string> keys;
+    for (const std::string& a : parts)
+        for (const std::string& b : parts)
+            for (const std::string& c : parts) keys.push_back(a + b + c);
+    ASSERT_GT(keys.size(), 50'000U);
+    keys.resize(50'000);
+    ASSERT_EQ(Key(keys.front()).hash(), Key(keys.back()).hash());
+    Dictionary dictionary;
+    for (const std::string& key : keys) dictionary.set(key, 1);
+    ASSERT_EQ(dictionary.size(), keys.size());
+    EXPECT_TRUE(std::all_of(keys.begin(), keys.end(), [&](const std::string& key) { return dictionary.find(key); }));
+}
+
+TEST(Dictionary, FindsItsKeysWhateverSizeItGrowsAndShrinksTo) {
+    Dictionary dictionary;
+    for (int i = 0; i < 1100; ++i) dictionary.set(std::to_string(i), i);
+    const DictionaryRef copy = dictionary.copy();
+    for (int i = 0; i < 1080; ++i) EXPECT_TRUE(dictionary.remove(std::to_string(i)));
+    for (int i = 0; i < 1100; ++i) EXPECT_EQ(dictionary.find(std::to_string(i)) != nullptr, i >= 1080) << i;
+    for (int i = 0; i < 1080; ++i) dictionary.set(std::to_string(i), -i);
+    for (int i = 0; i < 1100; ++i) {
+        EXPECT_EQ(dictionary[std::to_string(i)].number()->integer(), i >= 1080 ? i : -i);
+        EXPECT_EQ((*copy)[std::to_string(i)].number()->integer(), i);
+    }
 }
 
 TEST(Value, SharesArraysAndDictionariesUntilTheyAreCopied) {

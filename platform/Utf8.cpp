@@ -7,6 +7,9 @@ namespace kelvo {
 namespace {
 
 bool isAsciiByte(char c) { return static_cast<unsigned char>(c) < 0x80; }
+bool isControl(char32_t code) {
+    return code < 0x20 || (code >= 0x7f && code < 0xa0) || code == 0x2028 || code == 0x2029;
+}
 bool isHighSurrogate(char32_t unit) { return unit >= 0xD800 && unit < 0xDC00; }
 bool isLowSurrogate(char32_t unit) { return unit >= 0xDC00 && unit < 0xE000; }
 
@@ -63,6 +66,17 @@ void appendCleanUtf8(std::string& out, std::string_view text) {
         appendUtf8(out, character.code);
         text.remove_prefix(character.length);
     }
+}
+
+std::string printable(std::string_view text) {
+    std::string clean;
+    clean.reserve(text.size());
+    while (!text.empty()) {
+        const Utf8Character character = firstUtf8Character(text);
+        appendUtf8(clean, isControl(character.code) ? kReplacementCharacter : character.code);
+        text.remove_prefix(character.length);
+    }
+    return clean;
 }
 
 std::string utf8FromUtf16(ByteView text, std::endian order) {

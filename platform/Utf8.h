@@ -34,4 +34,8 @@ void appendCleanUtf8(std::string& out, std::string_view text);
 /// UTF-16 in the given byte order as UTF-8. Lone surrogates, and half a unit at the end, become U+FFFD.
 std::string utf8FromUtf16(ByteView text, std::endian order);
 
+/// `text` made safe to print on one line of a terminal or a log: control characters, which a record could hold to take
+/// the terminal over or to make up lines, and bytes that are not UTF-8 become U+FFFD.
+std::string printable(std::string_view text);
+
 }  // namespace kelvo

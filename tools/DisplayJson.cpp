@@ -1,5 +1,7 @@
 #include "tools/DisplayJson.h"
 
+#include <fmt/format.h>
+
 #include "platform/Base64.h"
 #include "platform/IsoDate.h"
 
@@ -50,8 +52,23 @@ nlohmann::ordered_json jsonFrom(const Value& value) {
     return nullptr;
 }
 
+// JSON leaves DEL and the control characters from U+0080 to U+009F as they are, and terminals obey them.
 std::string printedJson(const nlohmann::ordered_json& json) {
-    return json.dump(2, ' ', false, nlohmann::ordered_json::error_handler_t::replace) + "\n";
+    const std::string dumped = json.dump(2, ' ', false, nlohmann::ordered_json::error_handler_t::replace);
+    std::string text;
+    text.reserve(dumped.size() + 1);
+    for (std::size_t i = 0; i < dumped.size(); ++i) {
+        const unsigned char next = i + 1 < dumped.size() ? static_cast<unsigned char>(dumped[i + 1]) : 0;
+        if (dumped[i] == '\x7f') {
+            text += "\\u007f";
+        } else if (dumped[i] == '\xc2' && next >= 0x80 && next < 0xa0) {
+            text += fmt::format("\\u{:04x}", next);
+            ++i;
+        } else {
+            text += dumped[i];
+        }
+    }
+    return text + "\n";
 }
 
 }  // namespace kelvo

@@ -2,17 +2,11 @@
 
 #include <algorithm>
 
-#include "platform/Utf8.h"
-
 namespace kelvo {
 
 namespace {
 
 constexpr std::size_t kWidestColumn = 40;  // one long name does not push its siblings' values away
-
-bool isControl(char32_t code) {
-    return code < 0x20 || (code >= 0x7f && code < 0xa0) || code == 0x2028 || code == 0x2029;
-}
 
 std::size_t width(std::string_view cleanText) {
     return static_cast<std::size_t>(
@@ -47,17 +41,6 @@ void appendChildren(std::vector<std::string>& lines, const KelvoModelNode::Child
 }
 
 }  // namespace
-
-std::string printable(std::string_view text) {
-    std::string clean;
-    clean.reserve(text.size());
-    while (!text.empty()) {
-        const Utf8Character character = firstUtf8Character(text);
-        appendUtf8(clean, isControl(character.code) ? kReplacementCharacter : character.code);
-        text.remove_prefix(character.length);
-    }
-    return clean;
-}
 
 std::vector<std::string> displayLines(const KelvoModelNode& root) {
     if (root.value() != nullptr) return {leafLine(printable(root.displayName()), *root.value(), 0)};

@@ -6,12 +6,9 @@
 #include <vector>
 
 #include "model/KelvoModelNode.h"
+#include "platform/Utf8.h"
 
 namespace kelvo {
-
-/// `text` made safe to print on one line of a terminal: control characters, which a record could hold to take the
-/// terminal over, and bytes that are not UTF-8 become U+FFFD.
-std::string printable(std::string_view text);
 
 /// The display tree as lines without their line ends: a node's children in their order, two blanks deeper than the
 /// node; among siblings the values start in one column. The root shows as itself only when it is a leaf.

@@ -5,6 +5,10 @@
 #include <syslog.h>
 #include <unistd.h>
 
+#include <algorithm>
+
+#include "platform/Utf8.h"
+
 namespace kelvo {
 namespace {
 
@@ -71,6 +75,9 @@ void HostSystemLog::write(Level level, std::string_view text) {
 
 void HostSystemLog::writeOut() {
     const auto writeLine = [this](Level level, std::string_view text) {
+        const bool plain = std::all_of(text.begin(), text.end(), [](char c) { return c >= 0x20 && c < 0x7f; });
+        const std::string cleaned = plain ? std::string() : printable(text);
+        if (!plain) text = cleaned;
         _destination->log(
             spdlog::details::log_msg("", levelFor(level), spdlog::string_view_t(text.data(), text.size())));
     };

@@ -15,7 +15,8 @@ namespace kelvo {
 /// The system log on a thread of its own: taking a line never waits for whoever writes it out. Lines wait in a queue,
 /// a few milliseconds even when nothing is in their way; in an overflow the oldest go, and one line tells how many once
 /// the queue is empty again. Destruction writes everything that still waits. Lines go to syslog where the system has
-/// one, and to standard error elsewhere or when a terminal is there to read it.
+/// one, and to standard error elsewhere or when a terminal is there to read it. A line is one line: control characters
+/// in its text become U+FFFD.
 class HostSystemLog final : public SystemLog {
 public:
     static constexpr std::size_t kQueueLength = 8192;  // lines

@@ -1,5 +1,7 @@
 #include "platform/host/SessionBus.h"
 
+#include <unistd.h>
+
 #include <QFileInfo>
 
 namespace kelvo {
@@ -8,7 +10,8 @@ QString sessionBusAddress() {
     const QString address = qEnvironmentVariable("DBUS_SESSION_BUS_ADDRESS");
     if (!address.isEmpty()) return address;
     const QString socket = qEnvironmentVariable("XDG_RUNTIME_DIR") + "/bus";
-    return QFileInfo::exists(socket) ? "unix:path=" + socket : QString();
+    const QFileInfo bus(socket);  // of this user: after a change of user the directory may be somebody else's
+    return bus.exists() && bus.ownerId() == ::geteuid() ? "unix:path=" + socket : QString();
 }
 
 }  // namespace kelvo

@@ -66,6 +66,11 @@ TEST(DisplayJson, ADateNoCalendarHoldsIsNull) {
               R"({"$date":null})");
 }
 
+TEST(DisplayJson, EscapesWhatATerminalWouldObey) {
+    const std::string text = printedJson(jsonFrom(Value("a\x1b[2J\n\x7f\xc2\x9b z\u00a0é")));
+    EXPECT_EQ(text, "\"a\\u001b[2J\\n\\u007f\\u009b z\u00a0é\"\n");
+}
+
 TEST(DisplayJson, ReplacesBytesThatAreNotUtf8) { EXPECT_EQ(printedJson(jsonFrom(Value("a\xff"))), "\"a\uFFFD\"\n"); }
 
 }  // namespace

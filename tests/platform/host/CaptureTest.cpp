@@ -1,7 +1,9 @@
 #include "platform/host/Capture.h"
 
 #include <gtest/gtest.h>
+#include <sys/stat.h>
 
+#include <filesystem>
 
 #include "platform/MessagePorts.h"
 #include "tests/support/FileSizeLimit.h"
@@ -191,6 +193,14 @@ TEST_F(Capture, SaysWhyAFileCannotBeCreated) {
     const auto writer = CaptureWriter::create(inNoDirectory, Technology::LTE);
     ASSERT_FALSE(writer);
     EXPECT_EQ(writer.error().reason, inNoDirectory + " cannot be created: No such file or directory");
+}
+
+TEST_F(Capture, MakesAFileThatNobodyElseCanRead) {
+    const mode_t mask = ::umask(0);
+    const bool made = static_cast<bool>(CaptureWriter::create(path(), Technology::LTE));
+    ::umask(mask);
+    ASSERT_TRUE(made);
+    EXPECT_EQ(std::filesystem::status(path()).permissions(), std::filesystem::perms(0600));
 }
 
 TEST_F(Capture, SaysThatTheDiskIsFull) {

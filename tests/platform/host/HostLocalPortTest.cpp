@@ -1,7 +1,10 @@
+#include <fcntl.h>
 #include <gtest/gtest.h>
 #include <sys/resource.h>
+#include <sys/socket.h>
 
 #include <QAbstractEventDispatcher>
+#include <cstring>
 #include <ctime>
 #include <vector>
 
@@ -135,6 +138,33 @@ TEST_F(HostLocalPortTest, OutlivesRandomBytes) {
     ASSERT_TRUE(rawSend(sender, datagram(1, 0, 0, 1, "good")));
     ASSERT_TRUE(runUntil([&] { return !_heard.empty() && _log.lines().size() == 500; }));
     EXPECT_EQ(_heard, std::vector<std::string>{"good"});
+}
+
+TEST_F(HostLocalPortTest, TakesNoDescriptorsAlongWithAMessage) {
+    openRecorder();
+    const UniqueFd sender = connect();
+    int ends[2];
+    ASSERT_EQ(::pipe2(ends, O_CLOEXEC | O_NONBLOCK), 0);
+    const UniqueFd readEnd(ends[0]);
+    UniqueFd writeEnd(ends[1]);
+    Bytes bytes = datagram(1, 0, 0, 1, "gift");
+    iovec part{bytes.data(), bytes.size()};
+    alignas(cmsghdr) char control[CMSG_SPACE(sizeof(int))] = {};
+    msghdr message{};
+    message.msg_iov = &part;
+    message.msg_iovlen = 1;
+    message.msg_control = control;
+    message.msg_controllen = sizeof control;
+    cmsghdr* gift = CMSG_FIRSTHDR(&message);
+    gift->cmsg_level = SOL_SOCKET;
+    gift->cmsg_type = SCM_RIGHTS;
+    gift->cmsg_len = CMSG_LEN(sizeof(int));
+    std::memcpy(CMSG_DATA(gift), &ends[1], sizeof(int));
+    ASSERT_GT(::sendmsg(sender.get(), &message, 0), 0);
+    ASSERT_TRUE(runUntil([&] { return _heard.size() == 1; }));
+    writeEnd.reset();  // the only one, if none was taken
+    char byte = 0;
+    EXPECT_EQ(::read(readEnd.get(), &byte, 1), 0);
 }
 
 TEST_F(HostLocalPortTest, TakesABoundedNumberOfMessagesPerTurn) {

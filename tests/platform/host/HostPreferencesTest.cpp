@@ -1,15 +1,19 @@
 #include "platform/host/HostPreferences.h"
 
 #include <gtest/gtest.h>
+#include <sys/socket.h>
 #include <sys/stat.h>
+#include <sys/un.h>
 #include <unistd.h>
 
 #include <QProcess>
+#include <cstring>
 #include <fstream>
 #include <sstream>
 
 #include "platform/Environment.h"
 #include "platform/PropertyList.h"
+#include "platform/host/UniqueFd.h"
 #include "tests/support/EventLoop.h"
 #include "tests/support/PrivateBus.h"
 #include "tests/support/RecordingLog.h"
@@ -121,6 +125,22 @@ TEST_F(HostPreferencesTest, WithABusThatDoesNotAnswerWritesOneLine) {
     _preferences.broadcastChange("com.zorvik.dockmere", "DMShowGSMRSSI");
     ::unsetenv("DBUS_SESSION_BUS_ADDRESS");
     EXPECT_EQ(_log.lines().size(), 1U);
+}
+
+TEST_F(HostPreferencesTest, TellsNothingToABusOfAnotherUser) {
+    if (::geteuid() != 0) GTEST_SKIP() << "only root can give a file away";
+    ::unsetenv("DBUS_SESSION_BUS_ADDRESS");
+    ::setenv("XDG_RUNTIME_DIR", _temporary.path().c_str(), 1);
+    const UniqueFd listener(::socket(AF_UNIX, SOCK_STREAM | SOCK_CLOEXEC | SOCK_NONBLOCK, 0));
+    sockaddr_un address{};
+    address.sun_family = AF_UNIX;
+    std::strncpy(address.sun_path, (_temporary.path() / "bus").c_str(), sizeof address.sun_path - 1);
+    ASSERT_EQ(::bind(listener.get(), reinterpret_cast<const sockaddr*>(&address), sizeof address), 0);
+    ASSERT_EQ(::listen(listener.get(), 4), 0);
+    ASSERT_EQ(::chown((_temporary.path() / "bus").c_str(), 12345, 12345), 0);
+    _preferences.broadcastChange("com.zorvik.dockmere", "DMShowGSMRSSI");
+    EXPECT_EQ(_log.lines().size(), 1U);
+    EXPECT_LT(::accept(listener.get(), nullptr, nullptr), 0);  // nobody came
 }
 
 TEST_F(HostPreferencesTest, TellsTheChangeOnTheSessionBus) {

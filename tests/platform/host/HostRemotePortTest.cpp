@@ -106,6 +106,17 @@ TEST_F(HostRemotePortTest, SkipsGarbageAmongRepliesWithOneLineEach) {
                                    {3, "Port peer dropped a reply: it is too long"}}));
 }
 
+TEST_F(HostRemotePortTest, DropsWhatComesUnaskedAndTellsOfGarbage) {
+    rawSend(_peer, datagram(2, 0, 0, 1, "late"));
+    rawSend(_peer, Bytes{1, 2, 3});
+    rawSend(_peer, datagram(2, 0, 0, 1, "later"));
+    ASSERT_TRUE(runUntil([&] { return !_log.lines().empty(); }));
+    settle();
+    EXPECT_EQ(_log.lines(), (Lines{{3, "Port peer dropped a reply: it is shorter than a header"}}));
+    EXPECT_TRUE(_remote->isValid());
+    ASSERT_FALSE(ask("?", 1ms));  // nothing of it is an answer to this
+}
+
 TEST_F(HostRemotePortTest, EndsTheWaitInTimeUnderAFloodOfStaleReplies) {
     std::atomic<bool> stop = false;
     std::thread peer([&] {

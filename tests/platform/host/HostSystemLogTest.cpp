@@ -64,14 +64,32 @@ TEST(HostSystemLog, WritesEverythingInOrderBeforeItIsGone) {
     EXPECT_EQ(lines, (Lines{"error: three", "warning: four", "info: five", "error: sixteen"}));
 }
 
-TEST(HostSystemLog, DropsTrailingNewlinesOnly) {
+TEST(HostSystemLog, DropsTrailingNewlines) {
     Lines lines;
     {
         HostSystemLog log(std::make_shared<KeepingSink>(lines));
-        log.write(Level::Error, " a \n b {} %s \n\n");
+        log.write(Level::Error, " a  b {} %s \n\n");
         log.write(Level::Error, "\n");
     }
-    EXPECT_EQ(lines, (Lines{"error:  a \n b {} %s ", "error: "}));
+    EXPECT_EQ(lines, (Lines{"error:  a  b {} %s ", "error: "}));
+}
+
+TEST(HostSystemLog, WritesOneLineWhateverATextHolds) {
+    Lines lines;
+    {
+        HostSystemLog log(std::make_shared<KeepingSink>(lines));
+        log.write(Level::Error, "Cell\n00:00:00 kelvo: all is well\r\x1b[2J\xc2\x9b\x7f – \xff");
+    }
+    EXPECT_EQ(lines, (Lines{"error: Cell\uFFFD00:00:00 kelvo: all is well\uFFFD\uFFFD[2J\uFFFD\uFFFD – \uFFFD"}));
+}
+
+TEST(HostSystemLog, PutsTheTimeAndTheProgramBeforeLinesOnStandardError) {
+    testing::internal::CaptureStderr();
+    HostSystemLog("kelvo", HostSystemLog::To::StandardError).write(Level::Warning, "Deallocing");
+    const std::string line = testing::internal::GetCapturedStderr();
+    ASSERT_GT(line.size(), 12U);
+    EXPECT_EQ(line.substr(2, 1) + line.substr(5, 1) + line.substr(8, 1), "::.");  // 09:15:02.345
+    EXPECT_EQ(line.substr(12), " kelvo: Deallocing\n");
 }
 
 TEST(HostSystemLog, WantsWhatItWrites) {

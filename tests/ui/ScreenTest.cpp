@@ -1,6 +1,7 @@
 #include <gtest/gtest.h>
 
 #include <QAccessible>
+#include <QFontMetricsF>
 #include <QQuickItem>
 
 #include "tests/ui/ScreenFixture.h"
@@ -31,6 +32,24 @@ TEST_F(Screen, StopsTheIndicatorOnceItIsConnected) {
     start();
     EXPECT_TRUE(scene->shows(text("Updated 2011-03-04 at 09:15:04")));
     EXPECT_EQ(scene->itemOfType("kelvo::ActivityIndicator"), nullptr);
+}
+
+TEST_F(Screen, ShowsMarkupFromTheModemAsItStands) {
+    start();
+    const char* name = "<h1>Cell</h1>";
+    const char* value = "<b>7</b>";
+    const char* title = "<img src='http://x/'>";
+    scene->show(Dictionary::make({{title, Dictionary::make({{name, value}, {"b", "2"}})}, {"z", "1"}}));
+    scene->settle();
+    scene->tapText(text(title));
+    expectTop(title);
+    for (const char* shown : {title, name, value}) {
+        const QQuickItem* item = scene->itemWithText(text(shown));
+        ASSERT_NE(item, nullptr);
+        const QFontMetricsF metrics(item->property("font").value<QFont>());
+        EXPECT_GT(item->implicitWidth(), metrics.horizontalAdvance(text(shown)) - 2) << shown;  // every sign of it
+        EXPECT_LT(item->implicitHeight(), 2 * metrics.height()) << shown;
+    }
 }
 
 TEST_F(Screen, OpensAPaneWithATapAndLeavesItByItsWayBack) {

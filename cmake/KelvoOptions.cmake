@@ -6,6 +6,11 @@ option(KELVO_FUZZ "Build the libFuzzer targets (clang only)" OFF)
 option(KELVO_WERROR "Treat warnings as errors" OFF)
 set(KELVO_SANITIZE "" CACHE STRING "Sanitizers for every target, as -fsanitize= takes them")
 
+# ccache keeps nothing that was compiled with a precompiled header unless it is told that it may.
+if("${CMAKE_CXX_COMPILER_LAUNCHER}" MATCHES "ccache" AND NOT "$ENV{CCACHE_SLOPPINESS}" MATCHES "pch_defines")
+    set(CMAKE_DISABLE_PRECOMPILE_HEADERS ON)
+endif()
+
 set(CMAKE_CXX_STANDARD 20)
 set(CMAKE_CXX_STANDARD_REQUIRED ON)
 set(CMAKE_CXX_EXTENSIONS OFF)

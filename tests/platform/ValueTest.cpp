@@ -129,7 +129,8 @@ std::vector<std::string> keysOfOneHash(int doublings) {
 }
 
 TEST(Dictionary, FindsItsKeysFastAlsoWhenTheyAllHaveOneHash) {
-    const std::vector<std::string> keys = keysOfOneHash(12);  // compared in pairs, they would be compared eight million times
+    const std::vector<std::string> keys =
+        keysOfOneHash(12);  // compared in pairs, they would be compared eight million times
     Dictionary large;
     for (const std::string& key : keys) large.set(key, key);
     ASSERT_EQ(large.size(), keys.size());

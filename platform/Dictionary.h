@@ -39,8 +39,8 @@ public:
     const Value& operator[](Key key) const;
     /// The value under `key` for writing; a key that is not there yet is appended with a none value.
     Value& slot(Key key);
-    /// As `slot`, for keys that mostly follow one another: looks at position `next` first, and leaves there the position
-    /// behind the key's.
+    /// As `slot`, for keys that mostly follow one another: looks at position `next` first, and leaves there the
+    /// position behind the key's.
     Value& slot(Key key, std::size_t& next) {
         if (next >= _hashes.size() || !isAt(next, key)) return slotElsewhere(key, next);
         return _entries[next++].value;

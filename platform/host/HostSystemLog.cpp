@@ -75,7 +75,7 @@ void HostSystemLog::write(Level level, std::string_view text) {
 
 void HostSystemLog::writeOut() {
     const auto writeLine = [this](Level level, std::string_view text) {
-        const bool plain = std::ranges::all_of(text, [](char c) { return c >= 0x20 && c < 0x7f; });
+        const bool plain = std::all_of(text.begin(), text.end(), [](char c) { return c >= 0x20 && c < 0x7f; });
         const std::string cleaned = plain ? std::string() : printable(text);
         if (!plain) text = cleaned;
         _destination->log(

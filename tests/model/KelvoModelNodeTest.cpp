@@ -1,4 +1,5 @@
 #include <gtest/gtest.h>
+#include <sys/resource.h>
 
 #include <thread>
 
@@ -133,7 +134,26 @@ TEST_F(DisplayTree, ReplacesWhatThePathsHeldBefore) {
     EXPECT_EQ(at("/a"), "a=2");
 }
 
-/// Long names inside one another over many short ones: paths a thousand times as long as the display.
+/// Kept for every node, the paths of this display would take 180 megabytes.
+TEST_F(DisplayTree, FindsNodesBelowLongNamesWithoutKeepingTheirPaths) {
+    const DictionaryRef leaves = Dictionary::make();
+    for (int i = 0; i < 3000; ++i) leaves->set(std::to_string(i), "v" + std::to_string(i));
+    Value display = leaves;
+    std::string path;
+    for (int i = 0; i < 60; ++i) {
+        const std::string name(1000, static_cast<char>('A' + i));
+        display = Dictionary::make({{name, display}});
+        path.insert(0, "/" + name);
+    }
+    struct rusage before {};
+    struct rusage after {};
+    ::getrusage(RUSAGE_SELF, &before);
+    KelvoModelNode::makeTreeFromObject(display, nodes);
+    ::getrusage(RUSAGE_SELF, &after);
+    EXPECT_LT(after.ru_maxrss - before.ru_maxrss, 64 * 1024);  // in KiB
+    EXPECT_EQ(at(path + "/2999"), "2999=v2999");
+}
+
 TEST(DisplayPath, SeparatesComponentsByOneSlash) {
     EXPECT_EQ(pathByAppending("/", "A"), "/A");
     EXPECT_EQ(pathByAppending("/A", "B"), "/A/B");

@@ -1,4 +1,5 @@
 #include <fmt/format.h>
+#include <malloc.h>
 
 #include <QGuiApplication>
 #include <csignal>
@@ -27,12 +28,17 @@ namespace {
 
 using namespace kelvo;
 
+// A flood of records fills buffers of megabytes. As mappings of their own they go back to the system when it ends; the
+// allocator, whose threshold slides up by itself, would keep them in the heap from the second flood on.
+constexpr int kOwnMappingFrom = 256 * 1024;  // bytes
+
 void followDesktop(HostColorScheme::Scheme scheme) {
     const bool decided = scheme != HostColorScheme::Scheme::NoPreference;
     Theme::follow(decided ? std::optional(scheme == HostColorScheme::Scheme::Dark) : std::nullopt);
 }
 
 int runApplication(int argc, char** argv) {
+    ::mallopt(M_MMAP_THRESHOLD, kOwnMappingFrom);
     QuickWindow::chooseSceneGraph();
     QGuiApplication application(argc, argv);
     QGuiApplication::setApplicationName(QStringLiteral("kelvo"));

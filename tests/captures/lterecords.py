@@ -2,6 +2,8 @@
 import plistlib
 import struct
 
+plistlib.PLISTHEADER = b'<?xml version="1.0" encoding="UTF-8"?>\n'  # without a document type, as the service writes them
+
 # position in metres, physical cell id, cell identity, downlink EARFCN, resource blocks, tracking area, band
 CELLS = [
     (0, 301, 19467523, 5780, 50, 4566, 17),

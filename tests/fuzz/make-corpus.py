@@ -7,6 +7,7 @@ import pathlib
 import plistlib
 import struct
 
+plistlib.PLISTHEADER = b'<?xml version="1.0" encoding="UTF-8"?>\n'  # without a document type, as Kelvo writes them
 HERE = pathlib.Path(__file__).resolve().parent
 CAPTURES = HERE / "../captures"
 FAMILIES = {147: "cellmonitor", 148: "gsmmessages", 149: "cdmarecord", 150: "lterecord", 151: "utranrecord"}

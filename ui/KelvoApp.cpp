@@ -98,7 +98,7 @@ void KelvoApp::alertButtonPressed() {
 }
 
 // The home screen stops showing the signal as a number: this program is done with it.
-void KelvoApp::setGSMRSSI(bool shown) {
+void KelvoApp::_setGSMRSSI(bool shown) {
     constexpr const char* kDomain = "com.zorvik.dockmere";
     constexpr const char* kKey = "DMShowGSMRSSI";
     _services.preferences.set(kDomain, kKey, shown);
@@ -108,7 +108,7 @@ void KelvoApp::setGSMRSSI(bool shown) {
 void KelvoApp::applicationWillTerminate() {
     if (_terminated) return;
     _terminated = true;
-    setGSMRSSI(false);
+    _setGSMRSSI(false);
     setUpdateMessage({});
     _dateFormatter.reset();
     closeSaveView();

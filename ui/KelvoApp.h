@@ -86,7 +86,7 @@ Q_SIGNALS:
 private:
     void getSaveButtonPref();
     void reloadPanes();
-    void setGSMRSSI(bool shown);
+    void _setGSMRSSI(bool shown);
 
     const Services _services;
     std::unique_ptr<KelvoModel> _model;

@@ -30,7 +30,6 @@ class KelvoCell : public QQuickItem {
     Q_PROPERTY(QSizeF viewContentSize READ viewContentSize NOTIFY laidOut)
     Q_PROPERTY(QRectF contentArea READ contentArea WRITE setContentArea NOTIFY contentAreaChanged)
 public:
-    static constexpr const char* kReuseIdentifier = "KelvoPaneControllerCell";
     static constexpr qreal kStripHeight = 50;
 
     enum class Kind { Unsettled, Key, Value };

@@ -43,9 +43,15 @@ void KelvoPaneController::setTitle() {
     Q_EMIT titleChanged();
 }
 
+// More are beyond what a modem reports and would hold the window up: such lists begin anew.
+constexpr std::size_t kMostComparisons = 4'000'000;
+
 // Only what differs is told: rows that stay keep their place, their highlight and the finger on them. Children that
 // swapped places are taken out and put in again.
 void KelvoPaneController::reloadData(const std::vector<Row>& rows) {
+    const auto same = [](const Row& row, const Row& other) { return row.isSameChild(other); };
+    const bool differs = !std::ranges::equal(_rows, rows, same);
+    if (differs && _rows.size() * rows.size() > kMostComparisons) return resetRows(rows);
     std::size_t at = 0;
     while (at < _rows.size() || at < rows.size()) {
         if (at < _rows.size() && at < rows.size() && _rows[at].isSameChild(rows[at])) {
@@ -60,6 +66,13 @@ void KelvoPaneController::reloadData(const std::vector<Row>& rows) {
         }
     }
     updateValues(rows);
+}
+
+void KelvoPaneController::resetRows(const std::vector<Row>& rows) {
+    beginResetModel();
+    _rows = rows;
+    endResetModel();
+    selectRow(-1);
 }
 
 std::size_t KelvoPaneController::leadingWithout(const std::vector<Row>& rows, const std::vector<Row>& others,

@@ -24,7 +24,7 @@ struct ToolbarItem {
 };
 
 /// One table screen: the children of one node of the display tree, found again by its path after every rebuild.
-/// Main thread only. Rows are ready to draw: QML adds no text and takes no decision.
+/// Main thread only. Rows are ready to draw.
 class KelvoPaneController : public QAbstractListModel {
     Q_OBJECT
     QML_ELEMENT
@@ -93,6 +93,7 @@ private:
     void setTitle();
     void createToolbarItems();
     void reloadData(const std::vector<Row>& rows);
+    void resetRows(const std::vector<Row>& rows);
     /// How many of `rows` in a row, from index `from` on, are not among `others` from there on.
     static std::size_t leadingWithout(const std::vector<Row>& rows, const std::vector<Row>& others, std::size_t from);
     void removeRows(std::size_t first, std::size_t count);

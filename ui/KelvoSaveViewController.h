@@ -28,8 +28,6 @@ class KelvoSaveViewController : public QAbstractListModel {
 public:
     enum Role { DescriptionRole = Qt::UserRole + 1 };  // in QML: description
 
-    static constexpr const char* kReuseIdentifier = "SaveHistoryContentCell";
-
     /// The references outlive the screen.
     struct Services {
         MainQueue& queue;

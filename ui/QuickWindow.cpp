@@ -5,11 +5,17 @@
 #include <QQmlEngine>
 #include <QScreen>
 #include <QTimer>
+#include <algorithm>
 #include <chrono>
 
 #include "ui/KelvoApp.h"
 
 namespace kelvo {
+namespace {
+
+constexpr QSize kOnADesk(412, 732);  // as large as a phone's
+
+}  // namespace
 
 void QuickWindow::chooseSceneGraph() {
     const QStringList devices = QDir(QStringLiteral("/dev/dri")).entryList({QStringLiteral("renderD*")}, QDir::System);
@@ -19,13 +25,18 @@ void QuickWindow::chooseSceneGraph() {
 QuickWindow::QuickWindow() : _view(std::make_unique<QQuickView>()) {
     _view->setTitle(QStringLiteral("Kelvo"));
     _view->setResizeMode(QQuickView::SizeRootObjectToView);
-    // A phone's screen is filled by its window manager; on a desk the window is as large as a phone's.
-    const QSize screen = _view->screen() != nullptr ? _view->screen()->availableSize() : QSize(412, 732);
-    _view->resize(screen.boundedTo({412, 732}));
+    const QSize screen = _view->screen() != nullptr ? _view->screen()->availableSize() : kOnADesk;
+    _view->resize(openingSize(screen));
     _view->setMinimumSize(QSize(240, 240).boundedTo(screen));
 }
 
 QuickWindow::~QuickWindow() = default;
+
+QSize QuickWindow::openingSize(QSize screen) {
+    constexpr int kWidestPhone = 600;
+    const bool phone = std::min(screen.width(), screen.height()) <= kWidestPhone;
+    return phone ? screen : screen.boundedTo(kOnADesk);
+}
 
 void QuickWindow::setRootScreen(KelvoApp& application) {
     _view->setInitialProperties({{QStringLiteral("application"), QVariant::fromValue(&application)}});

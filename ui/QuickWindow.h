@@ -13,6 +13,8 @@ public:
     /// Chooses how windows are drawn: by the CPU where the machine has no graphics device, else by the GPU. Before the
     /// first window.
     static void chooseSceneGraph();
+    /// The size of the new window, in device-independent pixels: a phone's whole screen, or a part of a desk's.
+    static QSize openingSize(QSize screen);
 
     QuickWindow();
     ~QuickWindow() override;

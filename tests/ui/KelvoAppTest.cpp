@@ -57,6 +57,7 @@ private:
     void note(const char* what) {
         std::string text = std::string(what) + ": save " + (_app.allowSaveButton() ? "yes" : "no");
         text += _app.model() != nullptr ? ", model" : ", no model";
+        text += _app.saveViewController() != nullptr ? ", sheet" : ", no sheet";
         text += ", message '" + _app.updateMessage().toStdString() + "'";
         if (_app.navigation() != nullptr) text += ", " + _app.navigation()->topViewController().status().toStdString();
         text += ", asked " + std::to_string(_world.telephony.askedFor.size());
@@ -73,9 +74,10 @@ TEST_F(App, LaunchesInItsOrderAndConnectsOnlyAfterwards) {
     services.createWindow = [this] { return std::make_unique<WatchingWindow>(*app, world); };
     app = std::make_unique<KelvoApp>(std::move(services));
     launch();
-    EXPECT_EQ(world.events, (Events{"created: save yes, no model, message '', asked 0, ports 0",
-                                    "root: save yes, model, message 'Connecting...', Connecting, asked 0, ports 0",
-                                    "shown: save yes, model, message 'Connecting...', Connecting, asked 0, ports 0"}));
+    EXPECT_EQ(world.events,
+              (Events{"created: save yes, no model, no sheet, message '', asked 0, ports 0",
+                      "root: save yes, model, no sheet, message 'Connecting...', Connecting, asked 0, ports 0",
+                      "shown: save yes, model, no sheet, message 'Connecting...', Connecting, asked 0, ports 0"}));
     world.queue.run();
     EXPECT_EQ(world.telephony.askedFor.size(), 1U);
     EXPECT_TRUE(app->model()->isConnected());
@@ -99,13 +101,19 @@ TEST_F(App, TerminatesInItsOrder) {
     app = std::make_unique<KelvoApp>(std::move(services));
     launch();
     world.queue.run();
+    app->showSaveView();
+    ASSERT_NE(app->saveViewController(), nullptr);
+    QObject::connect(app.get(), &KelvoApp::saveViewDismissed, app.get(), [this] {
+        world.events.push_back("sheet away: message '" + app->updateMessage().toStdString() + "'");
+    });
     world.events.clear();
     app->applicationWillTerminate();
-    EXPECT_EQ(world.events,
-              (Events{"set com.zorvik.dockmere DMShowGSMRSSI false", "broadcast com.zorvik.dockmere DMShowGSMRSSI",
-                      "off: save no, model, message '', Connecting, asked 1, ports 1",
-                      "destroyed: save no, model, message '', Connecting, asked 1, ports 1"}));
+    EXPECT_EQ(world.events, (Events{"set com.zorvik.dockmere DMShowGSMRSSI false",
+                                    "broadcast com.zorvik.dockmere DMShowGSMRSSI", "sheet away: message ''",
+                                    "off: save no, model, no sheet, message '', Connecting, asked 1, ports 1",
+                                    "destroyed: save no, model, no sheet, message '', Connecting, asked 1, ports 1"}));
     EXPECT_EQ(app->model(), nullptr);
+    EXPECT_EQ(app->saveViewController(), nullptr);
     EXPECT_EQ(world.ports.openLocals(), 0U);
 }
 
@@ -203,6 +211,21 @@ TEST_F(App, NeverReloadsThePanesAboveTheFirstThatIsGone) {
     EXPECT_EQ(value(above, 1), "-95 dBm");
 }
 
+TEST_F(App, NeverReloadsAPaneAboveTheFirstThatIsGoneEvenWhenItsOwnPathIsStillThere) {
+    run();
+    const auto twoRows = [](const char* x) { return Dictionary::make({{"x", x}, {"y", "2"}}); };
+    world.show(Dictionary::make({{"A", Dictionary::make({{"B", twoRows("1")}, {"c", "1"}})}, {"z", "1"}}));
+    top().didSelectRow(0);
+    top().didSelectRow(0);
+    ASSERT_EQ(top().path(), "/A/B");
+    KelvoPaneController& above = top();
+    world.show(Dictionary::make({{"A/B", twoRows("9")}, {"z", "1"}}));  // a name that reads like the pane's path
+    ASSERT_NE(app->model()->nodeAtPath("/A/B"), nullptr);
+    ASSERT_EQ(app->model()->nodeAtPath("/A"), nullptr);
+    EXPECT_EQ(depth(), 1U);
+    EXPECT_EQ(value(above, 0), "1");
+}
+
 TEST_F(App, ReloadsTheRootEvenWhenThereIsNoTree) {
     world.telephony.reachable = false;
     launch();
@@ -212,6 +235,19 @@ TEST_F(App, ReloadsTheRootEvenWhenThereIsNoTree) {
     EXPECT_EQ(top().title(), QStringLiteral("Kelvo"));
     EXPECT_EQ(status(), "Connecting... (loading)");
     EXPECT_EQ(app->updateMessage(), QStringLiteral("Connecting..."));
+}
+
+TEST_F(App, ShowsAnEmptyRootWithItsStampWhenItIsConnectedBeforeTheFirstPacket) {
+    launch();
+    world.queue.run();
+    ASSERT_TRUE(app->model()->isConnected());
+    app->updateViewControllerFromModel();
+    EXPECT_EQ(depth(), 1U);
+    EXPECT_EQ(top().title(), QStringLiteral("Kelvo"));
+    EXPECT_EQ(top().rowCount(), 0);
+    EXPECT_EQ(status(), "Updated 2011-03-04 at 09:15:02");
+    world.show(sampleTree(3));
+    EXPECT_EQ(top().rowCount(), 3);
 }
 
 TEST_F(App, OffersNoSaveButtonWithoutTheMarker) {

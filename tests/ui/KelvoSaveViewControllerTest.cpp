@@ -67,6 +67,8 @@ TEST_F(SaveScreen, ListsTheEntriesByTheirDescriptions) {
     EXPECT_EQ(save.data(save.index(1), role).toString(), QStringLiteral("DLF binary (161 bytes)"));
 }
 
+TEST_F(SaveScreen, ListsNothingForAnEmptyHistory) { EXPECT_EQ(open(Array::make()).rowCount(), 0); }
+
 TEST_F(SaveScreen, ShowsAnEntryWithoutADescriptionAsAnEmptyRow) {
     KelvoSaveViewController& save = open(Array::make({Dictionary::make()}));
     EXPECT_TRUE(save.data(save.index(0), KelvoSaveViewController::DescriptionRole).toString().isEmpty());

@@ -2,6 +2,8 @@
 
 #include <gtest/gtest.h>
 
+#include <QQuickItem>
+#include <QVariant>
 #include <fstream>
 #include <iterator>
 
@@ -32,6 +34,20 @@ protected:
         scene->settle();
         ASSERT_TRUE(scene->shows(text("Save Snapshot")));
     }
+    /// What the keyboard is on, by its text: a button's own, a field's placeholder; empty for anything else.
+    QString focused() {
+        const QQuickItem* item = scene->view().activeFocusItem();
+        if (item == nullptr) return {};
+        const QVariant placeholder = item->property("placeholderText");
+        return placeholder.isValid() ? placeholder.toString() : item->property("text").toString();
+    }
+    /// Presses Tab until the keyboard is on the button or field of that text; fails the test when it never is.
+    void tabTo(const char* name) {
+        for (int presses = 0; presses < 5 && focused() != text(name); ++presses) scene->press(Qt::Key_Tab);
+        EXPECT_EQ(focused(), text(name));
+    }
+    /// The part of a row that scrolls sideways.
+    QQuickItem* strip(const QString& key) { return scene->row(key)->findChild<QQuickItem*>(text("strip")); }
     std::vector<std::filesystem::path> savedFiles() {
         return {std::filesystem::directory_iterator(scene->snapshotDirectory()), std::filesystem::directory_iterator()};
     }

@@ -2,10 +2,15 @@
 
 #include <QAccessible>
 #include <QFontMetricsF>
+#include <QImage>
+#include <QPointer>
 #include <QQuickItem>
+#include <QTest>
 
+#include "platform/TelephonyProtocol.h"
 #include "tests/ui/ScreenFixture.h"
 #include "ui/ActivityIndicator.h"
+#include "ui/Glyph.h"
 #include "ui/Theme.h"
 
 namespace kelvo {
@@ -32,6 +37,63 @@ TEST_F(Screen, StopsTheIndicatorOnceItIsConnected) {
     start();
     EXPECT_TRUE(scene->shows(text("Updated 2011-03-04 at 09:15:04")));
     EXPECT_EQ(scene->itemOfType("kelvo::ActivityIndicator"), nullptr);
+}
+
+TEST_F(Screen, GoesOnConnectingUntilASlowServiceAnswers) {
+    scene = std::make_unique<Scene>();
+    scene->telephony.answer = {.error = {.domain = kPLErrorDomainClient, .error = kPLErrorNoAnswer}, .portName = ""};
+    scene->connect();
+    scene->settle();
+    EXPECT_TRUE(scene->shows(text("Connecting")));
+    const QImage drawn = scene->view().grabWindow();
+    EXPECT_TRUE(QTest::qWaitFor([&] { return scene->view().grabWindow() != drawn; }));  // the indicator turns on
+    bool taskRan = false;
+    scene->queue.postAfter(4s, [&taskRan] { taskRan = true; });
+    scene->pass(4s);
+    EXPECT_TRUE(taskRan);
+    EXPECT_EQ(scene->telephony.askedFor.size(), 1U);
+    scene->pass(1s);
+    EXPECT_EQ(scene->telephony.askedFor.size(), 2U);
+    EXPECT_TRUE(scene->shows(text("Connecting")));
+
+    scene->telephony.answer = {.error = {}, .portName = "service"};
+    scene->ports.onRequest = [](const test::FakePorts::Sent&) -> test::FakePorts::Answer {
+        return RemotePort::Error::ReplyTimedOut;
+    };
+    scene->pass(5s);
+    EXPECT_EQ(scene->ports.sent.size(), 1U);
+    EXPECT_FALSE(scene->app().model()->isConnected());
+    EXPECT_TRUE(scene->shows(text("Connecting")));
+
+    scene->ports.onRequest = test::speaking(std::string(kPLLogChannelTechnology_IFX));
+    scene->pass(5s);
+    scene->show(sampleTree(3));
+    scene->settle();
+    EXPECT_TRUE(scene->shows(text("Registered")));
+    EXPECT_TRUE(scene->shows(text("Updated 2011-03-04 at 09:15:19")));
+    EXPECT_EQ(scene->itemOfType("kelvo::ActivityIndicator"), nullptr);
+}
+
+TEST_F(Screen, DrawsKeysBoldAndValuesRegularWhereTheRowPutsThem) {
+    start();
+    scene->tapText(text("Serving Cell"));
+    scene->settle();
+    const auto fontOf = [this](const char* shown) {
+        return scene->itemWithText(text(shown))->property("font").value<QFont>();
+    };
+    EXPECT_EQ(fontOf("RSRP").pixelSize(), 15);
+    EXPECT_TRUE(fontOf("RSRP").bold());
+    EXPECT_EQ(fontOf("-95 dBm").pixelSize(), 15);
+    EXPECT_FALSE(fontOf("-95 dBm").bold());
+    EXPECT_EQ(fontOf("Updated 2011-03-04 at 09:15:04").pixelSize(), 14);
+
+    const KelvoCell* row = scene->row(text("RSRP"));
+    const QQuickItem* key = scene->itemWithText(text("RSRP"));
+    const QQuickItem* value = scene->itemWithText(text("-95 dBm"))->parentItem();  // of the pieces of the text
+    EXPECT_EQ(key->position(), row->keyFrame().topLeft());
+    EXPECT_EQ(key->x(), 10);
+    EXPECT_EQ(value->position(), row->valueFrame().topLeft());
+    EXPECT_EQ(value->x() + row->valueFrame().width(), strip(text("RSRP"))->width());  // flush against the right edge
 }
 
 TEST_F(Screen, ShowsMarkupFromTheModemAsItStands) {
@@ -91,6 +153,53 @@ TEST_F(Screen, WalksByKeys) {
     expectTop("Kelvo");
 }
 
+TEST_F(Screen, OpensTheSaveScreenAndAllItsPartsByTheTabKey) {
+    start(true);
+    tabTo("Save");
+    EXPECT_TRUE(scene->view().activeFocusItem()->property("visualFocus").toBool());
+    scene->press(Qt::Key_Return);
+    scene->settle();
+    ASSERT_TRUE(scene->shows(text("Save Snapshot")));
+    for (const char* part : {"Cancel", "Save", "Description", "Cancel"}) {  // round again, and not to the pane below
+        scene->press(Qt::Key_Tab);
+        EXPECT_EQ(focused(), text(part));
+    }
+    scene->press(Qt::Key_Return);
+    scene->queue.run();
+    scene->settle();
+    EXPECT_FALSE(scene->shows(text("Save Snapshot")));
+    EXPECT_TRUE(savedFiles().empty());
+}
+
+TEST_F(Screen, SavesByKeysAlone) {
+    start(true);
+    tabTo("Save");
+    scene->press(Qt::Key_Return);
+    scene->settle();
+    tabTo("Description");
+    scene->type("by hand");
+    tabTo("Cancel");
+    tabTo("Save");
+    scene->press(Qt::Key_Return);
+    scene->queue.run();
+    scene->settle();
+    EXPECT_FALSE(scene->shows(text("Save Snapshot")));
+    ASSERT_EQ(savedFiles().size(), 1U);
+    EXPECT_EQ(savedDescription(), "by hand");
+}
+
+TEST_F(Screen, GoesBackByTheTabKey) {
+    start(true);
+    scene->press(Qt::Key_Down);
+    scene->press(Qt::Key_Return);
+    expectTop("Serving Cell");
+    tabTo("Kelvo");
+    EXPECT_TRUE(scene->view().activeFocusItem()->property("visualFocus").toBool());
+    scene->press(Qt::Key_Return);
+    expectTop("Kelvo");
+    EXPECT_EQ(depth(), 1U);
+}
+
 TEST_F(Screen, GoesBackByItselfWhenAPanesBranchVanishes) {
     start();
     scene->tapText(text("Neighbor Cells"));
@@ -102,6 +211,31 @@ TEST_F(Screen, GoesBackByItselfWhenAPanesBranchVanishes) {
     EXPECT_FALSE(scene->shows(text("2")));
 }
 
+TEST_F(Screen, FindsThePaneThatIsLeftWhenABranchVanishesUnderTheSaveScreen) {
+    start(true);
+    scene->tapText(text("Neighbor Cells"));
+    expectTop("Neighbor Cells");
+    scene->tap(scene->row(text("2")));
+    expectTop("2");
+    openSheet();
+    scene->show(sampleTree(1));
+    scene->settle();
+    EXPECT_TRUE(scene->shows(text("Save Snapshot")));
+    scene->tapText(text("Cancel"));
+    scene->queue.run();
+    expectTop("Neighbor Cells");
+    EXPECT_FALSE(scene->shows(text("Save Snapshot")));
+    EXPECT_EQ(depth(), 2U);
+    EXPECT_EQ(scene->itemOfType("QQuickStackView")->property("depth").toInt(), 2);
+    scene->press(Qt::Key_Down);
+    scene->press(Qt::Key_Return);
+    expectTop("0");
+    scene->press(Qt::Key_Escape);
+    expectTop("Neighbor Cells");
+    scene->press(Qt::Key_Escape);
+    expectTop("Kelvo");
+}
+
 TEST_F(Screen, SaysThatAListIsEmpty) {
     start();
     scene->show(sampleTree(0));
@@ -110,6 +244,56 @@ TEST_F(Screen, SaysThatAListIsEmpty) {
     EXPECT_TRUE(scene->shows(text("None reported")));
     scene->show(sampleTree(1));
     EXPECT_FALSE(scene->shows(text("None reported")));
+}
+
+TEST_F(Screen, SaysThatThereIsNothingToSaveYet) {
+    scene = std::make_unique<Scene>(true);
+    scene->telephony.reachable = false;
+    scene->connect();
+    scene->settle();
+    openSheet();
+    EXPECT_TRUE(scene->shows(text("Nothing recorded yet")));
+    EXPECT_FALSE(scene->shows(text("In this snapshot")));
+}
+
+TEST_F(Screen, ListsEachEntryInItsFontWithACheckMark) {
+    start(true);
+    openSheet();
+    const QQuickItem* entry = scene->itemWithText(text("Snapshot (2011-03-04 09:15:04 +0000)"));
+    const auto font = entry->property("font").value<QFont>();
+    EXPECT_EQ(font.family(), text("Helvetica"));
+    EXPECT_EQ(font.pixelSize(), 13);
+    const auto* mark = entry->parentItem()->findChild<Glyph*>();
+    ASSERT_NE(mark, nullptr);
+    EXPECT_TRUE(mark->isVisible());
+    EXPECT_EQ(mark->shape(), Glyph::Shape::Check);
+}
+
+TEST_F(Screen, MakesTheListOfEntriesAsHighAsTheyAre) {
+    start(true);
+    openSheet();
+    const auto expectEntries = [this](int entries) {
+        const QQuickItem* list = scene->itemOfType("QQuickListView");  // the sheet's, which lies on top
+        EXPECT_EQ(list->property("count").toInt(), entries);
+        EXPECT_EQ(list->height(), entries * 44);
+    };
+    expectEntries(1);
+    scene->tapText(text("Cancel"));
+    scene->queue.run();
+    scene->settle();
+    scene->show(sampleTree(3));
+    openSheet();
+    expectEntries(2);
+}
+
+TEST_F(Screen, LetsGoOfASaveScreenThatWasClosed) {
+    start(true);
+    openSheet();
+    const QPointer<KelvoSaveViewController> screen(scene->app().saveViewController());
+    scene->tapText(text("Cancel"));
+    scene->queue.run();
+    scene->settle();
+    EXPECT_TRUE(QTest::qWaitFor([&screen] { return screen.isNull(); }));
 }
 
 TEST_F(Screen, SavesWithTheDescriptionThatWasTyped) {
@@ -230,6 +414,61 @@ TEST_F(Screen, LeavesARowAloneThatAFingerScrollsSidewaysDuringAReload) {
     EXPECT_EQ(depth(), 1U);
 }
 
+/// A finger on a row whose value is too long for it.
+class SidewaysScroll : public test::ScreenFixture {
+protected:
+    void startWith(const std::string& state) {
+        start();
+        showState(state);
+    }
+    void showState(const std::string& state) {
+        scene->show(Dictionary::make({{"State", state}, {"Cells", Array::make()}}));
+        scene->settle();
+    }
+    double contentX() { return strip(text("State"))->property("contentX").toDouble(); }
+    /// Scrolls the row to the left; the finger stays on it, where the returned point is.
+    QPointF drag() {
+        const QPointF from = scene->row(text("State"))->mapToScene({300, 25});
+        scene->touch(from);
+        for (int x = 10; x <= 120; x += 10) scene->move(from - QPointF(x, 0));
+        return from - QPointF(120, 0);
+    }
+
+    const std::string tooLong = "a value that is much too long for the width of one row of this telephone ";
+};
+
+TEST_F(SidewaysScroll, StaysUnderTheFingerWhenTheValueItselfChanges) {
+    startWith(tooLong + "ab");
+    const QPointF finger = drag();
+    const double scrolled = contentX();
+    EXPECT_GT(scrolled, 40);
+    scene->show(Dictionary::make({{"State", tooLong + "ba"}, {"Cells", Array::make()}}));
+    EXPECT_TRUE(scene->shows(QString::fromStdString(tooLong + "ba")));
+    EXPECT_EQ(contentX(), scrolled);
+    EXPECT_TRUE(strip(text("State"))->property("dragging").toBool());
+    scene->move(finger - QPointF(20, 0));
+    EXPECT_EQ(contentX(), scrolled + 20);
+    scene->lift(finger - QPointF(20, 0));
+}
+
+TEST_F(SidewaysScroll, ComesBackToItsStartForAValueThatBecomesShort) {
+    startWith(tooLong);
+    scene->lift(drag());
+    EXPECT_TRUE(QTest::qWaitFor([this] { return !strip(text("State"))->property("moving").toBool(); }));
+    EXPECT_GT(contentX(), 40);
+    showState("short");
+    EXPECT_TRUE(scene->shows(text("short")));
+    EXPECT_TRUE(QTest::qWaitFor([this] { return contentX() == 0; }));
+}
+
+TEST_F(SidewaysScroll, ComesBackToItsStartForAValueThatBecomesShortWhileItGlides) {
+    startWith(tooLong);
+    scene->lift(drag());
+    EXPECT_GT(contentX(), 40);
+    showState("short");
+    EXPECT_TRUE(QTest::qWaitFor([this] { return contentX() == 0; }));
+}
+
 TEST_F(Screen, KeepsTheScrollPositionAndTheRowsThroughAReload) {
     start();
     const auto tree = [](const char* level, int rows) {
@@ -268,6 +507,42 @@ TEST_F(Screen, ShowsEveryRecycledRowEitherWholeOrByItsNameOnly) {
         byNameOnly += row->kind() == KelvoCell::Kind::Key ? 1 : 0;
     }
     EXPECT_GT(byNameOnly, 0);  // rows that came from the branches, all under one reuse identifier
+}
+
+TEST_F(Screen, ShowsABranchInARecycledRowOfAValueAsInAFreshRow) {
+    const auto branch = [](int number) { return "Branch " + std::to_string(number) + " " + std::string(60, 'n'); };
+    const auto nameEnds = [this](const QString& key) {
+        const QQuickItem* name = scene->itemWithText(key);
+        return name->x() + name->width();
+    };
+    scene = std::make_unique<Scene>();
+    scene->connect();
+    scene->show(Dictionary::make({{branch(99), Array::make()}, {"z", "1"}}));
+    scene->settle();
+    const QString first = QString::fromStdString(branch(99));
+    ASSERT_EQ(scene->row(first)->kind(), KelvoCell::Kind::Key);
+    const double stripWidth = strip(first)->width();
+    const double nameEnd = nameEnds(first);
+
+    const DictionaryRef display = Dictionary::make();
+    for (int row = 0; row < 30; ++row) display->set("Leaf " + std::to_string(row), std::string(80, 'x'));
+    for (int row = 0; row < 30; ++row) display->set(branch(row), Array::make());
+    scene->show(display);
+    QQuickItem* list = scene->itemOfType("QQuickListView");
+    for (int y = 0; y <= 2400; y += 100) {
+        list->setProperty("contentY", y);
+        scene->settle();
+    }
+    int recycled = 0;
+    for (int row = 20; row < 29; ++row) {
+        const QString key = QString::fromStdString(branch(row));
+        if (scene->row(key)->kind() != KelvoCell::Kind::Value) continue;
+        ++recycled;
+        EXPECT_FALSE(strip(key)->property("interactive").toBool());
+        EXPECT_EQ(strip(key)->width(), stripWidth);
+        EXPECT_EQ(nameEnds(key), nameEnd);
+    }
+    EXPECT_GT(recycled, 0);
 }
 
 TEST_F(Screen, ScrollsALongValueByKeys) {
@@ -318,7 +593,10 @@ TEST_F(Screen, TakesItsWindowAwayAtTheEnd) {
     scene->tapText(text("Serving Cell"));
     scene->settle();
     openSheet();
+    const QPointer<QQuickView> view(&scene->view());
     scene->app().applicationWillTerminate();
+    EXPECT_TRUE(view.isNull());
+    EXPECT_EQ(scene->app().saveViewController(), nullptr);
     EXPECT_EQ(scene->app().model(), nullptr);
     EXPECT_EQ(scene->ports.openLocals(), 0U);
 }

@@ -53,12 +53,13 @@ KelvoCell {
 
             x: row.viewFrame.x
             y: row.viewFrame.y
-            width: row.viewFrame.width > 0 ? row.viewFrame.width : content.width
+            width: row.opens || row.viewFrame.width === 0 ? content.width : row.viewFrame.width
             height: content.height
             contentWidth: row.viewContentSize.width
             contentHeight: height
             flickableDirection: Flickable.HorizontalFlick
-            interactive: contentWidth > width
+            interactive: !row.opens && contentWidth > width  // a row that showed a long value before may open now
+            onInteractiveChanged: if (!interactive) contentX = 0
             clip: interactive
 
             Text {

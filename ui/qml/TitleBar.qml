@@ -17,7 +17,8 @@ Rectangle {
         id: backButton
 
         // A title that needs the room first becomes smaller, and then leaves the way back its arrow alone.
-        readonly property real named: Math.min(implicitWidth, bar.width / 3)
+        // A third of the bar, or all that a title in its middle leaves.
+        readonly property real named: Math.min(implicitWidth, Math.max(bar.width / 3, (bar.width - title.implicitWidth) / 2 - x - 4))
         readonly property bool roomForName: x + named + 4 + title.implicitWidth * 14 / 17 <= bar.width - 16
 
         anchors { left: parent.left; leftMargin: 4; verticalCenter: parent.verticalCenter }

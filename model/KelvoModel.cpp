@@ -122,7 +122,10 @@ void KelvoModel::chooseGenerator(const Value& answer) {
         logLine(Level::Error, " ***** Reply to GetTechnology had no answer; cannot configure");
         return;
     }
-    if (_logGenerator) _replacedGenerators.push_back(std::move(_logGenerator));
+    if (_logGenerator) {
+        _logGenerator->limitRawLog(0);  // it stays, its records need not
+        _replacedGenerators.push_back(std::move(_logGenerator));
+    }
     const std::string* identifier = technology->string();
     _logGenerator = identifier != nullptr ? LogGenerator::generatorFromTechnology(*identifier) : nullptr;
     if (_logGenerator) _logGenerator->limitRawLog(kRawLogLimit);
@@ -173,13 +176,13 @@ void KelvoModel::refresh() {
         _recvPort->invalidate();  // whose callback restarts
         lost = !isConnected();
     }
-    if (!_updated && !lost) return;
+    if (!_updated && !(lost && _nodes)) return;
     if (_updated) {
         _updated = false;
         _nodes.reset();
         _nodesByPath.clear();
     }
-    // A lost connection is told even when nothing new has come: the screens must not pass for current.
+    // A lost connection is told even when nothing new has come: screens with values must not pass for current.
     _services.queue.post(whileAlive([this] { _services.updateViewControllerFromModel(); }));
 }
 
@@ -209,11 +212,7 @@ ArrayRef KelvoModel::getSaveContents() {
 }
 
 void KelvoModel::didReceive(std::int32_t id, ByteView data) {
-    if (id == kMessageId) {
-        updateWithData(data);
-    } else {
-        logLine(Level::Warning, "Ignoring a message with id %d", id);
-    }
+    if (id == kMessageId) updateWithData(data);
 }
 
 void KelvoModel::didInvalidate(const LocalPort& port) {

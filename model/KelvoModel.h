@@ -15,7 +15,8 @@ namespace kelvo {
 
 /// The one live monitor between the program and the baseband's log stream: owns the two ports of the log channel, picks
 /// the generator by the technology the modem speaks, feeds it every message, and every two seconds tells the screens
-/// when there is something new. Main queue only; the technology query blocks it for at most two seconds.
+/// when there is something new. Main queue only; a start blocks it for at most five seconds: two for the channel, two
+/// for the technology, one for the start command.
 class KelvoModel {
 public:
     /// The name of the local port on which the service delivers to the application.

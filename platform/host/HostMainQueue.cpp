@@ -11,21 +11,19 @@ namespace {
 
 using std::chrono::milliseconds;
 
+constexpr Qt::TimerType kNeverEarly = Qt::PreciseTimer;  // coarse ones come up to a twentieth of their time early
+
 // Qt's timers count whole milliseconds in an int: never early by rounding, at most 24 days.
 milliseconds wholeMilliseconds(std::chrono::nanoseconds time) {
     constexpr milliseconds kLongest{std::numeric_limits<int>::max()};
     return std::clamp(std::chrono::ceil<milliseconds>(time), milliseconds{0}, kLongest);
 }
 
-Qt::TimerType typeFor(milliseconds time) {
-    return time >= std::chrono::seconds(1) ? Qt::CoarseTimer : Qt::PreciseTimer;
-}
-
 class HostTimer final : public RepeatingTimer {
 public:
     HostTimer(milliseconds interval, MainQueue::Task task) : _timer(new QTimer) {
         QObject::connect(_timer, &QTimer::timeout, _timer, [run = std::move(task)] { HostEventLoop::call(run); });
-        _timer->setTimerType(typeFor(interval));
+        _timer->setTimerType(kNeverEarly);
         _timer->start(interval);
     }
     ~HostTimer() override {
@@ -45,8 +43,8 @@ void HostMainQueue::post(Task task) {
 }
 
 void HostMainQueue::postAfter(std::chrono::nanoseconds delay, Task task) {
-    const milliseconds time = wholeMilliseconds(delay);
-    QTimer::singleShot(time, typeFor(time), &_context, [run = std::move(task)] { HostEventLoop::call(run); });
+    QTimer::singleShot(wholeMilliseconds(delay), kNeverEarly, &_context,
+                       [run = std::move(task)] { HostEventLoop::call(run); });
 }
 
 std::unique_ptr<RepeatingTimer> HostMainQueue::repeat(std::chrono::nanoseconds interval, Task task) {

@@ -215,6 +215,15 @@ TEST_P(DeepDisplay, LeavesTheArrayLockFree) {
     std::thread([] { const ArrayLock::Held held; }).join();  // hangs while this thread still holds it
 }
 
+// Held 256 times, the lock stands at a depth of 0: one more take and its release, those of the walk, free it.
+TEST(DisplayTreeWalk, TakesTheArrayLockForAnArray) {
+    for (int i = 0; i < 256; ++i) ArrayLock::lockArray();
+    NodesByPath nodes;
+    KelvoModelNode::makeTreeFromObject(Array::make({"row"}), nodes);
+    std::thread([] { const ArrayLock::Held held; }).join();  // hangs when the walk took no lock
+    for (int i = 0; i < 256; ++i) ArrayLock::unlockArray();
+}
+
 INSTANTIATE_TEST_SUITE_P(Kinds, DeepDisplay, testing::Bool(),
                          [](const auto& info) { return info.param ? "Arrays" : "Dictionaries"; });
 

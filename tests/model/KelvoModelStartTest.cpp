@@ -69,6 +69,21 @@ TEST_F(KelvoModelStart, UsesThePortNameItIsGiven) {
     EXPECT_NE(ports.local("another.watcher"), nullptr);
 }
 
+TEST_F(KelvoModelStart, TellsTheTwoPortsApart) {
+    ports.onRequest = test::speaking(kLte);
+    model->restartMonitor();
+    const std::string receiving = fmt::sprintf("recv=%p)", static_cast<const void*>(ports.local(kLocalPort)));
+    const std::string invalidated =
+        fmt::sprintf(" ***** INVALIDATED %p *****", static_cast<const void*>(ports.local(kLocalPort)));
+    ports.killPeer();
+    queue.advance(2s);
+    std::vector<std::string> addressed;
+    for (const auto& [level, text] : log.lines()) {
+        if (text.ends_with(receiving) || text == invalidated) addressed.push_back(withoutAddresses(text));
+    }
+    EXPECT_EQ(addressed, (Texts{" ***** Created ports (send=%p, recv=%p)", " ***** INVALIDATED %p *****"}));
+}
+
 TEST_F(KelvoModelStart, LogsItsWayToTheStream) {
     ports.onRequest = test::speaking(kLte);
     model->restartMonitor();
@@ -140,6 +155,13 @@ TEST_F(KelvoModelStart, RetriesWhenTheLogChannelIsRefused) {
     telephony.answer = {.error = {.domain = 1, .error = 45}, .portName = "service"};
     EXPECT_EQ(errorsOfFailedStart(), (Texts{"_PLServerConnectionNetworkMonitorCreateLogChannel returns error: 45!",
                                             "Could not create the ports necessary"}));
+}
+
+TEST_F(KelvoModelStart, TakesAnErrorPairForAnErrorByItsSecondPartAlone) {
+    telephony.answer = {.error = {.domain = 1, .error = 0}, .portName = "service"};
+    ports.onRequest = test::speaking(kLte);
+    model->restartMonitor();
+    EXPECT_TRUE(model->isConnected());
 }
 
 TEST_F(KelvoModelStart, RetriesWhenTheLogChannelHasNoName) {

@@ -29,17 +29,6 @@ Value cellInfo(ByteView packet) {
     return lastValue;
 }
 
-ArrayRef cellsOf(const Value& payload) {
-    if (!payload) {
-        logLine(Level::Error, "Cell Info Array data could not be constructed");
-        logLine(Level::Error, "Failed to get Cell Array\n");
-        return nullptr;
-    }
-    return payload.array() ? payload.array() : Array::make();
-}
-
-ArrayRef cellInfoArray(ByteView packet) { return cellsOf(cellInfo(packet)); }
-
 bool isCell(const Value& cell, std::string_view technology, std::string_view cellType) {
     static constexpr Key kTechnology(kPLCellMonitorCellRadioAccessTechnology);
     static constexpr Key kType(kPLCellMonitorCellType);
@@ -50,14 +39,24 @@ bool isCell(const Value& cell, std::string_view technology, std::string_view cel
     return cell.dictionary() && says(kTechnology, technology) && says(kType, cellType);
 }
 
+namespace {
+
+/// The cells of a property list, or none and two error lines.
+ArrayRef cellsOf(const Value& payload) {
+    if (!payload) {
+        logLine(Level::Error, "Cell Info Array data could not be constructed");
+        logLine(Level::Error, "Failed to get Cell Array\n");
+        return nullptr;
+    }
+    return payload.array() ? payload.array() : Array::make();
+}
+
 const Dictionary* firstCell(const Array& cells, std::string_view technology, std::string_view cellType) {
     for (const Value& cell : cells) {
         if (isCell(cell, technology, cellType)) return cell.dictionary().get();
     }
     return nullptr;
 }
-
-namespace {
 
 /// The values of a cell, each with its field; what is no 32-bit integer has its line on the log instead.
 template <class Show>
@@ -75,9 +74,11 @@ void eachValue(const Dictionary& cell, std::span<const CellField> fields, Show s
 
 }  // namespace
 
-void showCell(Dictionary& shown, const Dictionary& cell, std::span<const CellField> fields) {
+ArrayRef cellInfoArray(ByteView packet) { return cellsOf(cellInfo(packet)); }
+
+void showCell(const DictionaryRef& shown, const Dictionary& cell, std::span<const CellField> fields) {
     eachValue(cell, fields, [&](const CellField& field, std::int32_t value) {
-        showValue(shown.slot(field.displayKey), value, field.shown);
+        if (shown) showValue(shown->slot(field.displayKey), value, field.shown);
     });
 }
 
@@ -85,7 +86,7 @@ void showServingCell(const DictionaryRef& shown, ByteView packet, std::string_vi
                      std::span<const CellField> fields) {
     const ArrayRef cells = cellInfoArray(packet);
     const Dictionary* serving = cells ? firstCell(*cells, technology, kPLCellMonitorCellTypeServing) : nullptr;
-    if (serving != nullptr && shown) showCell(*shown, *serving, fields);
+    if (serving != nullptr) showCell(shown, *serving, fields);
 }
 
 void showNeighbors(const ArrayRef& list, ByteView packet, std::string_view technology,

@@ -18,18 +18,12 @@ Value payloadPropertyList(ByteView packet);
 /// record, and not to be changed.
 Value cellInfo(ByteView packet);
 
-/// The cell-information array in such a property list. One that did not parse gives none and two error lines; one that
-/// parsed to something else than an array holds no cells.
-ArrayRef cellsOf(const Value& payload);
-
-/// The cell-information array of a packet: `cellsOf` its `cellInfo`.
+/// The cell-information array of a packet. One that does not parse gives none and two error lines; one that parses to
+/// something else than an array holds no cells.
 ArrayRef cellInfoArray(ByteView packet);
 
 /// Whether `cell` is a dictionary that says both `technology` and `cellType`.
 bool isCell(const Value& cell, std::string_view technology, std::string_view cellType);
-
-/// The first such cell of the array; null when there is none.
-const Dictionary* firstCell(const Array& cells, std::string_view technology, std::string_view cellType);
 
 /// One number of a cell and where it is shown.
 struct CellField {
@@ -40,11 +34,11 @@ struct CellField {
     Shown shown = decimal;
 };
 
-/// Shows each field in order; one that fails leaves its display key as it was. The fields are static data.
-void showCell(Dictionary& shown, const Dictionary& cell, std::span<const CellField> fields);
+/// Shows each field in order; one that fails leaves its display key as it was. With a null `shown` the failures are
+/// told all the same. The fields are static data.
+void showCell(const DictionaryRef& shown, const Dictionary& cell, std::span<const CellField> fields);
 
-/// Shows the first serving cell of `technology` in a packet's cell-information array; without one, or with nowhere to
-/// show it, nothing changes.
+/// Shows the first serving cell of `technology` in a packet's cell-information array; without one nothing changes.
 void showServingCell(const DictionaryRef& shown, ByteView packet, std::string_view technology,
                      std::span<const CellField> fields);
 

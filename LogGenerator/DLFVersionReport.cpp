@@ -12,7 +12,7 @@ void writeLittleEndian(std::uint8_t* to, std::uint32_t value, std::size_t width)
 }
 
 void writeText(std::uint8_t* to, std::string_view text, std::size_t most) {
-    std::memcpy(to, text.data(), std::min(text.size(), most));
+    std::ranges::copy(text.substr(0, most), to);
 }
 
 }  // namespace

@@ -30,7 +30,7 @@ public:
     /// The command that makes the service stream this family's records.
     virtual DictionaryRef getStartCommand() = 0;
     /// From now on at most so many bytes of raw records are kept between two rebuilds of the display; what comes beyond
-    /// is decoded all the same. Without a limit everything is kept.
+    /// is decoded all the same, and more than that kept already is forgotten. Without a limit everything is kept.
     virtual void limitRawLog(std::size_t /*bytes*/) {}
     /// The contents of a snapshot file.
     virtual ArrayRef getSaveContentsFromState(Dictionary& state) = 0;

@@ -2,7 +2,6 @@
 
 #include <fmt/printf.h>
 
-#include <algorithm>
 #include <utility>
 
 #include "LogGenerator/DLFVersionReport.h"
@@ -64,8 +63,14 @@ ArrayRef OSKLogGenerator::getSaveContentsFromState(Dictionary& state) {
     return contents;
 }
 
+void OSKLogGenerator::limitRawLog(std::size_t bytes) {
+    _rawLogLimit = bytes;
+    if (_binData.size() > bytes) _binData = Bytes();
+}
+
 void OSKLogGenerator::keepRaw(ByteView record) {
-    if (record.size() > _rawLogLimit - std::min(_rawLogLimit, _binData.size())) {
+    const std::size_t room = _rawLogLimit - _binData.size();
+    if (record.size() > room) {
         ++_notKept;
         return;
     }

@@ -16,7 +16,7 @@ class OSKLogGenerator : public LogGenerator {
 public:
     /// The history's snapshots, followed, when a DLF could be made, by a dictionary with "Description" and "DLF".
     ArrayRef getSaveContentsFromState(Dictionary& state) override;
-    void limitRawLog(std::size_t bytes) override { _rawLogLimit = bytes; }
+    void limitRawLog(std::size_t bytes) override;
 
     /// One version report followed by the raw records of the history, oldest first; none after one log line.
     static std::optional<Bytes> generateDlfFromState(const Dictionary& state);

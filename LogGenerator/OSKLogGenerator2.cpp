@@ -31,6 +31,12 @@ void collectParts(const Value& node, const ClassIndex& sections, Parts& parts) {
     }
 }
 
+/// A processed node on its way into its parent.
+Value storable(Value processed) {
+    if (!processed) throw std::invalid_argument("a template holds nothing but dictionaries, arrays and strings");
+    return processed;
+}
+
 }  // namespace
 
 OSKLogGenerator2::OSKLogGenerator2(std::string name, std::unique_ptr<ClassIndex> cIndexObj)
@@ -139,7 +145,7 @@ Value OSKLogGenerator2::processTemplate(const Value& node) {
     if (node.string() != nullptr) return node;
     if (node.array()) {
         const ArrayRef processed = Array::make();
-        for (const Value& element : *node.array()) processed->append(processTemplate(element));
+        for (const Value& element : *node.array()) processed->append(storable(processTemplate(element)));
         return processed;
     }
     if (node.dictionary()) {
@@ -147,13 +153,13 @@ Value OSKLogGenerator2::processTemplate(const Value& node) {
         for (const auto& [key, value] : *node.dictionary()) {
             Value part = processTemplate(value);
             bindSection(key, part);
-            processed->set(key, std::move(part));
+            processed->set(key, storable(std::move(part)));
         }
         return processed;
     }
     logLine(Level::Error, "Received an object of unknown type");
     logLine(Level::Warning, "Processing the template");
-    throw std::invalid_argument("a template holds nothing but dictionaries, arrays and strings");
+    return {};
 }
 
 void OSKLogGenerator2::printDict(const Value& node) const {

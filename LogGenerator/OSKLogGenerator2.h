@@ -24,8 +24,9 @@ public:
 
     /// Routes one message to its subscribers; a message that is no packet is dropped.
     void updateWithData(ByteView data);
-    /// The live copy of a template node, with the sections in it bound to their parts. Throws std::invalid_argument
-    /// for anything but dictionaries, arrays and strings.
+    /// The live copy of a template node, with the sections in it bound to their parts: a key that names a section
+    /// inside another section's part is not for templates. None for anything but dictionaries, arrays and strings; a
+    /// parent of such a node throws std::invalid_argument.
     Value processTemplate(const Value& node);
     /// Checks that a processed node holds nothing but dictionaries, arrays and strings.
     void printDict(const Value& node) const;

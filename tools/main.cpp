@@ -33,6 +33,7 @@ int main(int argc, char** argv) {
     const kelvo::DirectoryResources resources(resourcesDirectory());
     kelvo::Environment environment;
     environment.resources = &resources;
+    environment.version = KELVO_VERSION;
     const kelvo::Environment::Scope scope(environment);
 
     CLI::App app("Kelvo in the terminal: the screens of a phone's radio, of captures and of snapshots.", "kelvoctl");

@@ -35,10 +35,10 @@ DictionaryRef C2K1xActiveSet(RecordView record, std::size_t base) {
     const auto count = static_cast<std::size_t>(record.read(base + 8, u8));
     const auto extras = static_cast<std::size_t>(record.read(base + 9, u8));
     const std::int64_t reference = record.read(base + 10, u16);
-    const RecordEntries entries(base + 12, strideOf(extras), count);
+    const RecordEntries entries = RecordEntries(base + 12, strideOf(extras), count).within(record.size());
 
-    C2KPilotList pilots(count);
-    for (std::size_t i = 0; i < count && entries.offsetOf(i) < record.size(); ++i) {
+    C2KPilotList pilots(entries.count());
+    for (std::size_t i = 0; i < entries.count(); ++i) {
         const std::int64_t pn = record.read(entries.offsetOf(i), u16);
         const double level = scale.decibels(record.read(entries.offsetOf(i) + 12 + 4 * extras, u16));
         pilots.add(i, pn, level, pn == reference ? kReferencePilotLevel : kC2KPilotLevel);

@@ -8,8 +8,8 @@ namespace kelvo {
 
 /// The generator of CDMA2000 modems, 1x and EV-DO. Its screens come from the template "C2KTemplate": a text in it is
 /// the lookup key of the value that is to be shown there, and a decoded value is shown at every place that names its
-/// key. Everything it keeps lives in the state: beside the keys of every generator, "Lookup" (lookup key to the places
-/// in the live display) and the running values of the data rates and the frame error rate.
+/// key. Beside the keys of every generator the state has "Lookup" (lookup key to the places in the live display) and
+/// the running values of the data rates and the frame error rate; the generator itself keeps the raw packets alone.
 class C2KLogGenerator final : public OSKLogGenerator {
 public:
     static std::unique_ptr<LogGenerator> generator() { return std::make_unique<C2KLogGenerator>(); }
@@ -19,7 +19,8 @@ public:
     DictionaryRef getStartCommand() override;
 
     /// Decodes one message and keeps its packet for the raw log, also when its decoder refuses it. Messages that are
-    /// no packet, and codes that were not asked for, leave no trace. A null lookup shows nothing.
+    /// no packet leave no trace, and codes that were not asked for none but the line that tells of a wrong log type. A
+    /// null lookup shows nothing.
     void updateFromLog(ByteView data, const DictionaryRef& usingLookup, Dictionary& usingState);
 
     /// Fills `storeDisplayIntoDict` with the template's screens, every value still "", and `storeLookupIntoDict` with

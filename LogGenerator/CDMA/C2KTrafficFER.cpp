@@ -22,6 +22,7 @@ float filtered(bool erased, const Number* previous) {
     return rate;
 }
 
+/// The percentage is for the eye alone: it is multiplied in double precision, in which it is printed anyway.
 void show(const NumberFormat& format, double rate, const DictionaryRef& lookup) {
     Value shown;
     showReal(shown, 100 * rate, format);

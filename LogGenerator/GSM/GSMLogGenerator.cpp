@@ -9,44 +9,12 @@ namespace {
 
 constexpr std::string_view kSource = "LogGenerator/GSM/GSMLogGenerator";
 
-/// A dictionary or array on its way into its simplified form, `rebuilt`; the children before `next` are done.
-class OpenNode {
-public:
-    explicit OpenNode(const Value& source) : _source(source) {
-        if (source.dictionary()) {
-            _rebuilt = Dictionary::make();
-        } else if (source.array()) {
-            _rebuilt = Array::make();
-            _next = 1;  // intended: every array loses its first element
-        } else {
-            throw AssertionFailure("processObject:", kSource, 78,
-                                   "Unknown object of type " + std::string(kindName(source.kind())) + " encountered");
-        }
-    }
-
-    /// The child to simplify next; null when all are done.
-    const Value* nextChild() const {
-        if (_source.array()) return _next < _source.array()->size() ? &(*_source.array())[_next] : nullptr;
-        return _next < _source.dictionary()->size() ? &entry().value : nullptr;
-    }
-    /// Takes the simplified form of `nextChild`.
-    void add(Value child) {
-        if (_source.array()) {
-            _rebuilt.array()->append(std::move(child));
-        } else {
-            _rebuilt.dictionary()->set(entry().key, std::move(child));
-        }
-        ++_next;
-    }
-    const Value& rebuilt() const { return _rebuilt; }
-
-private:
-    const Dictionary::Entry& entry() const { return _source.dictionary()->begin()[static_cast<std::ptrdiff_t>(_next)]; }
-
-    const Value& _source;
-    Value _rebuilt;
-    std::size_t _next = 0;
-};
+/// A child in its parent's simplified form.
+Value simplifiedChild(const Value& child) {
+    Value processed = GSMLogGenerator::processObject(child);
+    Value collapsed = GSMLogGenerator::canCollapse(processed);
+    return collapsed ? collapsed : processed;
+}
 
 }  // namespace
 
@@ -55,25 +23,23 @@ Value GSMLogGenerator::canCollapse(const Value& object) {
     return dictionary && dictionary->size() == 1 ? dictionary->begin()->value : Value();
 }
 
-// The open nodes stand in a list of their own, not on the call stack, which a deep tree would exhaust.
 Value GSMLogGenerator::processObject(const Value& object) {
     if (object.string() != nullptr) return object;
-    std::vector<OpenNode> open;
-    open.emplace_back(object);
-    while (true) {
-        const Value* child = open.back().nextChild();
-        if (child != nullptr && child->string() == nullptr) {
-            open.emplace_back(*child);
-        } else if (child != nullptr) {
-            open.back().add(*child);
-        } else {
-            const Value done = open.back().rebuilt();
-            open.pop_back();
-            if (open.empty()) return done;  // the top is never collapsed
-            const Value collapsed = canCollapse(done);
-            open.back().add(collapsed ? collapsed : done);
-        }
+    if (object.dictionary()) {
+        const DictionaryRef simplified = Dictionary::make();
+        for (const auto& [key, child] : *object.dictionary()) simplified->set(key, simplifiedChild(child));
+        return simplified;
     }
+    if (object.array()) {
+        const ArrayRef simplified = Array::make();
+        // Intended: every array loses its first element.
+        for (std::size_t i = 1; i < object.array()->size(); ++i) {
+            simplified->append(simplifiedChild((*object.array())[i]));
+        }
+        return simplified;
+    }
+    throw AssertionFailure("processObject:", kSource, 78,
+                           "Unknown object of type " + std::string(kindName(object.kind())) + " encountered");
 }
 
 void GSMLogGenerator::updateState(Dictionary& state, ByteView data) {

@@ -11,9 +11,9 @@ class GSMLogGenerator final : public LogGenerator {
 public:
     static std::unique_ptr<LogGenerator> generator() { return std::make_unique<GSMLogGenerator>(); }
 
-    /// The tree without its one-entry dictionaries below the top, and without the first element of every array. Takes a
-    /// tree of any depth. Throws AssertionFailure for a value that is neither dictionary, array nor string; the
-    /// elements that are dropped are not looked at.
+    /// The tree without its one-entry dictionaries below the top, and without the first element of every array.
+    /// Recursive: a tree that was read is at most `kMaxPropertyListDepth` deep. Throws AssertionFailure for a value
+    /// that is neither dictionary, array nor string; the elements that are dropped are not looked at.
     static Value processObject(const Value& object);
     /// The value of a dictionary's only entry; none for anything else.
     static Value canCollapse(const Value& object);

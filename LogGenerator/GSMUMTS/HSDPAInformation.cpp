@@ -1,6 +1,5 @@
 #include "LogGenerator/GSMUMTS/HSDPAInformation.h"
 
-#include "LogGenerator/RowWriter.h"
 #include "platform/Environment.h"
 
 namespace kelvo {
@@ -43,7 +42,9 @@ void HSDPAInformation::updateWithData(ByteView data, LogCode logCode) {
 
 void HSDPAInformation::showProcesses(Key key, ByteView data, std::size_t start, std::size_t count) {
     if (count == 0 || !values()) return;
-    showRows(ownArray(values()->slot(key)), data, start, count, kProcess);
+    const ArrayRef processes = Array::make();
+    showRows(processes, data, start, count, kProcess);
+    values()->set(key, processes);
 }
 
 }  // namespace kelvo

@@ -71,14 +71,14 @@ void ServingPLMN::showServing(ByteView data) {
     };
     values()->slot("Mobile Country Code").text() = {digit(15, 0), digit(15, 4), digit(16, 0)};
     values()->slot("Mobile Network Code").text() = {digit(17, 0), digit(17, 4), digit(16, 4)};
-    show(data, kServing);
+    showFields(*values(), record, 0, kServing.fields);
 }
 
 void ServingPLMN::showCellArray(ByteView data) {
     const ArrayRef cells = cellInfoArray(data);
     if (!cells) return;
     const auto serving = std::find_if(cells->begin(), cells->end(), isServing);
-    if (serving != cells->end() && values()) showCell(*values(), *serving->dictionary(), kCell);
+    if (serving != cells->end()) showCell(values(), *serving->dictionary(), kCell);
 }
 
 }  // namespace kelvo

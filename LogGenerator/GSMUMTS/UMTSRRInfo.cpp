@@ -41,6 +41,8 @@ constexpr CellField kServingCell[] = {
 };
 // clang-format on
 
+constexpr NumberFormat kTransmitPower = "%4.2lf dBm";
+
 }  // namespace
 
 void UMTSRRInfo::updateWithData(ByteView data, LogCode logCode) {
@@ -67,9 +69,8 @@ void UMTSRRInfo::showTransmitPower(ByteView data) {
         sum += static_cast<double>((raw + 512) / 10 - 70);
         ++count;
     }
-    // Intended: without an entry that counts, 0/0 shows as printf has it. Not through printf: its decimal point moves
-    // with the locale.
-    values()->slot("Transmit Power").text() = fmt::sprintf("%4.2lf dBm", sum / count);
+    // Intended: without an entry that counts, 0/0 is shown.
+    showReal(values()->slot("Transmit Power"), sum / count, kTransmitPower);
 }
 
 }  // namespace kelvo

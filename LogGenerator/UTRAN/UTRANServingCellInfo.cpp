@@ -38,10 +38,10 @@ void UTRANServingCellInfo::updateWithData(ByteView data, LogCode logCode) {
 
 void UTRANServingCellInfo::showCellArray(ByteView data) {
     const Value payload = cellInfo(data);
-    if (!payload.array() || !values()) return;
+    if (!payload.array()) return;
     for (const Value& cell : *payload.array()) {  // every serving cell; the last one shows
         if (isCell(cell, kPLCellMonitorRadioAccessTechnologyUTRAN2, kPLCellMonitorCellTypeServing)) {
-            showCell(*values(), *cell.dictionary(), kCell);
+            showCell(values(), *cell.dictionary(), kCell);
         }
     }
 }

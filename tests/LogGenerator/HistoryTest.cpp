@@ -1,11 +1,14 @@
 #include <gtest/gtest.h>
 
+#include "LogGenerator/FieldTable.h"
 #include "LogGenerator/LogGenerator.h"
 #include "platform/Environment.h"
 #include "tests/support/ManualClock.h"
 
 namespace kelvo {
 namespace {
+
+constexpr auto kCell = entry(1, {{0, u8, "ID", decimal}});
 
 class History : public testing::Test {
 protected:
@@ -43,6 +46,20 @@ TEST_F(History, TakesACopyOfWhatTheScreensShowWithItsDate) {
     EXPECT_EQ((*history())[0], expected);
 }
 
+TEST_F(History, KeepsTheRowsThatNobodyHasReadYet) {
+    const ArrayRef list = Array::make();
+    showRows(list, Bytes{7}, 0, 1, kCell);
+    state.set("DisplayState", Bytes{1});
+    state.set("Display", Dictionary::make({{"Cells", list}}));
+    state.set("ExtraInfo", Dictionary::make());
+    LogGenerator::updateHistoryInState(state);
+    showRows(list, Bytes{8}, 0, 1, kCell);
+
+    const DictionaryRef snapshot = (*history())[0].dictionary();
+    EXPECT_EQ((*(*snapshot)["Display"].dictionary())["Cells"], Value(Array::make({Dictionary::make({{"ID", "7"}})})));
+    EXPECT_EQ(Value(list), Value(Array::make({Dictionary::make({{"ID", "8"}})})));
+}
+
 TEST_F(History, EndsASnapshotAtTheFirstValueThatIsAbsent) {
     LogGenerator::updateHistoryInState(state);
     state.set("DisplayState", Bytes{1});
@@ -72,9 +89,12 @@ TEST_F(History, DropsTheOldestOfFive) {
 
 TEST_F(History, DropsThreeOfSeven) {
     fill(7);
+    state.set("DisplayState", Bytes{1});
     LogGenerator::updateHistoryInState(state);
-    EXPECT_EQ(history()->size(), 5U);
+    ASSERT_EQ(history()->size(), 5U);
     EXPECT_EQ(description(0), "3");
+    EXPECT_EQ(description(3), "6");
+    EXPECT_EQ((*history())[4], Value(Dictionary::make({{"DisplayState", Bytes{1}}})));  // the newest
 }
 
 }  // namespace

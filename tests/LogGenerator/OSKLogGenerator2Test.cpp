@@ -115,16 +115,26 @@ TEST_F(TemplateGenerator, DropsShortMessagesSilently) {
 }
 
 TEST_F(TemplateGenerator, TakesLogTypesOneAndTwoHundredFiftyFiveAlone) {
-    Bytes packet = Record(0x0010, 20).bytes();
-    packet[0] = 254;
-    generator.updateState(state, packet);
+    generator.updateState(state, Record(0xB0C2, 38).bytes());
+    generator.updateState(state, Record(0xB0C2, 40).u8(0, 254).bytes());
     EXPECT_TRUE(logged(3, "Invalid log type: fe. Dropping."));
-    packet[0] = 0;
-    generator.updateState(state, packet);
+    generator.updateState(state, Record(0xB0C2, 42).u8(0, 0).bytes());
     EXPECT_TRUE(logged(3, "Invalid log type: 0. Dropping."));
-    packet[0] = 255;
-    generator.updateState(state, packet);
+    EXPECT_EQ(cellShows("45250"), "38");
+    EXPECT_EQ(*(*(*display())["Power"].dictionary())["45250"].string(), "38");
+    generator.updateState(state, Record(0x0010, 20).u8(0, 255).bytes());
     EXPECT_EQ(cellShows("16711696"), "20");  // 0xff0010
+}
+
+TEST_F(TemplateGenerator, KeepsAPacketOfAnotherLogTypeInTheRawLog) {
+    Bytes expected;
+    for (const std::uint32_t type : {254U, 0U}) {
+        const Bytes packet = Record(0xB0C2, 38).u8(0, type).bytes();
+        generator.updateState(state, packet);
+        expected.insert(expected.end(), packet.begin(), packet.end());
+    }
+    generator.generateLogUsingState(state);
+    EXPECT_EQ(*state["DisplayState"].data(), expected);
 }
 
 TEST_F(TemplateGenerator, KeepsARecordThatNobodySubscribedToInTheRawLog) {
@@ -166,6 +176,13 @@ TEST_F(TemplateGenerator, DecodesWhatItsRawLogHasNoRoomForAndCountsIt) {
     EXPECT_FALSE(logged(3, "The raw log was full: it lacks 3 records"));
 }
 
+TEST_F(TemplateGenerator, ForgetsTheRecordsThatANewLimitHasNoRoomFor) {
+    generator.updateState(state, Record(0xB0C2, 38).bytes());
+    generator.limitRawLog(37);
+    generator.generateLogUsingState(state);
+    EXPECT_TRUE(state["DisplayState"].data()->empty());
+}
+
 TEST_F(TemplateGenerator, LeavesTheTemplateItselfUntouched) {
     generator.updateState(state, Record(0xB0C2, 38).bytes());
     const Value& placeholder =
@@ -205,7 +222,10 @@ TEST_F(TemplateGenerator, RefusesATemplateWithNumbers) {
         log.clear();
         EXPECT_THROW(generator.processTemplate(Dictionary::make({{"Cell", odd}})), std::invalid_argument);
         EXPECT_EQ(log.lines(), (std::vector<test::RecordingLog::Line>{{3, "Received an object of unknown type"},
-                                                                      {4, "Processing the template"}}));
+                                                                      {4, "Processing the template"},
+                                                                      {4, "Cell"}}));  // bound before it is stored
+        EXPECT_THROW(generator.processTemplate(Array::make({odd})), std::invalid_argument);
+        EXPECT_FALSE(generator.processTemplate(odd));
     }
 }
 

@@ -2,6 +2,8 @@
 
 #include <gtest/gtest.h>
 
+#include <chrono>
+
 #include "LogGenerator/DLFVersionReport.h"
 #include "platform/Environment.h"
 #include "tests/support/ManualClock.h"
@@ -24,6 +26,23 @@ DictionaryRef snapshot(Value displayState) {
 }
 
 std::string textAt(const Bytes& bytes, std::size_t at) { return reinterpret_cast<const char*>(bytes.data() + at); }
+
+/// `size` bytes from offset `at` on.
+Bytes part(const Bytes& bytes, std::ptrdiff_t at, std::ptrdiff_t size) {
+    return {bytes.begin() + at, bytes.begin() + at + size};
+}
+
+/// A zone 4 h 56 min 2 s west of UTC that does not know whether daylight-saving time is in effect.
+class MeanTime final : public Clock {
+public:
+    TimePoint now() const override { return {}; }
+    std::tm local(TimePoint) const override {
+        std::tm broken{};
+        broken.tm_gmtoff = -17762;
+        broken.tm_isdst = -1;
+        return broken;
+    }
+};
 
 class Dlf : public testing::Test {
 protected:
@@ -52,6 +71,23 @@ TEST_F(Dlf, BeginsWithTheVersionReport) {
     put(85, {0xD4, 0xFE});              // -300 minutes
     put(87, {1});                       // daylight saving
     EXPECT_EQ(bytes, expected);
+}
+
+TEST_F(Dlf, TellsAZoneEastOfUtcWithoutDaylightSaving) {
+    const test::ManualClock east{0, 345, false};
+    const Environment::Scope there({.clock = &east});
+    EXPECT_EQ(part(dlf(), 85, 3), (Bytes{0x59, 0x01, 0}));
+}
+
+TEST_F(Dlf, CutsTheSecondsOfAZoneTowardsZero) {
+    const MeanTime west;
+    const Environment::Scope there({.clock = &west});
+    EXPECT_EQ(part(dlf(), 85, 3), (Bytes{0xD8, 0xFE, 0}));  // -296 minutes
+}
+
+TEST_F(Dlf, DropsTheFractionOfASecond) {
+    clock.advance(std::chrono::milliseconds(900));
+    EXPECT_EQ(part(dlf(), 81, 4), (Bytes{0x46, 0xAF, 0x70, 0x4D}));
 }
 
 TEST_F(Dlf, SaysThatTheApplicationHasNoVersion) {
@@ -109,6 +145,20 @@ TEST_F(Dlf, CutsTextsToTheirFields) {
     EXPECT_EQ(textAt(buffer, 63), std::string(17, 'x'));
     EXPECT_EQ(buffer[12], 2);
     EXPECT_EQ(buffer[14], 3);
+}
+
+TEST_F(Dlf, LeavesTheFieldsOfEmptyTextsEmpty) {
+    Bytes buffer(161, 0xFF);
+    std::size_t written = 0;
+    EXPECT_EQ(DLFAddVersionReport(buffer.data(), buffer.size(), written, 1, 1, {}, {}, {}, {}), kDLFSuccess);
+    EXPECT_EQ(part(buffer, 16, 65), Bytes(65));
+}
+
+TEST_F(Dlf, WritesVersionNumbersLowByteFirst) {
+    Bytes buffer(161);
+    std::size_t written = 0;
+    EXPECT_EQ(DLFAddVersionReport(buffer.data(), buffer.size(), written, 0x0102, 0x0304, "", "", "", {}), kDLFSuccess);
+    EXPECT_EQ(part(buffer, 12, 4), (Bytes{2, 1, 4, 3}));
 }
 
 TEST_F(Dlf, RefusesABufferThatIsTooSmall) {

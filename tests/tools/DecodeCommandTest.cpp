@@ -170,6 +170,8 @@ TEST_F(DecodeCommand, SavesTheHistoryAndTheDlfWithAnEmptyDescription) {
     ASSERT_EQ(data.size(), 2U);
     EXPECT_EQ((*data[0].dictionary())["DisplayState"], Value(message));
     EXPECT_EQ((*data[1].dictionary())["Description"], Value("DLF binary (198 bytes)"));  // 161 + 38 - 1
+    const Bytes& dlf = *(*data[1].dictionary())["DLF"].data();
+    EXPECT_EQ(std::string(dlf.begin() + 16, dlf.begin() + 22), "Kelvo ");  // and the version that the window would name
 }
 
 TEST_F(DecodeCommand, SaysWhyASnapshotCannotBeSaved) {

@@ -120,6 +120,34 @@ TEST(C2K1xStatus, ChangesNothingWhenASubpacketIsMissing) {
     EXPECT_TRUE(screen.state["TrafficFER"]);
 }
 
+TEST(C2K1xStatus, KeepsEveryValueOfACompleteRecordWhenTheFingersAreMissing) {
+    C2KScreen screen(complete(8));
+    screen.state.set("TrafficFER", 0.5);
+    screen.feed(Subpackets(0x119c)
+                    .add(1, 8)
+                    .u8(4, 6)
+                    .add(2, 16)
+                    .u8(4, 2)
+                    .u8(5, 2)
+                    .u16(6, 999)
+                    .u16(8, 999)
+                    .add(3, 26)
+                    .u8(8, 1)
+                    .u16(12, 7));
+    EXPECT_EQ(screen.log(), (Lines{{4, "Log code 0x119c: missing subpacket (ss=1,rf=1,ai=1,fi=0)."}}));
+    EXPECT_EQ(screen["k1xDeviceState"], "Traffic [8]");
+    EXPECT_EQ(screen["k1xRx0BandClass"], "1.8 to 2.0GHz PCS band [1]");
+    EXPECT_EQ(screen["k1xRx0ChanNum"], "325");
+    EXPECT_EQ(screen["k1xRxAGC0"], "-96.65 dBm");
+    EXPECT_EQ(screen["k1xRx1BandClass"], "Secondary 800 MHz band [10]");
+    EXPECT_EQ(screen["k1xRx1ChanNum"], "65535");
+    EXPECT_EQ(screen["k1xRxAGC1"], "-29.85 dBm");
+    EXPECT_EQ(screen["k1xTxAGC"], "+23.50 dBm");
+    EXPECT_EQ(*screen.list("k1xActiveSetInfo"), *Dictionary::make({{"_sorted", "_sorted"}}));
+    EXPECT_EQ(screen["k1xTrafficFER"], "(absent)");
+    EXPECT_EQ(screen.state["TrafficFER"], Value(0.5));
+}
+
 TEST(C2K1xStatus, LooksForEachSubpacketEvenWhenASizeIsBad) {
     Record record = complete(8);
     record.u16(17 + 8 + 16 + 2, 0xFFFF);  // of the active set, which 3 and 4 have to pass

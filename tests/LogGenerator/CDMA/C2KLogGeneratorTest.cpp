@@ -4,6 +4,7 @@
 
 #include "platform/TelephonyConstants.h"
 #include "tests/support/C2KScreen.h"
+#include "tests/support/FakeResources.h"
 
 namespace kelvo {
 namespace {
@@ -12,22 +13,14 @@ using test::C2KScreen;
 using test::Lines;
 using test::Record;
 
-/// Resources with one template, or none.
-class OneTemplate final : public Resources {
-public:
-    Result<DictionaryRef> dictionary(std::string_view name) const override {
-        ++loads;
-        if (name != "C2KTemplate" || !content) return Failure{"not found"};
-        return content;
-    }
-    std::vector<std::string> pathsOfType(std::string_view) const override { return {}; }
-
-    DictionaryRef content = Dictionary::make({{"EV-DO", Dictionary::make({{"Channel", "kChannel"}})}});
-    mutable int loads = 0;
-};
-
 class C2KGeneratorState : public testing::Test {
 protected:
+    C2KGeneratorState() { installTemplate(); }
+
+    void installTemplate() {
+        resources.dictionaries["C2KTemplate"] =
+            Dictionary::make({{"EV-DO", Dictionary::make({{"Channel", "kChannel"}})}});
+    }
     Lines lines() {
         Lines taken = log.lines();
         log.clear();
@@ -39,7 +32,7 @@ protected:
     }
 
     test::RecordingLog log;
-    OneTemplate resources;
+    test::FakeResources resources;
     Environment::Scope environment{{.log = &log, .resources = &resources}};
     Dictionary state;
 };
@@ -102,7 +95,7 @@ TEST_F(C2KGeneratorState, HasADisplayFromTheFirstCallOn) {
     const Value display = C2KLogGenerator::getDisplayFromState(state);
     EXPECT_EQ(*display.dictionary(), *Dictionary::make({{"EV-DO", Dictionary::make({{"Channel", ""}})}}));
     EXPECT_EQ(state["Display"].dictionary(), display.dictionary());
-    EXPECT_EQ(state["Template"].dictionary(), resources.content);
+    EXPECT_EQ(state["Template"].dictionary(), resources.dictionaries["C2KTemplate"]);
     EXPECT_EQ(state["ExtraInfo"], Value(Dictionary::make()));
     EXPECT_EQ(state["Lookup"].dictionary()->size(), 1U);
     EXPECT_EQ(C2KLogGenerator::getDisplayFromState(state).dictionary(), display.dictionary());
@@ -116,7 +109,7 @@ TEST_F(C2KGeneratorState, IsAskedForItsTemplateFirst) {
 }
 
 TEST_F(C2KGeneratorState, StaysWithoutADisplayUntilTheTemplateLoads) {
-    resources.content = nullptr;
+    resources.dictionaries.clear();
     C2KLogGenerator generator;
     log.clear();
     generator.updateState(state, status(5).bytes());
@@ -126,7 +119,7 @@ TEST_F(C2KGeneratorState, StaysWithoutADisplayUntilTheTemplateLoads) {
     EXPECT_EQ(state["DisplayState"], Value(status(5).bytes()));
     EXPECT_FALSE(state["Lookup"]);
 
-    resources.content = Dictionary::make({{"EV-DO", Dictionary::make({{"Channel", "kChannel"}})}});
+    installTemplate();
     generator.updateState(state, status(6).bytes());
     EXPECT_EQ(channel(), "6");
 }

@@ -2,8 +2,6 @@
 
 #include <gtest/gtest.h>
 
-#include <functional>
-
 #include "LogGenerator/AssertionFailure.h"
 #include "platform/Environment.h"
 #include "platform/PropertyList.h"
@@ -63,40 +61,23 @@ TEST(GSMLogGenerator, CollapsesADictionaryOfOneEntryAlone) {
     }
 }
 
-/// A tree under construction or destruction, one level at a time: the call stack never sees its depth.
-class DeepTree {
-public:
-    explicit DeepTree(const std::function<Value(Value)>& wrap) {
-        Value tree("leaf");
-        for (int i = 0; i < 10000; ++i) tree = wrap(std::move(tree));
-        top = std::move(tree);
+TEST(GSMLogGenerator, TakesTreesAsDeepAsPropertyListsReach) {
+    Value chain = "leaf";
+    Value nest = "leaf";
+    for (int i = 0; i < 512; ++i) {
+        chain = dict({{"k", chain}});
+        nest = list({"header", nest});
     }
-    ~DeepTree() { dismantle(top); }
-    DeepTree(const DeepTree&) = delete;
-    DeepTree& operator=(const DeepTree&) = delete;
+    EXPECT_EQ(simplified(chain), dict({{"k", "leaf"}}));
 
-    static void dismantle(Value& tree) {
-        while (tree.array() || tree.dictionary()) {
-            Value inner = tree.array() ? (*tree.array())[tree.array()->size() - 1] : tree.dictionary()->begin()->value;
-            if (tree.array()) tree.array()->clear();
-            if (tree.dictionary()) tree.dictionary()->clear();
-            tree = std::move(inner);
-        }
-    }
-
-    Value top;
-};
-
-TEST(GSMLogGenerator, TakesTreesOfTenThousandLevels) {
-    const DeepTree chain([](Value inner) { return dict({{"k", std::move(inner)}}); });
-    EXPECT_EQ(simplified(chain.top), dict({{"k", "leaf"}}));
-
-    const DeepTree nest([](Value inner) { return list({"header", std::move(inner)}); });
-    Value result = simplified(nest.top);
+    Value inner = simplified(nest);
     int depth = 0;
-    for (Value inner = result; inner.array(); inner = Value((*inner.array())[0])) ++depth;
-    EXPECT_EQ(depth, 10000);
-    DeepTree::dismantle(result);
+    for (; inner.array(); ++depth) {
+        ASSERT_EQ(inner.array()->size(), 1U);
+        inner = Value((*inner.array())[0]);
+    }
+    EXPECT_EQ(depth, 512);
+    EXPECT_EQ(inner, Value("leaf"));
 }
 
 class CellMonitor : public testing::Test {
@@ -138,6 +119,13 @@ TEST_F(CellMonitor, ReadsEveryEncoding) {
     EXPECT_EQ(state["Display"], dict({{"a", "b"}}));
     feedText("\"a bare text\"");
     EXPECT_EQ(state["Display"], Value("a bare text"));
+}
+
+TEST_F(CellMonitor, ShowsABareTextAsTheWholeDisplay) {
+    feedText("<plist><string>A</string></plist>");
+    EXPECT_EQ(state["DisplayState"], Value("A"));
+    EXPECT_EQ(state["Display"], Value("A"));
+    EXPECT_EQ(generator.generateLogUsingState(state), Value("A"));
 }
 
 TEST_F(CellMonitor, ReplacesTheWholeDisplayWithEachMessage) {

@@ -74,6 +74,19 @@ TEST(GSMServingCell, ChangesNothingWithoutAServingGsmCell) {
                                     {3, "Failed to get Cell Array\n"}}));
 }
 
+TEST(GSMServingCell, KeepsItsValuesWhenACellArrayHasNoServingGsmCell) {
+    Fed<GSMServingCell> section(Record(0x5134, 26).u16(13, 975).u16(15, 42).u16(17, 4711));
+    section.feed(cellArray({cell("GSM", "Serving", {{"kPLCellMonitorCellId", 4712}, {"kPLCellMonitorARFCN", 976}})}));
+    const Value before = section.part().copy();
+    section.clearLog();
+    for (const Value& other : {cell("GSM", "Neighbor", {{"kPLCellMonitorCellId", 1}, {"kPLCellMonitorARFCN", 2}}),
+                               cell("UMTS", "Serving", {{"kPLCellMonitorCellId", 3}, {"kPLCellMonitorARFCN", 4}})}) {
+        section.feed(cellArray({other}));
+    }
+    EXPECT_EQ(section.part(), before);
+    EXPECT_EQ(section.log(), (Lines(2, {4, "GSMServingCell"})));
+}
+
 TEST(GSMServingCell, IgnoresShortRecordsAndReportsACodeOfOthers) {
     Fed<GSMServingCell> section(Record(0x5134, 25));
     section.feed(Record(0x5137, 28));

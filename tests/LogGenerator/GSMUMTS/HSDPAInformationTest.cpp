@@ -2,6 +2,8 @@
 
 #include <gtest/gtest.h>
 
+#include <memory>
+
 #include "tests/support/Fed.h"
 #include "tests/support/Shows.h"
 
@@ -62,6 +64,12 @@ TEST(HSDPAInformation, ReadsTheSecondaryCarrierBehindAGap) {
     EXPECT_EQ(list(section, kSecondary), Value(Array::make({process("3", "7", "0", "0")})));
 }
 
+TEST(HSDPAInformation, WidensTheGapWithEveryPrimaryProcess) {
+    Fed<HSDPAInformation> section(Record(0x4221, 360).u8(16, 2).u8(17, 2).u8(342, 7).u8(351, 8).u8(180, 99));
+    EXPECT_EQ(list(section, kSecondary),
+              Value(Array::make({process("7", "0", "0", "0"), process("8", "0", "0", "0")})));
+}
+
 TEST(HSDPAInformation, ReadsTheSecondaryCarrierAtTheStartWithoutAPrimaryOne) {
     Fed<HSDPAInformation> section(Record(0x4221, 27).u8(17, 1).u8(18, 9));
     EXPECT_EQ(list(section, kSecondary), Value(Array::make({process("9", "0", "0", "0")})));
@@ -78,12 +86,31 @@ TEST(HSDPAInformation, KeepsTheListsThatARecordDoesNotCarry) {
     EXPECT_EQ(list(section, kPrimary).array(), before.array());
 }
 
-TEST(HSDPAInformation, StoresNewLists) {
-    Fed<HSDPAInformation> section(Record(0x4221, 27).u8(16, 1));
-    const Value before = list(section, kPrimary);
-    section.feed(Record(0x4221, 27).u8(16, 1).u8(18, 4));
-    EXPECT_EQ(before, Value(Array::make({process("0", "0", "0", "0")})));
-    EXPECT_EQ(list(section, kPrimary), Value(Array::make({process("4", "0", "0", "0")})));
+/// One process on each carrier.
+Record bothCarriers(std::uint32_t primaryId, std::uint32_t secondaryId) {
+    return Record(0x4221, 189).u8(16, 1).u8(17, 1).u8(18, primaryId).u8(180, secondaryId);
+}
+
+TEST(HSDPAInformation, LeavesTheListsOfAnEarlierRecordToTheirHolders) {
+    Fed<HSDPAInformation> section(bothCarriers(1, 2));
+    const ArrayRef primary = list(section, kPrimary).array();
+    const ArrayRef secondary = list(section, kSecondary).array();
+    section.feed(bothCarriers(3, 4));
+    EXPECT_EQ(Value(primary), Value(Array::make({process("1", "0", "0", "0")})));
+    EXPECT_EQ(Value(secondary), Value(Array::make({process("2", "0", "0", "0")})));
+    EXPECT_NE(list(section, kPrimary).array(), primary);
+    EXPECT_NE(list(section, kSecondary).array(), secondary);
+    EXPECT_EQ(list(section, kPrimary), Value(Array::make({process("3", "0", "0", "0")})));
+    EXPECT_EQ(list(section, kSecondary), Value(Array::make({process("4", "0", "0", "0")})));
+}
+
+TEST(HSDPAInformation, StoresNewListsEvenWhereNobodyHoldsTheOldOnes) {
+    Fed<HSDPAInformation> section(bothCarriers(1, 2));
+    const std::weak_ptr<Array> primary = list(section, kPrimary).array();
+    const std::weak_ptr<Array> secondary = list(section, kSecondary).array();
+    section.feed(bothCarriers(1, 2));
+    EXPECT_TRUE(primary.expired());
+    EXPECT_TRUE(secondary.expired());
 }
 
 TEST(HSDPAInformation, MakesUpNoProcessesBeyondTheEnd) {

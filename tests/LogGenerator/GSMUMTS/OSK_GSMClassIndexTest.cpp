@@ -4,6 +4,9 @@
 
 #include <algorithm>
 
+#include "platform/Environment.h"
+#include "tests/support/RecordingLog.h"
+
 namespace kelvo {
 namespace {
 
@@ -58,6 +61,17 @@ TEST(OSK_GSMClassIndex, HoldsItsSectionsByNameWithTheirCodes) {
         const auto codes = section->getLogCodeArray();
         EXPECT_EQ(std::vector<LogCode>(codes.begin(), codes.end()), row.codes) << row.name;
     }
+}
+
+TEST(OSK_GSMClassIndex, SaysOfEachSectionInTurnHowManyCodesItHas) {
+    test::RecordingLog log;
+    const Environment::Scope environment({.log = &log});
+    const OSK_GSMClassIndex index;
+    std::vector<test::RecordingLog::Line> expected;
+    for (int codes : {1, 0, 7, 4, 1, 3, 1, 2, 0, 0, 1, 1, 0, 2, 3, 2, 1, 4, 1, 0, 2, 5, 1, 1, 1, 1}) {
+        expected.emplace_back(4, "Array Count: " + std::to_string(codes));
+    }
+    EXPECT_EQ(log.lines(), expected);
 }
 
 TEST(OSK_GSMClassIndex, OffersARecordToItsSectionsInTheirOrder) {

@@ -187,8 +187,42 @@ TEST_F(OSK_GSM, FillsEveryListThatHasRecords) {
         EXPECT_TRUE(section(name).array()->empty()) << name;
     }
     for (const char* name : {"Coding Scheme", "Cell Change Counters", "UMTS RR Measurement"}) {
-        EXPECT_EQ(shown(name, "Status"), "not reported by the modem") << name;
+        EXPECT_EQ(section(name), Value(Dictionary::make())) << name;  // nothing that a record could fill
     }
+}
+
+TEST_F(OSK_GSM, OffersASearcherRecordToFourSectionsThatShowItEachInItsOwnPlace) {
+    OSK_GSMLogGenerator generator;
+    generator.generateLogUsingState(state);
+    for (const char* name : {"Active Set", "Detected Set", "Monitored Set", "Virtual Active Set"}) {
+        section(name).array()->append("row");
+    }
+    log.clear();
+    generator.updateState(state, Record(0x417a, 75)
+                                     .u16(13, static_cast<std::uint32_t>(-700))
+                                     .u8(15, 1)
+                                     .u16(23, 301)    // of the active set
+                                     .u32(63, 90000)  // -8 dB
+                                     .bytes());
+    EXPECT_EQ(section("Active Set"),
+              Value(Array::make({Dictionary::make(
+                  {{"Scrambling Code", "301"}, {"RSCP", "-132 dB"}, {"Energy Per Chip", "-8 dB"}})})));
+    for (const char* name : {"Detected Set", "Monitored Set", "Virtual Active Set"}) {
+        EXPECT_EQ(section(name), Value(Array::make())) << name;
+    }
+    EXPECT_EQ(log.lines(), (std::vector<test::RecordingLog::Line>{
+                               {4, "ActiveSet"}, {4, "DetectedSet"}, {4, "MonitoredSet"}, {4, "VirtualActiveSet"}}));
+}
+
+TEST_F(OSK_GSM, IgnoresARecordThatNoSectionSubscribedTo) {
+    OSK_GSMLogGenerator generator;
+    generator.generateLogUsingState(state);
+    const Value before = display().copy();
+    ASSERT_TRUE(before);
+    log.clear();
+    for (LogCode code : {0x4222, 0xff4221}) generator.updateState(state, Record(code, 40).bytes());
+    EXPECT_EQ(display(), before);
+    EXPECT_TRUE(log.lines().empty());
 }
 
 TEST_F(OSK_GSM, ShowsTheSameMeasurementInTwoWays) {

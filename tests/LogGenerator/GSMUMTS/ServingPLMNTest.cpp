@@ -96,6 +96,28 @@ TEST(ServingPLMN, SaysThatACellLacksItsCountryCode) {
                                     {3, "ServingPLMN: Failed to retrieve LAC\n"}}));
 }
 
+TEST(ServingPLMN, KeepsTheCodesThatALaterCellLacks) {
+    Fed<ServingPLMN> section(cellArray(
+        {cell("GSM", "Serving", {{"kPLCellMonitorMCC", 262}, {"kPLCellMonitorMNC", 1}, {"kPLCellMonitorLAC", 4566}})}));
+    section.clearLog();
+    section.feed(cellArray({cell("UMTS", "Serving", {{"kPLCellMonitorMNC", 2}})}));
+    EXPECT_EQ(section["Mobile Country Code"], "262");
+    EXPECT_EQ(section["Mobile Network Code"], "2");
+    EXPECT_EQ(section["Location Area Code"], "4566");
+    EXPECT_EQ(section.log(), (Lines{{4, "Serving PLMN"},
+                                    {3, "ServingPLMN: Failed to retrieve MCC\n"},
+                                    {3, "ServingPLMN: Failed to retrieve LAC\n"}}));
+}
+
+TEST(ServingPLMN, SaysWhatACellLacksEvenWithoutAPlaceOnTheScreen) {
+    Fed<ServingPLMN> section{Value()};
+    section.feed(cellArray({cell("GSM", "Serving")}));
+    EXPECT_EQ(section.log(), (Lines{{4, "Serving PLMN"},
+                                    {3, "ServingPLMN: Failed to retrieve MCC\n"},
+                                    {3, "ServingPLMN: Failed to retrieve MNC\n"},
+                                    {3, "ServingPLMN: Failed to retrieve LAC\n"}}));
+}
+
 TEST(ServingPLMN, IgnoresAnEmptyCellArrayAndReportsADamagedOne) {
     Fed<ServingPLMN> section(cellArray({}));
     EXPECT_EQ(section.log(), (Lines{{4, "Serving PLMN"}}));

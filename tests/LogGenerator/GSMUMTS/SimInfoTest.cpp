@@ -2,6 +2,10 @@
 
 #include <gtest/gtest.h>
 
+#include <array>
+#include <exception>
+#include <type_traits>
+
 #include "LogGenerator/UnknownDataException.h"
 #include "tests/support/CellArray.h"
 #include "tests/support/Fed.h"
@@ -15,6 +19,31 @@ using test::Record;
 using Lines = std::vector<test::RecordingLog::Line>;
 
 using test::payload;
+
+static_assert(std::is_empty_v<LogCode_0xFF0000::UnknownDataException>);
+static_assert(!std::is_base_of_v<std::exception, LogCode_0xFF0000::UnknownDataException>);
+
+struct File {
+    const char* name;
+    const char* label;
+};
+
+constexpr std::array<File, 14> kFiles = {{
+    {"kSimFile_ICCID", "EF-ICCID"},
+    {"kSimFile_MSISDN", "EF-MSISDN"},
+    {"kSimFile_MBDN", "EF-3GPP MAIL BOX DIALING NUMBER"},
+    {"kSimFile_HPPLMN", "EF-HPPLMN SEARCH PERIOD"},
+    {"kSimFile_LOCI", "EF-LOCI"},
+    {"kSimFile_PSLOCI", "EF-GPRS/PS-LOCI"},
+    {"kSimFile_ACC", "EF-ACCESS CONTROL CLASS"},
+    {"kSimFile_AD", "EF-ADMINISTRATIVE DATA"},
+    {"kSimFile_FPLMN", "EF-FPLMN"},
+    {"kSimFile_AHPLMN", "EF-ACTING HPLMN"},
+    {"kSimFile_RATMODE", "EF-RAT MODE"},
+    {"kSimFile_PNN", "EF-PLMN NETWORK NAME"},
+    {"kSimFile_OPL", "EF-OPERATOR PLMN LIST"},
+    {"kSimFile_OPLMNAcT", "EF-OPLMNAcT"},
+}};
 
 TEST(SimInfo, ShowsEveryFileAsItIs) {
     const Value pnn = Array::make({Dictionary::make({{"Name", "Net"}})});
@@ -47,8 +76,6 @@ TEST(SimInfo, ShowsEveryFileAsItIs) {
                                                       {"EF-PLMN NETWORK NAME", pnn},
                                                       {"EF-OPERATOR PLMN LIST", "13"},
                                                       {"EF-OPLMNAcT", "14"}})));
-    EXPECT_EQ(test::keysOf(section.part()).front(), "EF-ICCID");
-    EXPECT_EQ(test::keysOf(section.part()).back(), "EF-OPLMNAcT");
     EXPECT_EQ(section.log(), (Lines{{4, "SimInfo"}}));
 }
 
@@ -56,6 +83,19 @@ TEST(SimInfo, KeepsTheFilesThatARecordLacks) {
     Fed<SimInfo> section(payload(0xff0000, Dictionary::make({{"kSimFile_ICCID", "1"}, {"kSimFile_ACC", "7"}})));
     section.feed(payload(0xff0000, Dictionary::make({{"kSimFile_ICCID", "2"}})));
     EXPECT_EQ(section.part(), Value(Dictionary::make({{"EF-ICCID", "2"}, {"EF-ACCESS CONTROL CLASS", "7"}})));
+}
+
+TEST(SimInfo, UpdatesOneFileAndLeavesThirteenInTheirPlaces) {
+    const DictionaryRef files = Dictionary::make();
+    for (std::size_t i = kFiles.size(); i > 0; --i) files->set(kFiles[i - 1].name, std::to_string(i));  // backwards
+    Fed<SimInfo> section(payload(0xff0000, files));
+    section.feed(payload(0xff0000, Dictionary::make({{"kSimFile_ICCID", "x"}})));
+
+    std::vector<std::string> labels;
+    for (const File& file : kFiles) labels.emplace_back(file.label);
+    EXPECT_EQ(test::keysOf(section.part()), labels);
+    EXPECT_EQ(section["EF-ICCID"], "x");
+    for (std::size_t i = 1; i < kFiles.size(); ++i) EXPECT_EQ(section[kFiles[i].label], std::to_string(i + 1));
 }
 
 TEST(SimInfo, ThrowsForADamagedRecordAfterItsErrorLine) {

@@ -3,6 +3,8 @@
 #include <gtest/gtest.h>
 
 #include <cstdio>
+#include <initializer_list>
+
 #include "tests/support/CellArray.h"
 #include "tests/support/Fed.h"
 #include "tests/support/Shows.h"
@@ -16,6 +18,18 @@ using Lines = std::vector<test::RecordingLog::Line>;
 
 using test::cell;
 using test::cellArray;
+
+/// A record with one entry for each raw transmit power.
+Record transmitPowers(std::initializer_list<std::uint32_t> powers) {
+    Record record(0x4031, 16 + 14 * powers.size());
+    record.u8(14, static_cast<std::uint32_t>(powers.size()));
+    std::size_t at = 16 + 4;
+    for (std::uint32_t power : powers) {
+        record.u16(at, power);
+        at += 14;
+    }
+    return record;
+}
 
 TEST(UMTSRRInfo, NamesTheRadioStates) {
     test::expectNames<UMTSRRInfo>(0x4125, 14, 13, "RRC State",
@@ -45,6 +59,14 @@ TEST(UMTSRRInfo, TruncatesATransmitPowerTowardZero) {
     EXPECT_EQ(section["Transmit Power"], "-8.67 dBm");
     section.feed(Record(0x4031, 30).u8(14, 1).u16(20, 750));  // 126 - 70
     EXPECT_EQ(section["Transmit Power"], "56.00 dBm");
+}
+
+TEST(UMTSRRInfo, RoundsATransmitPowerBetweenTwoHundredthsToTheEvenOne) {
+    Fed<UMTSRRInfo> section;
+    section.feed(transmitPowers({110, 110, 110, 110, 110, 110, 110, 100}));
+    EXPECT_EQ(section["Transmit Power"], "-8.12 dBm");  // seven of -8 and one of -9: -8.125
+    section.feed(transmitPowers({100, 100, 100, 100, 100, 100, 100, 110}));
+    EXPECT_EQ(section["Transmit Power"], "-8.88 dBm");  // -8.875
 }
 
 TEST(UMTSRRInfo, ShowsNotANumberWhenNoTransmitPowerIsThere) {
@@ -88,6 +110,31 @@ TEST(UMTSRRInfo, TakesTheFirstServingUmtsCellOfTheCellArray) {
     EXPECT_EQ(section["UARFCN"], "10562");
     EXPECT_EQ(section["Scrambling Code"], "301");
     EXPECT_EQ(section.log(), (Lines{{4, "UMTSRRInfo"}}));
+}
+
+TEST(UMTSRRInfo, TakesNothingFromASecondServingCell) {
+    Fed<UMTSRRInfo> section(cellArray({
+        cell("UMTS", "Serving", {{"kPLCellMonitorSCN", 301}}),
+        cell("UMTS", "Serving", {{"kPLCellMonitorCellId", 3}, {"kPLCellMonitorUARFCN", 4}, {"kPLCellMonitorSCN", 5}}),
+    }));
+    EXPECT_EQ(section.part(), Value(Dictionary::make({{"Scrambling Code", "301"}})));
+    EXPECT_EQ(section.log(), (Lines{{4, "UMTSRRInfo"},
+                                    {3, "UMTSRRInfo: Failed to retrieve Cell ID\n"},
+                                    {3, "UMTSRRInfo: Failed to retrieve UARFCN\n"}}));
+}
+
+TEST(UMTSRRInfo, KeepsTheValuesThatALaterCellLacks) {
+    Fed<UMTSRRInfo> section(cellArray(
+        {cell("UMTS", "Serving",
+              {{"kPLCellMonitorCellId", 12345678}, {"kPLCellMonitorUARFCN", 10562}, {"kPLCellMonitorSCN", 301}})}));
+    section.clearLog();
+    section.feed(cellArray({cell("UMTS", "Serving", {{"kPLCellMonitorUARFCN", 10563}})}));
+    EXPECT_EQ(section["Cell ID"], "12345678");
+    EXPECT_EQ(section["UARFCN"], "10563");
+    EXPECT_EQ(section["Scrambling Code"], "301");
+    EXPECT_EQ(section.log(), (Lines{{4, "UMTSRRInfo"},
+                                    {3, "UMTSRRInfo: Failed to retrieve Cell ID\n"},
+                                    {3, "UMTSRRInfo: Failed to retrieve Scrambling Code\n"}}));
 }
 
 TEST(UMTSRRInfo, TakesItsOwnFrequenciesOverTheCellArraysUarfcn) {

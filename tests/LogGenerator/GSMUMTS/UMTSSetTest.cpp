@@ -51,6 +51,16 @@ TEST(UMTSSet, ShowsTheRanking) {
     EXPECT_EQ(section.log(), (Lines{{4, "UMTSSet"}}));
 }
 
+TEST(UMTSSet, ShowsTheEnergyInSignedHalves) {
+    Fed<UMTSSet> section(Value(Array::make()));
+    section.feed(Record(0x4005, 25).u8(13, 1).u8(22, 0xFF));
+    EXPECT_EQ(section.row(0, "Energy Per Chip"), "-0.500000 dB");
+    section.feed(Record(0x4005, 25).u8(13, 1).u8(22, 0x00));
+    EXPECT_EQ(section.row(0, "Energy Per Chip"), "0.000000 dB");
+    section.feed(Record(0x4005, 25).u8(13, 1).u8(22, 0x80));
+    EXPECT_EQ(section.row(0, "Energy Per Chip"), "-64.000000 dB");
+}
+
 TEST(UMTSSet, IsEmptiedByARankingWithoutUmtsCells) {
     Fed<UMTSSet> section(Value(Array::make({"row"})));
     section.feed(Record(0x4005, 40).u8(14, 3));

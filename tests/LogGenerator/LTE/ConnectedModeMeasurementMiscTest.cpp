@@ -3,6 +3,7 @@
 #include <gtest/gtest.h>
 
 #include "tests/support/Fed.h"
+#include "tests/support/Shows.h"
 
 namespace kelvo {
 namespace {
@@ -21,6 +22,9 @@ TEST(ConnectedModeMeasurementMisc, ShowsEveryField) {
     EXPECT_EQ(section["Subframe Number"], "9871");
     EXPECT_EQ(section["Serving Filtered RSRP"], "-109.25 dBm");
     EXPECT_EQ(section["Serving Filtered RSRQ"], "-10.38 dB");  // -10.375: the tie goes to the even digit
+    EXPECT_EQ(test::keysOf(section.part()),
+              (std::vector<std::string>{"E-ARFCN", "Serving Physical Cell ID", "Subframe Number",
+                                        "Serving Filtered RSRP", "Serving Filtered RSRQ"}));
     EXPECT_EQ(section.log(), (Lines{{4, kTitle}}));
 }
 

@@ -2,8 +2,10 @@
 
 #include <gtest/gtest.h>
 
+#include <algorithm>
 #include <set>
 
+#include "LogGenerator/LTE/LTEClassIndex.h"
 #include "platform/DirectoryResources.h"
 #include "platform/Environment.h"
 #include "tests/support/Record.h"
@@ -90,6 +92,15 @@ constexpr const char* kListScreens[] = {"Measured Neighbor Cells", "Detected Cel
 TEST_F(LTEScreens, HaveAPlaceForEverySection) {
     for (const char* name : kValueScreens) EXPECT_TRUE(screen(name)) << name;
     for (const char* name : kListScreens) EXPECT_TRUE(rows(name)) << name;
+}
+
+TEST_F(LTEScreens, HaveOnePlaceForEverySectionOfTheClassIndex) {
+    const LTEClassIndex index;
+    for (std::string_view name : index.getAllNames()) {
+        const RecordingLog::Line bound(4, name);  // written when a section is bound
+        EXPECT_EQ(std::count(log.lines().begin(), log.lines().end(), bound), 1) << name;
+        EXPECT_TRUE((*state["Display"].dictionary())[name]) << name;
+    }
 }
 
 TEST_F(LTEScreens, HaveAPlaceForEveryValueOfTheOrdinaryRecords) {

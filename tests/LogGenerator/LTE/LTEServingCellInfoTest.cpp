@@ -3,6 +3,7 @@
 #include <gtest/gtest.h>
 
 #include "tests/support/Fed.h"
+#include "tests/support/Shows.h"
 
 namespace kelvo {
 namespace {
@@ -45,6 +46,10 @@ TEST(LTEServingCellInfo, ShowsEveryFieldOfTheServingCell) {
     EXPECT_EQ(section["Cell Identity"], "12345678");
     EXPECT_EQ(section["Tracking Area Code"], "4566");
     EXPECT_EQ(section["Freq Band Indicator"], "17");
+    EXPECT_EQ(
+        test::keysOf(section.part()),
+        (std::vector<std::string>{"Physical Cell ID", "Download Frequency", "Upload Frequency", "Download Bandwidth",
+                                  "Upload Bandwidth", "Cell Identity", "Tracking Area Code", "Freq Band Indicator"}));
     EXPECT_EQ(section.log(), (Lines{{4, "LTE Serving Cell Info"}}));
 }
 
@@ -129,6 +134,38 @@ TEST(LTEServingCellInfo, TakesItsOwnFrequenciesOverTheCellArraysUarfcn) {
     ASSERT_EQ(section["UARFCN"], "5780");
     section.feed(Record(0xB0C2, 38));
     EXPECT_EQ(section["UARFCN"], "(absent)");
+}
+
+TEST(LTEServingCellInfo, KeepsTheCellArraysUarfcnWhenARecordIsOneByteShort) {
+    Fed<LTEServingCellInfo> section(cellArray(cell("LTE", "Serving", entry("kPLCellMonitorUARFCN", number(5780)))));
+    const Value before = section.part().copy();
+    section.feed(Record(0xB0C2, 37));
+    EXPECT_EQ(section["UARFCN"], "5780");
+    EXPECT_EQ(section.part(), before);
+}
+
+TEST(LTEServingCellInfo, KeepsItsValuesWhenACellArrayHasNoServingLteCell) {
+    Fed<LTEServingCellInfo> section(Record(0xB0C2, 38).u16(14, 301).u32(22, 99).u16(26, 4566));
+    section.feed(cellArray(cell("LTE", "Serving", entry("kPLCellMonitorUARFCN", number(5780)))));
+    ASSERT_EQ(section["UARFCN"], "5780");
+    const Value before = section.part().copy();
+    section.clearLog();
+    const std::string values = entry("kPLCellMonitorTAC", number(1)) + entry("kPLCellMonitorUARFCN", number(2));
+    section.feed(cellArray(cell("LTE", "Neighbor", values)));
+    section.feed(cellArray(cell("UMTS", "Serving", values)));
+    EXPECT_EQ(section.part(), before);
+    EXPECT_EQ(section.log(), (Lines(2, {4, "LTE Serving Cell Info"})));
+}
+
+TEST(LTEServingCellInfo, SaysWhatACellLacksEvenWithoutAPlaceOnTheScreen) {
+    Fed<LTEServingCellInfo> section{Value()};
+    section.feed(cellArray(cell("LTE", "Serving")));
+    EXPECT_EQ(section.log(), (Lines{{4, "LTE Serving Cell Info"},
+                                    {3, "Serving Cell Info: Failed to retrieve TAC\n"},
+                                    {3, "Serving Cell Info: Failed to retrieve Cell ID\n"},
+                                    {3, "Serving Cell Info: Failed to retrieve Physical Cell ID\n"},
+                                    {3, "Serving Cell Info: Failed to retrieve Freq Band Indicator\n"},
+                                    {3, "Serving Cell Info: Failed to retrieve UARFCN\n"}}));
 }
 
 TEST(LTEServingCellInfo, IgnoresAnArrayWithoutAServingLteCell) {

@@ -3,6 +3,7 @@
 #include <gtest/gtest.h>
 
 #include "tests/support/Fed.h"
+#include "tests/support/Shows.h"
 
 namespace kelvo {
 namespace {
@@ -52,6 +53,22 @@ TEST(ReselectionCandidatesList, ShowsTheFieldsOfEachTechnology) {
                                    {"Pilot", "508"}}));
     for (std::uint32_t type : {5u, 7u, 256u, 65535u}) {
         EXPECT_EQ(shown(cdma(type)), row({{"Candidate Priority", "5"}, {"Candidate RAT Type", "??"}})) << type;
+    }
+}
+
+TEST(ReselectionCandidatesList, ShowsTheFieldsInTheirOrder) {
+    const std::vector<std::string> fieldsByType[] = {{"E ARFCN", "Cell ID"},
+                                                     {"U ARFCN", "PSC"},
+                                                     {"ARFCN", "Band", "BSIC ID"},
+                                                     {"Band", "Channel", "Pilot"},
+                                                     {"Band", "Channel", "Pilot"}};
+    auto section = emptyList();
+    for (std::uint32_t type = 0; type < 5; ++type) {
+        std::vector<std::string> expected = {"Candidate Priority", "Candidate RAT Type"};
+        for (const std::string& key : fieldsByType[type]) expected.push_back(key);
+        section.feed(candidate(type));
+        ASSERT_EQ(section.rowCount(), 1U);
+        EXPECT_EQ(test::keysOf((*section.part().array())[0]), expected) << type;
     }
 }
 

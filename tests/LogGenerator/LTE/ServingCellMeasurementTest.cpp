@@ -3,6 +3,7 @@
 #include <gtest/gtest.h>
 
 #include "tests/support/Fed.h"
+#include "tests/support/Shows.h"
 
 namespace kelvo {
 namespace {
@@ -40,6 +41,12 @@ TEST(ServingCellMeasurement, ShowsEveryField) {
     EXPECT_EQ(section["S Non Intra Search"], "8 dBm");
     EXPECT_EQ(section["Measurement Rules Updated"], "True");
     EXPECT_EQ(section["Measurement Rules"], "9");
+    EXPECT_EQ(test::keysOf(section.part()),
+              (std::vector<std::string>{"Version", "E-ARFCN", "Physical Cell ID", "Serving Layer Priority",
+                                        "Measured RSRP", "Average RSRP", "Measured RSRQ", "Average RSRQ",
+                                        "Measured RSSI", "Qrxlevmin", "P_Max", "Max UE Tx Power", "Srxlev",
+                                        "Num of Consecutive DRX Cycles of S < 0", "S Intra Search",
+                                        "S Non Intra Search", "Measurement Rules Updated", "Measurement Rules"}));
     EXPECT_EQ(section.log(), (Lines{{4, "Serving Cell Measurements"}}));
 }
 

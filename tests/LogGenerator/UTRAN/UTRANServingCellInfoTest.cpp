@@ -3,6 +3,7 @@
 #include <gtest/gtest.h>
 
 #include "tests/support/Fed.h"
+#include "tests/support/Shows.h"
 
 namespace kelvo {
 namespace {
@@ -27,6 +28,13 @@ std::string cell(const std::string& technology, const std::string& type, const s
            "</string>" + more + "</dict>";
 }
 
+/// Reports one serving cell whose LAC is the XML element `lac`.
+Record cellWithLac(const std::string& lac) {
+    return cellArray(cell("UTRAN2", "Serving",
+                          "<key>kPLCellMonitorLAC</key>" + lac + number("CellId", 1) + number("BandInfo", 1) +
+                              number("SCN", 1) + number("UARFCN", 1)));
+}
+
 Record servingCell() {
     return Record(0xD0E2, 26).u8(14, 200).u8(15, 201).u16(17, 9400).u16(19, 10054).u32(21, 12345678).u8(25, 1);
 }
@@ -40,6 +48,13 @@ TEST(UTRANServingCellInfo, ShowsEveryField) {
     EXPECT_EQ(section["Cell ID"], "12345678");
     EXPECT_EQ(section["Allowed Access"], "Emergency Calls Only");
     EXPECT_EQ(section.log(), (Lines{{4, kTitle}}));
+}
+
+TEST(UTRANServingCellInfo, ShowsTheFieldsInTheirOrder) {
+    const Fed<UTRANServingCellInfo> section(servingCell());
+    EXPECT_EQ(test::keysOf(section.part()),
+              (std::vector<std::string>{"Cell Access Restrictions", "Cell ID", "Downlink UARFCN", "Uplink UARFCN",
+                                        "URA ID", "Allowed Access"}));
 }
 
 TEST(UTRANServingCellInfo, ReadsTheLowestBitAloneForTheAllowedAccess) {
@@ -99,6 +114,27 @@ TEST(UTRANServingCellInfo, SaysOnceWhichValueACellLacks) {
                                     {3, "Serving Cell Info: Failed to retrieve Cell ID\n"},
                                     {3, "Serving Cell Info: Failed to retrieve Freq Band Indicator\n"},
                                     {3, "Serving Cell Info: Failed to retrieve Cell Scrambling Code\n"},
+                                    {3, "Serving Cell Info: Failed to retrieve UARFCN\n"}}));
+}
+
+TEST(UTRANServingCellInfo, TakesWholeNumbersOfThirtyTwoSignedBitsAlone) {
+    Fed<UTRANServingCellInfo> section(cellWithLac("<integer>4566</integer>"));
+    for (const char* lac : {"<integer>2147483648</integer>", "<real>1.5</real>", "<true/>"}) {
+        section.clearLog();
+        section.feed(cellWithLac(lac));
+        EXPECT_EQ(section["Local Area Code"], "4566") << lac;
+        EXPECT_EQ(section.log(), (Lines{{4, kTitle}, {3, "Serving Cell Info: Failed to retrieve LAC\n"}})) << lac;
+    }
+    section.feed(cellWithLac("<integer>-2147483648</integer>"));
+    EXPECT_EQ(section["Local Area Code"], "-2147483648");
+}
+
+TEST(UTRANServingCellInfo, SaysWhichValueACellLacksWithoutAPartOfTheDisplay) {
+    Fed<UTRANServingCellInfo> section{Value()};
+    section.feed(cellArray(cell("UTRAN2", "Serving", number("LAC", 1) + number("SCN", 1))));
+    EXPECT_EQ(section.log(), (Lines{{4, kTitle},
+                                    {3, "Serving Cell Info: Failed to retrieve Cell ID\n"},
+                                    {3, "Serving Cell Info: Failed to retrieve Freq Band Indicator\n"},
                                     {3, "Serving Cell Info: Failed to retrieve UARFCN\n"}}));
 }
 

@@ -10,7 +10,6 @@
 #include "platform/TelephonyProtocol.h"
 #include "tests/ui/ScreenFixture.h"
 #include "ui/ActivityIndicator.h"
-#include "ui/Glyph.h"
 #include "ui/Theme.h"
 
 namespace kelvo {
@@ -153,41 +152,6 @@ TEST_F(Screen, WalksByKeys) {
     expectTop("Kelvo");
 }
 
-TEST_F(Screen, OpensTheSaveScreenAndAllItsPartsByTheTabKey) {
-    start(true);
-    tabTo("Save");
-    EXPECT_TRUE(scene->view().activeFocusItem()->property("visualFocus").toBool());
-    scene->press(Qt::Key_Return);
-    scene->settle();
-    ASSERT_TRUE(scene->shows(text("Save Snapshot")));
-    for (const char* part : {"Cancel", "Save", "Description", "Cancel"}) {  // round again, and not to the pane below
-        scene->press(Qt::Key_Tab);
-        EXPECT_EQ(focused(), text(part));
-    }
-    scene->press(Qt::Key_Return);
-    scene->queue.run();
-    scene->settle();
-    EXPECT_FALSE(scene->shows(text("Save Snapshot")));
-    EXPECT_TRUE(savedFiles().empty());
-}
-
-TEST_F(Screen, SavesByKeysAlone) {
-    start(true);
-    tabTo("Save");
-    scene->press(Qt::Key_Return);
-    scene->settle();
-    tabTo("Description");
-    scene->type("by hand");
-    tabTo("Cancel");
-    tabTo("Save");
-    scene->press(Qt::Key_Return);
-    scene->queue.run();
-    scene->settle();
-    EXPECT_FALSE(scene->shows(text("Save Snapshot")));
-    ASSERT_EQ(savedFiles().size(), 1U);
-    EXPECT_EQ(savedDescription(), "by hand");
-}
-
 TEST_F(Screen, GoesBackByTheTabKey) {
     start(true);
     scene->press(Qt::Key_Down);
@@ -246,119 +210,6 @@ TEST_F(Screen, SaysThatAListIsEmpty) {
     EXPECT_FALSE(scene->shows(text("None reported")));
 }
 
-TEST_F(Screen, SaysThatThereIsNothingToSaveYet) {
-    scene = std::make_unique<Scene>(true);
-    scene->telephony.reachable = false;
-    scene->connect();
-    scene->settle();
-    openSheet();
-    EXPECT_TRUE(scene->shows(text("Nothing recorded yet")));
-    EXPECT_FALSE(scene->shows(text("In this snapshot")));
-}
-
-TEST_F(Screen, ListsEachEntryInItsFontWithACheckMark) {
-    start(true);
-    openSheet();
-    const QQuickItem* entry = scene->itemWithText(text("Snapshot (2011-03-04 09:15:04 +0000)"));
-    const auto font = entry->property("font").value<QFont>();
-    EXPECT_EQ(font.family(), text("Helvetica"));
-    EXPECT_EQ(font.pixelSize(), 13);
-    const auto* mark = entry->parentItem()->findChild<Glyph*>();
-    ASSERT_NE(mark, nullptr);
-    EXPECT_TRUE(mark->isVisible());
-    EXPECT_EQ(mark->shape(), Glyph::Shape::Check);
-}
-
-TEST_F(Screen, MakesTheListOfEntriesAsHighAsTheyAre) {
-    start(true);
-    openSheet();
-    const auto expectEntries = [this](int entries) {
-        const QQuickItem* list = scene->itemOfType("QQuickListView");  // the sheet's, which lies on top
-        EXPECT_EQ(list->property("count").toInt(), entries);
-        EXPECT_EQ(list->height(), entries * 44);
-    };
-    expectEntries(1);
-    scene->tapText(text("Cancel"));
-    scene->queue.run();
-    scene->settle();
-    scene->show(sampleTree(3));
-    openSheet();
-    expectEntries(2);
-}
-
-TEST_F(Screen, LetsGoOfASaveScreenThatWasClosed) {
-    start(true);
-    openSheet();
-    const QPointer<KelvoSaveViewController> screen(scene->app().saveViewController());
-    scene->tapText(text("Cancel"));
-    scene->queue.run();
-    scene->settle();
-    EXPECT_TRUE(QTest::qWaitFor([&screen] { return screen.isNull(); }));
-}
-
-TEST_F(Screen, SavesWithTheDescriptionThatWasTyped) {
-    start(true);
-    openSheet();
-    EXPECT_TRUE(scene->shows(text("Snapshot (2011-03-04 09:15:04 +0000)")));
-    scene->tapText(text("Description"));
-    scene->type("drive home");
-    QQuickItem* field = scene->itemOfType("QQuickTextField");
-    ASSERT_NE(field, nullptr);
-    EXPECT_TRUE(field->hasActiveFocus());
-    scene->press(Qt::Key_Return);
-    EXPECT_FALSE(field->hasActiveFocus());
-    scene->tapText(text("Save"));  // the sheet's own, which lies on top
-    scene->queue.run();
-    scene->settle();
-    EXPECT_FALSE(scene->shows(text("Save Snapshot")));
-    ASSERT_EQ(savedFiles().size(), 1U);
-    EXPECT_EQ(savedDescription(), "drive home");
-}
-
-TEST_F(Screen, GivesTheKeyboardUpForATouchElsewhereAndForARow) {
-    start(true);
-    openSheet();
-    QQuickItem* field = scene->itemOfType("QQuickTextField");
-    scene->tap(field);
-    EXPECT_TRUE(field->hasActiveFocus());
-    scene->tap(QPointF(180, 600));
-    EXPECT_FALSE(field->hasActiveFocus());
-    scene->tap(field);
-    EXPECT_TRUE(field->hasActiveFocus());
-    scene->tapText(text("Snapshot (2011-03-04 09:15:04 +0000)"));
-    EXPECT_FALSE(field->hasActiveFocus());
-    EXPECT_NE(scene->app().saveViewController(), nullptr);
-}
-
-TEST_F(Screen, WritesNothingWhenSavingIsCancelledByTouchOrByKey) {
-    start(true);
-    openSheet();
-    scene->tapText(text("Cancel"));
-    scene->queue.run();
-    scene->settle();
-    EXPECT_FALSE(scene->shows(text("Save Snapshot")));
-    openSheet();
-    scene->press(Qt::Key_Escape);
-    scene->queue.run();
-    scene->settle();
-    EXPECT_FALSE(scene->shows(text("Save Snapshot")));
-    EXPECT_TRUE(savedFiles().empty());
-    scene->press(Qt::Key_Down);
-    scene->press(Qt::Key_Return);  // the panes have the keyboard again
-    expectTop("Serving Cell");
-}
-
-TEST_F(Screen, KeepsThePanesOutOfReachWhileTheSaveScreenIsUp) {
-    start(true);
-    openSheet();
-    scene->press(Qt::Key_Down);
-    scene->press(Qt::Key_Return);
-    scene->press(Qt::Key_Backspace);
-    scene->tap(QPointF(180, 12));
-    EXPECT_EQ(depth(), 1U);
-    EXPECT_NE(scene->app().saveViewController(), nullptr);
-}
-
 TEST_F(Screen, ShowsTheAlertOverThePaneUntilItIsClosed) {
     start(true);
     openSheet();
@@ -412,61 +263,6 @@ TEST_F(Screen, LeavesARowAloneThatAFingerScrollsSidewaysDuringAReload) {
     EXPECT_EQ(strip->property("contentX").toDouble(), scrolled + 20);
     scene->lift(from - QPointF(140, 0));
     EXPECT_EQ(depth(), 1U);
-}
-
-/// A finger on a row whose value is too long for it.
-class SidewaysScroll : public test::ScreenFixture {
-protected:
-    void startWith(const std::string& state) {
-        start();
-        showState(state);
-    }
-    void showState(const std::string& state) {
-        scene->show(Dictionary::make({{"State", state}, {"Cells", Array::make()}}));
-        scene->settle();
-    }
-    double contentX() { return strip(text("State"))->property("contentX").toDouble(); }
-    /// Scrolls the row to the left; the finger stays on it, where the returned point is.
-    QPointF drag() {
-        const QPointF from = scene->row(text("State"))->mapToScene({300, 25});
-        scene->touch(from);
-        for (int x = 10; x <= 120; x += 10) scene->move(from - QPointF(x, 0));
-        return from - QPointF(120, 0);
-    }
-
-    const std::string tooLong = "a value that is much too long for the width of one row of this telephone ";
-};
-
-TEST_F(SidewaysScroll, StaysUnderTheFingerWhenTheValueItselfChanges) {
-    startWith(tooLong + "ab");
-    const QPointF finger = drag();
-    const double scrolled = contentX();
-    EXPECT_GT(scrolled, 40);
-    scene->show(Dictionary::make({{"State", tooLong + "ba"}, {"Cells", Array::make()}}));
-    EXPECT_TRUE(scene->shows(QString::fromStdString(tooLong + "ba")));
-    EXPECT_EQ(contentX(), scrolled);
-    EXPECT_TRUE(strip(text("State"))->property("dragging").toBool());
-    scene->move(finger - QPointF(20, 0));
-    EXPECT_EQ(contentX(), scrolled + 20);
-    scene->lift(finger - QPointF(20, 0));
-}
-
-TEST_F(SidewaysScroll, ComesBackToItsStartForAValueThatBecomesShort) {
-    startWith(tooLong);
-    scene->lift(drag());
-    EXPECT_TRUE(QTest::qWaitFor([this] { return !strip(text("State"))->property("moving").toBool(); }));
-    EXPECT_GT(contentX(), 40);
-    showState("short");
-    EXPECT_TRUE(scene->shows(text("short")));
-    EXPECT_TRUE(QTest::qWaitFor([this] { return contentX() == 0; }));
-}
-
-TEST_F(SidewaysScroll, ComesBackToItsStartForAValueThatBecomesShortWhileItGlides) {
-    startWith(tooLong);
-    scene->lift(drag());
-    EXPECT_GT(contentX(), 40);
-    showState("short");
-    EXPECT_TRUE(QTest::qWaitFor([this] { return contentX() == 0; }));
 }
 
 TEST_F(Screen, KeepsTheScrollPositionAndTheRowsThroughAReload) {

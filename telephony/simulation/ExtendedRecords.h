@@ -31,6 +31,8 @@ struct SimFiles {
 /// A SIM of the test network MCC 001, MNC 01 (ITU-T E.212) that was last registered in this area: the files that name
 /// an area follow it, the others never change.
 SimFiles testNetworkSim(int locationAreaCode, int routingAreaCode);
+/// The same SIM registered nowhere: its area is deleted and its update status "not updated".
+SimFiles testNetworkSim();
 
 /// Record 0xff0000.
 Bytes simFilesRecord(const SimFiles& files, Time time);

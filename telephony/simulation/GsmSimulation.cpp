@@ -17,7 +17,7 @@ constexpr Time kBlocks = 2s;
 GsmSimulation::GsmSimulation(std::uint64_t seed)
     : _random(seed),
       _network(_random),
-      _air(_network, drawJourney(_random), _random.split()),
+      _air{_network, drawJourney(_random), _random.split()},  // braces: the draws have an order
       _phone(_network, _air, _random.split()) {}
 
 /// One that begins where UMTS is.
@@ -35,6 +35,7 @@ void GsmSimulation::step() {
     countSessions();
     reportSim();
     reportMobility();
+    if (!_phone.isDedicated(Rat::UMTS)) _blocks.reset();
     if (!_phone.isCamped()) return;
     reportCells();
     reportRanking();
@@ -54,16 +55,18 @@ void GsmSimulation::countSessions() {
 void GsmSimulation::reportSim() {
     const auto& registered = _phone.registration().registered();
     if (_sim.isDue(registered, now(), 60s)) {
-        const Area area = registered.value_or(Area{0xfffe, 0xff});  // "deleted", as 3GPP TS 24.008 words it
-        emit(simFilesRecord(testNetworkSim(area.lac, area.rac), now()));
+        const SimFiles files = registered ? testNetworkSim(registered->lac, registered->rac) : testNetworkSim();
+        emit(simFilesRecord(files, now()));
     }
     if (_contexts.isDue({_phone.use(), registered.has_value()}, now(), 60s)) {
         emit(pdpContextsRecord(pdpContexts(world(), _dataSessions), now()));
     }
 }
 
+/// When a move begins, too, so that where it goes has been told.
 void GsmSimulation::reportCells() {
-    if (_cells.isDue(cell(), now(), 15s)) emit(cellInformationRecord(monitoredCells(world()), now()));
+    if (_cells.isDue({cell(), _phone.isMoving()}, now(), 15s))
+        emit(cellInformationRecord(monitoredCells(world()), now()));
 }
 
 void GsmSimulation::reportMobility() {
@@ -127,17 +130,16 @@ void GsmSimulation::reportUmts() {
     if (_rrcState.isDue(_phone.rrcState(), now(), 480ms)) emit(rrcStateRecord(_phone.rrcState(), now()));
     const bool isCiphered = _phone.link() != Link::None && _phone.link() != Link::Opening;
     if (_ciphering.isDue(isCiphered, now(), 8s)) emit(cipheringRecord(isCiphered, now()));
-    if (isDue(_phone.link() == Link::Open ? 960ms : 1920ms, 640ms)) {
+    const bool isOpen = _phone.link() == Link::Open;
+    const auto active = isOpen ? _phone.activeSet().members() : std::vector{_phone.serving()};
+    if (_activeCells.isDue(active, now(), isOpen ? 960ms : 1920ms)) {
         emit(searcherRecord(_air.umtsRssi(), searchedCells(world()), now()));
     }
     reportUmtsChannel();
 }
 
 void GsmSimulation::reportUmtsChannel() {
-    if (!_phone.isDedicated(Rat::UMTS)) {
-        _blocks.reset();
-        return;
-    }
+    if (!_phone.isDedicated(Rat::UMTS)) return;
     if (isDue(480ms, 160ms)) {
         _drawn.transmitPower = drawTransmitPower(world(), _random);
         emit(transmitPowerRecord(_drawn.transmitPower, now()));

@@ -82,7 +82,7 @@ private:
 
     Reported<std::optional<gsm::Area>> _sim;
     Reported<std::pair<gsm::Use, bool>> _contexts;
-    Reported<Cell> _cells;
+    Reported<std::pair<Cell, bool>> _cells;
     Reported<gsm::Mobility> _mobility;
     Reported<gsm::ServingNetwork> _servingNetwork;
     Reported<std::vector<gsm::Plmn>> _equivalents;
@@ -92,6 +92,7 @@ private:
     Reported<Cell> _decoded;
     Reported<std::pair<Cell, bool>> _allocation;
     Reported<Cell> _servingUmts;
+    Reported<std::vector<std::size_t>> _activeCells;
     Reported<gsm::RrcState> _rrcState;
     Reported<bool> _ciphering;
     int _rankings = 0;

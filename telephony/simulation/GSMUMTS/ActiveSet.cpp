@@ -4,6 +4,11 @@
 
 namespace kelvo::simulation::gsm {
 
+void ActiveSet::start(std::size_t sector) {
+    _members.assign(1, sector);
+    for (HeldFor* trigger : {&_add, &_drop, &_replace}) trigger->restart();
+}
+
 bool ActiveSet::contains(std::size_t sector) const { return std::ranges::find(_members, sector) != _members.end(); }
 
 std::size_t ActiveSet::best(const Air& air) const {

@@ -15,7 +15,7 @@ public:
     static constexpr double kDropWindow = 6;  ///< dB below the best
     static constexpr double kReplaceBy = 2;   ///< dB above the worst
 
-    void start(std::size_t sector) { _members.assign(1, sector); }
+    void start(std::size_t sector);
     void update(const Air& air, Time now);
 
     /// At least one once started; in the order in which they joined.

@@ -10,7 +10,7 @@ namespace kelvo::simulation::gsm {
 namespace {
 
 constexpr double kNoise = -100;      // dBm in 3.84 MHz with a receiver's noise figure of 8 dB
-constexpr double kNewWeight = 0.25;  // of a sample, five of which come in a second
+constexpr double kNewWeight = 0.25;  // of a sample; one comes every 160 ms
 constexpr double kGsmSpread = 2;     // dB: samples about the mean
 constexpr double kUmtsSpread = 1.5;  // dB: less, as the carrier is wider than a fade
 constexpr double kOwnCellLeft = 0.1;

@@ -102,12 +102,23 @@ void Phone::followUse(Time now) {
         _useEnds = now + fromSeconds(_random.between(15.0, 40.0));
     }
     _isSilent = false;
+    restartTriggers();
 }
 
 void Phone::setLink(Link link, Time now) {
     if (link == Link::Open && _rat == Rat::UMTS) _activeSet.start(_serving);
     _link = link;
     _linkSince = now;
+    restartTriggers();
+}
+
+/// A condition is looked at in some states only, and not with the same limits in each: what held before a change of
+/// state says nothing of the time after it.
+void Phone::restartTriggers() {
+    for (HeldFor* trigger :
+         {&_gsmReselection, &_gsmHandover, &_umtsReselection, &_bestChange, &_toUmts, &_toGsm, &_toGsmHandover}) {
+        trigger->restart();
+    }
 }
 
 void Phone::followLink(Time now) {
@@ -144,14 +155,18 @@ void Phone::follow(const Change& change, Time now) {
     _rat = change.rat;
     _serving = change.sector;
     if (isNewRat) setLink(isHandover ? Link::Open : Link::None, now);
+    restartTriggers();
     _change.reset();
     rank();
 }
 
 bool Phone::isHysteresisApplied() const {
+    return isOn(Rat::GSM) && (_link == Link::Open || _network.gsm[gsmByC2()].area.lac != area().lac);
+}
+
+std::size_t Phone::gsmByC2() const {
     const auto neighbours = gsmNeighbours();
-    if (!isOn(Rat::GSM) || neighbours.empty()) return false;
-    return _link == Link::Open || _network.gsm[neighbours.front()].area.lac != area().lac;
+    return *std::ranges::max_element(neighbours, {}, [this](std::size_t cell) { return c2(cell); });
 }
 
 std::vector<std::size_t> Phone::gsmNeighbours() const {
@@ -200,16 +215,14 @@ void Phone::rank() {
 }
 
 void Phone::moveWithinGsm(Time now) {
-    const auto neighbours = gsmNeighbours();
     if (_use == Use::Voice) {
-        const std::size_t best = neighbours.front();  // the network's decision, on its power budget
+        const std::size_t best = gsmNeighbours().front();  // the network's decision, on its power budget
         const bool isBetter = _air.gsmLevel(best) > _air.gsmLevel(_serving) + kHandoverMargin;
         if (_link == Link::Open && _gsmHandover(isBetter, best, now)) _serving = best;
         return;
     }
-    const std::size_t best = *std::ranges::max_element(neighbours, {}, [this](std::size_t cell) { return c2(cell); });
-    const bool isOtherArea = _network.gsm[best].area.lac != area().lac;
-    const double margin = isOtherArea || _link == Link::Open ? kCellReselectHysteresis : 0;
+    const std::size_t best = gsmByC2();
+    const double margin = isHysteresisApplied() ? kCellReselectHysteresis : 0;
     if (_gsmReselection(c2(best) > c2(_serving) + margin, best, now)) {
         _change = {Rat::GSM, best, RrState::CellReselection, now + kReselection};
     }
@@ -225,13 +238,12 @@ void Phone::leaveGsm(Time now) {
     if (!isTime || _registration.wantsLink() || (isHandover && _link != Link::Open)) return;
     const RrState state = isHandover ? RrState::G2wHandover : RrState::G2wReselection;
     _change = {Rat::UMTS, best, state, now + kInterRatChange};
-    _toUmts.restart();
 }
 
 void Phone::moveWithinUmts(Time now) {
     if (_link == Link::Open) {
+        const std::size_t best = _activeSet.best(_air);  // of those in use already: it stays in the set
         _activeSet.update(_air, now);
-        const std::size_t best = _activeSet.best(_air);
         const bool isBetter = _air.ecNo(best) > _air.ecNo(_serving) + kBestHysteresis;
         if (_bestChange(isBetter, best, now) || !_activeSet.contains(_serving)) _serving = best;
         return;

@@ -26,7 +26,8 @@ enum class RrState {
     G2wHandover = 19,
     W2gCellChangeOrder = 21,
 };
-enum class RrcState { Disconnected, Connecting, CellFach, CellDch, CellPch, UraPch };
+/// States of its UMTS layer, numbered likewise; CELL_PCH, which is 4, is never entered.
+enum class RrcState { Disconnected = 0, Connecting = 1, CellFach = 2, CellDch = 3, UraPch = 5 };
 
 /// A cell as it stands in the ranking for reselection (3GPP TS 25.304, section 5.2.6.1.4), by RSCP or RXLEV.
 struct Ranked {
@@ -51,6 +52,8 @@ public:
     Link link() const { return _link; }
     bool isOn(Rat rat) const { return _isCamped && _rat == rat; }
     bool isDedicated(Rat rat) const { return isOn(rat) && _link == Link::Open; }
+    /// On its way to another cell, which is the best neighbour of its system.
+    bool isMoving() const { return _change.has_value(); }
     RrState rrState() const;
     RrcState rrcState() const;
     /// In a call: nobody is speaking into the phone.
@@ -58,8 +61,8 @@ public:
 
     const ActiveSet& activeSet() const { return _activeSet; }
     const Registration& registration() const { return _registration; }
-    /// The best GSM neighbour lies in another location area or a packet transfer runs, so that reselection to it wants
-    /// a hysteresis (3GPP TS 45.008, section 6.6.2).
+    /// The GSM neighbour of the highest C2 lies in another location area or a packet transfer runs, so that reselection
+    /// to it wants a hysteresis (3GPP TS 45.008, section 6.6.2).
     bool isHysteresisApplied() const;
     bool isMeasuringGsm() const { return isOn(Rat::GSM) || _isMeasuringGsm; }
     /// The GSM neighbours measured, the strongest first, at most six; none when GSM is not measured.
@@ -83,8 +86,10 @@ private:
     void followUse(Time now);
     void followLink(Time now);
     void setLink(Link link, Time now);
+    void restartTriggers();
     void follow(const Change& change, Time now);
-    double umtsQuality() const;  ///< Ec/No of the best cell in use, dB
+    std::size_t gsmByC2() const;  ///< the neighbour of the highest C2; on GSM only
+    double umtsQuality() const;   ///< Ec/No of the best cell in use, dB
     void rank();
     void leaveGsm(Time now);
     void moveWithinGsm(Time now);

@@ -195,15 +195,15 @@ std::vector<std::optional<double>> drawTransmitPower(const World& world, Random&
     constexpr double kPilot = 23;         // dBm
     constexpr double kWantedBelow = 118;  // dB: sent at 0 dBm, a call just arrives over this path
     constexpr double kDataMore = 6;       // dB
-    constexpr double kGap = 0.2;          // of the slots, while GSM is measured in compressed mode
+    constexpr double kGap = 0.5;          // of the records tell of one, while GSM is measured in compressed mode
     const double mean = kPilot - world.air.rscp(world.phone.serving()) - kWantedBelow +
                         (world.phone.use() == Use::Data ? kDataMore : 0);
     std::vector<std::optional<double>> slots;
     for (int i = 0; i < kSlots; ++i) {
         const double fading = std::max(rayleighFading(random), -10.0);
-        const bool isGap = world.phone.isMeasuringGsm() && random.chance(kGap);
-        slots.push_back(isGap ? std::nullopt : std::optional(std::clamp(mean - fading, -50.0, 24.0)));
+        slots.emplace_back(std::clamp(mean - fading, -50.0, 24.0));
     }
+    if (world.phone.isMeasuringGsm() && random.chance(kGap)) slots[random.between(0, kSlots - 1)].reset();
     return slots;
 }
 

@@ -27,7 +27,8 @@ std::vector<MonitoredCell> monitoredCells(const World& world);
 /// `sessions`: data sessions begun so far.
 std::vector<PdpContext> pdpContexts(const World& world, int sessions);
 
-/// Open-loop power for the path to the best cell, and the inner loop's answer to the fading in each slot.
+/// Open-loop power for the path to the serving cell, and the inner loop's answer to the fading in each slot. At most
+/// one slot has none.
 std::vector<std::optional<double>> drawTransmitPower(const World& world, Random& random);
 BlockErrors drawBlockErrors(const World& world, Time window, Random& random);
 HsdpaReport drawHsdpaReport(const World& world, Time window, Random& random);

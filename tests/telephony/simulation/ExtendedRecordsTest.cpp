@@ -39,6 +39,14 @@ TEST(SimFilesRecord, HoldsAllFourteenFilesOfTheTestNetwork) {
     EXPECT_EQ((*files)["kSimFile_PSLOCI"], Value("C41B7E02A95D1300F11012340A00"));
 }
 
+TEST(SimFilesRecord, SaysNotUpdatedAndNoAreaOfASimThatIsRegisteredNowhere) {
+    const Value payload = payloadOf(simFilesRecord(testNetworkSim(), 1s), 0);
+    const auto& files = payload.dictionary();
+    ASSERT_TRUE(files);
+    EXPECT_EQ((*files)["kSimFile_LOCI"], Value("3A9C41D700F110FFFEFF01"));
+    EXPECT_EQ((*files)["kSimFile_PSLOCI"], Value("C41B7E02A95D1300F110FFFEFF01"));
+}
+
 TEST(CellInformationRecord, GivesEachCellOnlyTheKeysItHas) {
     using enum MonitoredCell::Technology;
     const MonitoredCell cells[] = {

@@ -2,6 +2,7 @@
 
 #include <gtest/gtest.h>
 
+#include <algorithm>
 #include <map>
 #include <string>
 #include <vector>
@@ -66,14 +67,21 @@ private:
         EXPECT_EQ(_played.text(_group + path), expected) << path;
     }
     void shows(const std::string& path, int expected) { shows(path, std::to_string(expected)); }
-    void within(const std::string& path, double truth, double halfStep) {
-        EXPECT_NEAR(_played.number(_group + path), truth, halfStep + 1e-6) << path;
+    void within(const std::string& path, double truth, double halfStep, const std::string& unit = "") {
+        EXPECT_NEAR(numberBefore(unit, path), truth, halfStep + 1e-6) << path;
     }
     /// RXLEV r tells of -111 + r to -110 + r dBm; both ends are open.
-    void levelWithin(const std::string& path, double dBm) {
-        const double shown = _played.number(_group + path);
+    void levelWithin(const std::string& path, double dBm, const std::string& unit = "") {
+        const double shown = numberBefore(unit, path);
         EXPECT_TRUE(shown == 0 || dBm >= shown - 111) << path << " shows " << shown << " for " << dBm;
         EXPECT_TRUE(shown == 63 || dBm < shown - 110) << path << " shows " << shown << " for " << dBm;
+    }
+
+    /// The number shown, which nothing but this unit follows.
+    double numberBefore(const std::string& unit, const std::string& path) {
+        const std::string text = _played.text(_group + path);
+        EXPECT_EQ(text.substr(std::min(text.size(), text.find_first_not_of("-.0123456789"))), unit) << path;
+        return _played.number(_group + path);
     }
 
     const GsmCell& gsmCell() const { return _modem.network().gsm[_modem.phone().serving()]; }

@@ -75,6 +75,12 @@ TEST(GsmSimulation, ReportsEveryRecordKindAtItsRate) {
     }
 }
 
+TEST(GsmSimulation, WritesExactlyTheRecordsThatTheApplicationAsksFor) {
+    std::set<std::uint32_t> written;
+    for (const auto& [code, count] : write(1, 4min).counts) written.insert(code);
+    EXPECT_EQ(written, kelvo::test::codesAskedFor(Technology::GSM));
+}
+
 TEST(GsmSimulation, FillsEveryScreenWithinTwoSeconds) {
     for (std::uint64_t seed = 1; seed <= 20; ++seed) {
         EXPECT_EQ(write(seed, 2s).counts.size(), 28U) << "seed " << seed;
@@ -182,32 +188,108 @@ TEST(GsmSimulation, MovesWithinGsmToANeighbourThatWasShownAndHadRisen) {
     EXPECT_GE(risen * 10, changes * 8);
 }
 
-TEST(GsmSimulation, MovesWithinUmtsToACellThatWasShownInItsSets) {
-    GsmSimulation modem(5);  // mostly in UMTS
-    Played played(modem);
-    std::size_t serving = 0;
-    bool wasUmts = false;
-    bool wasConnected = false;
-    std::set<std::string> shown;
-    int changes = 0;
-    while (played.time() < 10min) {
-        const auto code = played.next();
-        const Phone& phone = modem.phone();
-        const bool isUmts = phone.isOn(Rat::UMTS);
-        if (isUmts && wasUmts && !wasConnected && phone.serving() != serving) {
-            ++changes;
-            EXPECT_TRUE(shown.contains(std::to_string(modem.network().umts[phone.serving()].scramblingCode)));
-        }
-        serving = phone.serving();
-        wasUmts = isUmts;
-        wasConnected = phone.link() == Link::Open;
-        if (code != 0x4005 && code != 0xff0001) continue;
-        if (played.rows("UMTS Cells/UMTS Set") > 0) shown.clear();
-        for (std::size_t row = 0; row < played.rows("UMTS Cells/UMTS Set"); ++row) {
-            shown.insert(played.text("UMTS Cells/UMTS Set/" + std::to_string(row) + "/Scrambling Code"));
+TEST(GsmSimulation, MovesWithinUmtsToACellThatWasShownAndHadRisen) {
+    struct Listing {
+        Time time;
+        std::map<std::size_t, double> levels;  // dBm, of the sectors shown
+    };
+    struct Count {
+        int changes = 0;
+        int risen = 0;
+    };
+    Count counts[2];  // idle, connected
+    for (std::uint64_t seed : {3U, 5U, 7U}) {
+        GsmSimulation modem(seed);
+        Played played(modem);
+        std::optional<std::size_t> serving;
+        bool wasConnected = false;
+        std::deque<Listing> listings;
+        while (played.time() < 10min) {
+            const auto code = played.next();
+            const Phone& phone = modem.phone();
+            if (!phone.isOn(Rat::UMTS)) {
+                serving.reset();
+                continue;
+            }
+            if (serving && *serving != phone.serving()) {
+                std::vector<double> leads;
+                for (const auto& [time, levels] : listings) {
+                    const auto next = levels.find(phone.serving());
+                    const auto own = levels.find(*serving);
+                    if (next != levels.end() && own != levels.end()) leads.push_back(next->second - own->second);
+                }
+                ASSERT_FALSE(leads.empty()) << "seed " << seed << " at " << seconds(played.time());
+                const double lead = modem.air().rscp(phone.serving()) - modem.air().rscp(*serving);
+                Count& count = counts[wasConnected];
+                ++count.changes;
+                count.risen += lead > leads.front();
+            }
+            serving = phone.serving();
+            wasConnected = phone.link() == Link::Open;
+            if (code != 0x417a && code != 0x4005 && code != 0xff0001) continue;
+            const std::string list = code == 0x417a ? "UMTS Cells/Active Set" : "UMTS Cells/UMTS Set";
+            Listing listing{played.time(), {}};
+            for (std::size_t row = 0; row < played.rows(list); ++row) {
+                const std::string cell = list + "/" + std::to_string(row);
+                if (played.text(cell + "/RSCP").empty()) continue;  // told of, but not found
+                const auto at =
+                    std::ranges::find(modem.network().umts, static_cast<int>(played.number(cell + "/Scrambling Code")),
+                                      &UmtsCell::scramblingCode);
+                listing.levels[static_cast<std::size_t>(at - modem.network().umts.begin())] =
+                    played.number(cell + "/RSCP");
+            }
+            listing.levels.try_emplace(*serving, modem.air().rscp(*serving));  // the cell array tells no level of it
+            listings.push_back(std::move(listing));
+            while (listings.front().time < played.time() - 5s) listings.pop_front();
         }
     }
-    EXPECT_GE(changes, 3);
+    for (const Count& count : counts) {
+        EXPECT_GE(count.changes, 8);
+        EXPECT_GE(count.risen * 4, count.changes * 3) << count.changes;
+    }
+}
+
+TEST(GsmSimulation, MovesBetweenTheSystemsToACellThatIsListed) {
+    std::map<RrState, int> moves;
+    for (std::uint64_t seed = 1; seed <= 5; ++seed) {
+        GsmSimulation modem(seed);
+        Played played(modem);
+        std::optional<Rat> last;
+        RrState move = RrState::Idle;
+        std::set<int> gsm;
+        std::set<int> umts;
+        const auto shown = [&](const std::string& list, const std::string& name) {
+            std::set<int> names;
+            for (std::size_t row = 0; row < played.rows(list); ++row) {
+                names.insert(static_cast<int>(played.number(list + "/" + std::to_string(row) + "/" + name)));
+            }
+            return names;
+        };
+        while (played.time() < 10min) {
+            const auto code = played.next();
+            const Phone& phone = modem.phone();
+            if (!phone.isCamped()) continue;
+            if (last && *last != phone.rat()) {
+                ++moves[move];
+                if (phone.rat() == Rat::GSM) {
+                    EXPECT_TRUE(gsm.contains(modem.network().gsm[phone.serving()].arfcn))
+                        << seed << " at " << seconds(played.time()) << " by " << static_cast<int>(move);
+                } else {
+                    EXPECT_TRUE(umts.contains(modem.network().umts[phone.serving()].scramblingCode))
+                        << seed << " at " << seconds(played.time()) << " by " << static_cast<int>(move);
+                }
+            }
+            last = phone.rat();
+            move = phone.rrState();
+            if (code != 0xff0001) continue;
+            gsm = shown("GSM Cell and Neighbours/Neighboring Cells", "ARFCN");
+            umts = shown("UMTS Cells/UMTS Set", "Scrambling Code");
+        }
+    }
+    for (const RrState each : {RrState::W2gHandover, RrState::W2gReselection, RrState::W2gCellChangeOrder,
+                               RrState::G2wReselection, RrState::G2wHandover}) {
+        EXPECT_GE(moves[each], 1) << static_cast<int>(each);
+    }
 }
 
 TEST(GsmSimulation, LeavesUmtsWhereItIsWeakAndComesBackWhereItIsGood) {
@@ -258,6 +340,116 @@ TEST(GsmSimulation, KeepsUpToThreeCloseCellsInSoftHandover) {
     });
     EXPECT_EQ(sizes, (std::set<std::size_t>{1, 2, 3}));
     EXPECT_LT(strays * 10, looks);  // only until the time to trigger has passed
+}
+
+TEST(GsmSimulation, BeginsAConnectionInUmtsWithOneCell) {
+    int openings = 0;
+    int widenings = 0;
+    for (std::uint64_t seed = 1; seed <= 10; ++seed) {
+        GsmSimulation modem(seed);
+        std::optional<Time> opened;
+        watch(modem, 10min, [&](Time now) {
+            const Phone& phone = modem.phone();
+            if (!phone.isDedicated(Rat::UMTS)) return opened.reset();
+            if (!opened) {
+                ++openings;
+                opened = now;
+            }
+            const bool isWide = phone.activeSet().members().size() > 1;
+            if (now - *opened < 320ms) {  // time to trigger of event 1A
+                EXPECT_FALSE(isWide) << seed << " at " << seconds(now);
+            } else if (now - *opened < 640ms) {
+                widenings += isWide;
+            }
+        });
+    }
+    EXPECT_GE(openings, 50);
+    EXPECT_GE(widenings, 10);
+}
+
+TEST(GsmSimulation, WaitsForItsTimesToTriggerAnewAfterEveryChangeOfState) {
+    struct Phase {
+        bool isCamped;
+        Rat rat;
+        Link link;
+        bool isMoving;
+        bool operator==(const Phase&) const = default;
+    };
+    int reselections[2] = {};  // GSM, UMTS
+    for (std::uint64_t seed = 1; seed <= 10; ++seed) {
+        GsmSimulation modem(seed);
+        std::optional<Phase> phase;
+        std::size_t serving = 0;
+        Time since{0};
+        watch(modem, 10min, [&](Time now) {
+            const Phone& phone = modem.phone();
+            const RrState state = phone.rrState();
+            const bool isMoving = state == RrState::CellReselection || state >= RrState::W2gHandover;
+            const Phase next{phone.isCamped(), phone.rat(), phone.link(), isMoving};
+            const bool isIdleUmts = phone.isOn(Rat::UMTS) && phone.link() != Link::Open;
+            if (phase == next) {
+                if (isIdleUmts && phone.serving() != serving) {
+                    ++reselections[1];
+                    EXPECT_GE(now - since, 1s) << seed << " at " << seconds(now);
+                }
+            } else if (phase && state == RrState::CellReselection) {
+                ++reselections[0];
+                EXPECT_GE(now - since, 5s) << seed << " at " << seconds(now);
+            }
+            if (phase != next) since = now;
+            phase = next;
+            serving = phone.serving();
+        });
+    }
+    EXPECT_GE(reselections[0], 30);
+    EXPECT_GE(reselections[1], 30);
+}
+
+TEST(GsmSimulation, CountsBlocksOverTheTimeInWhichItReceivedThem) {
+    int returns = 0;
+    int windows = 0;
+    for (std::uint64_t seed = 1; seed <= 30; ++seed) {
+        GsmSimulation modem(seed);
+        bool isHandover = false;
+        bool wasInUmtsCall = false;  // and not out of a connection since
+        for (auto message = modem.next(); message.time < 10min; message = modem.next()) {
+            const Phone& phone = modem.phone();
+            if (phone.link() != Link::Open) wasInUmtsCall = false;
+            if (phone.isDedicated(Rat::UMTS)) {
+                returns += wasInUmtsCall && isHandover;
+                wasInUmtsCall = true;
+            }
+            isHandover = phone.rrState() == RrState::G2wHandover;
+            const unsigned code = message.bytes[5] | message.bytes[6] << 8U;
+            const int size = modem.drawn().blockErrors.windowSize;
+            if (code == 0x4116) {
+                ++windows;
+                EXPECT_TRUE(size == 30 || size == 200) << size << " frames, seed " << seed;
+            }
+            if (code != 0x4221) continue;
+            EXPECT_EQ(modem.drawn().hsdpa.subFrames, 5 * size);  // of 2 ms, not 10
+        }
+    }
+    EXPECT_GE(windows, 1000);
+    EXPECT_GE(returns, 1) << "by handover into a call that had begun in UMTS";
+}
+
+TEST(GsmSimulation, SendsInAllSlotsButOneAtMost) {
+    int whole = 0;
+    int broken = 0;
+    for (std::uint64_t seed = 1; seed <= 10; ++seed) {
+        GsmSimulation modem(seed);
+        for (auto message = modem.next(); message.time < 10min; message = modem.next()) {
+            if (message.bytes[5] != 0x31 || message.bytes[6] != 0x40) continue;
+            const auto& slots = modem.drawn().transmitPower;
+            const auto gaps = std::ranges::count_if(slots, [](const auto& slot) { return !slot; });
+            ASSERT_EQ(slots.size(), 3U);
+            ASSERT_LE(gaps, modem.phone().isMeasuringGsm() ? 1 : 0);
+            ++(gaps == 0 ? whole : broken);
+        }
+    }
+    EXPECT_GT(whole, broken);
+    EXPECT_GE(broken, 10);
 }
 
 TEST(GsmSimulation, HoldsItsLevelsWhileThePhoneStands) {

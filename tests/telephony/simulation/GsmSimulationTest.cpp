@@ -75,6 +75,12 @@ TEST(GsmSimulation, ReportsEveryRecordKindAtItsRate) {
     }
 }
 
+TEST(GsmSimulation, WritesExactlyTheRecordsThatTheApplicationAsksFor) {
+    std::set<std::uint32_t> written;
+    for (const auto& [code, count] : write(1, 4min).counts) written.insert(code);
+    EXPECT_EQ(written, kelvo::test::codesAskedFor(Technology::GSM));
+}
+
 TEST(GsmSimulation, FillsEveryScreenWithinTwoSeconds) {
     for (std::uint64_t seed = 1; seed <= 20; ++seed) {
         EXPECT_EQ(write(seed, 2s).counts.size(), 28U) << "seed " << seed;

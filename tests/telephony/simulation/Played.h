@@ -4,6 +4,7 @@
 #include <cstdlib>
 #include <limits>
 #include <memory>
+#include <set>
 #include <string>
 #include <string_view>
 #include <vector>
@@ -16,6 +17,24 @@
 #include "tests/support/RecordingLog.h"
 
 namespace kelvo::test {
+
+/// The log codes that the application asks a modem of this family for, 0xff0000 and more for extended records.
+inline std::set<std::uint32_t> codesAskedFor(Technology technology) {
+    const DirectoryResources resources{KELVO_RESOURCE_DIR};
+    const Environment::Scope environment{{.resources = &resources}};
+    const auto generator = LogGenerator::generatorFromTechnology(namesOf(technology).identifier);
+    const DictionaryRef command = generator->getStartCommand();
+    std::set<std::uint32_t> codes;
+    const auto add = [&](std::string_view key, std::uint32_t first) {
+        const Value list = (*command)[key];
+        if (!list.array()) return;
+        for (const Value& code : *list.array())
+            codes.insert(first | static_cast<std::uint32_t>(code.number()->integer()));
+    };
+    add("SetOskraLogCodes", 0);
+    add("SetPlExtraCodes", 0xff0000);
+    return codes;
+}
 
 /// A simulated modem's log, played message by message into the generator of its family; what the application would
 /// show of it can be read at each moment.

@@ -32,7 +32,7 @@ CdmaSimulation::CdmaSimulation(std::uint64_t seed) : CdmaSimulation(Random(seed)
 
 CdmaSimulation::CdmaSimulation(Random random)
     : _network(buildCdmaNetwork(random)),
-      _drive(_network.radio, Journey::through(kDriveRadius, random), random.split()),
+      _drive{_network.radio, Journey::through(kDriveRadius, random), random.split()},  // braces: in this order
       _user(random.split()),
       _oneX(_network, random.split()),
       _evdo(_network, random.split()) {}

@@ -21,7 +21,7 @@ IfxSimulation::IfxSimulation(std::uint64_t seed) : IfxSimulation(Random(seed)) {
 
 IfxSimulation::IfxSimulation(Random random)
     : _network(ifx::buildNetwork(random)),
-      _drive(_network.radio, Journey::through(kDriveRadius, random), random.split()),
+      _drive{_network.radio, Journey::through(kDriveRadius, random), random.split()},  // braces: in this order
       _user(random.split()),
       _modem(_network, random.split()) {}
 

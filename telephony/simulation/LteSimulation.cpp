@@ -34,7 +34,7 @@ void LteSimulation::reportServingCell() {
 void LteSimulation::reportMeasurements() {
     if (!_modem.hasMeasured()) return;
     if (_modem.isConnected()) return emit(lteConnectedMeasurementRecord(now(), _modem));
-    emit(lteServingMeasurementRecord(now(), _modem));
+    emit(lteServingMeasurementRecord(now(), _modem.serving(), _modem.reading(), _modem.idle()));
     if (!_modem.neighbours().empty()) emit(lteNeighbourMeasurementRecord(now(), _modem));
     emit(lteCandidatesRecord(now(), _modem));
 }

@@ -11,6 +11,7 @@ constexpr double kNearest = 35;     // metres
 constexpr double kBeamWidth = 65;   // degrees between the points 3 dB down
 constexpr double kFrontToBack = 20;
 constexpr double kDeepestFade = -30;
+constexpr double kAttenuation = 0.6;  // of what Shannon allows
 
 }  // namespace
 
@@ -39,5 +40,13 @@ double rayleighFading(Random& random) { return std::max(toDecibels(random.expone
 double toMilliwatts(double dBm) { return std::pow(10, dBm / 10); }
 
 double toDecibels(double ratio) { return 10 * std::log10(ratio); }
+
+double linkCapacity(double bandwidth, double signalToRest) {
+    return kAttenuation * bandwidth * std::log2(1 + toMilliwatts(signalToRest));
+}
+
+double neededRatio(double bandwidth, double capacity) {
+    return toDecibels(std::exp2(capacity / (kAttenuation * bandwidth)) - 1);
+}
 
 }  // namespace kelvo::simulation

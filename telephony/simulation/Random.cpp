@@ -7,6 +7,8 @@ namespace kelvo::simulation {
 
 double Random::uniform() { return static_cast<double>(_engine() >> 11) * 0x1.0p-53; }
 
+double Random::between(double low, double high) { return low + (high - low) * uniform(); }
+
 int Random::between(int low, int high) {
     return low + static_cast<int>(uniform() * (static_cast<double>(high) - low + 1));
 }

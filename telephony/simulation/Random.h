@@ -5,15 +5,16 @@
 
 namespace kelvo::simulation {
 
-/// A repeatable source of chance: the same seed gives the same numbers with every compiler and standard library (the
-/// engine's sequence is fixed by the language; the distributions are not, so they are written out here).
+/// A repeatable source of chance: the same seed gives the same numbers with every compiler, as long as the mathematics
+/// library is one. (The engine's sequence is fixed by the language; the distributions are not, so they are written out
+/// here. The last bit of a logarithm or a cosine is the library's choice.)
 class Random {
 public:
     explicit Random(std::uint64_t seed) : _engine(seed) {}
 
     /// From 0 up to, not including, 1.
     double uniform();
-    double between(double low, double high) { return low + (high - low) * uniform(); }
+    double between(double low, double high);
     /// From `low` to `high`, both included.
     int between(int low, int high);
     bool chance(double probability) { return uniform() < probability; }

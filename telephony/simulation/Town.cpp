@@ -2,6 +2,7 @@
 
 #include <algorithm>
 #include <cmath>
+#include <functional>
 #include <numeric>
 #include <utility>
 
@@ -9,7 +10,7 @@ namespace kelvo::simulation {
 namespace {
 
 constexpr double kRowHeight = 0.8660254037844386;  // of a hexagonal grid, in distances between sites
-// Half of the shadow's variance lies near the phone and so is the same for all sectors of a site.
+// Half of the shadow's variance is the site's: its sectors stand on one mast, and what shadows one shadows all.
 const double kShared = std::sqrt(0.5);
 
 std::vector<Point> buildSites(const TownPlan& plan, Random& random) {
@@ -68,10 +69,10 @@ void Drive::moveTo(Time time) {
     }
 }
 
-std::vector<std::size_t> Drive::byStrength() const {
-    std::vector<std::size_t> order(_sectors.size());
+std::vector<std::size_t> byStrength(const std::vector<double>& levels) {
+    std::vector<std::size_t> order(levels.size());
     std::iota(order.begin(), order.end(), std::size_t{0});
-    std::ranges::stable_sort(order, std::greater(), [this](std::size_t sector) { return _received[sector]; });
+    std::ranges::stable_sort(order, std::greater(), [&levels](std::size_t sector) { return levels[sector]; });
     return order;
 }
 
@@ -86,6 +87,18 @@ bool HeldFor::operator()(bool condition, std::size_t subject, Time now) {
         _since = now;
     }
     return now - _since >= _hold;
+}
+
+std::optional<std::size_t> EachHeldFor::operator()(const std::vector<std::size_t>& subjects, Time now) {
+    std::map<std::size_t, Time> since;
+    std::optional<std::size_t> first;
+    for (const std::size_t subject : subjects) {
+        const auto before = _since.find(subject);
+        since[subject] = before != _since.end() ? before->second : now;
+        if (!first && now - since[subject] >= _hold) first = subject;
+    }
+    _since = std::move(since);
+    return first;
 }
 
 }  // namespace kelvo::simulation

@@ -1,5 +1,7 @@
 #pragma once
 
+#include <map>
+#include <optional>
 #include <vector>
 
 #include "telephony/simulation/Journey.h"
@@ -29,6 +31,9 @@ struct TownPlan {
 /// sectors 0 to 2 are the first site's.
 std::vector<Sector> buildSectors(const TownPlan& plan, Random& random);
 
+/// The indices of `levels`, the strongest first; of equals the first.
+std::vector<std::size_t> byStrength(const std::vector<double>& levels);
+
 /// A phone that drives through a town: what it receives of each sector at each moment.
 class Drive {
 public:
@@ -44,7 +49,7 @@ public:
     double received(std::size_t sector) const { return _received[sector]; }
     const std::vector<double>& received() const { return _received; }
     /// Every sector's index, the strongest first.
-    std::vector<std::size_t> byStrength() const;
+    std::vector<std::size_t> byStrength() const { return simulation::byStrength(_received); }
 
 private:
     std::vector<Sector> _sectors;
@@ -71,6 +76,22 @@ private:
     Time _since{0};
     std::size_t _subject = 0;
     bool _running = false;
+};
+
+/// HeldFor for many subjects at a time, such as all cells that are better than the serving one: two that are better by
+/// turns do not hold each other up.
+class EachHeldFor {
+public:
+    explicit EachHeldFor(Time hold) : _hold(hold) {}
+
+    /// `subjects` are those that the condition holds for now. The first of them for which it has held for the time
+    /// without a break.
+    std::optional<std::size_t> operator()(const std::vector<std::size_t>& subjects, Time now);
+    void restart() { _since.clear(); }
+
+private:
+    Time _hold;
+    std::map<std::size_t, Time> _since;
 };
 
 }  // namespace kelvo::simulation

@@ -9,8 +9,7 @@ namespace kelvo::simulation {
 namespace {
 
 constexpr double kSlotsPerSecond = 600;
-constexpr double kChipMHz = 1.2288;
-constexpr double kAttenuation = 0.6;      // of what Shannon allows, as in 3GPP TR 36.942, annex A.1
+constexpr double kChipRate = 1.2288e6;
 constexpr double kForwardLost = 0.01;     // of all packets
 constexpr double kSmallPackets = 0.15;    // of all packets: for several users, or the end of something
 constexpr double kPacketsPerSecond = 60;  // reverse: 150 sub-packets, of which a packet takes 2.5
@@ -20,7 +19,7 @@ constexpr std::size_t kLowLatency = 4;  // the sizes below are sent in a hurry
 
 /// The fastest format that a carrier-to-interference ratio allows; the null rate when it allows none.
 std::size_t formatFor(double carrierToInterference) {
-    const double capacity = kAttenuation * kChipMHz * 1e6 * std::log2(1 + toMilliwatts(carrierToInterference));
+    const double capacity = linkCapacity(kChipRate, carrierToInterference);
     const auto rate = [](const ForwardFormat& format) { return format.bits.back() * kSlotsPerSecond / format.slots; };
     std::size_t best = 0;
     for (std::size_t i = 1; i < kForwardFormats.size(); ++i) {

@@ -1,7 +1,6 @@
 #include "telephony/simulation/IFX/Air.h"
 
 #include <algorithm>
-#include <cmath>
 
 namespace kelvo::simulation::ifx {
 namespace {
@@ -11,7 +10,6 @@ constexpr double kGsmNoise = -113;     // dBm within 200 kHz, the receiver's own
 constexpr double kUmtsNoise = -100;    // dBm within 3.84 MHz
 constexpr double kPilotShare = -10;    // dB of a sector's power
 constexpr double kUmtsLoad = 0.6;      // part of its power that a sector sends
-constexpr double kAttenuation = 0.6;
 
 void readGsm(Air& air, const Drive& drive, const Network& network, Random& random) {
     const auto& cells = network.gsm;
@@ -46,10 +44,6 @@ Air listen(const Drive& drive, const Network& network, Random& random) {
     readGsm(air, drive, network, random);
     readUmts(air, drive, network, random);
     return air;
-}
-
-double capacity(double kHz, double signalToRest) {
-    return kAttenuation * kHz * std::log2(1 + toMilliwatts(signalToRest));
 }
 
 }  // namespace kelvo::simulation::ifx

@@ -16,7 +16,4 @@ struct Air {
 
 Air listen(const Drive& drive, const Network& network, Random& random);
 
-/// What a link carries at most by Shannon, less what real ones do not reach (3GPP TR 36.942, annex A.1): kbit/s.
-double capacity(double kHz, double signalToRest);
-
 }  // namespace kelvo::simulation::ifx

@@ -4,7 +4,7 @@
 #include <array>
 #include <cmath>
 #include <functional>
-#include <numeric>
+#include <set>
 
 namespace kelvo::simulation::ifx {
 namespace {
@@ -34,24 +34,26 @@ constexpr double kUmtsHysteresis = 3;
 constexpr std::array kEgprsRates{8.8, 11.2, 14.8, 17.6, 22.4, 29.6, 44.8, 54.4, 59.2};  // kbit/s a time slot
 constexpr double kTimeSlots = 4;
 constexpr double kSlotKHz = 9;        // of a time slot, as far as its modulation goes
+constexpr double kSchemeMargin = 3;   // dB: a scheme is taken with this much more than it needs
+constexpr double kAimedErrors = 0.1;  // of the blocks
+constexpr double kUmtsNeeded = -17;   // dB of Ec/N0
 constexpr double kHsShare = -3;       // dB of a cell's power that is left for data
 constexpr double kMostHsRate = 3600;  // kbit/s
 
-/// The strongest, `but` left out, in order.
-std::vector<std::size_t> strongest(const std::vector<double>& readings, std::optional<std::size_t> but) {
-    std::vector<std::size_t> order(readings.size());
-    std::iota(order.begin(), order.end(), std::size_t{0});
-    if (but) std::erase(order, *but);
-    std::ranges::stable_sort(order, std::greater(), [&readings](std::size_t i) { return readings[i]; });
-    order.resize(std::min(order.size(), kMostNeighbours));
-    return order;
-}
+const std::vector<std::size_t> kNone;
 
-std::size_t best(const std::vector<double>& readings, std::optional<std::size_t> but = {}) {
-    return strongest(readings, but).front();
+/// Those of the cells that meet a condition, in their order.
+std::vector<std::size_t> those(std::vector<std::size_t> cells, const std::function<bool(std::size_t)>& condition) {
+    std::erase_if(cells, std::not_fn(condition));
+    return cells;
 }
 
 double lost(double signalToRest, double needed) { return 0.002 + 0.5 / (1 + std::exp(signalToRest - needed)); }
+
+/// Blocks of data lost when first sent: those that the choice of a scheme puts up with, and what more the scheme loses.
+double lostAtFirst(double signalToRest, double needed) {
+    return kAimedErrors + (1 - kAimedErrors) * lost(signalToRest, needed);
+}
 
 }  // namespace
 
@@ -71,14 +73,27 @@ LocationArea Modem::area() const {
                                               : _network.umts[_status.serving].area;
 }
 
-std::optional<std::size_t> Modem::servingOn(RadioAccess access) const {
-    return _status.access == access ? std::optional(_status.serving) : std::nullopt;
+/// Of the cells on one carrier no more than the strongest can be decoded, and on the serving cell's carrier no other.
+std::vector<std::size_t> Modem::gsmByStrength() const {
+    std::set<int> heard;
+    if (_status.access == RadioAccess::Gsm) heard.insert(_network.gsm[_status.serving].arfcn);
+    std::vector<std::size_t> order = byStrength(_air.rssi);
+    std::erase_if(order, [&](std::size_t sector) { return !heard.insert(_network.gsm[sector].arfcn).second; });
+    order.resize(std::min(order.size(), kMostNeighbours));
+    return order;
+}
+
+std::vector<std::size_t> Modem::umtsByStrength() const {
+    std::vector<std::size_t> order = byStrength(_air.ecN0);
+    if (_status.access == RadioAccess::Umts) std::erase(order, _status.serving);
+    order.resize(std::min(order.size(), kMostNeighbours));
+    return order;
 }
 
 void Modem::choose(Time now) {
     switch (_status.access) {
         case RadioAccess::None:
-            if (now >= kSearch) move(RadioAccess::Gsm, best(_air.rssi), now);
+            if (now >= kSearch) move(RadioAccess::Gsm, gsmByStrength().front(), now);
             return;
         case RadioAccess::Gsm: return chooseFromGsm(now);
         case RadioAccess::Umts: return chooseFromUmts(now);
@@ -87,24 +102,25 @@ void Modem::choose(Time now) {
 
 void Modem::chooseFromGsm(Time now) {
     const bool idle = _status.connection == Connection::Idle;
-    const std::size_t umts = best(_air.ecN0);
-    const bool good = _air.ecN0[umts] > kUmtsGood && _air.rscp[umts] > kUmtsClose;
-    if (_toUmts(idle && good, umts, now)) return move(RadioAccess::Umts, umts, now);
-
-    const std::size_t other = best(_air.rssi, _status.serving);
-    const double better = _air.rssi[other] - _air.rssi[_status.serving];
-    const bool reselect = _gsmReselection(idle && better > gsmMargin(other, now), other, now);
-    const bool handOver = _gsmHandover(!idle && better > kHandoverMargin, other, now);
-    if (reselect || handOver) move(RadioAccess::Gsm, other, now);
+    const auto good = [this](std::size_t cell) { return _air.ecN0[cell] > kUmtsGood && _air.rscp[cell] > kUmtsClose; };
+    const auto better = [this](std::size_t cell) { return _air.rssi[cell] - _air.rssi[_status.serving]; };
+    const auto reselected = [&](std::size_t cell) { return better(cell) > gsmMargin(cell, now); };
+    const auto handedOver = [&](std::size_t cell) { return better(cell) > kHandoverMargin; };
+    const auto umts = _toUmts(idle ? those(umtsByStrength(), good) : kNone, now);
+    const auto reselection = _gsmReselection(idle ? those(gsmByStrength(), reselected) : kNone, now);
+    const auto handover = _gsmHandover(idle ? kNone : those(gsmByStrength(), handedOver), now);
+    if (umts) return move(RadioAccess::Umts, *umts, now);
+    if (const auto other = idle ? reselection : handover) move(RadioAccess::Gsm, *other, now);
 }
 
 void Modem::chooseFromUmts(Time now) {
-    const std::size_t gsm = best(_air.rssi);
-    const bool poor = _air.ecN0[_status.serving] < kUmtsPoor || _air.rscp[_status.serving] < kUmtsFar;
-    const std::size_t other = best(_air.ecN0, _status.serving);
-    const bool better = _air.ecN0[other] > _air.ecN0[_status.serving] + kUmtsHysteresis;
-    if (_umtsChange(better, other, now)) return move(RadioAccess::Umts, other, now);
-    if (_toGsm(poor, 0, now)) move(RadioAccess::Gsm, gsm, now);
+    const double own = _air.ecN0[_status.serving];
+    const auto better = [&](std::size_t cell) { return _air.ecN0[cell] > own + kUmtsHysteresis; };
+    const bool poor = own < kUmtsPoor || _air.rscp[_status.serving] < kUmtsFar;
+    const auto other = _umtsChange(those(umtsByStrength(), better), now);
+    const bool leaves = _toGsm(poor, 0, now);
+    if (other) return move(RadioAccess::Umts, *other, now);
+    if (leaves) move(RadioAccess::Gsm, gsmByStrength().front(), now);
 }
 
 double Modem::gsmMargin(std::size_t candidate, Time now) const {
@@ -116,7 +132,8 @@ void Modem::move(RadioAccess access, std::size_t sector, Time now) {
     _status.access = access;
     _status.serving = sector;
     _movedAt = now;
-    for (HeldFor* held : {&_gsmReselection, &_gsmHandover, &_umtsChange, &_toGsm, &_toUmts}) held->restart();
+    for (EachHeldFor* held : {&_gsmReselection, &_gsmHandover, &_umtsChange, &_toUmts}) held->restart();
+    _toGsm.restart();
 }
 
 /// An update of the area takes a while, and waits for the end of a call.
@@ -134,6 +151,7 @@ void Modem::registerInArea(Time now) {
 
 void Modem::readServing() {
     _status.rssi = _air.rssi[_status.serving];
+    _status.gsmToRest = _air.gsmToRest[_status.serving];
     _status.rscp = _air.rscp[_status.serving];
     _status.ecN0 = _air.ecN0[_status.serving];
 }
@@ -142,7 +160,7 @@ void Modem::readGsmNeighbours(Time now) {
     _status.gsm.clear();
     if (_status.access == RadioAccess::None) return;
     std::map<std::size_t, Time> listed;
-    for (const std::size_t sector : strongest(_air.rssi, servingOn(RadioAccess::Gsm))) {
+    for (const std::size_t sector : gsmByStrength()) {
         const auto before = _listed.find(sector);
         const Time since = before != _listed.end() ? before->second : now;
         listed[sector] = since;
@@ -155,7 +173,7 @@ void Modem::readGsmNeighbours(Time now) {
 void Modem::readUmtsNeighbours() {
     _status.umts.clear();
     if (_status.access == RadioAccess::None) return;
-    for (const std::size_t sector : strongest(_air.ecN0, servingOn(RadioAccess::Umts))) {
+    for (const std::size_t sector : umtsByStrength()) {
         if (_air.ecN0[sector] < kDetected) break;
         _status.umts.push_back({sector, _air.rscp[sector], _air.ecN0[sector]});
     }
@@ -174,16 +192,16 @@ void Modem::connect(PhoneUser::Activity activity, double demand) {
 }
 
 void Modem::connectOnGsm(double demand) {
-    const double ratio = _air.gsmToRest[_status.serving];
+    const double ratio = _status.gsmToRest;
     // The base station wants -85 dBm.
     _status.tx = std::clamp(Network::kPower - _status.rssi - 85, 5.0, 33.0);
-    const double rate = capacity(kSlotKHz, ratio);
+    const double rate = linkCapacity(kSlotKHz, ratio);
     const auto scheme = std::ranges::upper_bound(kEgprsRates, rate) - kEgprsRates.begin();
     _status.codingScheme = static_cast<int>(std::max<std::ptrdiff_t>(scheme, 1));
+    const double offered = kEgprsRates[static_cast<std::size_t>(_status.codingScheme - 1)];
     const bool call = _status.connection == Connection::Call;
-    _status.errors = call ? lost(ratio, 6) : _random.between(0.02, 0.12);
-    const double offered = kEgprsRates[static_cast<std::size_t>(_status.codingScheme - 1)] * kTimeSlots;
-    _status.throughput = call ? 0 : offered * demand * (1 - _status.errors);
+    _status.errors = call ? lost(ratio, 6) : lostAtFirst(ratio, neededRatio(kSlotKHz, offered) - kSchemeMargin);
+    _status.throughput = call ? 0 : offered * kTimeSlots * demand * (1 - _status.errors);
 }
 
 void Modem::connectOnUmts(double demand) {
@@ -191,8 +209,8 @@ void Modem::connectOnUmts(double demand) {
     _status.tx = std::clamp(loss - 108, -50.0, 24.0);
     const double ratio = _status.ecN0 + 10 + kHsShare;
     const bool call = _status.connection == Connection::Call;
-    _status.errors = call ? lost(_status.ecN0, -17) : _random.between(0.05, 0.15);
-    const double offered = std::min(capacity(3840, ratio), kMostHsRate);
+    _status.errors = call ? lost(_status.ecN0, kUmtsNeeded) : lostAtFirst(_status.ecN0, kUmtsNeeded);
+    const double offered = std::min(linkCapacity(3840, ratio), kMostHsRate);
     _status.throughput = call ? 0 : offered * demand * (1 - _status.errors);
 }
 

@@ -1,7 +1,6 @@
 #pragma once
 
 #include <map>
-#include <optional>
 #include <vector>
 
 #include "telephony/simulation/IFX/Air.h"
@@ -33,6 +32,7 @@ struct Status {
     RadioAccess access = RadioAccess::None;
     std::size_t serving = 0;          ///< meant where `access` is not None, as are the readings
     double rssi = 0;                  ///< dBm, on GSM
+    double gsmToRest = 0;             ///< dB above others on its carrier and noise, on GSM
     double rscp = 0;                  ///< dBm, on UMTS
     double ecN0 = 0;                  ///< dB, on UMTS
     std::vector<GsmNeighbour> gsm;    ///< the strongest first
@@ -61,7 +61,9 @@ public:
     LocationArea area() const;
 
 private:
-    std::optional<std::size_t> servingOn(RadioAccess access) const;
+    // The most that are listed, without the serving one.
+    std::vector<std::size_t> gsmByStrength() const;
+    std::vector<std::size_t> umtsByStrength() const;
     void choose(Time now);
     void chooseFromGsm(Time now);
     void chooseFromUmts(Time now);
@@ -79,11 +81,11 @@ private:
     Random _random;
     Air _air;
     Status _status;
-    HeldFor _gsmReselection{std::chrono::seconds(5)};
-    HeldFor _gsmHandover{std::chrono::seconds(1)};
-    HeldFor _umtsChange{std::chrono::seconds(1)};
+    EachHeldFor _gsmReselection{std::chrono::seconds(5)};
+    EachHeldFor _gsmHandover{std::chrono::seconds(1)};
+    EachHeldFor _umtsChange{std::chrono::seconds(1)};
     HeldFor _toGsm{std::chrono::seconds(2)};
-    HeldFor _toUmts{std::chrono::seconds(5)};
+    EachHeldFor _toUmts{std::chrono::seconds(5)};
     Time _movedAt{0};
     Time _updatedAt{0};
     std::map<std::size_t, Time> _listed;  // since when a GSM cell is in the neighbour list

@@ -41,7 +41,7 @@ LteModem::LteModem(std::uint64_t seed)
     : _random(seed),
       _sectors(buildSectors({}, _random)),
       _cells(nameLteCells(_sectors, _random)),
-      _drive{_sectors, Journey::through(kDriveRadius, _random), _random.split()},
+      _drive{_sectors, Journey::through(kDriveRadius, _random), _random.split()},  // braces: in this order
       _receiver(_cells, _random.split()),
       _better(kReselection),
       _elsewhere(kRedirectionTime) {
@@ -116,30 +116,38 @@ void LteModem::camp(std::size_t cell) {
 
 void LteModem::measureConnected() {
     _receiver.measure(_drive, serving().carrier, _serving, _now);
-    for (const LteCarrier& carrier : kLteCarriers) {
-        if (carrier.downlink != serving().carrier.downlink) _receiver.leave(carrier, _serving);
-    }
+    measureInGaps();
     handOver();
     listNeighbours(serving().carrier);
     redirect();
 }
 
+// Where the serving cell is weak, the network leaves the phone gaps to measure other carriers in (TS 36.331, section
+// 5.5.2.9).
+void LteModem::measureInGaps() {
+    const double srxlev = reading().averageRsrp - serving().minimumLevel;
+    const bool isWeak = !serving().searchOther || srxlev <= *serving().searchOther;
+    for (const LteCarrier& carrier : kLteCarriers) {
+        if (isOnServingCarrier(carrier)) continue;
+        if (isWeak) {
+            _receiver.measure(_drive, carrier, _serving, _now);
+        } else {
+            _receiver.leave(carrier, _serving);
+        }
+    }
+}
+
 void LteModem::handOver() {
-    const auto best = bestMeasured();
+    const auto best = bestMeasured([this](const LteCell& cell) { return isOnServingCarrier(cell.carrier); });
     const bool isBetter = best && _receiver.reading(*best).averageRsrp - kHysteresis > reading().averageRsrp + kOffset;
     if (_better(isBetter, best.value_or(_serving), _now)) camp(*best);
 }
 
-// The connection does not reach to another carrier: the network ends it when the phone should go there.
+// The connection does not reach to another carrier: the network ends it when the phone should go there, but no call.
 void LteModem::redirect() {
-    bool isElsewhere = false;
-    for (std::size_t i = 0; i < _cells.size(); ++i) {
-        isElsewhere |= _cells[i].carrier.downlink != serving().carrier.downlink &&
-                       meanLevel(i) > meanLevel(_serving) + kRedirection;
-    }
-    const double srxlev = reading().averageRsrp - serving().minimumLevel;
-    const bool isWeak = !serving().searchOther || srxlev <= *serving().searchOther;
-    if (!_elsewhere(isElsewhere && isWeak && !_registersAt, _serving, _now)) return;
+    const auto best = bestMeasured([this](const LteCell& cell) { return !isOnServingCarrier(cell.carrier); });
+    const bool isElsewhere = best && _receiver.reading(*best).averageRsrp > reading().averageRsrp + kRedirection;
+    if (!_elsewhere(isElsewhere && !_isOnCall && !_registersAt, _serving, _now)) return;
     release(_now + kAfterRedirection);
     _hasMeasured = false;  // what was measured is no idle phone's
 }
@@ -168,7 +176,7 @@ void LteModem::evaluateServing() {
 void LteModem::lookAround() {
     std::vector<LteCarrier> searched;
     for (const LteCarrier& carrier : kLteCarriers) {
-        const bool isServing = carrier.downlink == serving().carrier.downlink;
+        const bool isServing = isOnServingCarrier(carrier);
         if (_idle.rules & (isServing ? LteIdleState::SearchIntra : LteIdleState::SearchInter)) {
             if (!isServing) _receiver.measure(_drive, carrier, _serving, _now);
             searched.push_back(carrier);
@@ -224,7 +232,7 @@ void LteModem::weighCandidates() {
 }
 
 void LteModem::reselect() {
-    const auto best = bestMeasured();
+    const auto best = bestMeasured([](const LteCell&) { return true; });
     const bool isBetter = best && isFit(*best) &&
                           _receiver.reading(*best).averageRsrp > reading().averageRsrp + kRankHysteresis &&
                           _now - _camped > kReselection;
@@ -234,10 +242,10 @@ void LteModem::reselect() {
     _hasMeasured = false;  // what was measured is the last cell's
 }
 
-std::optional<std::size_t> LteModem::bestMeasured() const {
+std::optional<std::size_t> LteModem::bestMeasured(const std::function<bool(const LteCell&)>& isWanted) const {
     std::optional<std::size_t> best;
     for (std::size_t i = 0; i < _cells.size(); ++i) {
-        if (i == _serving || !_receiver.isMeasured(i, _now)) continue;
+        if (i == _serving || !isWanted(_cells[i]) || !_receiver.isMeasured(i, _now)) continue;
         if (!best || _receiver.reading(i).averageRsrp > _receiver.reading(*best).averageRsrp) best = i;
     }
     return best;

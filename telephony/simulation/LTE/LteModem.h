@@ -1,5 +1,7 @@
 #pragma once
 
+#include <functional>
+
 #include "telephony/simulation/LTE/LteReceiver.h"
 
 namespace kelvo::simulation {
@@ -69,6 +71,7 @@ private:
     void registerInArea();
     void camp(std::size_t cell);
     void measureConnected();
+    void measureInGaps();
     void handOver();
     void redirect();
     void measureIdle();
@@ -78,7 +81,8 @@ private:
     LteNeighbour neighbour(std::size_t cell) const;
     void weighCandidates();
     void reselect();
-    std::optional<std::size_t> bestMeasured() const;
+    std::optional<std::size_t> bestMeasured(const std::function<bool(const LteCell&)>& isWanted) const;
+    bool isOnServingCarrier(const LteCarrier& carrier) const { return carrier.downlink == serving().carrier.downlink; }
     double meanLevel(std::size_t cell) const;
     bool isFit(std::size_t cell) const { return _receiver.reading(cell).averageRsrp > _cells[cell].minimumLevel; }
 

@@ -96,10 +96,7 @@ Bytes lteConnectedMeasurementRecord(Time time, const LteModem& modem) {
     return record.finish();
 }
 
-Bytes lteServingMeasurementRecord(Time time, const LteModem& modem) {
-    const LteCell& cell = modem.serving();
-    const LteReading& reading = modem.reading();
-    const LteIdleState& idle = modem.idle();
+Bytes lteServingMeasurementRecord(Time time, const LteCell& cell, const LteReading& reading, const LteIdleState& idle) {
     const std::uint32_t maximumPower = cell.maximumPower ? steps(*cell.maximumPower, -30, 1, 6) : kAbsentPower;
     // clang-format off
     return RecordWriter(0xB17F, time, 33)

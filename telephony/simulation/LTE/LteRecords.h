@@ -14,7 +14,7 @@ Bytes lteAntennasRecord(Time time, const LteCell& cell);
 /// 0xb179: a connected phone's measurement of its carrier.
 Bytes lteConnectedMeasurementRecord(Time time, const LteModem& modem);
 /// 0xb17f: an idle phone's measurement of its serving cell.
-Bytes lteServingMeasurementRecord(Time time, const LteModem& modem);
+Bytes lteServingMeasurementRecord(Time time, const LteCell& cell, const LteReading& reading, const LteIdleState& idle);
 /// 0xb180: an idle phone's measurement of the other cells of a carrier, of which there is at least one.
 Bytes lteNeighbourMeasurementRecord(Time time, const LteModem& modem);
 /// 0xb186: the candidate for reselection, if there is one. The layout lays candidates closer to one another than a

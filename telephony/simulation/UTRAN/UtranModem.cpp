@@ -25,7 +25,7 @@ constexpr double kListedRange = 1600;  // metres: cells of sites up to here are 
 constexpr double kJointRange = 15;     // dB below the serving cell: detected jointly
 constexpr double kGsmStronger = 9;     // dB: a GSM carrier beside the P-CCPCH at the same mast
 
-// Reselection (3GPP TS 25.304, section 5.2.6) and event 1G (TS 25.331, section 14.1.2, for TDD).
+// Reselection (3GPP TS 25.304, section 5.2.6) and event 1G (TS 25.331, for TDD).
 constexpr double kRankHysteresis = 4;  // Qhyst1, dB
 constexpr Time kReselection = 960ms;   // Treselection
 constexpr double kHysteresis = 3;      // dB
@@ -55,7 +55,7 @@ UtranModem::UtranModem(std::uint64_t seed)
     : _random(seed),
       _sectors(buildSectors(kPlan, _random)),
       _cells(nameUtranCells(_sectors, _random)),
-      _drive{_sectors, Journey::through(kDriveRadius, _random), _random.split()},
+      _drive{_sectors, Journey::through(kDriveRadius, _random), _random.split()},  // braces: in this order
       _filtered(_cells.size()),
       _better(kReselection) {
     _serving = _drive.byStrength().front();

@@ -1,6 +1,7 @@
 // What the CDMA2000 screens show of a simulated drive, held against the world that was simulated.
 #include <gtest/gtest.h>
 
+#include <algorithm>
 #include <cmath>
 #include <map>
 #include <optional>
@@ -91,6 +92,7 @@ protected:
         for (const char* path : {"1x/Rx1 Band Class", "1x/Rx1 Channel", "1x/Rx1 AGC", "1x/Tx AGC"}) is(path, "N/A");
         if (!errors) return;
         near("1x/Traffic FER", *errors * 100, 0, "% (old)");
+        near("Rates and Errors/1x Traffic FER", *errors * 100, 0, "% (old)");
         errors.reset();
     }
     void checkOneXActiveSet(const OneXStatus& truth) {
@@ -222,6 +224,80 @@ TEST_F(CdmaDisplay, ShowsTheWorldAsItIsForTenMinutes) {
     EXPECT_EQ(sessionStates.size(), 5U);
     EXPECT_GT(fastest["Rates and Errors/EV-DO Forward Rate"], 500);
     EXPECT_GT(fastest["Rates and Errors/EV-DO Reverse Rate"], 50);
+}
+
+namespace {
+
+/// An active set of a connected phone, as the screens show it: how far each pilot stood above the one that is followed
+/// since this one is.
+class ShownPilots {
+public:
+    void forget() {
+        _followed.clear();
+        _above.clear();
+    }
+    /// `rows`: position and PN offset, and the strength, perhaps after a mark.
+    void look(const std::string& followed, const std::vector<std::pair<std::string, std::string>>& rows) {
+        std::map<std::string, double> strengths;
+        for (const auto& [key, text] : rows) {
+            strengths[key.substr(key.find(';') + 1)] = std::stod(text.substr(text.find(')') + 1));
+        }
+        ASSERT_TRUE(strengths.contains(followed));
+        if (!_followed.empty() && followed != _followed) {
+            const auto& before = _above[followed];
+            ASSERT_FALSE(before.empty()) << followed << " was not shown";
+            double last = before.back();
+            if (strengths.contains(_followed)) {
+                last = strengths[followed] - strengths[_followed];
+                EXPECT_GT(last, 2.98);  // 3 dB, less what is not printed
+            }
+            ++changes;
+            rising += last > before.front();
+            _above.clear();
+        }
+        _followed = followed;
+        for (const auto& [pn, strength] : strengths) _above[pn].push_back(strength - strengths[followed]);
+    }
+
+    int changes = 0;
+    int rising = 0;
+
+private:
+    std::string _followed;
+    std::map<std::string, std::vector<double>> _above;
+};
+
+}  // namespace
+
+TEST_F(CdmaDisplay, FollowsOnlyPilotsThatItHasShownBeforeAndThatCameCloser) {
+    ShownPilots oneX;
+    ShownPilots evdo;
+    while (played.time() < kDrive) {
+        const std::uint32_t code = played.next();
+        if (code == 0x119C) {
+            if (played.text("1x/State") != "Traffic [8]") {
+                oneX.forget();
+                continue;
+            }
+            const auto rows = rowsOf(played.at("1x/Active Set"));
+            const auto isReference = [](const auto& row) { return row.second.starts_with("(ref pilot)"); };
+            const auto reference = std::ranges::find_if(rows, isReference);
+            ASSERT_NE(reference, rows.end());
+            oneX.look(reference->first.substr(reference->first.find(';') + 1), rows);
+        } else if (code == 0x12B6) {  // comes after 0x1183, which tells who serves
+            if (played.text("EV-DO/Device State") != "Connected [5]") {
+                evdo.forget();
+                continue;
+            }
+            const std::string serving = played.text("EV-DO/Serving PN Offset");
+            evdo.look(serving.substr(0, serving.find(' ')), rowsOf(played.at("EV-DO/Active Set")));
+        }
+        if (HasFatalFailure()) FAIL() << "at " << seconds(played.time()) << " s";
+    }
+    EXPECT_GE(oneX.changes, 20);
+    EXPECT_GE(oneX.rising, oneX.changes * 3 / 4) << oneX.changes;
+    EXPECT_GE(evdo.changes, 20);
+    EXPECT_GE(evdo.rising, evdo.changes * 3 / 4) << evdo.changes;
 }
 
 TEST_F(CdmaDisplay, FillsEveryScreenWithinTwoSeconds) {

@@ -3,8 +3,11 @@
 #include <gtest/gtest.h>
 
 #include <algorithm>
+#include <deque>
 #include <map>
 #include <set>
+
+#include "tests/telephony/simulation/Played.h"
 
 using namespace kelvo;
 using namespace kelvo::simulation;
@@ -35,11 +38,14 @@ TEST(CdmaSimulation, GivesTheSameBytesForTheSameSeed) {
 TEST(CdmaSimulation, SendsEveryRecordAskedForAtItsRate) {
     CdmaSimulation modem(1);
     std::map<std::uint32_t, int> counts;
+    std::set<std::uint32_t> codes;  // of the first four minutes
     std::size_t bytes = 0;
     for (auto message = modem.next(); message.time < 10min; message = modem.next()) {
         ++counts[codeOf(message.bytes)];
+        if (message.time < 4min) codes.insert(codeOf(message.bytes));
         bytes += message.bytes.size();
     }
+    EXPECT_EQ(codes, test::codesAskedFor(Technology::CDMA));
     const std::map<std::uint32_t, std::pair<int, int>> expected{
         {0x108A, {450, 1500}}, {0x1183, {400, 1000}}, {0x1192, {100, 300}}, {0x12B6, {450, 1500}},
         {0x119C, {600, 1500}}, {0x119D, {900, 3000}}, {0x127E, {40, 120}},  {0x134F, {25, 100}},
@@ -77,16 +83,38 @@ TEST(CdmaSimulation, HandsOffOnlyToPilotsOfTheActiveSetDuringACall) {
     EXPECT_GE(most, 3U);
 }
 
-TEST(CdmaSimulation, MovesToClearlyStrongerPilotsWhenIdle) {
+// An idle phone's records show the pilot that it follows alone, so the others come from the world.
+TEST(CdmaSimulation, MovesToClearlyStrongerPilotsThatCameCloserWhenIdle) {
     CdmaSimulation modem(1);
-    std::set<int> followed;
-    for (auto message = modem.next(); message.time < 3min; message = modem.next()) {
+    const auto& sectors = modem.network().sectors;
+    const auto sectorOf = [&sectors](int pn) {
+        return static_cast<std::size_t>(std::ranges::find(sectors, pn, &CdmaSector::pn) - sectors.begin());
+    };
+    std::deque<std::pair<Time, std::vector<double>>> received;  // of the last 8 s
+    int followed = -1;
+    int moves = 0;
+    int rising = 0;
+    for (auto message = modem.next(); message.time < 10min; message = modem.next()) {
         const OneXStatus& status = modem.oneX().status();
-        if (status.active.empty()) continue;
-        EXPECT_TRUE(status.state == OneXState::Traffic || status.active.size() == 1);
-        followed.insert(status.referencePn);
+        received.emplace_back(message.time, modem.drive().received());
+        while (received.front().first < message.time - 8s) received.pop_front();
+        if (status.state != OneXState::Paging && status.state != OneXState::Sleep) {
+            followed = -1;
+            continue;
+        }
+        ASSERT_EQ(status.active.size(), 1U);
+        if (followed >= 0 && status.referencePn != followed) {
+            const auto above = [&, to = sectorOf(status.referencePn), from = sectorOf(followed)](const auto& levels) {
+                return levels[to] - levels[from];
+            };
+            EXPECT_GT(above(received.back().second), 2) << seconds(message.time);  // 3 dB as read, noise included
+            rising += above(received.back().second) > above(received.front().second);
+            ++moves;
+        }
+        followed = status.referencePn;
     }
-    EXPECT_GE(followed.size(), 4U);
+    EXPECT_GE(moves, 12);
+    EXPECT_GE(rising, moves * 3 / 4) << moves;
 }
 
 TEST(CdmaSimulation, RegistersWheneverTheSystemOrNetworkChanges) {

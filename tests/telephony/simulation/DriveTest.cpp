@@ -98,6 +98,12 @@ TEST(RayleighFading, HasTheMeanPowerOfOne) {
     EXPECT_NEAR(power / 20'000, 1, 0.03);
 }
 
+TEST(LinkCapacity, IsThreeFifthsOfShannonsBound) {
+    EXPECT_DOUBLE_EQ(linkCapacity(1000, 0), 600);                     // log2 of 2
+    EXPECT_NEAR(linkCapacity(1000, 10 * std::log10(3)), 1200, 1e-9);  // log2 of 4
+    EXPECT_NEAR(neededRatio(1000, 1200), 10 * std::log10(3), 1e-9);
+}
+
 TEST(Town, HasThreeSectorsASiteOneThirdOfATurnApart) {
     Random random(1);
     const auto sectors = buildSectors({}, random);
@@ -138,4 +144,18 @@ TEST(HeldFor, FiresOnlyAfterTheWholeTimeWithoutABreak) {
     EXPECT_FALSE(held(true, 3, 140ms));
     EXPECT_FALSE(held(true, 4, 240ms));  // another candidate begins anew
     EXPECT_TRUE(held(true, 4, 340ms));
+}
+
+TEST(EachHeldFor, NamesTheFirstThatHasHeldAndLetsNoneHoldUpAnother) {
+    EachHeldFor held(100ms);
+    using Subjects = std::vector<std::size_t>;
+    EXPECT_EQ(held(Subjects{3, 4}, 0ms), std::nullopt);
+    EXPECT_EQ(held(Subjects{4, 3}, 60ms), std::nullopt);
+    EXPECT_EQ(held(Subjects{3, 4}, 100ms), 3U);
+    EXPECT_EQ(held(Subjects{5, 4, 3}, 120ms), 4U);  // 5 is new
+    EXPECT_EQ(held(Subjects{3}, 140ms), 3U);
+    EXPECT_EQ(held(Subjects{4}, 200ms), std::nullopt);  // had a break
+    held.restart();
+    EXPECT_EQ(held(Subjects{4}, 300ms), std::nullopt);
+    EXPECT_EQ(held(Subjects{4}, 400ms), 4U);
 }

@@ -3,7 +3,7 @@
 #include <gtest/gtest.h>
 
 #include <algorithm>
-#include <optional>
+#include <map>
 #include <set>
 
 #include "tests/telephony/simulation/Played.h"
@@ -22,9 +22,32 @@ std::vector<Bytes> minuteOf(std::uint64_t seed) {
     return messages;
 }
 
-bool lists(const std::vector<GsmNeighbour>& cells, std::size_t sector) {
-    return std::ranges::find(cells, sector, &GsmNeighbour::sector) != cells.end();
-}
+constexpr Time kMeasurement = 480ms;
+
+/// The cells that a screen shows, by network and carrier or code.
+struct Cells {
+    explicit Cells(test::Played& played) {
+        network = played.text("Serving/Technology");
+        const bool onGsm = network == "GSM";
+        if (network != "(absent)") serving = network + played.text(onGsm ? "Serving/ARFCN" : "Serving/SCN");
+        const double level = played.number(onGsm ? "Serving/RSSI" : "Serving/RSCP");
+        const double quality = onGsm ? 0 : played.number("Serving/ECN0");
+        for (std::size_t i = 0; i < played.rows("Neighbours/GSM"); ++i) {
+            const std::string row = "Neighbours/GSM/" + std::to_string(i);
+            if (played.text(row + "/RSSI") == "(absent)") continue;
+            above["GSM" + played.text(row + "/ARFCN")] = played.number(row + "/RSSI") - level;
+        }
+        for (std::size_t i = 0; i < played.rows("Neighbours/UMTS"); ++i) {
+            const std::string row = "Neighbours/UMTS/" + std::to_string(i);
+            above["UMTS" + played.text(row + "/SCN")] = played.number(row + "/ECN0") - quality;
+        }
+    }
+
+    std::string network;
+    std::string serving;
+    /// How far each neighbour stands above the serving cell, in dB; as seen from GSM, a UMTS cell's Ec/N0.
+    std::map<std::string, double> above;
+};
 
 }  // namespace
 
@@ -184,34 +207,158 @@ TEST(IfxSimulation, SendsATreeEveryFewSecondsAndAtEachChange) {
     EXPECT_LT(bytes / 600, 1000U);  // a second
 }
 
-TEST(IfxSimulation, ReselectsAmongTheNeighboursThatWereListed) {
-    IfxSimulation modem(1);
-    std::optional<Status> before;
-    int reselections = 0;
-    int changes = 0;
-    for (auto message = modem.next(); message.time < 10min; message = modem.next()) {
-        const Status& status = modem.modem().status();
-        if (before && before->access == RadioAccess::Gsm && status.access == RadioAccess::Gsm &&
-            before->serving != status.serving && status.connection == Connection::Idle) {
-            ++reselections;
-            EXPECT_TRUE(lists(before->gsm, status.serving));
+TEST(IfxSimulation, GoesOnlyToCellsThatItHasShownBeforeAndThatCameCloser) {
+    struct Sighting {
+        Time time;
+        double above;
+    };
+    struct Moves {
+        int all = 0;
+        int rising = 0;
+    };
+    std::map<std::string, Moves> moves;
+    for (std::uint64_t seed = 1; seed <= 3; ++seed) {
+        IfxSimulation modem(seed);
+        test::Played played(modem);
+        std::map<std::string, std::vector<Sighting>> sightings;
+        Cells before(played);
+        while (played.time() < 10min) {
+            played.next();
+            const Cells shown(played);
+            if (!before.serving.empty() && shown.serving != before.serving) {
+                const auto& history = sightings[shown.serving];
+                ASSERT_FALSE(history.empty()) << shown.serving << " at " << seconds(played.time()) << " s";
+                EXPECT_LE(played.time() - history.back().time, 6720ms);  // by one of the last two messages
+                double last = history.back().above;
+                if (const auto left = shown.above.find(before.serving);
+                    left != shown.above.end() && shown.network == before.network) {
+                    last = -left->second;
+                    EXPECT_GE(last, 0);
+                }
+                if (before.network == "GSM" && shown.network == "UMTS") {
+                    EXPECT_GE(last, -11);  // for 5 s
+                }
+                Moves& kind = moves[before.network + " to " + shown.network];
+                ++kind.all;
+                kind.rising += last > history.front().above;
+                sightings.clear();
+            }
+            for (const auto& [cell, above] : shown.above) sightings[cell].push_back({played.time(), above});
+            before = shown;
         }
-        changes += before && before->access != RadioAccess::None &&
-                   std::pair(before->access, before->serving) != std::pair(status.access, status.serving);
-        before = status;
     }
-    EXPECT_GE(reselections, 2);
-    EXPECT_GE(changes, 10);
+    EXPECT_GE(moves["GSM to GSM"].all, 40);
+    EXPECT_GE(moves["GSM to UMTS"].all, 5);
+    EXPECT_GE(moves["UMTS to UMTS"].all, 8);
+    EXPECT_GE(moves["UMTS to GSM"].all, 5);
+    for (const char* kind : {"GSM to GSM", "UMTS to UMTS", "UMTS to GSM"}) {
+        EXPECT_GE(moves[kind].rising, moves[kind].all * 3 / 4) << kind << ", " << moves[kind].all << " in all";
+    }
 }
 
+// The rules of GSM: idle, a cell is left for one that has been stronger by 6 dB for 5 s (in another area; by less
+// within one); connected, for one that has been stronger by 4 dB for 1 s.
 TEST(IfxSimulation, ServesTheStrongestWithinTheMarginsOfItsRules) {
-    IfxSimulation modem(2);
-    for (auto message = modem.next(); message.time < 5min; message = modem.next()) {
-        const Status& status = modem.modem().status();
-        if (status.access != RadioAccess::Gsm || status.gsm.empty()) continue;
-        EXPECT_GT(status.rssi, status.gsm.front().rssi - 25) << seconds(message.time);
-        EXPECT_TRUE(std::ranges::is_sorted(status.gsm, std::greater(), &GsmNeighbour::rssi));
+    for (std::uint64_t seed = 1; seed <= 3; ++seed) {
+        Random random(seed);
+        const Network network = buildNetwork(random);
+        Drive drive{network.radio, Journey::through(2000, random), random.split()};
+        PhoneUser user(random.split());
+        Modem modem(network, random.split());
+        const Status& status = modem.status();
+        std::size_t serving = 0;
+        std::map<std::size_t, Time> idleSince;
+        std::map<std::size_t, Time> connectedSince;
+        int compared = 0;
+        for (Time now{0}; now < 10min; now += kMeasurement) {
+            drive.moveTo(now);
+            const bool wasIdle = status.connection == Connection::Idle;
+            const auto activity = user.at(now);
+            modem.measure(drive, now, activity, user.demand());
+            EXPECT_TRUE(std::ranges::is_sorted(status.gsm, std::greater(), &GsmNeighbour::rssi));
+            std::map<std::size_t, Time> idle;
+            std::map<std::size_t, Time> connected;
+            if (status.access == RadioAccess::Gsm && status.serving == serving) {
+                ++compared;
+                for (const GsmNeighbour& other : status.gsm) {
+                    const auto since = [&](const auto& before) {
+                        return before.contains(other.sector) ? before.at(other.sector) : now;
+                    };
+                    const double better = other.rssi - status.rssi;
+                    if (wasIdle && better > 6) idle[other.sector] = since(idleSince);
+                    if (!wasIdle && better > 4) connected[other.sector] = since(connectedSince);
+                }
+            }
+            serving = status.serving;
+            idleSince = idle;
+            connectedSince = connected;
+            for (const auto& [sector, since] : idle) EXPECT_LT(now - since, 5s) << seed << ": " << seconds(now);
+            for (const auto& [sector, since] : connected) EXPECT_LT(now - since, 1s) << seed << ": " << seconds(now);
+        }
+        EXPECT_GT(compared, 300);
     }
+}
+
+TEST(IfxSimulation, HearsOneCellOfACarrierAtMost) {
+    for (std::uint64_t seed = 1; seed <= 5; ++seed) {
+        IfxSimulation modem(seed);
+        test::Played played(modem);
+        std::size_t most = 0;
+        while (played.time() < 5min) {
+            played.next();
+            std::set<std::string> carriers{played.text("Serving/ARFCN")};
+            const std::size_t rows = played.rows("Neighbours/GSM");
+            for (std::size_t i = 0; i < rows; ++i) {
+                const std::string row = "Neighbours/GSM/" + std::to_string(i);
+                const std::string carrier = played.text(row + "/ARFCN");
+                carriers.insert(carrier == "(absent)" ? played.text(row) : carrier);  // nothing else is known
+            }
+            EXPECT_EQ(carriers.size(), rows + 1) << "seed " << seed << " at " << seconds(played.time()) << " s";
+            most = std::max(most, rows);
+        }
+        EXPECT_EQ(most, 6U);
+    }
+}
+
+TEST(IfxSimulation, LosesMoreAndCarriesLessWhereTheSignalIsWorse) {
+    std::map<int, std::map<double, double>> gsm;     // by coding scheme, and call as 0: errors by signal to rest
+    std::map<double, int> schemes;                   // by signal to rest
+    std::map<bool, std::map<double, double>> umts;   // by call: errors by Ec/N0
+    std::map<bool, std::pair<double, int>> carried;  // on UMTS, by a good Ec/N0: the sum of kbit/s, the messages
+    for (std::uint64_t seed = 1; seed <= 3; ++seed) {
+        IfxSimulation modem(seed);
+        for (auto message = modem.next(); message.time < 10min; message = modem.next()) {
+            const Status& status = modem.modem().status();
+            if (status.connection == Connection::Idle) continue;
+            const bool call = status.connection == Connection::Call;
+            if (status.access == RadioAccess::Gsm) {
+                gsm[call ? 0 : status.codingScheme][status.gsmToRest] = status.errors;
+                if (!call) schemes[status.gsmToRest] = status.codingScheme;
+            } else {
+                umts[call][status.ecN0] = status.errors;
+                if (call || status.throughput == 0) continue;
+                auto& [sum, count] = carried[status.ecN0 > -9];
+                sum += status.throughput;
+                ++count;
+            }
+        }
+    }
+    const auto second = [](const auto& entry) { return entry.second; };
+    const auto falls = [&second](const auto& values) {
+        return std::ranges::is_sorted(values, std::greater(), second) &&
+               values.begin()->second > values.rbegin()->second;
+    };
+    EXPECT_GE(gsm.size(), 5U);
+    for (const auto& [scheme, errors] : gsm) {
+        if (errors.size() < 2) continue;
+        EXPECT_TRUE(falls(errors)) << scheme;
+    }
+    EXPECT_TRUE(std::ranges::is_sorted(schemes, {}, second));
+    EXPECT_TRUE(falls(umts[false]));
+    EXPECT_TRUE(falls(umts[true]));
+    ASSERT_GE(carried[false].second, 20);
+    ASSERT_GE(carried[true].second, 20);
+    EXPECT_GT(carried[true].first / carried[true].second, 1.3 * carried[false].first / carried[false].second);
 }
 
 TEST(IfxSimulation, ChangesBetweenItsTwoNetworksWithinThreeMinutes) {

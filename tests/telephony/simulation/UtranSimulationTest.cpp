@@ -48,10 +48,14 @@ TEST(UtranSimulation, ShowsTheWorldItPlays) {
 TEST(UtranSimulation, SendsEveryRecordThatTheApplicationAsksFor) {
     UtranSimulation modem(3);
     std::map<std::uint32_t, int> counts;
+    std::set<std::uint32_t> codes;  // of the first four minutes
     for (auto message = modem.next(); message.time < 10min; message = modem.next()) {
         const auto& bytes = message.bytes;
-        ++counts[(bytes[5] | bytes[6] << 8U) | (bytes[2] == 255 ? 0xff0000U : 0U)];
+        const std::uint32_t code = (bytes[5] | bytes[6] << 8U) | (bytes[2] == 255 ? 0xff0000U : 0U);
+        if (message.time < 4min) codes.insert(code);
+        ++counts[code];
     }
+    EXPECT_EQ(codes, codesAskedFor(Technology::UTRAN));
     EXPECT_TRUE(between(counts[0xD0E0], 3000, 3300)) << counts[0xD0E0];  // 5 a second and with each change
     EXPECT_TRUE(between(counts[0xD0E2], 600, 700)) << counts[0xD0E2];    // each second and with each change
     EXPECT_EQ(counts[0xD00A], 625);                                      // every 960 ms

@@ -2,8 +2,6 @@
 
 #include <algorithm>
 #include <cmath>
-#include <functional>
-#include <numeric>
 #include <set>
 
 namespace kelvo::simulation::gsm {
@@ -15,13 +13,6 @@ constexpr double kGsmSpread = 2;     // dB: samples about the mean
 constexpr double kUmtsSpread = 1.5;  // dB: less, as the carrier is wider than a fade
 constexpr double kOwnCellLeft = 0.1;
 constexpr double kDataShare = 0.4;
-
-std::vector<std::size_t> orderBy(const std::vector<double>& values) {
-    std::vector<std::size_t> order(values.size());
-    std::iota(order.begin(), order.end(), std::size_t{0});
-    std::ranges::stable_sort(order, std::greater(), [&](std::size_t index) { return values[index]; });
-    return order;
-}
 
 }  // namespace
 
@@ -46,7 +37,7 @@ void Air::measureGsm() {
         const double sample = _gsm.received(i) + kGsmSpread * _random.normal();
         _gsmLevels[i] = _isFirst ? sample : std::lerp(_gsmLevels[i], sample, kNewWeight);
     }
-    _gsmByLevel = orderBy(_gsmLevels);
+    _gsmByLevel = byStrength(_gsmLevels);
     std::set<int> heard;
     std::erase_if(_gsmByLevel, [&](std::size_t sector) { return !heard.insert(_network.gsm[sector].arfcn).second; });
 }
@@ -59,7 +50,7 @@ void Air::measureUmts() {
         const double sample = _umts.received(i) + kPilotShare - _umtsRssi + kUmtsSpread * _random.normal();
         _ecNo[i] = std::max(_isFirst ? sample : std::lerp(_ecNo[i], sample, kNewWeight), kEcNoFloor);
     }
-    _umtsByEcNo = orderBy(_ecNo);
+    _umtsByEcNo = byStrength(_ecNo);
 }
 
 double Air::dataSinr(std::size_t sector) const {

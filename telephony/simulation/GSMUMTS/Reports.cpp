@@ -7,7 +7,6 @@ namespace kelvo::simulation::gsm {
 namespace {
 
 constexpr double kBandwidth = 3.84e6;       // Hz
-constexpr double kAttenuation = 0.6;        // of Shannon's bound
 constexpr double kFastestCarrier = 14.4e6;  // bit/s, category 10
 constexpr double kFirstBlockErrors = 0.1;   // what the choice of block size aims at
 constexpr double kSecondCarrierLoss = -1;   // dB
@@ -90,9 +89,7 @@ std::vector<HarqProcess> drawProcesses(int subFrames, double sinr, double errorR
 
 double blockErrorRate(double ecNo) { return 1 / (1 + std::exp((ecNo + 16) / 1.2)); }
 
-double dataRate(double sinr) {
-    return std::min(kAttenuation * kBandwidth * std::log2(1 + toMilliwatts(sinr)), kFastestCarrier);
-}
+double dataRate(double sinr) { return std::min(linkCapacity(kBandwidth, sinr), kFastestCarrier); }
 
 GsmMeasurement gsmMeasurement(const World& world) {
     const Phone& phone = world.phone;

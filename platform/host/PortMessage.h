@@ -36,7 +36,7 @@ public:
     const char* problem() const { return _problem; }
 
 private:
-    Outcome check(std::size_t received, bool truncated);
+    Outcome check(std::size_t received);
     Outcome refuse(const char* problem);
 
     Bytes _buffer;  // made at the first read

@@ -15,6 +15,7 @@ namespace {
 constexpr std::size_t kMaxConnections = 64;
 constexpr std::size_t kMessagesPerTurn = 256;         // over all connections
 constexpr std::chrono::milliseconds kTimePerTurn{8};  // for one connection: half a frame of the screen
+constexpr std::chrono::milliseconds kRest{1};
 constexpr int kAcceptsPerTurn = 16;
 constexpr std::chrono::milliseconds kAcceptPause{500};
 
@@ -24,6 +25,11 @@ PortServer::PortServer(PortClaim claim, std::string name, MessageCallback callba
     : _claim(std::make_unique<PortClaim>(std::move(claim))), _name(std::move(name)), _callback(std::move(callback)) {
     _acceptAgain.setSingleShot(true);
     QObject::connect(&_acceptAgain, &QTimer::timeout, &_acceptAgain, [this] { _acceptor->setEnabled(true); });
+    _rest.setSingleShot(true);
+    _rest.setTimerType(Qt::PreciseTimer);
+    QObject::connect(&_rest, &QTimer::timeout, &_rest, [this] {
+        for (auto& [fd, connection] : _connections) connection.watcher->setEnabled(true);
+    });
 }
 
 void PortServer::start() {
@@ -33,6 +39,7 @@ void PortServer::start() {
 
 void PortServer::close() {
     _acceptAgain.stop();
+    _rest.stop();
     _acceptor.reset();
     _connections.clear();
     _claim.reset();
@@ -79,9 +86,27 @@ void PortServer::receive(int fd) {
     _delivering = true;
     const std::size_t share = std::max<std::size_t>(1, kMessagesPerTurn / _connections.size());
     const auto end = std::chrono::steady_clock::now() + kTimePerTurn;
-    for (std::size_t i = 0; i < share && isOpen() && receiveOne(fd); ++i)
-        if (std::chrono::steady_clock::now() > end) break;
+    std::size_t taken = 0;
+    bool isDrained = false;
+    while (taken < share && isOpen() && !isDrained) {
+        if (receiveOne(fd)) {
+            ++taken;
+            if (std::chrono::steady_clock::now() > end) break;
+        } else {
+            isDrained = true;
+        }
+    }
     _delivering = false;
+    if (isDrained && taken > 1) rest(fd);
+}
+
+// A reader that outruns its sender would fall asleep between any two messages, and waking it costs the sender more than
+// sending. So under load the next messages wait for each other.
+void PortServer::rest(int fd) {
+    const auto found = _connections.find(fd);
+    if (found == _connections.end()) return;
+    found->second.watcher->setEnabled(false);
+    if (!_rest.isActive()) _rest.start(kRest);
 }
 
 bool PortServer::receiveOne(int fd) {

@@ -36,6 +36,7 @@ private:
     void admit(UniqueFd fd);
     void pauseAccepting();
     void receive(int fd);
+    void rest(int fd);
     bool receiveOne(int fd);
     void answer(int fd, const PortHeader& request, ByteView reply);
 
@@ -44,6 +45,7 @@ private:
     const MessageCallback _callback;
     std::unique_ptr<FdWatcher> _acceptor;
     QTimer _acceptAgain;
+    QTimer _rest;
     std::map<int, Connection> _connections;  // by descriptor
     PortReader _reader;
     bool _delivering = false;

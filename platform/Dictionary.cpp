@@ -68,8 +68,6 @@ bool Dictionary::remove(Key key) {
     return true;
 }
 
-void Dictionary::clear() { truncate(0); }
-
 void Dictionary::truncate(std::size_t size) {
     if (size == _hashes.size()) return;
     _entries.erase(_entries.begin() + static_cast<std::ptrdiff_t>(size), _entries.end());

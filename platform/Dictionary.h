@@ -49,7 +49,6 @@ public:
     void set(Key key, Value value) { slot(key) = std::move(value); }
     /// Removes `key` and keeps the order of the others; false when it was not there.
     bool remove(Key key);
-    void clear();
     void reserve(std::size_t entries);
 
     DictionaryRef copy() const;  ///< deep

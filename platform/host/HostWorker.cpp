@@ -1,39 +1,46 @@
 #include "platform/host/HostWorker.h"
 
+#include <QCoreApplication>
+#include <QScopeGuard>
 #include <utility>
 
 #include "platform/host/HostEventLoop.h"
 
 namespace kelvo {
 
-HostWorker::HostWorker() { _thread.setMaxThreadCount(1); }
-
 HostWorker::~HostWorker() {
-    _thread.waitForDone();
     while (!_jobs.empty()) {
-        if (!_jobs.front().failure) _jobs.front().done();
-        _jobs.pop_front();
+        try {
+            finishFirst();
+        } catch (...) {  // the loop that would have ended with it has ended
+        }
     }
 }
 
 void HostWorker::run(Task work, Task done) {
-    Job& job = _jobs.emplace_back(Job{std::move(work), std::move(done)});
-    _thread.start([this, &job] {
-        try {
-            job.work();
-        } catch (...) {
-            job.failure = std::current_exception();
-        }
-        QMetaObject::invokeMethod(
-            &_context, [this] { HostEventLoop::call([this] { finishFirst(); }); }, Qt::QueuedConnection);
+    _jobs.push_back({std::move(work), std::move(done)});
+    if (_jobs.size() == 1) startFirst();
+}
+
+void HostWorker::startFirst() {
+    _atWork = std::async(std::launch::async, [this, work = std::move(_jobs.front().work)] {
+        const auto tell = qScopeGuard([this] { QCoreApplication::postEvent(this, new QEvent(QEvent::User)); });
+        work();
     });
 }
 
+void HostWorker::customEvent(QEvent* /*event*/) {
+    HostEventLoop::call([this] { finishFirst(); });
+}
+
 void HostWorker::finishFirst() {
-    const Job job = std::move(_jobs.front());
+    const Task done = std::move(_jobs.front().done);
     _jobs.pop_front();
-    if (job.failure) std::rethrow_exception(job.failure);
-    job.done();
+    std::future<void> worked = std::move(_atWork);
+    worked.wait();
+    if (!_jobs.empty()) startFirst();
+    worked.get();
+    done();
 }
 
 }  // namespace kelvo

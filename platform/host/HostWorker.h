@@ -1,19 +1,17 @@
 #pragma once
 
 #include <QObject>
-#include <QThreadPool>
-#include <exception>
-#include <list>
+#include <deque>
+#include <future>
 
 #include "platform/Worker.h"
 
 namespace kelvo {
 
-/// A worker with one thread, which ends when nothing has been there to do for a while. The destructor waits for the
-/// work that was handed over and calls what is to follow it, so that nothing stays half written when the program ends.
-class HostWorker final : public Worker {
+/// A worker with a thread for each piece of work. The destructor waits for what was handed over and calls what is to
+/// follow it, so that nothing stays half written when the program ends.
+class HostWorker final : public QObject, public Worker {
 public:
-    HostWorker();
     ~HostWorker() override;
     void run(Task work, Task done) override;
 
@@ -21,13 +19,13 @@ private:
     struct Job {
         Task work;
         Task done;
-        std::exception_ptr failure = nullptr;  // written by the thread before it says that it is done
     };
+    void startFirst();
     void finishFirst();
+    void customEvent(QEvent* event) override;
 
-    std::list<Job> _jobs;  // main queue only; the thread holds on to its own job
-    QObject _context;
-    QThreadPool _thread;
+    std::deque<Job> _jobs;        // in their order; the first is being worked on
+    std::future<void> _atWork{};  // the first one's
 };
 
 }  // namespace kelvo

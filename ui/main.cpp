@@ -45,6 +45,11 @@ int runApplication(int argc, char** argv) {
     QGuiApplication::setApplicationDisplayName(QStringLiteral("Kelvo"));
     QGuiApplication::setDesktopFileName(QStringLiteral("org.kelvo.Kelvo"));
 
+    bool isEnding = false;  // by Ctrl-C or a polite kill
+    const UnixSignals endings({SIGINT, SIGTERM, SIGHUP}, [&](int) {
+        isEnding = true;
+        QGuiApplication::quit();
+    });
     const HostColorScheme colors(followDesktop);  // early: the answer comes before the first frame
     HostSystemLog log("kelvo");
     const DirectoryResources resources(HostPaths::resourcesDirectory());
@@ -59,10 +64,11 @@ int runApplication(int argc, char** argv) {
     KelvoApp app({queue, ports, telephony, preferences, worker, [] { return std::make_unique<QuickWindow>(); }});
     app.applicationDidFinishLaunching();
 
-    // Closing the window, Ctrl-C and a polite kill end the program the same way.
+    // Closing the window and the signals above end the program the same way.
     QObject::connect(&application, &QGuiApplication::aboutToQuit, &app,
                      [&app] { HostEventLoop::call([&app] { app.applicationWillTerminate(); }); });
-    const UnixSignals endings({SIGINT, SIGTERM, SIGHUP}, [](int) { QGuiApplication::quit(); });
+    // Making the first screen may have run events, and there was no loop to quit yet.
+    if (isEnding) QMetaObject::invokeMethod(&application, &QGuiApplication::quit, Qt::QueuedConnection);
     return HostEventLoop::run(QGuiApplication::exec);
 }
 

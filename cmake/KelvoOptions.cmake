@@ -11,6 +11,11 @@ if("${CMAKE_CXX_COMPILER_LAUNCHER}" MATCHES "ccache" AND NOT "$ENV{CCACHE_SLOPPI
     set(CMAKE_DISABLE_PRECOMPILE_HEADERS ON)
 endif()
 
+# What most files include one way or another takes half of the time that they are compiled for. A file still includes
+# whatever it uses: the thread sanitizer's build precompiles nothing.
+set(KELVO_COMMON_HEADERS <algorithm> <chrono> <functional> <memory> <optional> <string> <string_view> <utility> <vector>
+    <fmt/format.h>)
+
 set(CMAKE_CXX_STANDARD 20)
 set(CMAKE_CXX_STANDARD_REQUIRED ON)
 set(CMAKE_CXX_EXTENSIONS OFF)
@@ -32,6 +37,7 @@ endif()
 if(KELVO_SANITIZE)
     add_compile_options(-fsanitize=${KELVO_SANITIZE} -fno-omit-frame-pointer -fno-sanitize-recover=all)
     add_link_options(-fsanitize=${KELVO_SANITIZE})
+    add_compile_definitions(KELVO_SANITIZED)
     if(CMAKE_CXX_COMPILER_ID STREQUAL "GNU")
         add_compile_options(-Wno-maybe-uninitialized)  # GCC 12 loses track of std::variant in instrumented code
     endif()

@@ -1,5 +1,7 @@
 #include "platform/DirectoryResources.h"
 
+#include <fmt/format.h>
+
 #include <algorithm>
 #include <fstream>
 
@@ -27,7 +29,7 @@ std::vector<std::string> DirectoryResources::pathsOfType(std::string_view type) 
     std::vector<std::string> paths;
     std::error_code unreadable;  // a missing directory holds nothing
     for (const auto& entry : std::filesystem::directory_iterator(_directory, unreadable)) {
-        if (entry.path().extension() == "." + std::string(type)) paths.push_back(entry.path().string());
+        if (entry.path().extension() == fmt::format(".{}", type)) paths.push_back(entry.path().string());
     }
     std::sort(paths.begin(), paths.end());
     return paths;

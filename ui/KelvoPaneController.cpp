@@ -57,12 +57,12 @@ void KelvoPaneController::reloadData(const std::vector<Row>& rows) {
         if (at < _rows.size() && at < rows.size() && _rows[at].isSameChild(rows[at])) {
             ++at;
         } else if (const std::size_t gone = leadingWithout(_rows, rows, at); gone > 0) {
-            removeRows(at, gone);
+            dropRows(at, gone);
         } else if (const std::size_t come = leadingWithout(rows, _rows, at); come > 0) {
-            insertRows(at, come, rows);
+            addRows(at, come, rows);
             at += come;
         } else {
-            removeRows(at, 1);
+            dropRows(at, 1);
         }
     }
     updateValues(rows);
@@ -87,7 +87,7 @@ std::size_t KelvoPaneController::leadingWithout(const std::vector<Row>& rows, co
                                     first);
 }
 
-void KelvoPaneController::removeRows(std::size_t first, std::size_t count) {
+void KelvoPaneController::dropRows(std::size_t first, std::size_t count) {
     if (count == 0) return;
     const int from = static_cast<int>(first);
     const int to = static_cast<int>(first + count);
@@ -97,7 +97,7 @@ void KelvoPaneController::removeRows(std::size_t first, std::size_t count) {
     if (_selectedRow >= from) selectRow(_selectedRow < to ? -1 : _selectedRow - (to - from));
 }
 
-void KelvoPaneController::insertRows(std::size_t first, std::size_t count, const std::vector<Row>& rows) {
+void KelvoPaneController::addRows(std::size_t first, std::size_t count, const std::vector<Row>& rows) {
     if (count == 0) return;
     const int from = static_cast<int>(first);
     const int to = static_cast<int>(first + count);

@@ -96,8 +96,8 @@ private:
     void resetRows(const std::vector<Row>& rows);
     /// How many of `rows` in a row, from index `from` on, are not among `others` from there on.
     static std::size_t leadingWithout(const std::vector<Row>& rows, const std::vector<Row>& others, std::size_t from);
-    void removeRows(std::size_t first, std::size_t count);
-    void insertRows(std::size_t first, std::size_t count, const std::vector<Row>& rows);
+    void dropRows(std::size_t first, std::size_t count);
+    void addRows(std::size_t first, std::size_t count, const std::vector<Row>& rows);
     void updateValues(const std::vector<Row>& rows);
     /// Tells that a row has changed in the roles `changed`, and in its freshness when that does.
     void setFresh(std::size_t row, bool fresh, QList<int> changed);

@@ -47,7 +47,8 @@ bool loadTemplate(Dictionary& state) {
     return true;
 }
 
-void bind(std::string_view lookupKey, std::string_view displayKey, const DictionaryRef& display, Dictionary& lookup) {
+void addBinding(std::string_view lookupKey, std::string_view displayKey, const DictionaryRef& display,
+                Dictionary& lookup) {
     Value& bindings = lookup.slot(lookupKey);
     if (!bindings.array()) bindings = Array::make();
     bindings.array()->append(Dictionary::make({{"key", displayKey}, {"dict", display}}));
@@ -72,7 +73,7 @@ void C2KLogGenerator::processTemplate(const Dictionary& templateDict, const Dict
             storeDisplayIntoDict->set(key, value);
         } else if (value.string() != nullptr) {
             storeDisplayIntoDict->set(key, "");
-            bind(*value.string(), key, storeDisplayIntoDict, storeLookupIntoDict);
+            addBinding(*value.string(), key, storeDisplayIntoDict, storeLookupIntoDict);
         }
     }
     logLine(Level::Warning, "Processing the template");

@@ -61,13 +61,13 @@ TEST(Printing, WritesWholeNumbersAsPrintfDoes) {
         {2, 0, "%ld dBm", whole(2, 0, "%d dBm")},
         {2, 0, "%ld dB", whole(2, 0, "%d dB")},
     };
-    for (const auto& [factor, summand, format, shown] : kCases) {
-        SCOPED_TRACE(format);
+    for (const auto& number : kCases) {
+        SCOPED_TRACE(number.format);
         const auto reference = [&](std::int64_t raw) {
-            return byPrintf(format, static_cast<long>(raw * factor + summand));
+            return byPrintf(number.format, static_cast<long>(raw * number.factor + number.summand));
         };
-        expectLikePrintf(shown, sixteenBits(), reference);
-        expectLikePrintf(shown, signedEdges(), reference);
+        expectLikePrintf(number.shown, sixteenBits(), reference);
+        expectLikePrintf(number.shown, signedEdges(), reference);
     }
 }
 
@@ -103,13 +103,13 @@ TEST(Printing, WritesRealNumbersAsPrintfDoes) {
         {0.334, -63.248, "%+.2f dBm", linear(0.334, -63.248, "%+.2f dBm")},
         {0.1, 0.0, "%+.2f dBm", linear(0.1, 0.0, "%+.2f dBm")},
     };
-    for (const auto& [scale, offset, format, shown] : kCases) {
-        SCOPED_TRACE(format);
+    for (const auto& number : kCases) {
+        SCOPED_TRACE(number.format);
         const auto reference = [&](std::int64_t raw) {
-            return byPrintf(format, static_cast<double>(raw) * scale + offset);
+            return byPrintf(number.format, static_cast<double>(raw) * number.scale + number.offset);
         };
-        expectLikePrintf(shown, sixteenBits(), reference);
-        expectLikePrintf(shown, signedEdges(), reference);
+        expectLikePrintf(number.shown, sixteenBits(), reference);
+        expectLikePrintf(number.shown, signedEdges(), reference);
     }
 }
 

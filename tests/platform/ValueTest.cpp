@@ -109,37 +109,6 @@ TEST(Number, FitsThirtyTwoBitsOnlyWhenNothingIsLost) {
     EXPECT_EQ(Number(1e300).int32(), std::nullopt);
 }
 
-/// 2 to the power of `doublings` keys that all have one hash: a text and another that leads the hash to the same place
-/// are interchangeable at the front of any key.
-std::vector<std::string> keysOfOneHash(int doublings) {
-    std::vector<std::string> keys = {""};
-    for (int i = 0; i < doublings; ++i) {
-        std::unordered_map<std::uint32_t, std::string> seen;
-        std::string tail[2];
-        for (std::uint32_t candidate = 0; tail[0].empty(); ++candidate) {
-            tail[1] = std::to_string(candidate) + ".";
-            const auto [before, isNew] = seen.try_emplace(Key(keys.front() + tail[1]).hash(), tail[1]);
-            if (!isNew) tail[0] = before->second;
-        }
-        const std::size_t count = keys.size();
-        for (std::size_t k = 0; k < count; ++k) keys.push_back(keys[k] + tail[1]);
-        for (std::size_t k = 0; k < count; ++k) keys[k] += tail[0];
-    }
-    return keys;
-}
-
-TEST(Dictionary, FindsItsKeysFastAlsoWhenTheyAllHaveOneHash) {
-    const std::vector<std::string> keys =
-        keysOfOneHash(12);  // compared in pairs, they would be compared eight million times
-    Dictionary large;
-    for (const std::string& key : keys) large.set(key, key);
-    ASSERT_EQ(large.size(), keys.size());
-    for (const std::string& key : keys) {
-        ASSERT_EQ(Key(key).hash(), Key(keys.front()).hash());
-        ASSERT_EQ(*large[key].string(), key);
-    }
-}
-
 TEST(Dictionary, RewritesItsEntriesInTheirPlaces) {
     const DictionaryRef row = Dictionary::make({{"a", "1"}, {"b", "2"}, {"c", "3"}});
     const Value* second = row->find("b");

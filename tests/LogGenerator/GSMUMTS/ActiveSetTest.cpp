@@ -31,7 +31,7 @@ Value row(const char* code, const char* rscp, const char* energy) {
 }
 
 TEST(ActiveSet, ShowsLevelAndEnergyOfACell) {
-    Fed<ActiveSet> section(Value(Array::make()));
+    Fed<ActiveSet> section(Array::make());
     section.feed(searcher(1, -700).u16(cellAt(0), cell(301, 0)).u32(energyAt(0, 1), 90000));  // -8 dB
     EXPECT_EQ(section.part(), Value(Array::make({row("301", "-132 dB", "-8 dB")})));
     EXPECT_EQ(test::keysOf((*section.part().array())[0]),
@@ -40,7 +40,7 @@ TEST(ActiveSet, ShowsLevelAndEnergyOfACell) {
 }
 
 TEST(ActiveSet, TruncatesTheReceivedPowerTowardZero) {
-    Fed<ActiveSet> section(Value(Array::make()));
+    Fed<ActiveSet> section(Array::make());
     section.feed(searcher(1, -517));  // -5 / 10
     EXPECT_EQ(section.row(0, "RSCP"), "-106 dB");
     section.feed(searcher(1, -503));  // 9 / 10
@@ -50,7 +50,7 @@ TEST(ActiveSet, TruncatesTheReceivedPowerTowardZero) {
 }
 
 TEST(ActiveSet, TakesTheFirstEnergyThatIsThere) {
-    Fed<ActiveSet> section(Value(Array::make()));
+    Fed<ActiveSet> section(Array::make());
     section.feed(searcher(4, -512)
                      .u16(cellAt(0), cell(1, 0))
                      .u32(energyAt(0, 4), 420000)  // -1 dB
@@ -69,7 +69,7 @@ TEST(ActiveSet, LeavesOutCellsOfOtherSets) {
     Record record = searcher(8, -512);
     for (std::uint32_t i = 0; i < 8; ++i) record.u16(cellAt(i), cell(8191 - i, i));
     record.u16(cellAt(5), cell(77, 0));
-    Fed<ActiveSet> section(Value(Array::make()));
+    Fed<ActiveSet> section(Array::make());
     section.feed(record);
     ASSERT_EQ(section.rowCount(), 2U);
     EXPECT_EQ(section.row(0, "Scrambling Code"), "8191");
@@ -77,7 +77,7 @@ TEST(ActiveSet, LeavesOutCellsOfOtherSets) {
 }
 
 TEST(ActiveSet, ReadsMeasurementsBehindAllCellsOfAnySet) {
-    Fed<ActiveSet> section(Value(Array::make()));
+    Fed<ActiveSet> section(Array::make());
     section.feed(searcher(2, -512)
                      .u16(cellAt(0), cell(5, 1))
                      .u32(energyAt(0, 2), 90000)
@@ -87,7 +87,7 @@ TEST(ActiveSet, ReadsMeasurementsBehindAllCellsOfAnySet) {
 }
 
 TEST(ActiveSet, IsEmptiedByARecordWithoutCellsAndFillsAgain) {
-    Fed<ActiveSet> section(Value(Array::make()));
+    Fed<ActiveSet> section(Array::make());
     section.feed(searcher(3, 0));
     EXPECT_EQ(section.rowCount(), 3U);
     section.feed(searcher(0, 0));
@@ -97,14 +97,14 @@ TEST(ActiveSet, IsEmptiedByARecordWithoutCellsAndFillsAgain) {
 }
 
 TEST(ActiveSet, MakesUpNoCellsBeyondTheEnd) {
-    Fed<ActiveSet> section(Value(Array::make()));
+    Fed<ActiveSet> section(Array::make());
     section.feed(Record(0x417a, 16 + 2 * 15).u8(15, 255).u16(cellAt(0), 1).u16(cellAt(1), 2));
     EXPECT_EQ(section.rowCount(), 2U);
     EXPECT_EQ(section.row(1, "Energy Per Chip"), "0 dB");
 }
 
 TEST(ActiveSet, IgnoresAShortRecordAndReportsACodeOfOthers) {
-    Fed<ActiveSet> section(Value(Array::make({"row"})));
+    Fed<ActiveSet> section(Array::make({"row"}));
     section.feed(Record(0x417a, 15));
     section.feed(Record(0x4005, 40));
     EXPECT_EQ(section.rowCount(), 1U);

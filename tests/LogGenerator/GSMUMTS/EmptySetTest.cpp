@@ -29,20 +29,20 @@ using Sections = testing::Types<DetectedSet, MonitoredSet, VirtualActiveSet>;
 TYPED_TEST_SUITE(EmptySetTest, Sections);
 
 TYPED_TEST(EmptySetTest, StaysEmptyWhateverTheSearcherReports) {
-    Fed<TypeParam> section(Value(Array::make({"row"})));
+    Fed<TypeParam> section(Array::make({"row"}));
     section.feed(everySetType());
     EXPECT_EQ(section.rowCount(), 0U);
     EXPECT_EQ(section.log().size(), 1U);
 }
 
 TYPED_TEST(EmptySetTest, IsEmptiedByARecordWithoutCells) {
-    Fed<TypeParam> section(Value(Array::make({"row"})));
+    Fed<TypeParam> section(Array::make({"row"}));
     section.feed(Record(0x417a, 16));
     EXPECT_EQ(section.rowCount(), 0U);
 }
 
 TYPED_TEST(EmptySetTest, IgnoresAShortRecordAndReportsACodeOfOthers) {
-    Fed<TypeParam> section(Value(Array::make({"row"})));
+    Fed<TypeParam> section(Array::make({"row"}));
     section.feed(Record(0x417a, 15));
     section.feed(Record(0x4005, 40));
     EXPECT_EQ(section.rowCount(), 1U);

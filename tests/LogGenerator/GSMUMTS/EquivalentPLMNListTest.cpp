@@ -20,7 +20,7 @@ Record counting(std::uint32_t networks, std::size_t size) {
 }
 
 TEST(EquivalentPLMNList, ReadsSixBytesEveryThreeBytes) {
-    Fed<EquivalentPLMNList> section(Value(Array::make()));
+    Fed<EquivalentPLMNList> section(Array::make());
     section.feed(counting(2, 26));  // 1 2 3 4 5 6 7 8 9
     ASSERT_EQ(section.rowCount(), 2U);
     EXPECT_EQ(section.row(0, "Mobile Country Code"), "135");
@@ -31,14 +31,14 @@ TEST(EquivalentPLMNList, ReadsSixBytesEveryThreeBytes) {
 }
 
 TEST(EquivalentPLMNList, CountsBytesOfMoreThanADigitInFull) {
-    Fed<EquivalentPLMNList> section(Value(Array::make()));
+    Fed<EquivalentPLMNList> section(Array::make());
     section.feed(Record(0x7150, 23).u8(16, 1).u16(17, 0xFFFF).u16(19, 0xFFFF).u16(21, 0xFFFF));
     EXPECT_EQ(section.row(0, "Mobile Country Code"), "28305");  // 255 * 111
     EXPECT_EQ(section.row(0, "Mobile Network Code"), "28305");
 }
 
 TEST(EquivalentPLMNList, ReadsZeroPastTheEndAndMakesUpNoNetworks) {
-    Fed<EquivalentPLMNList> section(Value(Array::make()));
+    Fed<EquivalentPLMNList> section(Array::make());
     section.feed(counting(200, 19));  // 1 2
     ASSERT_EQ(section.rowCount(), 1U);
     EXPECT_EQ(section.row(0, "Mobile Country Code"), "100");
@@ -48,7 +48,7 @@ TEST(EquivalentPLMNList, ReadsZeroPastTheEndAndMakesUpNoNetworks) {
 }
 
 TEST(EquivalentPLMNList, IsEmptiedByARecordWithoutNetworks) {
-    Fed<EquivalentPLMNList> section(Value(Array::make()));
+    Fed<EquivalentPLMNList> section(Array::make());
     section.feed(counting(2, 26));
     section.feed(Record(0x7150, 26));
     EXPECT_EQ(section.rowCount(), 0U);
@@ -58,7 +58,7 @@ TEST(EquivalentPLMNList, IsEmptiedByARecordWithoutNetworks) {
 }
 
 TEST(EquivalentPLMNList, IgnoresAShortRecordAndReportsACodeOfOthers) {
-    Fed<EquivalentPLMNList> section(Value(Array::make()));
+    Fed<EquivalentPLMNList> section(Array::make());
     section.feed(counting(2, 26));
     section.clearLog();
     section.feed(Record(0x7150, 16));

@@ -12,7 +12,7 @@ using test::Record;
 using Lines = std::vector<test::RecordingLog::Line>;
 
 TEST(GSMSet, ShowsTheRanking) {
-    Fed<GSMSet> section(Value(Array::make()));
+    Fed<GSMSet> section(Array::make());
     section.feed(Record(0x4005, 29)
                      .u8(14, 2)
                      .u16(15, 975)
@@ -36,26 +36,26 @@ TEST(GSMSet, ShowsTheRanking) {
 }
 
 TEST(GSMSet, ReadsItsCellsWhereTheUmtsCellsBegin) {
-    Fed<GSMSet> section(Value(Array::make()));
+    Fed<GSMSet> section(Array::make());
     section.feed(Record(0x4005, 15 + 2 * 10 + 7).u8(13, 2).u8(14, 1).u16(15, 975).u16(35, 976));
     ASSERT_EQ(section.rowCount(), 1U);
     EXPECT_EQ(section.row(0, "ARFCN"), "975");
 }
 
 TEST(GSMSet, IsEmptiedByARankingWithoutGsmCells) {
-    Fed<GSMSet> section(Value(Array::make({"row"})));
+    Fed<GSMSet> section(Array::make({"row"}));
     section.feed(Record(0x4005, 40).u8(13, 3));
     EXPECT_EQ(section.rowCount(), 0U);
 }
 
 TEST(GSMSet, MakesUpNoRowsBeyondTheEnd) {
-    Fed<GSMSet> section(Value(Array::make()));
+    Fed<GSMSet> section(Array::make());
     section.feed(Record(0x4005, 23).u8(14, 255));
     EXPECT_EQ(section.rowCount(), 2U);
 }
 
 TEST(GSMSet, IgnoresAShortRecordAndReportsACodeOfOthers) {
-    Fed<GSMSet> section(Value(Array::make({"row"})));
+    Fed<GSMSet> section(Array::make({"row"}));
     section.feed(Record(0x4005, 14));
     section.feed(Record(0xff0001, 40));
     EXPECT_EQ(section.rowCount(), 1U);

@@ -20,7 +20,7 @@ Record neighbours(std::uint32_t count) { return Record(0x5137, 29 + 14 * count).
 constexpr std::size_t at(std::size_t index) { return 29 + 14 * index; }
 
 TEST(NeighboringCells, ShowsTheMeasuredCells) {
-    Fed<NeighboringCells> section(Value(Array::make({"row"})));
+    Fed<NeighboringCells> section(Array::make({"row"}));
     section.feed(neighbours(2)
                      .u16(at(0), 975)
                      .u8(at(0) + 2, 60)
@@ -35,7 +35,7 @@ TEST(NeighboringCells, ShowsTheMeasuredCells) {
 }
 
 TEST(NeighboringCells, AddsTheIdentityOfCellsThatTheLastIdentityRecordNamed) {
-    Fed<NeighboringCells> section(Value(Array::make()));
+    Fed<NeighboringCells> section(Array::make());
     section.feed(Record(0x51ff, 27).u8(14, 3).u16(15, 975).u8(17, 1).u16(19, 512).u8(21, 63).u16(23, 975).u8(25, 42));
     EXPECT_EQ(section.rowCount(), 0U);
     section.feed(neighbours(3).u16(at(0), 512).u16(at(1), 700).u16(at(2), 975));
@@ -47,7 +47,7 @@ TEST(NeighboringCells, AddsTheIdentityOfCellsThatTheLastIdentityRecordNamed) {
 }
 
 TEST(NeighboringCells, ForgetsTheIdentitiesOfEarlierRecords) {
-    Fed<NeighboringCells> section(Value(Array::make()));
+    Fed<NeighboringCells> section(Array::make());
     section.feed(Record(0x51ff, 19).u8(14, 1).u16(15, 975).u8(17, 42));
     section.feed(Record(0x51ff, 14));  // too short: kept
     section.feed(neighbours(1).u16(at(0), 975));
@@ -59,13 +59,13 @@ TEST(NeighboringCells, ForgetsTheIdentitiesOfEarlierRecords) {
 }
 
 TEST(NeighboringCells, IsEmptiedByAMeasurementWithoutNeighbours) {
-    Fed<NeighboringCells> section(Value(Array::make({"row"})));
+    Fed<NeighboringCells> section(Array::make({"row"}));
     section.feed(neighbours(0));
     EXPECT_EQ(section.rowCount(), 0U);
 }
 
 TEST(NeighboringCells, MakesUpNothingBeyondTheEnd) {
-    Fed<NeighboringCells> section(Value(Array::make()));
+    Fed<NeighboringCells> section(Array::make());
     section.feed(Record(0x51ff, 19).u8(14, 255).u16(15, 975).u8(17, 42));
     section.feed(Record(0x5137, 29 + 15).u8(28, 255).u16(29, 975));
     ASSERT_EQ(section.rowCount(), 2U);
@@ -75,7 +75,7 @@ TEST(NeighboringCells, MakesUpNothingBeyondTheEnd) {
 }
 
 TEST(NeighboringCells, ShowsGsmNeighboursOfTheCellArrayWithTheDoubledLevel) {
-    Fed<NeighboringCells> section(Value(Array::make({"row"})));
+    Fed<NeighboringCells> section(Array::make({"row"}));
     section.feed(Record(0x51ff, 19).u8(14, 1).u16(15, 975).u8(17, 42));
     section.clearLog();
     section.feed(cellArray({
@@ -95,11 +95,11 @@ TEST(NeighboringCells, ShowsGsmNeighboursOfTheCellArrayWithTheDoubledLevel) {
 
 TEST(NeighboringCells, IsEmptyAfterADamagedCellArrayOrOneWithoutNeighbours) {
     for (const Record& record : {Record(0xff0001, 20), cellArray({}), cellArray({cell("GSM", "Serving")})}) {
-        Fed<NeighboringCells> section(Value(Array::make({"row"})));
+        Fed<NeighboringCells> section(Array::make({"row"}));
         section.feed(record);
         EXPECT_EQ(section.rowCount(), 0U);
     }
-    Fed<NeighboringCells> section(Value(Array::make({"row"})));
+    Fed<NeighboringCells> section(Array::make({"row"}));
     section.feed(Record(0xff0001, 20));
     EXPECT_EQ(section.log(), (Lines{{4, "NeighboringCells"},
                                     {3, "Cell Info Array data could not be constructed"},
@@ -107,7 +107,7 @@ TEST(NeighboringCells, IsEmptyAfterADamagedCellArrayOrOneWithoutNeighbours) {
 }
 
 TEST(NeighboringCells, IgnoresAShortRecordAndReportsACodeOfOthers) {
-    Fed<NeighboringCells> section(Value(Array::make({"row"})));
+    Fed<NeighboringCells> section(Array::make({"row"}));
     section.feed(Record(0x5137, 28));
     section.feed(Record(0x5134, 40));
     EXPECT_EQ(section.rowCount(), 1U);

@@ -16,7 +16,7 @@ using test::payload;
 
 TEST(PDPContextList, ShowsTheContextsAsDelivered) {
     const Value context = Dictionary::make({{"APN", "internet"}, {"NSAPI", 5}, {"QoS", Array::make({1.5, true})}});
-    Fed<PDPContextList> section(Value(Array::make({"old"})));
+    Fed<PDPContextList> section(Array::make({"old"}));
     section.feed(payload(0xff0002, Array::make({context, "text"})));
     EXPECT_EQ(section.part(), Value(Array::make({context, "text"})));
     EXPECT_EQ(section.log(), (Lines{{4, "PDPContextList"}}));
@@ -32,7 +32,7 @@ TEST(PDPContextList, KeepsTheArrayOfTheDisplay) {
 }
 
 TEST(PDPContextList, ChangesNothingForAnythingButAnArray) {
-    Fed<PDPContextList> section(Value(Array::make({"old"})));
+    Fed<PDPContextList> section(Array::make({"old"}));
     section.feed(payload(0xff0002, Dictionary::make({{"APN", "internet"}})));
     section.feed(payload(0xff0002, "text"));
     section.feed(Record(0xff0002, 13).text(13, "<plist><array>"));
@@ -42,7 +42,7 @@ TEST(PDPContextList, ChangesNothingForAnythingButAnArray) {
 }
 
 TEST(PDPContextList, ReportsACodeOfOthers) {
-    Fed<PDPContextList> section(Value(Array::make({"old"})));
+    Fed<PDPContextList> section(Array::make({"old"}));
     section.feed(payload(0xff0001, Array::make()));
     EXPECT_EQ(section.rowCount(), 1U);
     EXPECT_EQ(section.log(), (Lines{{4, "PDPContextList"}, {3, "Received an unknown log message: 16711681"}}));

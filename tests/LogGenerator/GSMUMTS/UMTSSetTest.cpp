@@ -17,7 +17,7 @@ using test::cell;
 using test::cellArray;
 
 TEST(UMTSSet, ShowsTheRanking) {
-    Fed<UMTSSet> section(Value(Array::make()));
+    Fed<UMTSSet> section(Array::make());
     section.feed(Record(0x4005, 35)
                      .u8(13, 2)
                      .u16(15, 10562)
@@ -52,7 +52,7 @@ TEST(UMTSSet, ShowsTheRanking) {
 }
 
 TEST(UMTSSet, ShowsTheEnergyInSignedHalves) {
-    Fed<UMTSSet> section(Value(Array::make()));
+    Fed<UMTSSet> section(Array::make());
     section.feed(Record(0x4005, 25).u8(13, 1).u8(22, 0xFF));
     EXPECT_EQ(section.row(0, "Energy Per Chip"), "-0.500000 dB");
     section.feed(Record(0x4005, 25).u8(13, 1).u8(22, 0x00));
@@ -62,19 +62,19 @@ TEST(UMTSSet, ShowsTheEnergyInSignedHalves) {
 }
 
 TEST(UMTSSet, IsEmptiedByARankingWithoutUmtsCells) {
-    Fed<UMTSSet> section(Value(Array::make({"row"})));
+    Fed<UMTSSet> section(Array::make({"row"}));
     section.feed(Record(0x4005, 40).u8(14, 3));
     EXPECT_EQ(section.rowCount(), 0U);
 }
 
 TEST(UMTSSet, MakesUpNoRowsBeyondTheEnd) {
-    Fed<UMTSSet> section(Value(Array::make()));
+    Fed<UMTSSet> section(Array::make());
     section.feed(Record(0x4005, 26).u8(13, 255));
     EXPECT_EQ(section.rowCount(), 2U);
 }
 
 TEST(UMTSSet, ShowsUmtsNeighboursOfTheCellArray) {
-    Fed<UMTSSet> section(Value(Array::make({"row"})));
+    Fed<UMTSSet> section(Array::make({"row"}));
     section.feed(cellArray({
         cell("UMTS", "Serving", {{"kPLCellMonitorSCN", 1}}),
         cell("UMTS", "Neighbor",
@@ -101,7 +101,7 @@ TEST(UMTSSet, ShowsUmtsNeighboursOfTheCellArray) {
 }
 
 TEST(UMTSSet, AddsANeighbourWithoutTheValuesThatItLacks) {
-    Fed<UMTSSet> section(Value(Array::make()));
+    Fed<UMTSSet> section(Array::make());
     section.feed(cellArray({cell("UMTS", "Neighbor"), cell("UMTS", "Neighbor", {{"kPLCellMonitorSCN", 5}})}));
     EXPECT_EQ(section.part(), Value(Array::make({Dictionary::make(), Dictionary::make({{"Scrambling Code", "5"}})})));
     EXPECT_EQ(section.log(), (Lines{{4, "UMTSSet"},
@@ -115,7 +115,7 @@ TEST(UMTSSet, AddsANeighbourWithoutTheValuesThatItLacks) {
 }
 
 TEST(UMTSSet, IsEmptiedByACellArrayWithoutUmtsNeighbours) {
-    Fed<UMTSSet> section(Value(Array::make({"row"})));
+    Fed<UMTSSet> section(Array::make({"row"}));
     section.feed(cellArray({cell("GSM", "Neighbor")}));
     EXPECT_EQ(section.rowCount(), 0U);
     EXPECT_EQ(section.log(), (Lines{{4, "UMTSSet"}}));
@@ -150,7 +150,7 @@ TEST(UMTSSet, IsEmptyWhenItReportsADamagedCellArray) {
 }
 
 TEST(UMTSSet, IgnoresAShortRecordAndReportsACodeOfOthers) {
-    Fed<UMTSSet> section(Value(Array::make({"row"})));
+    Fed<UMTSSet> section(Array::make({"row"}));
     section.feed(Record(0x4005, 14));
     section.feed(Record(0x417a, 40));
     EXPECT_EQ(section.rowCount(), 1U);

@@ -25,14 +25,14 @@ Record twoNeighbors() {
 }
 
 TEST(GSMNeighbhorMeasurements, EmptiesTheListAndLeavesItSo) {
-    Fed<GSMNeighbhorMeasurements> section(Value(Array::make({"row"})));
+    Fed<GSMNeighbhorMeasurements> section(Array::make({"row"}));
     section.feed(twoNeighbors());
     EXPECT_EQ(section.rowCount(), 0U);
     EXPECT_EQ(section.log(), (Lines{{4, kTitle}}));
 }
 
 TEST(GSMNeighbhorMeasurements, KeepsTheListWhenARecordIsShortOrOfAnotherCode) {
-    Fed<GSMNeighbhorMeasurements> section(Value(Array::make({"row"})));
+    Fed<GSMNeighbhorMeasurements> section(Array::make({"row"}));
     section.feed(twoNeighbors().cut(16), 0xD00E);
     section.feed(Record(0xD00A, 40));
     EXPECT_EQ(section.rowCount(), 1U);

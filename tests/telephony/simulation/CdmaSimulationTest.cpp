@@ -5,6 +5,7 @@
 #include <algorithm>
 #include <deque>
 #include <map>
+#include <optional>
 #include <set>
 
 #include "tests/telephony/simulation/Played.h"
@@ -83,38 +84,58 @@ TEST(CdmaSimulation, HandsOffOnlyToPilotsOfTheActiveSetDuringACall) {
     EXPECT_GE(most, 3U);
 }
 
-// An idle phone's records show the pilot that it follows alone, so the others come from the world.
-TEST(CdmaSimulation, MovesToClearlyStrongerPilotsThatCameCloserWhenIdle) {
+// The pilot that the modem follows alone, as it does when idle.
+std::optional<PilotReading> followedOneX(const CdmaSimulation& modem) {
+    const OneXStatus& status = modem.oneX().status();
+    if (status.state != OneXState::Paging && status.state != OneXState::Sleep) return std::nullopt;
+    EXPECT_EQ(status.active.size(), 1U);
+    return status.active.at(0);
+}
+
+std::optional<PilotReading> followedEvdo(const CdmaSimulation& modem) {
+    const EvdoStatus& status = modem.evdo().status();
+    if (status.state != EvdoState::Idle) return std::nullopt;
+    EXPECT_EQ(status.active.size(), 1U);
+    return status.active.at(0);
+}
+
+// An idle phone's records show the pilot that it follows alone, so the others come from the world. A pilot weaker than
+// `drop` may be left for any that is stronger.
+void expectMovesWhenIdle(std::optional<PilotReading> (*followed)(const CdmaSimulation&), double drop, int fewest) {
     CdmaSimulation modem(1);
     const auto& sectors = modem.network().sectors;
     const auto sectorOf = [&sectors](int pn) {
         return static_cast<std::size_t>(std::ranges::find(sectors, pn, &CdmaSector::pn) - sectors.begin());
     };
     std::deque<std::pair<Time, std::vector<double>>> received;  // of the last 8 s
-    int followed = -1;
+    std::optional<PilotReading> before;
     int moves = 0;
     int rising = 0;
     for (auto message = modem.next(); message.time < 10min; message = modem.next()) {
-        const OneXStatus& status = modem.oneX().status();
         received.emplace_back(message.time, modem.drive().received());
         while (received.front().first < message.time - 8s) received.pop_front();
-        if (status.state != OneXState::Paging && status.state != OneXState::Sleep) {
-            followed = -1;
-            continue;
-        }
-        ASSERT_EQ(status.active.size(), 1U);
-        if (followed >= 0 && status.referencePn != followed) {
-            const auto above = [&, to = sectorOf(status.referencePn), from = sectorOf(followed)](const auto& levels) {
+        const std::optional<PilotReading> now = followed(modem);
+        if (before && now && now->pn != before->pn) {
+            const auto above = [&, to = sectorOf(now->pn), from = sectorOf(before->pn)](const auto& levels) {
                 return levels[to] - levels[from];
             };
-            EXPECT_GT(above(received.back().second), 2) << seconds(message.time);  // 3 dB as read, noise included
+            const double least = before->strength < drop + 1 ? -1 : 2;  // 0 or 3 dB as read, noise included
+            EXPECT_GT(above(received.back().second), least) << seconds(message.time);
             rising += above(received.back().second) > above(received.front().second);
             ++moves;
         }
-        followed = status.referencePn;
+        before = now;
     }
-    EXPECT_GE(moves, 12);
+    EXPECT_GE(moves, fewest);
     EXPECT_GE(rising, moves * 3 / 4) << moves;
+}
+
+TEST(CdmaSimulation, MovesToClearlyStrongerPilotsThatCameCloserWhenIdle) {
+    expectMovesWhenIdle(followedOneX, -16, 12);  // T_DROP
+}
+
+TEST(CdmaSimulation, MovesLikewiseInEvdo) {
+    expectMovesWhenIdle(followedEvdo, -9, 6);  // PilotDrop
 }
 
 TEST(CdmaSimulation, RegistersWheneverTheSystemOrNetworkChanges) {

@@ -5,22 +5,15 @@
 #include <string>
 
 #include "platform/DirectoryResources.h"
+#include "tests/support/TemporaryDirectory.h"
 
 namespace kelvo {
 namespace {
 
 namespace fs = std::filesystem;
 
-/// A directory of its own for every test.
 class DirectoryResourcesTest : public testing::Test {
 protected:
-    void SetUp() override {
-        std::string name = (fs::temp_directory_path() / "kelvo-resources-XXXXXX").string();
-        ASSERT_NE(mkdtemp(name.data()), nullptr);
-        directory = name;
-    }
-    void TearDown() override { fs::remove_all(directory); }
-
     void put(std::string_view name, std::string_view content) { std::ofstream(directory / name) << content; }
     std::string path(std::string_view name) const { return (directory / name).string(); }
     std::string reason(std::string_view name) const {
@@ -28,7 +21,8 @@ protected:
         return result ? "(was read)" : result.error().reason;
     }
 
-    fs::path directory;
+    const test::TemporaryDirectory temporary;
+    const fs::path directory = temporary.path();
 };
 
 TEST_F(DirectoryResourcesTest, LoadsADictionaryByItsName) {

@@ -21,6 +21,8 @@
 
 namespace kelvo::test {
 
+using Lines = std::vector<RecordingLog::Line>;
+
 /// A modem whose records the test makes up.
 class TestSource final : public RecordSource {
 public:

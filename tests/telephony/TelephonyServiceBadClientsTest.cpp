@@ -3,8 +3,6 @@
 using namespace kelvo;
 using namespace kelvo::test;
 
-using Lines = std::vector<RecordingLog::Line>;
-
 TEST_F(TelephonyServiceTest, AnswersCommandsItCannotUseWithAnErrorAndOneLine) {
     start();
     auto client = makeClient("client");

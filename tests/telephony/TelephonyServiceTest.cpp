@@ -5,8 +5,6 @@
 using namespace kelvo;
 using namespace kelvo::test;
 
-using Lines = std::vector<RecordingLog::Line>;
-
 TEST_F(TelephonyServiceTest, OpensAChannelAndNamesTheTechnology) {
     start();
     auto client = makeClient("client");

@@ -1,13 +1,6 @@
 #include "tests/ui/AppWorld.h"
 
-#include <cstdlib>
-
 namespace kelvo::test {
-
-TemporaryDirectory::TemporaryDirectory() {
-    std::string pattern = (std::filesystem::temp_directory_path() / "kelvo-ui-XXXXXX").string();
-    path = mkdtemp(pattern.data());
-}
 
 AppWorld::AppWorld() {
     ports.onRequest = speaking(std::string(kPLLogChannelTechnology_IFX));

@@ -13,20 +13,13 @@
 #include "tests/support/ManualQueue.h"
 #include "tests/support/ManualWorker.h"
 #include "tests/support/RecordingLog.h"
+#include "tests/support/TemporaryDirectory.h"
 #include "tests/ui/FakeWindow.h"
 #include "ui/KelvoApp.h"
 
 namespace kelvo::test {
 
 using namespace std::chrono_literals;
-
-/// An empty directory of its own that goes with the object.
-class TemporaryDirectory {
-public:
-    TemporaryDirectory();
-    ~TemporaryDirectory() { std::filesystem::remove_all(path); }
-    std::filesystem::path path;
-};
 
 /// The application with a modem whose service sends ready-made trees, on a clock, a queue and ports of the test's own.
 class AppWorld {
@@ -35,9 +28,9 @@ public:
 
     KelvoApp::Services services();
     /// A file at this path permits saving; it is not there unless the test puts it there.
-    std::filesystem::path markerPath() const { return directory.path / "Carrier Settings.bundle"; }
+    std::filesystem::path markerPath() const { return directory.path() / "Carrier Settings.bundle"; }
     void permitSaving() { std::filesystem::create_directory(markerPath()); }
-    std::filesystem::path snapshotDirectory() const { return directory.path / "snapshots"; }
+    std::filesystem::path snapshotDirectory() const { return directory.path() / "snapshots"; }
 
     /// The service delivers a tree. Dictionaries of one entry and the first element of each list do not reach the
     /// screens: that is how this modem family's trees are read.

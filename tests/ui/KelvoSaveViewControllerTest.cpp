@@ -25,7 +25,7 @@ class SaveScreen : public testing::Test {
 protected:
     KelvoSaveViewController& open(const ArrayRef& history) {
         screen = std::make_unique<KelvoSaveViewController>(
-            history, KelvoSaveViewController::Services{queue, host, worker, folder.path.string()});
+            history, KelvoSaveViewController::Services{queue, host, worker, folder.path().string()});
         return *screen;
     }
     static ArrayRef twoEntries() {
@@ -33,7 +33,7 @@ protected:
                             Dictionary::make({{"Description", "DLF binary (161 bytes)"}, {"DLF", Bytes{1, 2}}})});
     }
     std::string pathAt(long long seconds) const {
-        return (folder.path / ("KelvoSnapshot-" + std::to_string(seconds) + ".kelvo")).string();
+        return (folder.path() / ("KelvoSnapshot-" + std::to_string(seconds) + ".kelvo")).string();
     }
     static std::string textOfFile(const std::string& path) {
         std::ifstream file(path, std::ios::binary);
@@ -45,7 +45,7 @@ protected:
         return value ? *value : Value();
     }
     std::ptrdiff_t files() const {
-        return std::distance(std::filesystem::directory_iterator(folder.path), std::filesystem::directory_iterator());
+        return std::distance(std::filesystem::directory_iterator(folder.path()), std::filesystem::directory_iterator());
     }
 
     test::ManualClock clock{1299230102, 120};  // 2011-03-04 09:15:02 UTC, seen from two hours east
@@ -129,7 +129,7 @@ TEST_F(SaveScreen, ReplacesASnapshotOfTheSameSecondInPlace) {
     KelvoSaveViewController& first = open(twoEntries());
     first.setSaveDescription(QStringLiteral("a long description that a shorter file must not keep"));
     first.savePressed();
-    std::filesystem::create_hard_link(pathAt(1299230102), folder.path / "other-name");
+    std::filesystem::create_hard_link(pathAt(1299230102), folder.path() / "other-name");
     KelvoSaveViewController& second = open(Array::make());
     second.setSaveDescription(QStringLiteral("second"));
     second.savePressed();
@@ -137,18 +137,18 @@ TEST_F(SaveScreen, ReplacesASnapshotOfTheSameSecondInPlace) {
     const Value expected = Dictionary::make(
         {{"Timestamp", "2011-03-04 09:15:02 +0000"}, {"Data", Array::make()}, {"Description", "second"}});
     EXPECT_EQ(contents(pathAt(1299230102)), expected);
-    EXPECT_EQ(contents((folder.path / "other-name").string()), expected);  // the same file, written over
+    EXPECT_EQ(contents((folder.path() / "other-name").string()), expected);  // the same file, written over
 }
 
 TEST_F(SaveScreen, LogsAlertsAndClosesAllTheSameWhenTheFileCannotBeWritten) {
     KelvoSaveViewController& save = open(twoEntries());
-    std::filesystem::remove(folder.path);
+    std::filesystem::remove(folder.path());
     save.savePressed();
 
     const std::vector<test::RecordingLog::Line> expected = {{3, "Unable to write snapshot to " + pathAt(1299230102)}};
     EXPECT_EQ(log.lines(), expected);
     EXPECT_EQ(host.alerts, QStringList(QStringLiteral("File Error|Unable to write file to disk|Close")));
-    EXPECT_FALSE(std::filesystem::exists(folder.path));
+    EXPECT_FALSE(std::filesystem::exists(folder.path()));
     queue.run();
     EXPECT_EQ(host.saveViewsClosed, 1);
 }
@@ -188,7 +188,7 @@ TEST_F(SaveScreen, LogsAFailureThatComesAfterItHasGoneAndAsksNobody) {
     worker.held = true;
     open(twoEntries()).savePressed();
     screen.reset();
-    std::filesystem::remove(folder.path);
+    std::filesystem::remove(folder.path());
     worker.finish();
     queue.run();
     EXPECT_EQ(log.lines().size(), 1U);

@@ -4,7 +4,7 @@
 #include <iterator>
 
 #include "LogGenerator/ArrayLock.h"
-#include "platform/Environment.h"
+#include "platform/system/Environment.h"
 
 namespace kelvo {
 

@@ -10,8 +10,8 @@
 #include "LogGenerator/CodeDictionary.h"
 #include "LogGenerator/FieldTable.h"
 #include "LogGenerator/LogCode.h"
-#include "platform/Bytes.h"
-#include "platform/Value.h"
+#include "platform/values/Bytes.h"
+#include "platform/values/Value.h"
 
 namespace kelvo {
 

@@ -69,7 +69,7 @@ void printInteger(std::string& text, std::int64_t value, const NumberFormat& for
     printBetween(text, format, value < 0, [value](Line& line) { line.appendNumber(value); });
 }
 
-/// The decimals of 0 to 7 eighths. With two of them 1/8 is 12.5 hundredths; the half goes to the even neighbour, as
+/// The decimals of 0 to 7 eighths. With two of them 1/8 is 12.5 hundredths; the half goes to the even neighbor, as
 /// printf rounds, and never past the next whole number.
 constexpr std::string_view kHundredths[] = {"00", "12", "25", "38", "50", "62", "75", "88"};
 constexpr std::string_view kThousandths[] = {"000", "125", "250", "375", "500", "625", "750", "875"};

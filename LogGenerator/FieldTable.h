@@ -11,8 +11,8 @@
 
 #include "LogGenerator/NumberFormat.h"
 #include "LogGenerator/RecordView.h"
-#include "platform/Dictionary.h"
-#include "platform/Key.h"
+#include "platform/values/Dictionary.h"
+#include "platform/values/Key.h"
 
 /// The words in which record layouts are written, one field a line: where it lies, how it is stored, the display key,
 /// how it is shown. What cannot be right does not compile: a field past the record's minimum length, a key twice, 32

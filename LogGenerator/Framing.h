@@ -1,7 +1,7 @@
 #pragma once
 
 #include "LogGenerator/LogCode.h"
-#include "platform/Bytes.h"
+#include "platform/values/Bytes.h"
 
 /// How a diagnostic log packet is wrapped. All multi-byte fields are little-endian. A message is an optional prefix of
 /// two bytes, the first of them 0x81, and the packet:

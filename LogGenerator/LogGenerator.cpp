@@ -1,13 +1,13 @@
 #include "LogGenerator/LogGenerator.h"
 
 #include "LogGenerator/CDMA/C2KLogGenerator.h"
-#include "LogGenerator/GSM/GSMLogGenerator.h"
 #include "LogGenerator/GSMUMTS/OSK_GSMLogGenerator.h"
+#include "LogGenerator/IFX/GSMLogGenerator.h"
 #include "LogGenerator/LTE/LTELogGenerator.h"
 #include "LogGenerator/UTRAN/UTRANLogGenerator.h"
-#include "platform/DateText.h"
-#include "platform/Environment.h"
-#include "platform/TelephonyConstants.h"
+#include "platform/system/DateText.h"
+#include "platform/system/Environment.h"
+#include "platform/telephony/TelephonyConstants.h"
 
 namespace kelvo {
 

@@ -4,8 +4,8 @@
 #include <memory>
 #include <string_view>
 
-#include "platform/Bytes.h"
-#include "platform/Value.h"
+#include "platform/values/Bytes.h"
+#include "platform/values/Value.h"
 
 namespace kelvo {
 

@@ -5,7 +5,7 @@
 #include <utility>
 
 #include "LogGenerator/DLFVersionReport.h"
-#include "platform/Environment.h"
+#include "platform/system/Environment.h"
 
 namespace kelvo {
 

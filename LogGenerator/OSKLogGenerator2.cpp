@@ -6,7 +6,7 @@
 
 #include "LogGenerator/Framing.h"
 #include "LogGenerator/UnknownDataException.h"
-#include "platform/Environment.h"
+#include "platform/system/Environment.h"
 
 namespace kelvo {
 

@@ -5,7 +5,7 @@
 #include <cstdint>
 
 #include "LogGenerator/ArrayOutOfBoundsException.h"
-#include "platform/Bytes.h"
+#include "platform/values/Bytes.h"
 
 namespace kelvo {
 

@@ -3,8 +3,8 @@
 #include <cstddef>
 
 #include "LogGenerator/ArrayLock.h"
-#include "platform/Array.h"
-#include "platform/Dictionary.h"
+#include "platform/values/Array.h"
+#include "platform/values/Dictionary.h"
 
 namespace kelvo {
 

@@ -5,7 +5,7 @@
 #include <string>
 #include <vector>
 
-#include "platform/Value.h"
+#include "platform/values/Value.h"
 
 namespace kelvo::bench {
 

@@ -11,9 +11,9 @@
 #include <optional>
 
 #include "bench/Families.h"
-#include "platform/DirectoryResources.h"
-#include "platform/Environment.h"
 #include "platform/host/HostSystemLog.h"
+#include "platform/system/DirectoryResources.h"
+#include "platform/system/Environment.h"
 
 namespace {
 
@@ -99,7 +99,7 @@ int main(int argc, char** argv) {
     add("LTE and GSM/UMTS / 0xB0C1, 0xB0C2, 0xB179 and 0x7130 to 0x7135",
         {{lte.technology, traffic(lte, "0xB0C1, 0xB0C2, 0xB179").messages},
          {gsm.technology, traffic(gsm, "0x7130 to 0x7135").messages}});
-    for (const Family& family : {lte, gsm, bench::cdmaFamily(), bench::utranFamily(), bench::cellMonitorFamily()}) {
+    for (const Family& family : {lte, gsm, bench::cdmaFamily(), bench::utranFamily(), bench::ifxFamily()}) {
         for (const auto& [name, messages] : family.traffic) {
             add(family.name + " / " + name, {{family.technology, messages}});
         }

@@ -53,7 +53,7 @@ Family lteFamily();
 Family gsmFamily();
 Family cdmaFamily();
 Family utranFamily();
-Family cellMonitorFamily();
+Family ifxFamily();
 
 /// The records that fill every list of the GSM/UMTS screens.
 std::vector<Bytes> fullestGSMScreen();

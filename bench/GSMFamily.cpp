@@ -2,8 +2,8 @@
 
 #include "bench/BinaryEncoder.h"
 #include "bench/Families.h"
-#include "platform/PropertyList.h"
-#include "platform/TelephonyConstants.h"
+#include "platform/encodings/PropertyList.h"
+#include "platform/telephony/TelephonyConstants.h"
 
 namespace kelvo::bench {
 namespace {

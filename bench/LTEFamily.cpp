@@ -1,5 +1,5 @@
 #include "bench/Families.h"
-#include "platform/TelephonyConstants.h"
+#include "platform/telephony/TelephonyConstants.h"
 
 namespace kelvo::bench {
 namespace {

@@ -5,8 +5,8 @@
 #include <cstdint>
 
 #include "bench/BinaryEncoder.h"
-#include "platform/PropertyList.h"
-#include "platform/TelephonyConstants.h"
+#include "platform/encodings/PropertyList.h"
+#include "platform/telephony/TelephonyConstants.h"
 
 namespace {
 

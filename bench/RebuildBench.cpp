@@ -5,8 +5,8 @@
 
 #include "bench/Families.h"
 #include "model/KelvoModelNode.h"
-#include "platform/DirectoryResources.h"
-#include "platform/Environment.h"
+#include "platform/system/DirectoryResources.h"
+#include "platform/system/Environment.h"
 
 namespace kelvo {
 namespace {

@@ -18,12 +18,12 @@
 
 #include "bench/Families.h"
 #include "model/KelvoModel.h"
-#include "platform/DirectoryResources.h"
-#include "platform/Environment.h"
-#include "platform/PropertyList.h"
+#include "platform/encodings/PropertyList.h"
 #include "platform/host/HostMainQueue.h"
 #include "platform/host/HostMessagePorts.h"
 #include "platform/host/HostTelephonyClient.h"
+#include "platform/system/DirectoryResources.h"
+#include "platform/system/Environment.h"
 #include "telephony/TelephonyService.h"
 
 namespace {

@@ -46,5 +46,5 @@ if(KELVO_FUZZ)
     add_compile_options(-fsanitize=fuzzer-no-link)  # the libraries count their branches for the fuzz targets
 endif()
 
-# Headers are included by their path from the root: "platform/Value.h".
+# Headers are included by their path from the root: "platform/values/Value.h".
 include_directories(${CMAKE_SOURCE_DIR})

@@ -1,7 +1,7 @@
 #include "model/KelvoModel.h"
 
-#include "platform/Environment.h"
-#include "platform/PropertyList.h"
+#include "platform/encodings/PropertyList.h"
+#include "platform/system/Environment.h"
 
 namespace kelvo {
 

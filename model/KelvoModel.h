@@ -7,9 +7,9 @@
 
 #include "LogGenerator/LogGenerator.h"
 #include "model/KelvoModelNode.h"
-#include "platform/MainQueue.h"
-#include "platform/MessagePorts.h"
-#include "platform/Telephony.h"
+#include "platform/system/MainQueue.h"
+#include "platform/system/MessagePorts.h"
+#include "platform/telephony/Telephony.h"
 
 namespace kelvo {
 

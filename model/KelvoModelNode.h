@@ -5,8 +5,8 @@
 #include <string_view>
 #include <vector>
 
-#include "platform/PropertyList.h"
-#include "platform/Value.h"
+#include "platform/encodings/PropertyList.h"
+#include "platform/values/Value.h"
 
 namespace kelvo {
 

@@ -13,7 +13,7 @@
 #include <memory>
 #include <utility>
 
-#include "platform/PropertyList.h"
+#include "platform/encodings/PropertyList.h"
 
 namespace kelvo {
 namespace {

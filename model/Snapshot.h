@@ -4,10 +4,10 @@
 #include <string>
 #include <string_view>
 
-#include "platform/Bytes.h"
-#include "platform/Clock.h"
-#include "platform/Result.h"
-#include "platform/Value.h"
+#include "platform/system/Clock.h"
+#include "platform/values/Bytes.h"
+#include "platform/values/Result.h"
+#include "platform/values/Value.h"
 
 namespace kelvo {
 

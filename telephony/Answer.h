@@ -4,8 +4,8 @@
 #include <string_view>
 #include <utility>
 
-#include "platform/PropertyList.h"
-#include "platform/TelephonyProtocol.h"
+#include "platform/encodings/PropertyList.h"
+#include "platform/telephony/TelephonyProtocol.h"
 
 namespace kelvo {
 

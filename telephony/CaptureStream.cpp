@@ -3,7 +3,7 @@
 #include <algorithm>
 #include <utility>
 
-#include "platform/Environment.h"
+#include "platform/system/Environment.h"
 
 namespace kelvo {
 namespace {

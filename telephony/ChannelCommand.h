@@ -3,8 +3,8 @@
 #include <cstddef>
 #include <memory>
 
-#include "platform/Bytes.h"
-#include "platform/Result.h"
+#include "platform/values/Bytes.h"
+#include "platform/values/Result.h"
 #include "telephony/RecordFilter.h"
 
 namespace kelvo {

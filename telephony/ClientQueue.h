@@ -4,7 +4,7 @@
 #include <deque>
 #include <utility>
 
-#include "platform/Bytes.h"
+#include "platform/values/Bytes.h"
 
 namespace kelvo {
 

@@ -2,7 +2,7 @@
 
 #include <utility>
 
-#include "platform/Environment.h"
+#include "platform/system/Environment.h"
 #include "telephony/Answer.h"
 #include "telephony/ChannelCommand.h"
 

@@ -3,8 +3,8 @@
 #include <memory>
 #include <string>
 
-#include "platform/MessagePorts.h"
-#include "platform/Technology.h"
+#include "platform/system/MessagePorts.h"
+#include "platform/telephony/Technology.h"
 #include "telephony/ClientQueue.h"
 #include "telephony/RecordFilter.h"
 

@@ -4,7 +4,7 @@
 #include <memory>
 #include <optional>
 
-#include "platform/MainQueue.h"
+#include "platform/system/MainQueue.h"
 #include "telephony/RecordSource.h"
 #include "telephony/RecordStream.h"
 #include "telephony/SteadyTime.h"

@@ -6,7 +6,7 @@
 #include <optional>
 
 #include "LogGenerator/LogCode.h"
-#include "platform/Bytes.h"
+#include "platform/values/Bytes.h"
 
 namespace kelvo {
 

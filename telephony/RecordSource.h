@@ -2,8 +2,8 @@
 
 #include <string>
 
-#include "platform/Bytes.h"
-#include "platform/Technology.h"
+#include "platform/telephony/Technology.h"
+#include "platform/values/Bytes.h"
 
 namespace kelvo {
 

@@ -2,8 +2,8 @@
 
 #include <string>
 
-#include "platform/Result.h"
-#include "platform/Value.h"
+#include "platform/values/Result.h"
+#include "platform/values/Value.h"
 
 namespace kelvo {
 

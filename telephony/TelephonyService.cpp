@@ -5,7 +5,7 @@
 
 #include <algorithm>
 
-#include "platform/Environment.h"
+#include "platform/system/Environment.h"
 #include "telephony/Answer.h"
 
 namespace kelvo {

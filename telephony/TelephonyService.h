@@ -5,7 +5,7 @@
 #include <optional>
 #include <string>
 
-#include "platform/MessagePorts.h"
+#include "platform/system/MessagePorts.h"
 #include "telephony/LogChannel.h"
 #include "telephony/RecordRates.h"
 #include "telephony/RecordSource.h"

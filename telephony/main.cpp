@@ -5,14 +5,14 @@
 #include <QCoreApplication>
 #include <chrono>
 
-#include "platform/Environment.h"
-#include "platform/PropertyList.h"
-#include "platform/TelephonyProtocol.h"
+#include "platform/encodings/PropertyList.h"
 #include "platform/host/HostEventLoop.h"
 #include "platform/host/HostMainQueue.h"
 #include "platform/host/HostMessagePorts.h"
 #include "platform/host/HostSystemLog.h"
 #include "platform/host/UnixSignals.h"
+#include "platform/system/Environment.h"
+#include "platform/telephony/TelephonyProtocol.h"
 #include "telephony/CaptureStream.h"
 #include "telephony/ServiceOptions.h"
 #include "telephony/SimulationStream.h"

@@ -7,8 +7,8 @@
 
 #include "LogGenerator/LogGenerator.h"
 #include "model/Snapshot.h"
-#include "platform/Environment.h"
 #include "platform/host/Capture.h"
+#include "platform/system/Environment.h"
 #include "tools/CommandFailure.h"
 #include "tools/DisplayJson.h"
 #include "tools/DisplayText.h"

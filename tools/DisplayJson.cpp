@@ -2,8 +2,8 @@
 
 #include <fmt/format.h>
 
-#include "platform/Base64.h"
-#include "platform/IsoDate.h"
+#include "platform/encodings/Base64.h"
+#include "platform/encodings/IsoDate.h"
 
 namespace kelvo {
 

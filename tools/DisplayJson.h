@@ -3,7 +3,7 @@
 #include <nlohmann/json.hpp>
 #include <string>
 
-#include "platform/Value.h"
+#include "platform/values/Value.h"
 
 namespace kelvo {
 

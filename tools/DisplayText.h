@@ -6,7 +6,7 @@
 #include <vector>
 
 #include "model/KelvoModelNode.h"
-#include "platform/Utf8.h"
+#include "platform/encodings/Utf8.h"
 
 namespace kelvo {
 

@@ -3,7 +3,7 @@
 #include <cstddef>
 #include <vector>
 
-#include "platform/Bytes.h"
+#include "platform/values/Bytes.h"
 
 namespace kelvo {
 

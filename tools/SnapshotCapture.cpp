@@ -6,7 +6,7 @@
 #include <limits>
 #include <optional>
 
-#include "platform/PropertyList.h"
+#include "platform/encodings/PropertyList.h"
 #include "platform/host/Capture.h"
 #include "tools/CommandFailure.h"
 #include "tools/RawRecords.h"

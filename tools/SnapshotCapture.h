@@ -4,7 +4,7 @@
 #include <string>
 #include <vector>
 
-#include "platform/Technology.h"
+#include "platform/telephony/Technology.h"
 #include "tools/SnapshotFile.h"
 
 namespace kelvo {

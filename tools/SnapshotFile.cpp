@@ -7,7 +7,7 @@
 #include <memory>
 #include <system_error>
 
-#include "platform/PropertyList.h"
+#include "platform/encodings/PropertyList.h"
 
 namespace kelvo {
 

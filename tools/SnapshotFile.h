@@ -5,8 +5,8 @@
 #include <string>
 #include <vector>
 
-#include "platform/Result.h"
-#include "platform/Value.h"
+#include "platform/values/Result.h"
+#include "platform/values/Value.h"
 
 namespace kelvo {
 

@@ -5,7 +5,7 @@
 #include <memory>
 
 #include "LogGenerator/LogGenerator.h"
-#include "platform/PropertyList.h"
+#include "platform/encodings/PropertyList.h"
 #include "tools/CommandFailure.h"
 #include "tools/StandardOutput.h"
 #include "tools/TechnologyOption.h"

@@ -4,7 +4,7 @@
 #include <optional>
 #include <string>
 
-#include "platform/Technology.h"
+#include "platform/telephony/Technology.h"
 
 namespace kelvo {
 

@@ -12,7 +12,6 @@
 #include <optional>
 
 #include "model/KelvoModel.h"
-#include "platform/Environment.h"
 #include "platform/host/FdWatcher.h"
 #include "platform/host/HostEventLoop.h"
 #include "platform/host/HostMainQueue.h"
@@ -20,6 +19,7 @@
 #include "platform/host/HostSystemLog.h"
 #include "platform/host/HostTelephonyClient.h"
 #include "platform/host/UnixSignals.h"
+#include "platform/system/Environment.h"
 #include "tools/CommandFailure.h"
 #include "tools/DisplayText.h"
 #include "tools/WatchView.h"

@@ -4,8 +4,8 @@
 #include <cstdio>
 #include <filesystem>
 
-#include "platform/DirectoryResources.h"
-#include "platform/Environment.h"
+#include "platform/system/DirectoryResources.h"
+#include "platform/system/Environment.h"
 #include "tools/CommandFailure.h"
 #include "tools/DecodeCommand.h"
 #include "tools/DisplayText.h"

@@ -2,7 +2,7 @@
 
 #include <QDateTime>
 
-#include "platform/Environment.h"
+#include "platform/system/Environment.h"
 
 namespace kelvo {
 

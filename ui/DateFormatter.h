@@ -2,7 +2,7 @@
 
 #include <QString>
 
-#include "platform/Clock.h"
+#include "platform/system/Clock.h"
 
 namespace kelvo {
 

@@ -9,7 +9,7 @@
 #include <vector>
 
 #include "model/KelvoModel.h"
-#include "platform/Preferences.h"
+#include "platform/system/Preferences.h"
 #include "ui/DateFormatter.h"
 #include "ui/KelvoSaveViewController.h"
 #include "ui/NavigationStack.h"

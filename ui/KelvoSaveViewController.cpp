@@ -4,7 +4,7 @@
 #include <QInputMethod>
 
 #include "model/Snapshot.h"
-#include "platform/Environment.h"
+#include "platform/system/Environment.h"
 #include "ui/ScreenHost.h"
 
 namespace kelvo {

@@ -7,10 +7,10 @@
 #include <optional>
 #include <string>
 
-#include "platform/Clock.h"
-#include "platform/MainQueue.h"
-#include "platform/Value.h"
-#include "platform/Worker.h"
+#include "platform/system/Clock.h"
+#include "platform/system/MainQueue.h"
+#include "platform/system/Worker.h"
+#include "platform/values/Value.h"
 
 namespace kelvo {
 

@@ -2,7 +2,7 @@
 
 #include <QString>
 
-#include "platform/MainQueue.h"
+#include "platform/system/MainQueue.h"
 
 namespace kelvo {
 

@@ -8,8 +8,6 @@
 #include <exception>
 #include <optional>
 
-#include "platform/DirectoryResources.h"
-#include "platform/Environment.h"
 #include "platform/host/HostColorScheme.h"
 #include "platform/host/HostEventLoop.h"
 #include "platform/host/HostMainQueue.h"
@@ -20,6 +18,8 @@
 #include "platform/host/HostTelephonyClient.h"
 #include "platform/host/HostWorker.h"
 #include "platform/host/UnixSignals.h"
+#include "platform/system/DirectoryResources.h"
+#include "platform/system/Environment.h"
 #include "ui/KelvoApp.h"
 #include "ui/QuickWindow.h"
 #include "ui/Theme.h"

@@ -3,7 +3,7 @@
 #include <cstddef>
 
 #include "LogGenerator/RecordView.h"
-#include "platform/Dictionary.h"
+#include "platform/values/Dictionary.h"
 
 namespace kelvo {
 

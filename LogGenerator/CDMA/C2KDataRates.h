@@ -1,7 +1,7 @@
 #pragma once
 
-#include "platform/Bytes.h"
-#include "platform/Dictionary.h"
+#include "platform/values/Bytes.h"
+#include "platform/values/Dictionary.h"
 
 /// EV-DO data rates. Each record holds counters that grow with what was sent, each worth a fixed number of bits; the
 /// rate is the growth of their sum over the growth of the record's sequence number, in kbps of 1024 bits.

@@ -1,7 +1,7 @@
 #pragma once
 
-#include "platform/Bytes.h"
-#include "platform/Dictionary.h"
+#include "platform/values/Bytes.h"
+#include "platform/values/Dictionary.h"
 
 /// Pilots of EV-DO with their energy over the total received, in dB. Energies are stored in steps of 1/512; one of 0
 /// shows "-inf dB".

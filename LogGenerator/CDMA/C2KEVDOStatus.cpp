@@ -2,7 +2,7 @@
 
 #include "LogGenerator/CDMA/C2KBandClass.h"
 #include "LogGenerator/CDMA/C2KStoreDisplayValue.h"
-#include "platform/Environment.h"
+#include "platform/system/Environment.h"
 
 namespace kelvo {
 

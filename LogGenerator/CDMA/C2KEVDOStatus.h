@@ -1,7 +1,7 @@
 #pragma once
 
-#include "platform/Bytes.h"
-#include "platform/Dictionary.h"
+#include "platform/values/Bytes.h"
+#include "platform/values/Dictionary.h"
 
 namespace kelvo {
 

@@ -4,7 +4,7 @@
 #include <cstdint>
 #include <optional>
 
-#include "platform/Bytes.h"
+#include "platform/values/Bytes.h"
 
 namespace kelvo {
 

@@ -10,7 +10,7 @@
 #include "LogGenerator/CDMA/C2KSystemIdentification.h"
 #include "LogGenerator/CDMA/C2KTrafficFER.h"
 #include "LogGenerator/Framing.h"
-#include "platform/Environment.h"
+#include "platform/system/Environment.h"
 
 namespace kelvo {
 

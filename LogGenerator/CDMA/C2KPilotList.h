@@ -4,7 +4,7 @@
 #include <cstdint>
 
 #include "LogGenerator/NumberFormat.h"
-#include "platform/Dictionary.h"
+#include "platform/values/Dictionary.h"
 
 namespace kelvo {
 

@@ -4,7 +4,7 @@
 
 #include "LogGenerator/FieldTable.h"
 #include "LogGenerator/RecordView.h"
-#include "platform/Dictionary.h"
+#include "platform/values/Dictionary.h"
 
 /// The road from a decoder to the screens. A lookup maps lookup keys to arrays of bindings; a binding is a dictionary
 /// with "dict", the live display dictionary itself, and "key", the display key in it. A null lookup shows nothing.

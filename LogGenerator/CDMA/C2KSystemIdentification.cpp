@@ -1,7 +1,7 @@
 #include "LogGenerator/CDMA/C2KSystemIdentification.h"
 
 #include "LogGenerator/CDMA/C2KStoreDisplayValue.h"
-#include "platform/Environment.h"
+#include "platform/system/Environment.h"
 
 namespace kelvo {
 

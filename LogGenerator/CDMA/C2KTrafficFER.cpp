@@ -3,7 +3,7 @@
 #include "LogGenerator/CDMA/C2KFindSubpacket.h"
 #include "LogGenerator/CDMA/C2KStoreDisplayValue.h"
 #include "LogGenerator/RecordView.h"
-#include "platform/Environment.h"
+#include "platform/system/Environment.h"
 
 namespace kelvo {
 

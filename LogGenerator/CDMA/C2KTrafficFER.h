@@ -1,7 +1,7 @@
 #pragma once
 
-#include "platform/Bytes.h"
-#include "platform/Dictionary.h"
+#include "platform/values/Bytes.h"
+#include "platform/values/Dictionary.h"
 
 /// The frame error rate of a 1x call: each traffic frame, erased or good, moves it by 1/64 of the way. The running
 /// fraction (0 to 1) is the state's "TrafficFER".

@@ -1,7 +1,7 @@
 #include "LogGenerator/GSMUMTS/BLER.h"
 
 #include "LogGenerator/RowWriter.h"
-#include "platform/Environment.h"
+#include "platform/system/Environment.h"
 
 namespace kelvo {
 

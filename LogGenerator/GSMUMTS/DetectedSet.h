@@ -4,7 +4,7 @@
 
 namespace kelvo {
 
-/// UMTS cells found outside the neighbour list.
+/// UMTS cells found outside the neighbor list.
 class DetectedSet final : public EmptySet<DetectedSet> {
 public:
     static constexpr std::string_view kSectionName = "Detected Set";

@@ -3,7 +3,7 @@
 #include <array>
 
 #include "LogGenerator/Base.h"
-#include "platform/Environment.h"
+#include "platform/system/Environment.h"
 
 namespace kelvo {
 

@@ -6,7 +6,7 @@
 
 namespace kelvo {
 
-/// GSM neighbours by their rank for cell reselection.
+/// GSM neighbors by their rank for cell reselection.
 class GSMSet final : public Section<GSMSet> {
 public:
     static constexpr std::string_view kSectionName = "GSM Set";

@@ -4,7 +4,7 @@
 
 namespace kelvo {
 
-/// UMTS cells of the neighbour list that are not in the active set.
+/// UMTS cells of the neighbor list that are not in the active set.
 class MonitoredSet final : public EmptySet<MonitoredSet> {
 public:
     static constexpr std::string_view kSectionName = "Monitored Set";

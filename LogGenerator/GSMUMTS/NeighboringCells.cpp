@@ -1,9 +1,9 @@
 #include "LogGenerator/GSMUMTS/NeighboringCells.h"
 
-#include "LogGenerator/CellInfo.h"
+#include "LogGenerator/PhoneServices/CellInfo.h"
 #include "LogGenerator/RowWriter.h"
-#include "platform/Environment.h"
-#include "platform/TelephonyConstants.h"
+#include "platform/system/Environment.h"
+#include "platform/telephony/TelephonyConstants.h"
 
 namespace kelvo {
 

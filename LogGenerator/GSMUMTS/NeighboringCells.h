@@ -7,7 +7,7 @@
 
 namespace kelvo {
 
-/// GSM neighbours, measured (0x5137) or as the cell-information array lists them.
+/// GSM neighbors, measured (0x5137) or as the cell-information array lists them.
 class NeighboringCells final : public Section<NeighboringCells> {
 public:
     static constexpr std::string_view kSectionName = "Neighboring Cells";

@@ -4,7 +4,7 @@
 
 namespace kelvo {
 
-/// GSM neighbours outside the reselection ranking; no modem reports them.
+/// GSM neighbors outside the reselection ranking; no modem reports them.
 class NonRankedGSMSet final : public SilentSection<NonRankedGSMSet> {
 public:
     static constexpr std::string_view kSectionName = "Non-Ranked GSM Set";

@@ -4,7 +4,7 @@
 
 namespace kelvo {
 
-/// UMTS neighbours outside the reselection ranking; no modem reports them.
+/// UMTS neighbors outside the reselection ranking; no modem reports them.
 class NonRankedUMTSSet final : public SilentSection<NonRankedUMTSSet> {
 public:
     static constexpr std::string_view kSectionName = "Non-Ranked UMTS Set";

@@ -17,16 +17,16 @@
 #include "LogGenerator/GSMUMTS/NeighboringCells.h"
 #include "LogGenerator/GSMUMTS/NonRankedGSMSet.h"
 #include "LogGenerator/GSMUMTS/NonRankedUMTSSet.h"
-#include "LogGenerator/GSMUMTS/PDPContextList.h"
 #include "LogGenerator/GSMUMTS/ProcessCO.h"
 #include "LogGenerator/GSMUMTS/ProcessCS.h"
 #include "LogGenerator/GSMUMTS/ProcessPS.h"
 #include "LogGenerator/GSMUMTS/ServingPLMN.h"
-#include "LogGenerator/GSMUMTS/SimInfo.h"
 #include "LogGenerator/GSMUMTS/UMTSRRInfo.h"
 #include "LogGenerator/GSMUMTS/UMTSRRMeasurement.h"
 #include "LogGenerator/GSMUMTS/UMTSSet.h"
 #include "LogGenerator/GSMUMTS/VirtualActiveSet.h"
+#include "LogGenerator/PhoneServices/PDPContextList.h"
+#include "LogGenerator/PhoneServices/SimInfo.h"
 
 namespace kelvo {
 

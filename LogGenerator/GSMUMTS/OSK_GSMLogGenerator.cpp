@@ -1,7 +1,7 @@
 #include "LogGenerator/GSMUMTS/OSK_GSMLogGenerator.h"
 
 #include "LogGenerator/GSMUMTS/OSK_GSMClassIndex.h"
-#include "platform/Environment.h"
+#include "platform/system/Environment.h"
 
 namespace kelvo {
 

@@ -1,7 +1,7 @@
 #pragma once
 
 #include "LogGenerator/Base.h"
-#include "platform/Environment.h"
+#include "platform/system/Environment.h"
 
 namespace kelvo {
 

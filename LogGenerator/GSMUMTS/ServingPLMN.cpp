@@ -2,9 +2,9 @@
 
 #include <algorithm>
 
-#include "LogGenerator/CellInfo.h"
-#include "platform/Environment.h"
-#include "platform/TelephonyConstants.h"
+#include "LogGenerator/PhoneServices/CellInfo.h"
+#include "platform/system/Environment.h"
+#include "platform/telephony/TelephonyConstants.h"
 
 namespace kelvo {
 

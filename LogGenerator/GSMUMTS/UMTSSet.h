@@ -6,7 +6,7 @@
 
 namespace kelvo {
 
-/// UMTS neighbours, by their rank for cell reselection or as the cell-information array lists them.
+/// UMTS neighbors, by their rank for cell reselection or as the cell-information array lists them.
 class UMTSSet final : public Section<UMTSSet> {
 public:
     static constexpr std::string_view kSectionName = "UMTS Set";

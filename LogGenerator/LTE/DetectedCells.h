@@ -6,7 +6,7 @@
 
 namespace kelvo {
 
-/// The neighbours that were seen in connected mode but not measured, one row a cell.
+/// The neighbors that were seen in connected mode but not measured, one row a cell.
 class DetectedCells final : public Section<DetectedCells> {
 public:
     static constexpr std::string_view kSectionName = "Detected Cells";

@@ -1,8 +1,6 @@
 #pragma once
 
 #include "LogGenerator/ClassIndex.h"
-#include "LogGenerator/GSMUMTS/PDPContextList.h"
-#include "LogGenerator/GSMUMTS/SimInfo.h"
 #include "LogGenerator/LTE/ConnectedModeMeasurementMisc.h"
 #include "LogGenerator/LTE/DetectedCells.h"
 #include "LogGenerator/LTE/LTEServingCellInfo.h"
@@ -12,6 +10,8 @@
 #include "LogGenerator/LTE/ReselectionCandidatesList.h"
 #include "LogGenerator/LTE/ReselectionCandidatesMisc.h"
 #include "LogGenerator/LTE/ServingCellMeasurement.h"
+#include "LogGenerator/PhoneServices/PDPContextList.h"
+#include "LogGenerator/PhoneServices/SimInfo.h"
 
 namespace kelvo {
 

@@ -1,7 +1,7 @@
 #include "LogGenerator/LTE/LTELogGenerator.h"
 
 #include "LogGenerator/LTE/LTEClassIndex.h"
-#include "platform/Environment.h"
+#include "platform/system/Environment.h"
 
 namespace kelvo {
 

@@ -1,6 +1,6 @@
 #include "LogGenerator/LTE/MeasuredNeighborCells.h"
 
-#include "platform/Environment.h"
+#include "platform/system/Environment.h"
 
 namespace kelvo {
 

@@ -6,7 +6,7 @@
 
 namespace kelvo {
 
-/// The neighbours whose power and quality were measured in connected mode, one row a cell.
+/// The neighbors whose power and quality were measured in connected mode, one row a cell.
 class MeasuredNeighborCells final : public Section<MeasuredNeighborCells> {
 public:
     static constexpr std::string_view kSectionName = "Measured Neighbor Cells";

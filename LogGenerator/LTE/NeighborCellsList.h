@@ -6,7 +6,7 @@
 
 namespace kelvo {
 
-/// The neighbours measured in idle mode, one row a cell; a record states 1 to 32 of them.
+/// The neighbors measured in idle mode, one row a cell; a record states 1 to 32 of them.
 class NeighborCellsList final : public Section<NeighborCellsList> {
 public:
     static constexpr std::string_view kSectionName = "Neighbor Cells List";

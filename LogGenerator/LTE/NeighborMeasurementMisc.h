@@ -6,7 +6,7 @@
 
 namespace kelvo {
 
-/// What the idle-mode neighbour measurements have in common; the cells are NeighborCellsList's.
+/// What the idle-mode neighbor measurements have in common; the cells are NeighborCellsList's.
 class NeighborMeasurementMisc final : public Section<NeighborMeasurementMisc> {
 public:
     static constexpr std::string_view kSectionName = "Neighbor Measurements";

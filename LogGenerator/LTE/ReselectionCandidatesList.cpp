@@ -1,13 +1,13 @@
 #include "LogGenerator/LTE/ReselectionCandidatesList.h"
 
 #include "LogGenerator/RowWriter.h"
-#include "platform/Environment.h"
+#include "platform/system/Environment.h"
 
 namespace kelvo {
 
 namespace {
 
-constexpr std::size_t kStride = 4;  // intended: shorter than a candidate, so that the fields of neighbours overlap
+constexpr std::size_t kStride = 4;  // intended: shorter than a candidate, so that the fields of neighbors overlap
 
 // clang-format off
 constexpr ValueTable kTechnology({

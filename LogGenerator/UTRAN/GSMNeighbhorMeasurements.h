@@ -6,7 +6,7 @@
 
 namespace kelvo {
 
-/// The GSM neighbours. Every record empties the list and none fills it: the cells it reports are not shown.
+/// The GSM neighbors. Every record empties the list and none fills it: the cells it reports are not shown.
 class GSMNeighbhorMeasurements final : public Section<GSMNeighbhorMeasurements> {
 public:
     static constexpr std::string_view kSectionName = "GSM Neighbor Cell List";

@@ -1,6 +1,6 @@
 #include "LogGenerator/UTRAN/TRCHBLERMeasurement.h"
 
-#include "platform/Environment.h"
+#include "platform/system/Environment.h"
 
 namespace kelvo {
 

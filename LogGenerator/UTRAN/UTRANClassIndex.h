@@ -1,8 +1,8 @@
 #pragma once
 
 #include "LogGenerator/ClassIndex.h"
-#include "LogGenerator/GSMUMTS/PDPContextList.h"
-#include "LogGenerator/GSMUMTS/SimInfo.h"
+#include "LogGenerator/PhoneServices/PDPContextList.h"
+#include "LogGenerator/PhoneServices/SimInfo.h"
 #include "LogGenerator/UTRAN/CCTRCHSIRMeasurement.h"
 #include "LogGenerator/UTRAN/GSMNeighbhorMeasurements.h"
 #include "LogGenerator/UTRAN/RRC_State.h"

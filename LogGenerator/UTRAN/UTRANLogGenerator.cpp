@@ -4,7 +4,7 @@
 #include <filesystem>
 
 #include "LogGenerator/UTRAN/UTRANClassIndex.h"
-#include "platform/Environment.h"
+#include "platform/system/Environment.h"
 
 namespace kelvo {
 

@@ -6,7 +6,7 @@
 
 namespace kelvo {
 
-/// The measured UTRAN neighbours, one row a cell.
+/// The measured UTRAN neighbors, one row a cell.
 class UTRANNeighbhorMeasurements final : public Section<UTRANNeighbhorMeasurements> {
 public:
     static constexpr std::string_view kSectionName = "Neighbor Cell List";

@@ -9,7 +9,7 @@
 #include <cerrno>
 #include <system_error>
 
-#include "platform/MessagePorts.h"
+#include "platform/system/MessagePorts.h"
 
 namespace kelvo {
 

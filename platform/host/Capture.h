@@ -6,9 +6,9 @@
 #include <memory>
 #include <optional>
 
-#include "platform/Bytes.h"
-#include "platform/Result.h"
-#include "platform/Technology.h"
+#include "platform/telephony/Technology.h"
+#include "platform/values/Bytes.h"
+#include "platform/values/Result.h"
 
 struct pcap;
 struct pcap_dumper;

@@ -1,7 +1,7 @@
 #pragma once
 
-#include "platform/MessagePorts.h"
 #include "platform/host/PortServer.h"
+#include "platform/system/MessagePorts.h"
 
 namespace kelvo {
 

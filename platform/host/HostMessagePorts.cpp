@@ -3,12 +3,12 @@
 #include <cerrno>
 #include <cstring>
 
-#include "platform/Environment.h"
 #include "platform/host/HostLocalPort.h"
 #include "platform/host/HostPaths.h"
 #include "platform/host/HostRemotePort.h"
 #include "platform/host/PortServer.h"
 #include "platform/host/PrivateDirectory.h"
+#include "platform/system/Environment.h"
 
 namespace kelvo {
 namespace {

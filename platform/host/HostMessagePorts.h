@@ -2,7 +2,7 @@
 
 #include <filesystem>
 
-#include "platform/MessagePorts.h"
+#include "platform/system/MessagePorts.h"
 
 namespace kelvo {
 

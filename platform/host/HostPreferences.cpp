@@ -11,10 +11,10 @@
 #include <cctype>
 #include <string>
 
-#include "platform/Environment.h"
-#include "platform/PropertyList.h"
+#include "platform/encodings/PropertyList.h"
 #include "platform/host/HostPaths.h"
 #include "platform/host/SessionBus.h"
+#include "platform/system/Environment.h"
 
 namespace kelvo {
 namespace {

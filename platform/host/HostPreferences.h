@@ -2,7 +2,7 @@
 
 #include <filesystem>
 
-#include "platform/Preferences.h"
+#include "platform/system/Preferences.h"
 
 namespace kelvo {
 

@@ -4,7 +4,7 @@
 
 #include <utility>
 
-#include "platform/Environment.h"
+#include "platform/system/Environment.h"
 
 namespace kelvo {
 namespace {

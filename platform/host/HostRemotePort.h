@@ -3,10 +3,10 @@
 #include <memory>
 #include <string>
 
-#include "platform/MessagePorts.h"
 #include "platform/host/FdWatcher.h"
 #include "platform/host/PortMessage.h"
 #include "platform/host/UniqueFd.h"
+#include "platform/system/MessagePorts.h"
 
 namespace kelvo {
 

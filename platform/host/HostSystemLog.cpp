@@ -7,7 +7,7 @@
 
 #include <algorithm>
 
-#include "platform/Utf8.h"
+#include "platform/encodings/Utf8.h"
 
 namespace kelvo {
 namespace {

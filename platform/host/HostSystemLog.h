@@ -7,8 +7,8 @@
 #include <string>
 #include <thread>
 
-#include "platform/SystemLog.h"
 #include "platform/host/LineQueue.h"
+#include "platform/system/SystemLog.h"
 
 namespace kelvo {
 

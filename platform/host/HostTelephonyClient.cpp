@@ -3,8 +3,8 @@
 #include <chrono>
 #include <utility>
 
-#include "platform/PropertyList.h"
-#include "platform/TelephonyProtocol.h"
+#include "platform/encodings/PropertyList.h"
+#include "platform/telephony/TelephonyProtocol.h"
 
 namespace kelvo {
 namespace {

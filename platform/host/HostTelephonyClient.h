@@ -1,7 +1,7 @@
 #pragma once
 
-#include "platform/MessagePorts.h"
-#include "platform/Telephony.h"
+#include "platform/system/MessagePorts.h"
+#include "platform/telephony/Telephony.h"
 
 namespace kelvo {
 

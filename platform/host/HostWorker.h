@@ -4,7 +4,7 @@
 #include <deque>
 #include <future>
 
-#include "platform/Worker.h"
+#include "platform/system/Worker.h"
 
 namespace kelvo {
 

@@ -7,7 +7,7 @@
 #include <string_view>
 #include <vector>
 
-#include "platform/SystemLog.h"
+#include "platform/system/SystemLog.h"
 
 namespace kelvo {
 

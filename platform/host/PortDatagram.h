@@ -2,8 +2,8 @@
 
 #include <cstdint>
 
-#include "platform/Bytes.h"
-#include "platform/Result.h"
+#include "platform/values/Bytes.h"
+#include "platform/values/Result.h"
 
 namespace kelvo {
 

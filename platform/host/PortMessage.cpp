@@ -9,7 +9,7 @@
 #include <cerrno>
 #include <cstring>
 
-#include "platform/MessagePorts.h"
+#include "platform/system/MessagePorts.h"
 
 namespace kelvo {
 namespace {

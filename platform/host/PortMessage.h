@@ -2,8 +2,8 @@
 
 #include <chrono>
 
-#include "platform/Bytes.h"
 #include "platform/host/PortDatagram.h"
+#include "platform/values/Bytes.h"
 
 namespace kelvo {
 

@@ -7,7 +7,7 @@
 #include <chrono>
 #include <cstring>
 
-#include "platform/Environment.h"
+#include "platform/system/Environment.h"
 
 namespace kelvo {
 namespace {

@@ -6,10 +6,10 @@
 #include <memory>
 #include <string>
 
-#include "platform/MessagePorts.h"
 #include "platform/host/FdWatcher.h"
 #include "platform/host/PortMessage.h"
 #include "platform/host/PortSocket.h"
+#include "platform/system/MessagePorts.h"
 
 namespace kelvo {
 

@@ -3,8 +3,8 @@
 #include <string>
 #include <string_view>
 
-#include "platform/Result.h"
 #include "platform/host/UniqueFd.h"
+#include "platform/values/Result.h"
 
 namespace kelvo {
 

@@ -2,8 +2,8 @@
 
 #include <filesystem>
 
-#include "platform/Result.h"
 #include "platform/host/UniqueFd.h"
+#include "platform/values/Result.h"
 
 namespace kelvo {
 

@@ -3,7 +3,7 @@
 #include <cstdio>
 #include <string_view>
 
-#include "platform/TelephonyConstants.h"
+#include "platform/telephony/TelephonyConstants.h"
 #include "telephony/simulation/RecordWriter.h"
 
 namespace kelvo::simulation {

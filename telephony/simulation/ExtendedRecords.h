@@ -4,7 +4,7 @@
 #include <span>
 #include <string>
 
-#include "platform/Bytes.h"
+#include "platform/values/Bytes.h"
 #include "telephony/simulation/Journey.h"
 
 namespace kelvo::simulation {

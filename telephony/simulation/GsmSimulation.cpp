@@ -101,7 +101,7 @@ void GsmSimulation::reportGsm() {
     const bool isDedicated = _phone.isDedicated(Rat::GSM);
     if (isDue(isDedicated ? kSlowMeasurement / 2 : kSlowMeasurement, 320ms)) {
         const GsmMeasurement measurement = gsmMeasurement(world());
-        if (_decoded.isDue(cell(), now(), 4s)) emit(decodedCellsRecord(measurement.neighbours, now()));
+        if (_decoded.isDue(cell(), now(), 4s)) emit(decodedCellsRecord(measurement.neighbors, now()));
         emit(measurementRecord(measurement, now()));
     }
     if (_allocation.isDue({cell(), isDedicated}, now(), 20s) && isDedicated)

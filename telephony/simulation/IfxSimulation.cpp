@@ -2,7 +2,7 @@
 
 #include <utility>
 
-#include "platform/PropertyList.h"
+#include "platform/encodings/PropertyList.h"
 #include "telephony/simulation/IFX/Tree.h"
 
 namespace kelvo::simulation {

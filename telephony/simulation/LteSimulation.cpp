@@ -13,7 +13,7 @@ constexpr Time kServingCellPeriod = 5s;
 constexpr Time kCellsPeriod = 20s;
 constexpr Time kContextsPeriod = 30s;
 constexpr Time kSimPeriod = 60s;
-constexpr std::size_t kMonitoredNeighbours = 2;
+constexpr std::size_t kMonitoredNeighbors = 2;
 constexpr int kCountryCode = 1;  // ITU-T E.212: a test network, 001 01
 constexpr int kNetworkCode = 1;
 
@@ -35,7 +35,7 @@ void LteSimulation::reportMeasurements() {
     if (!_modem.hasMeasured()) return;
     if (_modem.isConnected()) return emit(lteConnectedMeasurementRecord(now(), _modem));
     emit(lteServingMeasurementRecord(now(), _modem.serving(), _modem.reading(), _modem.idle()));
-    if (!_modem.neighbours().empty()) emit(lteNeighbourMeasurementRecord(now(), _modem));
+    if (!_modem.neighbors().empty()) emit(lteNeighborMeasurementRecord(now(), _modem));
     emit(lteCandidatesRecord(now(), _modem));
 }
 
@@ -58,11 +58,11 @@ std::vector<MonitoredCell> LteSimulation::monitoredCells() const {
                                          .pid = serving.physicalId,
                                          .uarfcn = serving.carrier.downlink,
                                          .bandInfo = serving.carrier.band}};
-    const std::size_t count = std::min(_modem.neighbours().size(), kMonitoredNeighbours);
+    const std::size_t count = std::min(_modem.neighbors().size(), kMonitoredNeighbors);
     for (std::size_t i = 0; i < count; ++i) {
         cells.push_back({.technology = MonitoredCell::Technology::LTE,
-                         .pid = _modem.neighbours()[i].physicalId,
-                         .uarfcn = _modem.neighboursCarrier().downlink});
+                         .pid = _modem.neighbors()[i].physicalId,
+                         .uarfcn = _modem.neighborsCarrier().downlink});
     }
     return cells;
 }

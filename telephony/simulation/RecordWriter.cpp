@@ -2,7 +2,7 @@
 
 #include <algorithm>
 
-#include "platform/PropertyList.h"
+#include "platform/encodings/PropertyList.h"
 
 namespace kelvo::simulation {
 namespace {

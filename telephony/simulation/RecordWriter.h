@@ -2,8 +2,8 @@
 
 #include <cstdint>
 
-#include "platform/Bytes.h"
-#include "platform/Value.h"
+#include "platform/values/Bytes.h"
+#include "platform/values/Value.h"
 #include "telephony/simulation/Journey.h"
 
 namespace kelvo::simulation {

@@ -3,8 +3,8 @@
 #include <deque>
 #include <utility>
 
-#include "platform/Bytes.h"
-#include "platform/Technology.h"
+#include "platform/telephony/Technology.h"
+#include "platform/values/Bytes.h"
 #include "telephony/simulation/Journey.h"
 
 namespace kelvo::simulation {

@@ -22,7 +22,7 @@ struct Sector {
 /// How a network was built.
 struct TownPlan {
     double radius = 2500;       ///< metres: sites up to here
-    double siteDistance = 900;  ///< metres between neighbouring sites
+    double siteDistance = 900;  ///< metres between neighboring sites
     double carrierMHz = 2100;
     double power = 58;  ///< dBm, antenna gain included
 };

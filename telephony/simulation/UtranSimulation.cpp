@@ -14,7 +14,7 @@ constexpr Time kServingCellPeriod = 1s;
 constexpr Time kCellsPeriod = 20s;
 constexpr Time kContextsPeriod = 30s;
 constexpr Time kSimPeriod = 60s;
-constexpr std::size_t kMonitoredNeighbours = 2;
+constexpr std::size_t kMonitoredNeighbors = 2;
 constexpr int kCountryCode = 1;  // ITU-T E.212: a test network, 001 01
 constexpr int kNetworkCode = 1;
 constexpr int kRoutingArea = 1;
@@ -66,7 +66,7 @@ std::vector<MonitoredCell> UtranSimulation::monitoredCells() const {
                                          .scn = serving.parameterId,
                                          .bandInfo = serving.band}};
     for (const UtranMeasurement& measured : _modem.measurements()) {
-        if (cells.size() > kMonitoredNeighbours) break;
+        if (cells.size() > kMonitoredNeighbors) break;
         const UtranCell& cell = _modem.cells()[measured.cell];
         if (measured.cell == _modem.servingIndex()) continue;
         cells.push_back({.technology = UTRAN2,

@@ -3,7 +3,7 @@
 #include <gtest/gtest.h>
 
 #include "LogGenerator/ClassIndex.h"
-#include "platform/Environment.h"
+#include "platform/system/Environment.h"
 #include "tests/support/RecordingLog.h"
 
 namespace kelvo {

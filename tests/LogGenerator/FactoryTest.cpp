@@ -1,8 +1,8 @@
 #include <gtest/gtest.h>
 
 #include "LogGenerator/CDMA/C2KLogGenerator.h"
-#include "LogGenerator/GSM/GSMLogGenerator.h"
 #include "LogGenerator/GSMUMTS/OSK_GSMLogGenerator.h"
+#include "LogGenerator/IFX/GSMLogGenerator.h"
 #include "LogGenerator/LTE/LTELogGenerator.h"
 #include "LogGenerator/UTRAN/UTRANLogGenerator.h"
 

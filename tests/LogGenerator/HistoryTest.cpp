@@ -2,7 +2,7 @@
 
 #include "LogGenerator/FieldTable.h"
 #include "LogGenerator/LogGenerator.h"
-#include "platform/Environment.h"
+#include "platform/system/Environment.h"
 #include "tests/support/ManualClock.h"
 
 namespace kelvo {

@@ -6,7 +6,7 @@
 #include <stdexcept>
 
 #include "LogGenerator/UnknownDataException.h"
-#include "platform/Environment.h"
+#include "platform/system/Environment.h"
 #include "tests/support/FakeResources.h"
 #include "tests/support/Record.h"
 #include "tests/support/RecordingLog.h"

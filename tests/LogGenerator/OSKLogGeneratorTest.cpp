@@ -5,7 +5,7 @@
 #include <chrono>
 
 #include "LogGenerator/DLFVersionReport.h"
-#include "platform/Environment.h"
+#include "platform/system/Environment.h"
 #include "tests/support/ManualClock.h"
 #include "tests/support/RecordingLog.h"
 

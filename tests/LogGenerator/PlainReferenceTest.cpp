@@ -8,8 +8,8 @@
 #include <random>
 
 #include "LogGenerator/LTE/LTELogGenerator.h"
-#include "platform/DirectoryResources.h"
-#include "platform/Environment.h"
+#include "platform/system/DirectoryResources.h"
+#include "platform/system/Environment.h"
 #include "tests/support/Record.h"
 
 namespace kelvo {

@@ -62,7 +62,7 @@ def idle_measurement(cell, rsrp, rsrq):
     return packet(0xB17F, payload)
 
 
-def idle_neighbours(serving, others):
+def idle_neighbors(serving, others):
     payload = bytes([2, 0, 0, 0]) + struct.pack("<HH", serving[3], 8 | (len(others) - 1) << 6)
     for cell, rsrp, rsrq in others:
         level = clamp((rsrp + 140) / 0.5, 0, 511)

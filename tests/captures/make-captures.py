@@ -30,7 +30,7 @@ write("lte-idle.pcap", "lte", [
     serving,
     lte.antennas(2),
     lte.idle_measurement(near, -92.5, -8.25),
-    lte.idle_neighbours(near, [(far, -101, -12), (other, -110, -15)]),
+    lte.idle_neighbors(near, [(far, -101, -12), (other, -110, -15)]),
     lte.candidates(near, [(far, -101, -12)]),
 ])
 write("lte-connected.pcap", "lte", [
@@ -108,15 +108,15 @@ write("cdma-evdo.pcap", "cdma", [
 ])
 
 
-def neighbour(uarfcn, cell, level, status, joint):
+def neighbor(uarfcn, cell, level, status, joint):
     return uarfcn | cell << 14 | level << 21 | status << 29 | joint << 31
 
 
 write("utran-cells.pcap", "utran", [
     record(0xD0E0, 15, (13, "B", 1), (14, "B", 3)),
     record(0xD0E2, 26, (14, "B", 2), (15, "B", 9), (17, "H", 10054), (19, "H", 10055), (21, "I", 0xFFFFFFFE), (25, "B", 1)),
-    record(0xD00A, 200, (16, "B", 2 << 1), (168, "I", neighbour(10054, 77, 128, 2, 1)),
-           (184, "I", neighbour(10063, 12, 0, 3, 0))),
+    record(0xD00A, 200, (16, "B", 2 << 1), (168, "I", neighbor(10054, 77, 128, 2, 1)),
+           (184, "I", neighbor(10063, 12, 0, 3, 0))),
     record(0xD00E, 25, (16, "B", 1), (17, "H", 42)),
     record(0xD00C, 365, (14, "H", 1 << 12 | 2 << 6), (17, "B", 5), (18, "B", 6), (19, "B", 7), (20, "B", 8),
            (357, "B", 3), (358, "B", 4), (359, "B", 10), (364, "B", 15)),

@@ -1,7 +1,7 @@
 // Any bytes between the signature and the end as a binary property list; none may crash, hang or lead outside the
 // document.
 
-#include "platform/BinaryPropertyListReader.h"
+#include "platform/encodings/BinaryPropertyListReader.h"
 
 #include "tests/fuzz/PropertyListRoundTrip.h"
 

@@ -4,7 +4,7 @@
 
 #include <vector>
 
-#include "platform/MessagePorts.h"
+#include "platform/system/MessagePorts.h"
 #include "tests/fuzz/InMemoryFile.h"
 #include "tests/fuzz/PropertyListRoundTrip.h"
 

@@ -6,7 +6,7 @@
 
 #include <string>
 
-#include "platform/Bytes.h"
+#include "platform/values/Bytes.h"
 
 namespace kelvo::fuzz {
 

@@ -4,7 +4,7 @@
 #include <cstdlib>
 #include <string_view>
 
-#include "platform/PropertyList.h"
+#include "platform/encodings/PropertyList.h"
 
 namespace kelvo::fuzz {
 

@@ -1,7 +1,7 @@
 // Any bytes may come as a snapshot file; what is read can be listed, shown and turned into a capture, and none of its
 // texts reaches a terminal with a control character.
 
-#include "platform/Technology.h"
+#include "platform/telephony/Technology.h"
 #include "tests/fuzz/InMemoryFile.h"
 #include "tests/fuzz/PropertyListRoundTrip.h"
 #include "tools/CommandFailure.h"

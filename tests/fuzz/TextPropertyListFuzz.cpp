@@ -1,6 +1,6 @@
 // Any text without NUL in the old text form; none may crash, hang or lead outside the document.
 
-#include "platform/TextPropertyListReader.h"
+#include "platform/encodings/TextPropertyListReader.h"
 
 #include "tests/fuzz/PropertyListRoundTrip.h"
 

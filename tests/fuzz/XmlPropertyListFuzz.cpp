@@ -1,6 +1,6 @@
 // Any text without NUL as XML; none may crash, hang or lead outside the document.
 
-#include "platform/XmlPropertyListReader.h"
+#include "platform/encodings/XmlPropertyListReader.h"
 
 #include "tests/fuzz/PropertyListRoundTrip.h"
 

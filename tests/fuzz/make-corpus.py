@@ -10,7 +10,7 @@ import struct
 plistlib.PLISTHEADER = b'<?xml version="1.0" encoding="UTF-8"?>\n'  # without a document type, as Kelvo writes them
 HERE = pathlib.Path(__file__).resolve().parent
 CAPTURES = HERE / "../captures"
-FAMILIES = {147: "cellmonitor", 148: "gsmmessages", 149: "cdmarecord", 150: "lterecord", 151: "utranrecord"}
+FAMILIES = {147: "ifxmessages", 148: "gsmmessages", 149: "cdmamessages", 150: "ltemessages", 151: "utranmessages"}
 HEADER = struct.Struct("<IHHiIII")
 PACKET = struct.Struct("<IIII")
 

@@ -10,8 +10,8 @@
 #include <vector>
 
 #include "model/KelvoModel.h"
-#include "platform/DirectoryResources.h"
-#include "platform/Environment.h"
+#include "platform/system/DirectoryResources.h"
+#include "platform/system/Environment.h"
 #include "tests/support/FakePorts.h"
 #include "tests/support/FakeTelephony.h"
 #include "tests/support/ManualClock.h"

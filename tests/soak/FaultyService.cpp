@@ -9,10 +9,10 @@
 #include <chrono>
 #include <thread>
 
-#include "platform/PropertyList.h"
-#include "platform/TelephonyProtocol.h"
+#include "platform/encodings/PropertyList.h"
 #include "platform/host/HostPaths.h"
 #include "platform/host/PortSocket.h"
+#include "platform/telephony/TelephonyProtocol.h"
 #include "telephony/Answer.h"
 
 namespace kelvo::soak {

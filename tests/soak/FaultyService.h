@@ -8,9 +8,9 @@
 #include <string_view>
 #include <vector>
 
-#include "platform/MainQueue.h"
-#include "platform/MessagePorts.h"
-#include "platform/Technology.h"
+#include "platform/system/MainQueue.h"
+#include "platform/system/MessagePorts.h"
+#include "platform/telephony/Technology.h"
 
 namespace kelvo::soak {
 

@@ -5,8 +5,8 @@
 #include <string_view>
 #include <utility>
 
-#include "platform/Bytes.h"
-#include "platform/PropertyList.h"
+#include "platform/encodings/PropertyList.h"
+#include "platform/values/Bytes.h"
 #include "tests/support/Record.h"
 
 namespace kelvo::test {

@@ -7,7 +7,7 @@
 #include <utility>
 #include <vector>
 
-#include "platform/MessagePorts.h"
+#include "platform/system/MessagePorts.h"
 
 namespace kelvo::test {
 

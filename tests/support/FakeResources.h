@@ -4,7 +4,7 @@
 #include <string>
 #include <vector>
 
-#include "platform/Resources.h"
+#include "platform/system/Resources.h"
 
 namespace kelvo::test {
 

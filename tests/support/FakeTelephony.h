@@ -4,7 +4,7 @@
 #include <utility>
 #include <vector>
 
-#include "platform/Telephony.h"
+#include "platform/telephony/Telephony.h"
 #include "tests/support/FakePorts.h"
 
 namespace kelvo::test {

@@ -4,7 +4,7 @@
 #include <vector>
 
 #include "LogGenerator/Base.h"
-#include "platform/Environment.h"
+#include "platform/system/Environment.h"
 #include "tests/support/Record.h"
 #include "tests/support/RecordingLog.h"
 

@@ -6,7 +6,7 @@
 #include <memory>
 #include <vector>
 
-#include "platform/MainQueue.h"
+#include "platform/system/MainQueue.h"
 
 namespace kelvo::test {
 

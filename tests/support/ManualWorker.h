@@ -3,7 +3,7 @@
 #include <deque>
 #include <utility>
 
-#include "platform/Worker.h"
+#include "platform/system/Worker.h"
 
 namespace kelvo::test {
 

@@ -4,7 +4,7 @@
 #include <string_view>
 
 #include "LogGenerator/LogCode.h"
-#include "platform/Bytes.h"
+#include "platform/values/Bytes.h"
 
 namespace kelvo::test {
 

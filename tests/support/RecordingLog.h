@@ -4,7 +4,7 @@
 #include <utility>
 #include <vector>
 
-#include "platform/SystemLog.h"
+#include "platform/system/SystemLog.h"
 
 namespace kelvo::test {
 

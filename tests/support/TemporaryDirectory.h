@@ -8,7 +8,7 @@
 #include <stdexcept>
 #include <string>
 
-#include "platform/Bytes.h"
+#include "platform/values/Bytes.h"
 
 namespace kelvo::test {
 

@@ -5,7 +5,7 @@
 #include <QProcessEnvironment>
 #include <algorithm>
 
-#include "platform/PropertyList.h"
+#include "platform/encodings/PropertyList.h"
 #include "platform/host/Capture.h"
 #include "platform/host/HostMessagePorts.h"
 #include "platform/host/HostTelephonyClient.h"

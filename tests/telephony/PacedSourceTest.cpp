@@ -6,7 +6,7 @@
 #include <string>
 #include <vector>
 
-#include "platform/Environment.h"
+#include "platform/system/Environment.h"
 #include "telephony/CaptureStream.h"
 #include "tests/support/EventLoop.h"
 #include "tests/support/FileSizeLimit.h"

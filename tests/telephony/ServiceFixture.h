@@ -10,9 +10,9 @@
 #include <utility>
 #include <vector>
 
-#include "platform/Environment.h"
-#include "platform/PropertyList.h"
+#include "platform/encodings/PropertyList.h"
 #include "platform/host/HostMessagePorts.h"
+#include "platform/system/Environment.h"
 #include "telephony/TelephonyService.h"
 #include "tests/platform/host/RawPort.h"
 #include "tests/support/EventLoop.h"

@@ -1,4 +1,4 @@
-#include "platform/PropertyList.h"
+#include "platform/encodings/PropertyList.h"
 #include "tests/tools/KelvoctlTest.h"
 
 namespace kelvo {

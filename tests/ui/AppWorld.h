@@ -4,9 +4,9 @@
 #include <filesystem>
 #include <string>
 
-#include "platform/Environment.h"
-#include "platform/PropertyList.h"
-#include "platform/TelephonyConstants.h"
+#include "platform/encodings/PropertyList.h"
+#include "platform/system/Environment.h"
+#include "platform/telephony/TelephonyConstants.h"
 #include "tests/support/FakePorts.h"
 #include "tests/support/FakeTelephony.h"
 #include "tests/support/ManualClock.h"

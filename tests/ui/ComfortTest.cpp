@@ -117,7 +117,7 @@ TEST_F(Comfort, NeverMovesAValueWhoseDigitsChange) {
     }
 }
 
-TEST_F(Comfort, ShowsAHundredNeighboursToTheLast) {
+TEST_F(Comfort, ShowsAHundredNeighborsToTheLast) {
     start();
     scene->show(sampleTree(101));
     scene->tapText(text("Neighbor Cells"));

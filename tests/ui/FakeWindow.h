@@ -4,7 +4,7 @@
 #include <utility>
 #include <vector>
 
-#include "platform/Preferences.h"
+#include "platform/system/Preferences.h"
 #include "ui/Window.h"
 
 namespace kelvo::test {

@@ -17,7 +17,7 @@ class App : public testing::Test {
 protected:
     void SetUp() override { app = std::make_unique<KelvoApp>(world.services()); }
     void launch() { app->applicationDidFinishLaunching(); }
-    /// Launched, connected and showing a tree with three neighbours.
+    /// Launched, connected and showing a tree with three neighbors.
     void run() {
         launch();
         world.queue.run();

@@ -7,8 +7,8 @@
 #include <fstream>
 #include <iterator>
 
-#include "platform/Environment.h"
-#include "platform/PropertyList.h"
+#include "platform/encodings/PropertyList.h"
+#include "platform/system/Environment.h"
 #include "tests/support/ManualClock.h"
 #include "tests/support/ManualQueue.h"
 #include "tests/support/ManualWorker.h"

@@ -13,7 +13,7 @@ namespace kelvo::test {
 
 inline QString text(const char* latin1) { return QString::fromLatin1(latin1); }
 
-/// A scene that is connected and shows the sample tree with three neighbours.
+/// A scene that is connected and shows the sample tree with three neighbors.
 class ScreenFixture : public testing::Test {
 protected:
     Scene& start(bool savingPermitted = false, QSize size = {360, 640}) {

@@ -7,7 +7,7 @@
 #include <QQuickItem>
 #include <QTest>
 
-#include "platform/TelephonyProtocol.h"
+#include "platform/telephony/TelephonyProtocol.h"
 #include "tests/ui/ScreenFixture.h"
 #include "ui/ActivityIndicator.h"
 #include "ui/Theme.h"

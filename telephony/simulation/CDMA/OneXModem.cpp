@@ -10,7 +10,7 @@ using namespace std::chrono_literals;
 
 constexpr CdmaLoading kLoading{.gain = 0, .pilot = 0.2, .all = 0.65};
 constexpr Time kSlotCycle = 2560ms;  // SLOT_CYCLE_INDEX 1
-constexpr Time kAwake = 480ms;       // of each cycle, for the paging slot and a look at the neighbours
+constexpr Time kAwake = 480ms;       // of each cycle, for the paging slot and a look at the neighbors
 constexpr Time kOverhead = 300ms;
 constexpr Time kRegistration = 1200ms;
 constexpr Time kAccess = 600ms;

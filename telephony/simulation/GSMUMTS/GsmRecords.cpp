@@ -24,32 +24,32 @@ Bytes servingCellRecord(const GsmCell& cell, Time time) {
 }
 
 Bytes measurementRecord(const GsmMeasurement& measurement, Time time) {
-    RecordWriter record(0x5137, time, 29 + 14 * measurement.neighbours.size());
+    RecordWriter record(0x5137, time, 29 + 14 * measurement.neighbors.size());
     record
         .i8 (15, rxLev(measurement.level))
         .i32(16, std::lround(measurement.c1))
         .i32(20, std::lround(measurement.c2))
         .u8 (26, measurement.isHysteresisApplied)
-        .u8 (28, measurement.neighbours.size());
+        .u8 (28, measurement.neighbors.size());
     std::size_t at = 29;
-    for (const GsmNeighbour& neighbour : measurement.neighbours) {
+    for (const GsmNeighbor& neighbor : measurement.neighbors) {
         record
-            .i16(at + 0, neighbour.arfcn)
-            .i8 (at + 2, rxLev(neighbour.level))
-            .i32(at + 3, std::lround(neighbour.c1));
+            .i16(at + 0, neighbor.arfcn)
+            .i8 (at + 2, rxLev(neighbor.level))
+            .i32(at + 3, std::lround(neighbor.c1));
         at += 14;
     }
     return record.finish();
 }
 
-Bytes decodedCellsRecord(std::span<const GsmNeighbour> neighbours, Time time) {
+Bytes decodedCellsRecord(std::span<const GsmNeighbor> neighbors, Time time) {
     RecordWriter record(0x51ff, time, 15);
-    record.u8(14, neighbours.size());
+    record.u8(14, neighbors.size());
     std::size_t at = 15;
-    for (const GsmNeighbour& neighbour : neighbours) {
+    for (const GsmNeighbor& neighbor : neighbors) {
         record
-            .i16(at + 0, neighbour.arfcn)
-            .i8 (at + 2, neighbour.bsic)
+            .i16(at + 0, neighbor.arfcn)
+            .i8 (at + 2, neighbor.bsic)
             .u8 (at + 3, 0);
         at += 4;
     }

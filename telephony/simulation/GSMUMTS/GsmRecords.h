@@ -2,13 +2,13 @@
 
 #include <span>
 
-#include "platform/Bytes.h"
+#include "platform/values/Bytes.h"
 #include "telephony/simulation/GSMUMTS/Phone.h"
 
 namespace kelvo::simulation::gsm {
 
 /// A GSM cell beside the serving one.
-struct GsmNeighbour {
+struct GsmNeighbor {
     int arfcn = 0;
     int bsic = 0;
     double level = 0;  ///< dBm
@@ -21,7 +21,7 @@ struct GsmMeasurement {
     double c1 = 0;     ///< dB
     double c2 = 0;     ///< dB
     bool isHysteresisApplied = false;
-    std::vector<GsmNeighbour> neighbours = {};
+    std::vector<GsmNeighbor> neighbors = {};
 };
 
 struct RrStatus {
@@ -32,13 +32,13 @@ struct RrStatus {
     bool operator==(const RrStatus&) const = default;
 };
 
-Bytes servingCellRecord(const GsmCell& cell, Time time);                        // 0x5134
-Bytes measurementRecord(const GsmMeasurement& measurement, Time time);          // 0x5137
-Bytes decodedCellsRecord(std::span<const GsmNeighbour> neighbours, Time time);  // 0x51ff
-Bytes rrStatusRecord(const RrStatus& status, Time time);                        // 0x512c
-Bytes dedicatedCarrierRecord(int arfcn, Time time);                             // 0x5076
-Bytes channelModeRecord(bool isDtxUsed, Time time);                             // 0x5072
-Bytes mobileAllocationRecord(const GsmCell& cell, Time time);                   // 0x51f8
+Bytes servingCellRecord(const GsmCell& cell, Time time);                      // 0x5134
+Bytes measurementRecord(const GsmMeasurement& measurement, Time time);        // 0x5137
+Bytes decodedCellsRecord(std::span<const GsmNeighbor> neighbors, Time time);  // 0x51ff
+Bytes rrStatusRecord(const RrStatus& status, Time time);                      // 0x512c
+Bytes dedicatedCarrierRecord(int arfcn, Time time);                           // 0x5076
+Bytes channelModeRecord(bool isDtxUsed, Time time);                           // 0x5072
+Bytes mobileAllocationRecord(const GsmCell& cell, Time time);                 // 0x51f8
 
 Bytes si13PositionRecord(const GprsOptions& options, Time time);  // 0x51f4
 Bytes si13Record(const GprsOptions& options, Time time);          // 0x51f5

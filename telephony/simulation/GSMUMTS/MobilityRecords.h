@@ -2,7 +2,7 @@
 
 #include <span>
 
-#include "platform/Bytes.h"
+#include "platform/values/Bytes.h"
 #include "telephony/simulation/GSMUMTS/Registration.h"
 
 namespace kelvo::simulation::gsm {

@@ -31,7 +31,7 @@ constexpr double kHandoverToGsm = -15;    // dB
 constexpr double kGsmGoodEnough = -95;    // dBm
 constexpr double kFddQmin = -12;          // dB, for reselection from GSM
 constexpr double kHandoverToUmts = -10;   // dB
-constexpr std::size_t kNeighbours = 6;
+constexpr std::size_t kNeighbors = 6;
 
 }  // namespace
 
@@ -165,28 +165,28 @@ bool Phone::isHysteresisApplied() const {
 }
 
 std::size_t Phone::gsmByC2() const {
-    const auto neighbours = gsmNeighbours();
-    return *std::ranges::max_element(neighbours, {}, [this](std::size_t cell) { return c2(cell); });
+    const auto neighbors = gsmNeighbors();
+    return *std::ranges::max_element(neighbors, {}, [this](std::size_t cell) { return c2(cell); });
 }
 
-std::vector<std::size_t> Phone::gsmNeighbours() const {
-    std::vector<std::size_t> neighbours;
-    if (!isMeasuringGsm()) return neighbours;
+std::vector<std::size_t> Phone::gsmNeighbors() const {
+    std::vector<std::size_t> neighbors;
+    if (!isMeasuringGsm()) return neighbors;
     for (const std::size_t sector : _air.gsmByLevel()) {
         const bool isOwnCarrier = _rat == Rat::GSM && _network.gsm[sector].arfcn == _network.gsm[_serving].arfcn;
-        if (!isOwnCarrier && neighbours.size() < kNeighbours) neighbours.push_back(sector);
+        if (!isOwnCarrier && neighbors.size() < kNeighbors) neighbors.push_back(sector);
     }
-    return neighbours;
+    return neighbors;
 }
 
-std::vector<std::size_t> Phone::umtsNeighbours(std::size_t count) const {
-    std::vector<std::size_t> neighbours;
+std::vector<std::size_t> Phone::umtsNeighbors(std::size_t count) const {
+    std::vector<std::size_t> neighbors;
     for (const std::size_t sector : _air.umtsByEcNo()) {
         const bool isOwn =
             _rat == Rat::UMTS && (_link == Link::Open ? _activeSet.contains(sector) : sector == _serving);
-        if (!isOwn && _air.isFound(sector) && neighbours.size() < count) neighbours.push_back(sector);
+        if (!isOwn && _air.isFound(sector) && neighbors.size() < count) neighbors.push_back(sector);
     }
-    return neighbours;
+    return neighbors;
 }
 
 double Phone::c1(std::size_t gsmSector) const { return _air.gsmLevel(gsmSector) - kRxLevAccessMin; }
@@ -202,12 +202,12 @@ void Phone::rank() {
 
     _rankedUmts.clear();
     if (isUmts) _rankedUmts.push_back({_serving, _air.rscp(_serving) + kQhyst});
-    for (const std::size_t sector : umtsNeighbours(isUmts ? 4 : 3)) {
+    for (const std::size_t sector : umtsNeighbors(isUmts ? 4 : 3)) {
         _rankedUmts.push_back({sector, _air.rscp(sector) - kQoffsetUmts});
     }
     _rankedGsm.clear();
     if (!isUmts) _rankedGsm.push_back({_serving, _air.gsmLevel(_serving) + kQhyst});
-    for (const std::size_t sector : gsmNeighbours()) {
+    for (const std::size_t sector : gsmNeighbors()) {
         _rankedGsm.push_back({sector, _air.gsmLevel(sector) - (isUmts ? kQoffsetGsm : 0)});
     }
     std::ranges::stable_sort(_rankedUmts, std::greater(), &Ranked::rank);
@@ -216,7 +216,7 @@ void Phone::rank() {
 
 void Phone::moveWithinGsm(Time now) {
     if (_use == Use::Voice) {
-        const std::size_t best = gsmNeighbours().front();  // the network's decision, on its power budget
+        const std::size_t best = gsmNeighbors().front();  // the network's decision, on its power budget
         const bool isBetter = _air.gsmLevel(best) > _air.gsmLevel(_serving) + kHandoverMargin;
         if (_link == Link::Open && _gsmHandover(isBetter, best, now)) _serving = best;
         return;
@@ -253,13 +253,13 @@ void Phone::moveWithinUmts(Time now) {
 }
 
 void Phone::leaveUmts(Time now) {
-    const auto neighbours = gsmNeighbours();
-    if (neighbours.empty()) {
+    const auto neighbors = gsmNeighbors();
+    if (neighbors.empty()) {
         _toGsm.restart();
         _toGsmHandover.restart();
         return;
     }
-    const std::size_t best = neighbours.front();
+    const std::size_t best = neighbors.front();
     if (_link == Link::Open) {
         const bool isNeeded = umtsQuality() < kHandoverToGsm && _air.gsmLevel(best) > kGsmGoodEnough;
         const RrState state = _use == Use::Voice ? RrState::W2gHandover : RrState::W2gCellChangeOrder;

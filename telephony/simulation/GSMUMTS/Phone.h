@@ -52,7 +52,7 @@ public:
     Link link() const { return _link; }
     bool isOn(Rat rat) const { return _isCamped && _rat == rat; }
     bool isDedicated(Rat rat) const { return isOn(rat) && _link == Link::Open; }
-    /// On its way to another cell, which is the best neighbour of its system.
+    /// On its way to another cell, which is the best neighbor of its system.
     bool isMoving() const { return _change.has_value(); }
     RrState rrState() const;
     RrcState rrcState() const;
@@ -61,14 +61,14 @@ public:
 
     const ActiveSet& activeSet() const { return _activeSet; }
     const Registration& registration() const { return _registration; }
-    /// The GSM neighbour of the highest C2 lies in another location area or a packet transfer runs, so that reselection
+    /// The GSM neighbor of the highest C2 lies in another location area or a packet transfer runs, so that reselection
     /// to it wants a hysteresis (3GPP TS 45.008, section 6.6.2).
     bool isHysteresisApplied() const;
     bool isMeasuringGsm() const { return isOn(Rat::GSM) || _isMeasuringGsm; }
-    /// The GSM neighbours measured, the strongest first, at most six; none when GSM is not measured.
-    std::vector<std::size_t> gsmNeighbours() const;
+    /// The GSM neighbors measured, the strongest first, at most six; none when GSM is not measured.
+    std::vector<std::size_t> gsmNeighbors() const;
     /// The UMTS cells found beside those of the active set, the best first, at most `count`.
-    std::vector<std::size_t> umtsNeighbours(std::size_t count) const;
+    std::vector<std::size_t> umtsNeighbors(std::size_t count) const;
     /// The highest first, the serving cell among them.
     const std::vector<Ranked>& rankedGsm() const { return _rankedGsm; }
     const std::vector<Ranked>& rankedUmts() const { return _rankedUmts; }
@@ -88,7 +88,7 @@ private:
     void setLink(Link link, Time now);
     void restartTriggers();
     void follow(const Change& change, Time now);
-    std::size_t gsmByC2() const;  ///< the neighbour of the highest C2; on GSM only
+    std::size_t gsmByC2() const;  ///< the neighbor of the highest C2; on GSM only
     double umtsQuality() const;   ///< Ec/No of the best cell in use, dB
     void rank();
     void leaveGsm(Time now);

@@ -17,7 +17,7 @@ constexpr int kSpeechChannel = 1;
 constexpr int kSignallingChannel = 24;
 constexpr int kSlots = 3;
 
-GsmNeighbour gsmNeighbour(const World& world, std::size_t sector) {
+GsmNeighbor gsmNeighbor(const World& world, std::size_t sector) {
     const GsmCell& cell = world.network.gsm[sector];
     return {cell.arfcn, cell.bsic, world.air.gsmLevel(sector), world.phone.c1(sector)};
 }
@@ -98,8 +98,8 @@ GsmMeasurement gsmMeasurement(const World& world) {
                                .c1 = phone.c1(serving),
                                .c2 = phone.c2(serving),
                                .isHysteresisApplied = phone.isHysteresisApplied()};
-    for (const std::size_t sector : phone.gsmNeighbours()) {
-        measurement.neighbours.push_back(gsmNeighbour(world, sector));
+    for (const std::size_t sector : phone.gsmNeighbors()) {
+        measurement.neighbors.push_back(gsmNeighbor(world, sector));
     }
     return measurement;
 }
@@ -135,7 +135,7 @@ std::vector<SearchedCell> searchedCells(const World& world) {
         add(serving, CellSet::Active);
     }
     const int site = world.network.umtsSectors[serving].siteNumber;
-    for (const std::size_t sector : phone.umtsNeighbours(2)) {
+    for (const std::size_t sector : phone.umtsNeighbors(2)) {
         const bool isTold = world.network.umtsSectors[sector].siteNumber <= site + 6;  // far sites are not in its list
         add(sector, isTold ? CellSet::Monitored : CellSet::Detected);
     }
@@ -164,10 +164,10 @@ std::vector<RankedGsmCell> rankedGsmCells(const World& world) {
 std::vector<MonitoredCell> monitoredCells(const World& world) {
     const bool isGsm = world.phone.rat() == Rat::GSM;
     std::vector<MonitoredCell> cells{servingCell(world)};
-    auto neighbours = world.phone.gsmNeighbours();
-    neighbours.resize(std::min(neighbours.size(), std::size_t{isGsm ? 2U : 1U}));
-    for (const std::size_t sector : neighbours) cells.push_back(monitoredGsmCell(world, sector));
-    for (const std::size_t sector : world.phone.umtsNeighbours(isGsm ? 1 : 2)) {
+    auto neighbors = world.phone.gsmNeighbors();
+    neighbors.resize(std::min(neighbors.size(), std::size_t{isGsm ? 2U : 1U}));
+    for (const std::size_t sector : neighbors) cells.push_back(monitoredGsmCell(world, sector));
+    for (const std::size_t sector : world.phone.umtsNeighbors(isGsm ? 1 : 2)) {
         cells.push_back(monitoredUmtsCell(world, sector));
     }
     if (const auto missed = missedSibling(world)) cells.push_back(monitoredUmtsCell(world, *missed));

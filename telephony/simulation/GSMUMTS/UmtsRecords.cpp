@@ -15,7 +15,7 @@ std::uint64_t energy(double dB) { return static_cast<std::uint64_t>(std::lround(
 long receivedPower(double dBm) { return std::lround((dBm + 106) * 10) - 512; }
 
 /// The transmitter's counts tenths of a dB likewise, from -70 dBm; 0 means that it is off, so that -18.8 dBm is told
-/// as its neighbour.
+/// as its neighbor.
 long transmittedPower(double dBm) {
     const long tenths = std::lround((dBm + 70) * 10) - 512;
     return tenths == 0 ? 1 : tenths;

@@ -5,7 +5,7 @@
 #include <span>
 #include <vector>
 
-#include "platform/Bytes.h"
+#include "platform/values/Bytes.h"
 #include "telephony/simulation/GSMUMTS/Phone.h"
 
 namespace kelvo::simulation::gsm {

@@ -13,9 +13,9 @@ using namespace std::chrono_literals;
 
 constexpr Time kSearch = 800ms;
 constexpr Time kUpdate = 2500ms;
-constexpr std::size_t kMostNeighbours = 6;
-constexpr Time kMeasureNeighbour = 480ms;
-constexpr Time kDecodeNeighbour = 1440ms;
+constexpr std::size_t kMostNeighbors = 6;
+constexpr Time kMeasureNeighbor = 480ms;
+constexpr Time kDecodeNeighbor = 1440ms;
 constexpr double kDetected = -20;  // dB of Ec/N0
 
 // GSM: 3GPP TS 45.008, sections 6.6.2 (reselection) and A.3.1 (handover by power budget).
@@ -62,8 +62,8 @@ void Modem::measure(const Drive& drive, Time now, PhoneUser::Activity activity, 
     choose(now);
     registerInArea(now);
     readServing();
-    readGsmNeighbours(now);
-    readUmtsNeighbours();
+    readGsmNeighbors(now);
+    readUmtsNeighbors();
     connect(activity, demand);
 }
 
@@ -79,14 +79,14 @@ std::vector<std::size_t> Modem::gsmByStrength() const {
     if (_status.access == RadioAccess::Gsm) heard.insert(_network.gsm[_status.serving].arfcn);
     std::vector<std::size_t> order = byStrength(_air.rssi);
     std::erase_if(order, [&](std::size_t sector) { return !heard.insert(_network.gsm[sector].arfcn).second; });
-    order.resize(std::min(order.size(), kMostNeighbours));
+    order.resize(std::min(order.size(), kMostNeighbors));
     return order;
 }
 
 std::vector<std::size_t> Modem::umtsByStrength() const {
     std::vector<std::size_t> order = byStrength(_air.ecN0);
     if (_status.access == RadioAccess::Umts) std::erase(order, _status.serving);
-    order.resize(std::min(order.size(), kMostNeighbours));
+    order.resize(std::min(order.size(), kMostNeighbors));
     return order;
 }
 
@@ -156,7 +156,7 @@ void Modem::readServing() {
     _status.ecN0 = _air.ecN0[_status.serving];
 }
 
-void Modem::readGsmNeighbours(Time now) {
+void Modem::readGsmNeighbors(Time now) {
     _status.gsm.clear();
     if (_status.access == RadioAccess::None) return;
     std::map<std::size_t, Time> listed;
@@ -165,12 +165,12 @@ void Modem::readGsmNeighbours(Time now) {
         const Time since = before != _listed.end() ? before->second : now;
         listed[sector] = since;
         _status.gsm.push_back(
-            {sector, _air.rssi[sector], now - since >= kMeasureNeighbour, now - since >= kDecodeNeighbour});
+            {sector, _air.rssi[sector], now - since >= kMeasureNeighbor, now - since >= kDecodeNeighbor});
     }
     _listed = std::move(listed);
 }
 
-void Modem::readUmtsNeighbours() {
+void Modem::readUmtsNeighbors() {
     _status.umts.clear();
     if (_status.access == RadioAccess::None) return;
     for (const std::size_t sector : umtsByStrength()) {

@@ -12,16 +12,16 @@ enum class RadioAccess { None, Gsm, Umts };
 enum class Registration { Searching, Updating, Registered };
 enum class Connection { Idle, Call, Packet };
 
-/// A GSM cell of the neighbour list. Its level is known half a second after it has come into the list, its identity
+/// A GSM cell of the neighbor list. Its level is known half a second after it has come into the list, its identity
 /// code, which must be decoded, a second later.
-struct GsmNeighbour {
+struct GsmNeighbor {
     std::size_t sector;
     double rssi;  ///< dBm
     bool measured;
     bool identified;
 };
 
-struct UmtsNeighbour {
+struct UmtsNeighbor {
     std::size_t sector;
     double rscp;  ///< dBm
     double ecN0;  ///< dB
@@ -30,13 +30,13 @@ struct UmtsNeighbour {
 /// What the modem knows at one moment.
 struct Status {
     RadioAccess access = RadioAccess::None;
-    std::size_t serving = 0;          ///< meant where `access` is not None, as are the readings
-    double rssi = 0;                  ///< dBm, on GSM
-    double gsmToRest = 0;             ///< dB above others on its carrier and noise, on GSM
-    double rscp = 0;                  ///< dBm, on UMTS
-    double ecN0 = 0;                  ///< dB, on UMTS
-    std::vector<GsmNeighbour> gsm;    ///< the strongest first
-    std::vector<UmtsNeighbour> umts;  ///< the strongest first
+    std::size_t serving = 0;         ///< meant where `access` is not None, as are the readings
+    double rssi = 0;                 ///< dBm, on GSM
+    double gsmToRest = 0;            ///< dB above others on its carrier and noise, on GSM
+    double rscp = 0;                 ///< dBm, on UMTS
+    double ecN0 = 0;                 ///< dB, on UMTS
+    std::vector<GsmNeighbor> gsm;    ///< the strongest first
+    std::vector<UmtsNeighbor> umts;  ///< the strongest first
 
     Registration registration = Registration::Searching;
     LocationArea registered;  ///< the area registered in last
@@ -71,8 +71,8 @@ private:
     void move(RadioAccess access, std::size_t sector, Time now);
     void registerInArea(Time now);
     void readServing();
-    void readGsmNeighbours(Time now);
-    void readUmtsNeighbours();
+    void readGsmNeighbors(Time now);
+    void readUmtsNeighbors();
     void connect(PhoneUser::Activity activity, double demand);
     void connectOnGsm(double demand);
     void connectOnUmts(double demand);
@@ -88,7 +88,7 @@ private:
     EachHeldFor _toUmts{std::chrono::seconds(5)};
     Time _movedAt{0};
     Time _updatedAt{0};
-    std::map<std::size_t, Time> _listed;  // since when a GSM cell is in the neighbour list
+    std::map<std::size_t, Time> _listed;  // since when a GSM cell is in the neighbor list
 };
 
 }  // namespace kelvo::simulation::ifx

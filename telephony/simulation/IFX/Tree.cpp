@@ -48,27 +48,27 @@ Value serving(const Status& status, const Network& network) {
     }
 }
 
-Value gsmNeighbour(const GsmNeighbour& neighbour, const GsmCell& cell) {
+Value gsmNeighbor(const GsmNeighbor& neighbor, const GsmCell& cell) {
     const DictionaryRef entry = Dictionary::make({{"ARFCN", number(cell.arfcn)}});
-    if (neighbour.identified) entry->set("BSIC", number(cell.bsic));
-    if (neighbour.measured) entry->set("RSSI", dBm(neighbour.rssi));
+    if (neighbor.identified) entry->set("BSIC", number(cell.bsic));
+    if (neighbor.measured) entry->set("RSSI", dBm(neighbor.rssi));
     return entry;
 }
 
-Value umtsNeighbour(const UmtsNeighbour& neighbour, const UmtsCell& cell) {
+Value umtsNeighbor(const UmtsNeighbor& neighbor, const UmtsCell& cell) {
     return Dictionary::make(
-        {{"SCN", number(cell.scramblingCode)}, {"RSCP", dBm(neighbour.rscp)}, {"ECN0", halfDecibels(neighbour.ecN0)}});
+        {{"SCN", number(cell.scramblingCode)}, {"RSCP", dBm(neighbor.rscp)}, {"ECN0", halfDecibels(neighbor.ecN0)}});
 }
 
-Value neighbours(const Status& status, const Network& network) {
+Value neighbors(const Status& status, const Network& network) {
     // The header says how many follow.
     const ArrayRef gsm = Array::make({number(static_cast<long>(status.gsm.size()))});
-    for (const GsmNeighbour& neighbour : status.gsm) {
-        gsm->append(gsmNeighbour(neighbour, network.gsm[neighbour.sector]));
+    for (const GsmNeighbor& neighbor : status.gsm) {
+        gsm->append(gsmNeighbor(neighbor, network.gsm[neighbor.sector]));
     }
     const ArrayRef umts = Array::make({number(static_cast<long>(status.umts.size()))});
-    for (const UmtsNeighbour& neighbour : status.umts) {
-        umts->append(umtsNeighbour(neighbour, network.umts[neighbour.sector]));
+    for (const UmtsNeighbor& neighbor : status.umts) {
+        umts->append(umtsNeighbor(neighbor, network.umts[neighbor.sector]));
     }
     return Dictionary::make({{"GSM", gsm}, {"UMTS", umts}});
 }
@@ -106,7 +106,7 @@ Value connection(const Status& status) {
 
 Value monitorTree(const Status& status, const Network& network) {
     return Dictionary::make({{"Serving", Dictionary::make({{"Cell", serving(status, network)}})},
-                             {"Neighbours", neighbours(status, network)},
+                             {"Neighbours", neighbors(status, network)},
                              {"Registration", registration(status)},
                              {"Connection", connection(status)}});
 }

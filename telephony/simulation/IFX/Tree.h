@@ -1,6 +1,6 @@
 #pragma once
 
-#include "platform/Value.h"
+#include "platform/values/Value.h"
 #include "telephony/simulation/IFX/Modem.h"
 
 namespace kelvo::simulation::ifx {

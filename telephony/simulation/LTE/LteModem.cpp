@@ -118,7 +118,7 @@ void LteModem::measureConnected() {
     _receiver.measure(_drive, serving().carrier, _serving, _now);
     measureInGaps();
     handOver();
-    listNeighbours(serving().carrier);
+    listNeighbors(serving().carrier);
     redirect();
 }
 
@@ -185,26 +185,26 @@ void LteModem::lookAround() {
         }
     }
     if (searched.empty()) {
-        _neighbours.clear();
+        _neighbors.clear();
     } else {
-        listNeighbours(searched[_cycle % searched.size()]);
+        listNeighbors(searched[_cycle % searched.size()]);
     }
 }
 
-void LteModem::listNeighbours(const LteCarrier& carrier) {
-    _neighbours.clear();
+void LteModem::listNeighbors(const LteCarrier& carrier) {
+    _neighbors.clear();
     _detected.clear();
-    _neighboursCarrier = carrier;
+    _neighborsCarrier = carrier;
     for (std::size_t i = 0; i < _cells.size(); ++i) {
         if (i == _serving || _cells[i].carrier.downlink != carrier.downlink) continue;
-        _neighboursMinimumLevel = _cells[i].minimumLevel;
-        if (_receiver.isMeasured(i, _now)) _neighbours.push_back(neighbour(i));
+        _neighborsMinimumLevel = _cells[i].minimumLevel;
+        if (_receiver.isMeasured(i, _now)) _neighbors.push_back(neighbor(i));
         if (_receiver.isDetected(i, _now)) _detected.push_back(_cells[i].physicalId);
     }
-    std::ranges::sort(_neighbours, std::greater(), [](const LteNeighbour& cell) { return cell.reading.averageRsrp; });
+    std::ranges::sort(_neighbors, std::greater(), [](const LteNeighbor& cell) { return cell.reading.averageRsrp; });
 }
 
-LteNeighbour LteModem::neighbour(std::size_t cell) const {
+LteNeighbor LteModem::neighbor(std::size_t cell) const {
     const LteCell& named = _cells[cell];
     const LteReading& reading = _receiver.reading(cell);
     const double metres = distance(_drive.position(), _drive.sectors()[cell].site);
@@ -238,7 +238,7 @@ void LteModem::reselect() {
                           _now - _camped > kReselection;
     if (!_better(isBetter, best.value_or(_serving), _now)) return;
     camp(*best);
-    listNeighbours(serving().carrier);
+    listNeighbors(serving().carrier);
     _hasMeasured = false;  // what was measured is the last cell's
 }
 

@@ -7,7 +7,7 @@
 namespace kelvo::simulation {
 
 /// A cell beside the serving one, as it was last measured.
-struct LteNeighbour {
+struct LteNeighbor {
     int physicalId = 0;
     LteReading reading;
     double srxlev = 0;       ///< dB: its level above what it asks for
@@ -54,9 +54,9 @@ public:
     int subframe() const;
 
     /// Measured on the carrier that was looked at last; of an idle phone each carrier in its turn.
-    const std::vector<LteNeighbour>& neighbours() const { return _neighbours; }
-    const LteCarrier& neighboursCarrier() const { return _neighboursCarrier; }
-    int neighboursMinimumLevel() const { return _neighboursMinimumLevel; }
+    const std::vector<LteNeighbor>& neighbors() const { return _neighbors; }
+    const LteCarrier& neighborsCarrier() const { return _neighborsCarrier; }
+    int neighborsMinimumLevel() const { return _neighborsMinimumLevel; }
     /// Physical identities of those found on the serving carrier, and not measured yet.
     const std::vector<int>& detected() const { return _detected; }
     /// Of an idle phone.
@@ -77,8 +77,8 @@ private:
     void measureIdle();
     void evaluateServing();
     void lookAround();
-    void listNeighbours(const LteCarrier& carrier);
-    LteNeighbour neighbour(std::size_t cell) const;
+    void listNeighbors(const LteCarrier& carrier);
+    LteNeighbor neighbor(std::size_t cell) const;
     void weighCandidates();
     void reselect();
     std::optional<std::size_t> bestMeasured(const std::function<bool(const LteCell&)>& isWanted) const;
@@ -105,9 +105,9 @@ private:
     std::optional<Time> _registersAt;
     std::size_t _cycle = 0;  // of the idle phone
 
-    std::vector<LteNeighbour> _neighbours;
-    LteCarrier _neighboursCarrier{};
-    int _neighboursMinimumLevel = 0;
+    std::vector<LteNeighbor> _neighbors;
+    LteCarrier _neighborsCarrier{};
+    int _neighborsMinimumLevel = 0;
     std::vector<int> _detected;
     LteIdleState _idle;
     std::optional<LteCandidate> _candidate;

@@ -15,7 +15,7 @@ constexpr int kLtePriority = 5;  // of both carriers: cells of either are ranked
 
 int areaOf(const Sector& sector) { return kFirstArea + static_cast<int>(bearing({}, sector.site) / kAreaDegrees); }
 
-// What lies below LTE at the same site; CDMA belongs to a neighbouring network and reaches some sites only.
+// What lies below LTE at the same site; CDMA belongs to a neighboring network and reaches some sites only.
 std::vector<LteCandidate> othersNear(int site, int sector) {
     using enum LteCandidate::Kind;
     std::vector<LteCandidate> others = {

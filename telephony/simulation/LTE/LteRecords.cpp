@@ -12,7 +12,7 @@ constexpr int kVersion = 1;
 constexpr int kAbsentPower = 64;
 constexpr int kAbsentThreshold = 32;
 constexpr int kStrongestPower = 23;  // dBm, of a phone of power class 3
-constexpr std::size_t kMostNeighbours = 32;
+constexpr std::size_t kMostNeighbors = 32;
 
 // Steps of `step` from `lowest` up to the value, as many as `bits` bits count.
 std::uint32_t steps(double value, double lowest, double step, int bits) {
@@ -31,7 +31,7 @@ void writeConnected(RecordWriter& record, std::size_t at, const LteReading& read
     record.u16(at, steps(reading.averageRsrp, -140, 0.25, 16)).u16(at + 2, steps(reading.averageRsrq, -20, 0.125, 16));
 }
 
-void writeNeighbour(RecordWriter& record, std::size_t at, const LteNeighbour& cell) {
+void writeNeighbor(RecordWriter& record, std::size_t at, const LteNeighbor& cell) {
     const LteReading& reading = cell.reading;
     const std::uint32_t timing = cell.frames | cell.samples << 11;
     // clang-format off
@@ -86,8 +86,8 @@ Bytes lteConnectedMeasurementRecord(Time time, const LteModem& modem) {
     RecordWriter record(0xB179, time, 29);
     record.u16(17, modem.serving().carrier.downlink).u16(19, modem.serving().physicalId).u16(21, modem.subframe());
     writeConnected(record, 23, modem.reading());
-    record.u8(27, modem.neighbours().size()).u8(28, modem.detected().size());
-    for (const LteNeighbour& cell : modem.neighbours()) {
+    record.u8(27, modem.neighbors().size()).u8(28, modem.detected().size());
+    for (const LteNeighbor& cell : modem.neighbors()) {
         const std::size_t at = record.size();
         record.u16(at, cell.physicalId);
         writeConnected(record, at + 2, cell.reading);
@@ -122,14 +122,14 @@ Bytes lteServingMeasurementRecord(Time time, const LteCell& cell, const LteReadi
     // clang-format on
 }
 
-Bytes lteNeighbourMeasurementRecord(Time time, const LteModem& modem) {
-    const auto& cells = modem.neighbours();
-    const std::size_t count = std::min(cells.size(), kMostNeighbours);
+Bytes lteNeighborMeasurementRecord(Time time, const LteModem& modem) {
+    const auto& cells = modem.neighbors();
+    const std::size_t count = std::min(cells.size(), kMostNeighbors);
     RecordWriter record(0xB180, time, 21);
     record.u8(13, kVersion)
-        .u16(17, modem.neighboursCarrier().downlink)
-        .u16(19, minimumLevel(modem.neighboursMinimumLevel()) | (count - 1) << 6);  // bits 0-5, bits 6-10
-    for (std::size_t i = 0; i < count; ++i) writeNeighbour(record, 21 + 20 * i, cells[i]);
+        .u16(17, modem.neighborsCarrier().downlink)
+        .u16(19, minimumLevel(modem.neighborsMinimumLevel()) | (count - 1) << 6);  // bits 0-5, bits 6-10
+    for (std::size_t i = 0; i < count; ++i) writeNeighbor(record, 21 + 20 * i, cells[i]);
     return record.finish();
 }
 

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "platform/Bytes.h"
+#include "platform/values/Bytes.h"
 #include "telephony/simulation/LTE/LteModem.h"
 
 namespace kelvo::simulation {
@@ -16,7 +16,7 @@ Bytes lteConnectedMeasurementRecord(Time time, const LteModem& modem);
 /// 0xb17f: an idle phone's measurement of its serving cell.
 Bytes lteServingMeasurementRecord(Time time, const LteCell& cell, const LteReading& reading, const LteIdleState& idle);
 /// 0xb180: an idle phone's measurement of the other cells of a carrier, of which there is at least one.
-Bytes lteNeighbourMeasurementRecord(Time time, const LteModem& modem);
+Bytes lteNeighborMeasurementRecord(Time time, const LteModem& modem);
 /// 0xb186: the candidate for reselection, if there is one. The layout lays candidates closer to one another than a
 /// candidate is long, so that a record has room for one only.
 Bytes lteCandidatesRecord(Time time, const LteModem& modem);

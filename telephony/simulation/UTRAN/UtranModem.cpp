@@ -21,7 +21,7 @@ constexpr double kLost = -4;
 constexpr std::size_t kMostCells = 6;
 constexpr std::size_t kMostGsmCells = 6;
 constexpr std::size_t kIdentifiedGsmCells = 4;
-constexpr double kListedRange = 1600;  // metres: cells of sites up to here are in the serving cell's neighbour list
+constexpr double kListedRange = 1600;  // metres: cells of sites up to here are in the serving cell's neighbor list
 constexpr double kJointRange = 15;     // dB below the serving cell: detected jointly
 constexpr double kGsmStronger = 9;     // dB: a GSM carrier beside the P-CCPCH at the same mast
 

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "platform/Bytes.h"
+#include "platform/values/Bytes.h"
 #include "telephony/simulation/UTRAN/UtranModem.h"
 
 namespace kelvo::simulation {

@@ -2,7 +2,7 @@
 
 #include <gtest/gtest.h>
 
-#include "platform/Environment.h"
+#include "platform/system/Environment.h"
 #include "tests/support/RecordingLog.h"
 #include "tests/support/Subpackets.h"
 

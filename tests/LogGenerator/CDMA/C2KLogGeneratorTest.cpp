@@ -2,7 +2,7 @@
 
 #include <gtest/gtest.h>
 
-#include "platform/TelephonyConstants.h"
+#include "platform/telephony/TelephonyConstants.h"
 #include "tests/support/C2KScreen.h"
 #include "tests/support/FakeResources.h"
 

@@ -7,7 +7,7 @@
 
 #include "LogGenerator/GSMUMTS/OSK_GSMClassIndex.h"
 #include "LogGenerator/UnknownDataException.h"
-#include "platform/Environment.h"
+#include "platform/system/Environment.h"
 #include "tests/support/CellArray.h"
 #include "tests/support/Record.h"
 #include "tests/support/RecordingLog.h"
@@ -85,7 +85,7 @@ TEST_F(GSMBadInput, ChangesNothingBelowTheMinimumSizeAndSomethingFromItOn) {
     });
 }
 
-TEST_F(GSMBadInput, KeepsNeighbourIdentitiesBelowTheMinimumSizeAndForgetsThemFromItOn) {
+TEST_F(GSMBadInput, KeepsNeighborIdentitiesBelowTheMinimumSizeAndForgetsThemFromItOn) {
     Base& section = *index.getClass("Neighboring Cells");
     const Record identity = Record(0x51ff, 19).u8(14, 1).u16(15, 975).u8(17, 42);
     const Record measurement = Record(0x5137, 43).u8(28, 1).u16(29, 975);

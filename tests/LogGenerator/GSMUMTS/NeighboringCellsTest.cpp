@@ -16,12 +16,12 @@ using Lines = std::vector<test::RecordingLog::Line>;
 using test::cell;
 using test::cellArray;
 
-Record neighbours(std::uint32_t count) { return Record(0x5137, 29 + 14 * count).u8(28, count); }
+Record neighbors(std::uint32_t count) { return Record(0x5137, 29 + 14 * count).u8(28, count); }
 constexpr std::size_t at(std::size_t index) { return 29 + 14 * index; }
 
 TEST(NeighboringCells, ShowsTheMeasuredCells) {
     Fed<NeighboringCells> section(Array::make({"row"}));
-    section.feed(neighbours(2)
+    section.feed(neighbors(2)
                      .u16(at(0), 975)
                      .u8(at(0) + 2, 60)
                      .u32(at(0) + 3, 65541)
@@ -38,7 +38,7 @@ TEST(NeighboringCells, AddsTheIdentityOfCellsThatTheLastIdentityRecordNamed) {
     Fed<NeighboringCells> section(Array::make());
     section.feed(Record(0x51ff, 27).u8(14, 3).u16(15, 975).u8(17, 1).u16(19, 512).u8(21, 63).u16(23, 975).u8(25, 42));
     EXPECT_EQ(section.rowCount(), 0U);
-    section.feed(neighbours(3).u16(at(0), 512).u16(at(1), 700).u16(at(2), 975));
+    section.feed(neighbors(3).u16(at(0), 512).u16(at(1), 700).u16(at(2), 975));
     EXPECT_EQ(section.row(0, "BSIC"), "63");
     EXPECT_EQ(section.row(1, "BSIC"), "(absent)");
     EXPECT_EQ(section.row(2, "BSIC"), "42");  // the last of two
@@ -50,17 +50,17 @@ TEST(NeighboringCells, ForgetsTheIdentitiesOfEarlierRecords) {
     Fed<NeighboringCells> section(Array::make());
     section.feed(Record(0x51ff, 19).u8(14, 1).u16(15, 975).u8(17, 42));
     section.feed(Record(0x51ff, 14));  // too short: kept
-    section.feed(neighbours(1).u16(at(0), 975));
+    section.feed(neighbors(1).u16(at(0), 975));
     EXPECT_EQ(section.row(0, "BSIC"), "42");
     section.feed(Record(0x51ff, 15));
     EXPECT_EQ(section.row(0, "BSIC"), "42");  // the list on the screen stays until it is measured again
-    section.feed(neighbours(1).u16(at(0), 975));
+    section.feed(neighbors(1).u16(at(0), 975));
     EXPECT_EQ(section.row(0, "BSIC"), "(absent)");
 }
 
-TEST(NeighboringCells, IsEmptiedByAMeasurementWithoutNeighbours) {
+TEST(NeighboringCells, IsEmptiedByAMeasurementWithoutNeighbors) {
     Fed<NeighboringCells> section(Array::make({"row"}));
-    section.feed(neighbours(0));
+    section.feed(neighbors(0));
     EXPECT_EQ(section.rowCount(), 0U);
 }
 
@@ -74,7 +74,7 @@ TEST(NeighboringCells, MakesUpNothingBeyondTheEnd) {
     EXPECT_EQ(section.row(1, "BSIC"), "(absent)");
 }
 
-TEST(NeighboringCells, ShowsGsmNeighboursOfTheCellArrayWithTheDoubledLevel) {
+TEST(NeighboringCells, ShowsGsmNeighborsOfTheCellArrayWithTheDoubledLevel) {
     Fed<NeighboringCells> section(Array::make({"row"}));
     section.feed(Record(0x51ff, 19).u8(14, 1).u16(15, 975).u8(17, 42));
     section.clearLog();
@@ -93,7 +93,7 @@ TEST(NeighboringCells, ShowsGsmNeighboursOfTheCellArrayWithTheDoubledLevel) {
                                     {3, "NeighboringCells: Failed to retrieve RSSI\n"}}));
 }
 
-TEST(NeighboringCells, IsEmptyAfterADamagedCellArrayOrOneWithoutNeighbours) {
+TEST(NeighboringCells, IsEmptyAfterADamagedCellArrayOrOneWithoutNeighbors) {
     for (const Record& record : {Record(0xff0001, 20), cellArray({}), cellArray({cell("GSM", "Serving")})}) {
         Fed<NeighboringCells> section(Array::make({"row"}));
         section.feed(record);

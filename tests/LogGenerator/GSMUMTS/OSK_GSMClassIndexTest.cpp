@@ -4,7 +4,7 @@
 
 #include <algorithm>
 
-#include "platform/Environment.h"
+#include "platform/system/Environment.h"
 #include "tests/support/RecordingLog.h"
 
 namespace kelvo {

@@ -73,7 +73,7 @@ TEST(UMTSSet, MakesUpNoRowsBeyondTheEnd) {
     EXPECT_EQ(section.rowCount(), 2U);
 }
 
-TEST(UMTSSet, ShowsUmtsNeighboursOfTheCellArray) {
+TEST(UMTSSet, ShowsUmtsNeighborsOfTheCellArray) {
     Fed<UMTSSet> section(Array::make({"row"}));
     section.feed(cellArray({
         cell("UMTS", "Serving", {{"kPLCellMonitorSCN", 1}}),
@@ -100,7 +100,7 @@ TEST(UMTSSet, ShowsUmtsNeighboursOfTheCellArray) {
     EXPECT_EQ(section.log(), (Lines{{4, "UMTSSet"}}));
 }
 
-TEST(UMTSSet, AddsANeighbourWithoutTheValuesThatItLacks) {
+TEST(UMTSSet, AddsANeighborWithoutTheValuesThatItLacks) {
     Fed<UMTSSet> section(Array::make());
     section.feed(cellArray({cell("UMTS", "Neighbor"), cell("UMTS", "Neighbor", {{"kPLCellMonitorSCN", 5}})}));
     EXPECT_EQ(section.part(), Value(Array::make({Dictionary::make(), Dictionary::make({{"Scrambling Code", "5"}})})));
@@ -114,7 +114,7 @@ TEST(UMTSSet, AddsANeighbourWithoutTheValuesThatItLacks) {
                                     {3, "UMTSSet: Failed to retrieve Energy Per Chip\n"}}));
 }
 
-TEST(UMTSSet, IsEmptiedByACellArrayWithoutUmtsNeighbours) {
+TEST(UMTSSet, IsEmptiedByACellArrayWithoutUmtsNeighbors) {
     Fed<UMTSSet> section(Array::make({"row"}));
     section.feed(cellArray({cell("GSM", "Neighbor")}));
     EXPECT_EQ(section.rowCount(), 0U);

@@ -3,8 +3,8 @@
 #include <algorithm>
 
 #include "LogGenerator/LTE/LTELogGenerator.h"
-#include "platform/DirectoryResources.h"
-#include "platform/Environment.h"
+#include "platform/system/DirectoryResources.h"
+#include "platform/system/Environment.h"
 #include "tests/support/CellArray.h"
 
 namespace kelvo {

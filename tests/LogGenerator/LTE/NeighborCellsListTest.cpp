@@ -15,7 +15,7 @@ constexpr const char* kTitle = "Neighbor Cells List";
 
 Fed<NeighborCellsList> emptyList() { return Fed<NeighborCellsList>(Value(Array::make())); }
 
-/// A record that holds and reports `cells` neighbours, each of zeros.
+/// A record that holds and reports `cells` neighbors, each of zeros.
 Record cells(std::size_t cells) {
     return Record(0xB180, 21 + 20 * cells).u16(19, static_cast<std::uint32_t>(cells - 1) << 6);
 }
@@ -44,7 +44,7 @@ TEST(NeighborCellsList, ShowsEveryFieldOfACell) {
     EXPECT_EQ(section.row(0, "Ant 0 Sample Offset"), "300000");
 }
 
-TEST(NeighborCellsList, CountsTheNeighboursRsrpInHalves) {
+TEST(NeighborCellsList, CountsTheNeighborsRsrpInHalves) {
     auto section = emptyList();
     section.feed(oneCell());
     EXPECT_EQ(section.row(0, "Measured RSRP"), "-95.50 dBm");  // 89 halves above -140

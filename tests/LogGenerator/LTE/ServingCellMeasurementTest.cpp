@@ -62,7 +62,7 @@ TEST(ServingCellMeasurement, ShowsTheLowestValuesOfAnEmptyRecord) {
     EXPECT_EQ(section["Measurement Rules Updated"], "False");
 }
 
-TEST(ServingCellMeasurement, KeepsNeighbouringBitFieldsApart) {
+TEST(ServingCellMeasurement, KeepsNeighboringBitFieldsApart) {
     Fed<ServingCellMeasurement> section(
         Record(0xB17F, 33).u16(19, 0xFFFF).u32(21, 0xFFFFFFFF).u32(25, 0xFFFFFFFF).u32(29, 0xFFFFFFFF));
     EXPECT_EQ(section["Physical Cell ID"], "511");

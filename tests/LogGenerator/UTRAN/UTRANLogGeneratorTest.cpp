@@ -4,8 +4,8 @@
 
 #include <set>
 
-#include "platform/DirectoryResources.h"
-#include "platform/Environment.h"
+#include "platform/system/DirectoryResources.h"
+#include "platform/system/Environment.h"
 #include "tests/support/CellArray.h"
 #include "tests/support/Record.h"
 #include "tests/support/RecordingLog.h"

@@ -15,7 +15,7 @@ constexpr const char* kTitle = "NeighbhorMeasurements List";
 
 Fed<UTRANNeighbhorMeasurements> emptyList() { return Fed<UTRANNeighbhorMeasurements>(Value(Array::make())); }
 
-/// Holds and reports `count` neighbours of zeros; the lowest bit at 16 is not the count's.
+/// Holds and reports `count` neighbors of zeros; the lowest bit at 16 is not the count's.
 Record neighbors(std::uint32_t count) { return Record(0xD00A, 168 + 16 * count).u8(16, count << 1 | 1); }
 
 TEST(UTRANNeighbhorMeasurements, ShowsOneRowACell) {

@@ -5,7 +5,7 @@
 
 #include <filesystem>
 
-#include "platform/MessagePorts.h"
+#include "platform/system/MessagePorts.h"
 #include "tests/support/FileSizeLimit.h"
 #include "tests/support/TemporaryDirectory.h"
 

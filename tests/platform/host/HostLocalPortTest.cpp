@@ -8,8 +8,8 @@
 #include <ctime>
 #include <vector>
 
-#include "platform/Environment.h"
 #include "platform/host/HostMessagePorts.h"
+#include "platform/system/Environment.h"
 #include "tests/platform/host/RawPort.h"
 #include "tests/support/EventLoop.h"
 #include "tests/support/RecordingLog.h"

@@ -6,8 +6,8 @@
 
 #include <fstream>
 
-#include "platform/Environment.h"
 #include "platform/host/HostPaths.h"
+#include "platform/system/Environment.h"
 #include "tests/platform/host/RawPort.h"
 #include "tests/support/EventLoop.h"
 #include "tests/support/RecordingLog.h"

@@ -11,9 +11,9 @@
 #include <fstream>
 #include <sstream>
 
-#include "platform/Environment.h"
-#include "platform/PropertyList.h"
+#include "platform/encodings/PropertyList.h"
 #include "platform/host/UniqueFd.h"
+#include "platform/system/Environment.h"
 #include "tests/support/EventLoop.h"
 #include "tests/support/PrivateBus.h"
 #include "tests/support/RecordingLog.h"

@@ -9,8 +9,8 @@
 #include <optional>
 #include <string>
 
-#include "platform/Bytes.h"
 #include "platform/host/UniqueFd.h"
+#include "platform/values/Bytes.h"
 
 namespace kelvo::test {
 

@@ -2,7 +2,7 @@
 
 #include <gtest/gtest.h>
 
-#include "platform/PropertyList.h"
+#include "platform/encodings/PropertyList.h"
 
 using namespace kelvo;
 using namespace kelvo::simulation;

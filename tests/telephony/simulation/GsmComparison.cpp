@@ -127,15 +127,15 @@ void GsmComparison::cells() {
         shows("UMTS Radio/UMTS RR Info/UARFCN", "10562");
         shows("UMTS Radio/UMTS RR Info/Scrambling Code", umtsCell().scramblingCode);
     }
-    umtsNeighboursOfArray();
-    gsmNeighboursOfArray();
+    umtsNeighborsOfArray();
+    gsmNeighborsOfArray();
 }
 
 /// The best cells that are found beside those in use and, in UMTS, the first of the serving site that is not found.
-void GsmComparison::umtsNeighboursOfArray() {
+void GsmComparison::umtsNeighborsOfArray() {
     const Phone& phone = _modem.phone();
     const bool isUmts = phone.rat() == Rat::UMTS;
-    std::vector<std::size_t> told = phone.umtsNeighbours(isUmts ? 2 : 1);
+    std::vector<std::size_t> told = phone.umtsNeighbors(isUmts ? 2 : 1);
     const std::size_t first = phone.serving() - phone.serving() % 3;
     for (std::size_t sector = first; isUmts && sector < first + 3; ++sector) {
         if (sector == phone.serving() || _modem.air().isFound(sector)) continue;
@@ -159,14 +159,14 @@ void GsmComparison::umtsNeighboursOfArray() {
     }
 }
 
-void GsmComparison::gsmNeighboursOfArray() {
-    const auto neighbours = _modem.phone().gsmNeighbours();
-    const std::size_t told = std::min<std::size_t>(neighbours.size(), _modem.phone().rat() == Rat::GSM ? 2 : 1);
+void GsmComparison::gsmNeighborsOfArray() {
+    const auto neighbors = _modem.phone().gsmNeighbors();
+    const std::size_t told = std::min<std::size_t>(neighbors.size(), _modem.phone().rat() == Rat::GSM ? 2 : 1);
     ASSERT_EQ(_played.rows("GSM Cell and Neighbours/Neighboring Cells"), told);
     for (std::size_t row = 0; row < told; ++row) {
         _group = "GSM Cell and Neighbours/Neighboring Cells/" + std::to_string(row) + "/";
-        shows("ARFCN", _modem.network().gsm[neighbours[row]].arfcn);
-        within("RSSI", _modem.air().gsmLevel(neighbours[row]), 1, " dBm");  // told in steps of 2 dB
+        shows("ARFCN", _modem.network().gsm[neighbors[row]].arfcn);
+        within("RSSI", _modem.air().gsmLevel(neighbors[row]), 1, " dBm");  // told in steps of 2 dB
     }
 }
 

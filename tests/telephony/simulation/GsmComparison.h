@@ -46,7 +46,7 @@ private:
     void servingNetwork();
     void equivalents();
     void gsmMeasurement();
-    void gsmNeighbours();
+    void gsmNeighbors();
     void rememberBsics();
     void mobileAllocation();
     void searcher();
@@ -59,8 +59,8 @@ private:
     void processes(const std::string& path, const std::vector<HarqProcess>& expected);
     void sim();
     void cells();
-    void umtsNeighboursOfArray();
-    void gsmNeighboursOfArray();
+    void umtsNeighborsOfArray();
+    void gsmNeighborsOfArray();
     void contexts();
 
     void shows(const std::string& path, const std::string& expected) {

@@ -49,23 +49,23 @@ void GsmComparison::gsmMeasurement() {
     levelWithin("GSM RR Info/Serving Rx Level", level);
     within("GSM RR Info/Rx Quality Full", c1, 0.5);
     within("GSM RR Info/Rx Quality Sub", c1 + gsmCell().reselectOffset, 0.5);
-    const auto neighbours = _modem.phone().gsmNeighbours();
+    const auto neighbors = _modem.phone().gsmNeighbors();
     const auto& cells = _modem.network().gsm;
-    const std::size_t candidate = *std::ranges::max_element(neighbours, {}, [&](std::size_t sector) {
+    const std::size_t candidate = *std::ranges::max_element(neighbors, {}, [&](std::size_t sector) {
         return _modem.air().gsmLevel(sector) + cells[sector].reselectOffset;
     });
     const bool isApplied = _modem.phone().link() == Link::Open || cells[candidate].area.lac != gsmCell().area.lac;
     EXPECT_EQ(_played.text("GPRS/GPRS Information/Cell Reselect Hysteresis"), isApplied ? "Applied" : "Not Applied");
-    gsmNeighbours();
+    gsmNeighbors();
 }
 
-void GsmComparison::gsmNeighbours() {
-    const auto neighbours = _modem.phone().gsmNeighbours();
-    ASSERT_EQ(_played.rows(_group + "Neighboring Cells"), neighbours.size());
-    for (std::size_t row = 0; row < neighbours.size(); ++row) {
+void GsmComparison::gsmNeighbors() {
+    const auto neighbors = _modem.phone().gsmNeighbors();
+    ASSERT_EQ(_played.rows(_group + "Neighboring Cells"), neighbors.size());
+    for (std::size_t row = 0; row < neighbors.size(); ++row) {
         const std::string path = "Neighboring Cells/" + std::to_string(row);
-        const GsmCell& cell = _modem.network().gsm[neighbours[row]];
-        const double level = _modem.air().gsmLevel(neighbours[row]);
+        const GsmCell& cell = _modem.network().gsm[neighbors[row]];
+        const double level = _modem.air().gsmLevel(neighbors[row]);
         shows(path + "/ARFCN", cell.arfcn);
         levelWithin(path + "/RSSI", level);
         within(path + "/C1 Value", level + 104, 0.5);
@@ -76,7 +76,7 @@ void GsmComparison::gsmNeighbours() {
 
 void GsmComparison::rememberBsics() {
     _bsics.clear();
-    for (const std::size_t sector : _modem.phone().gsmNeighbours()) {
+    for (const std::size_t sector : _modem.phone().gsmNeighbors()) {
         const GsmCell& cell = _modem.network().gsm[sector];
         _bsics[cell.arfcn] = cell.bsic;
     }

@@ -14,7 +14,7 @@ using namespace kelvo::simulation::gsm;
 using namespace std::chrono_literals;
 using kelvo::test::Played;
 
-TEST(GsmMoves, MovesWithinGsmToANeighbourThatWasShownAndHadRisen) {
+TEST(GsmMoves, MovesWithinGsmToANeighborThatWasShownAndHadRisen) {
     GsmSimulation modem(10);  // mostly in GSM
     Played played(modem);
     std::size_t serving = 0;

@@ -100,7 +100,7 @@ TEST(SearcherRecord, TellsTheSetOfEachCellAboveThirteenBitsOfItsCode) {
     EXPECT_EQ(record[90 + 32] | record[90 + 33] << 8 | record[90 + 34] << 16, 52429);
 }
 
-TEST(TransmitPowerRecord, TellsAPowerThatLooksLikeOffAsItsNeighbour) {
+TEST(TransmitPowerRecord, TellsAPowerThatLooksLikeOffAsItsNeighbor) {
     const std::optional<double> slots[] = {-18.8, std::nullopt};
     const Bytes message = transmitPowerRecord(slots, 0s);
     EXPECT_EQ(message[2 + 14], 2);

@@ -45,7 +45,7 @@ struct Cells {
 
     std::string network;
     std::string serving;
-    /// How far each neighbour stands above the serving cell, in dB; as seen from GSM, a UMTS cell's Ec/N0.
+    /// How far each neighbor stands above the serving cell, in dB; as seen from GSM, a UMTS cell's Ec/N0.
     std::map<std::string, double> above;
 };
 
@@ -96,22 +96,22 @@ protected:
         near("Serving/RSCP", truth().rscp, 1, " dBm");
         near("Serving/ECN0", truth().ecN0, 0.5, " dB");
     }
-    void checkGsmNeighbours() {
+    void checkGsmNeighbors() {
         ASSERT_EQ(played.rows("Neighbours/GSM"), truth().gsm.size());
         for (std::size_t i = 0; i < truth().gsm.size(); ++i) {
-            const GsmNeighbour& neighbour = truth().gsm[i];
-            const GsmCell& cell = modem.network().gsm[neighbour.sector];
+            const GsmNeighbor& neighbor = truth().gsm[i];
+            const GsmCell& cell = modem.network().gsm[neighbor.sector];
             const std::string row = "Neighbours/GSM/" + std::to_string(i);
-            if (!neighbour.measured) {
+            if (!neighbor.measured) {
                 is(row, cell.arfcn);  // nothing else is known
                 continue;
             }
             is(row + "/ARFCN", cell.arfcn);
-            near(row + "/RSSI", neighbour.rssi, 1, " dBm");
-            is(row + "/BSIC", neighbour.identified ? std::to_string(cell.bsic) : "(absent)");
+            near(row + "/RSSI", neighbor.rssi, 1, " dBm");
+            is(row + "/BSIC", neighbor.identified ? std::to_string(cell.bsic) : "(absent)");
         }
     }
-    void checkUmtsNeighbours() {
+    void checkUmtsNeighbors() {
         ASSERT_EQ(played.rows("Neighbours/UMTS"), truth().umts.size());
         for (std::size_t i = 0; i < truth().umts.size(); ++i) {
             const std::string row = "Neighbours/UMTS/" + std::to_string(i);
@@ -148,8 +148,8 @@ protected:
     }
     void check() {
         checkServing();
-        if (truth().access != RadioAccess::None) checkGsmNeighbours();
-        checkUmtsNeighbours();
+        if (truth().access != RadioAccess::None) checkGsmNeighbors();
+        checkUmtsNeighbors();
         checkRegistration();
         checkConnection();
     }
@@ -181,8 +181,8 @@ TEST_F(IfxDisplay, HasASearchAtFirstAndACellWithinTwoSeconds) {
         shown = played.refresh();
         played.next();
     }
-    const auto& neighbours = (*shown.dictionary())["Neighbours"];
-    EXPECT_EQ((*neighbours.dictionary())["GSM"].array()->size(), 6U);
+    const auto& neighbors = (*shown.dictionary())["Neighbours"];
+    EXPECT_EQ((*neighbors.dictionary())["GSM"].array()->size(), 6U);
     EXPECT_TRUE((*(*shown.dictionary())["Serving"].dictionary())["CellId"]);
 }
 
@@ -275,12 +275,12 @@ TEST(IfxSimulation, ServesTheStrongestWithinTheMarginsOfItsRules) {
             const bool wasIdle = status.connection == Connection::Idle;
             const auto activity = user.at(now);
             modem.measure(drive, now, activity, user.demand());
-            EXPECT_TRUE(std::ranges::is_sorted(status.gsm, std::greater(), &GsmNeighbour::rssi));
+            EXPECT_TRUE(std::ranges::is_sorted(status.gsm, std::greater(), &GsmNeighbor::rssi));
             std::map<std::size_t, Time> idle;
             std::map<std::size_t, Time> connected;
             if (status.access == RadioAccess::Gsm && status.serving == serving) {
                 ++compared;
-                for (const GsmNeighbour& other : status.gsm) {
+                for (const GsmNeighbor& other : status.gsm) {
                     const auto since = [&](const auto& before) {
                         return before.contains(other.sector) ? before.at(other.sector) : now;
                     };
@@ -398,7 +398,7 @@ TEST(IfxSimulation, UpdatesItsAreaAfterEachChangeButNotDuringACall) {
     EXPECT_GE(registered.size(), 4U);
 }
 
-TEST(IfxSimulation, GivesNeighbouringCellsDifferentIdentities) {
+TEST(IfxSimulation, GivesNeighboringCellsDifferentIdentities) {
     IfxSimulation modem(7);
     const auto& network = modem.network();
     std::set<std::pair<int, int>> gsm;

@@ -14,7 +14,7 @@ void LteShown::compare(std::uint32_t code) {
         case 0xB0C1: EXPECT_EQ(_played.number("Serving Cell Info/Num Tx Antennas"), _modem.serving().antennas); return;
         case 0xB179: return connectedMeasurement();
         case 0xB17F: return servingMeasurement();
-        case 0xB180: return neighbourMeasurement();
+        case 0xB180: return neighborMeasurement();
         case 0xB186: return candidates();
         case 0xFF0000: return simFiles();
         case 0xFF0001: return monitoredCell();
@@ -57,9 +57,9 @@ void LteShown::connectedMeasurement() {
     reads("Serving Filtered RSRP", _modem.reading().averageRsrp, 0.25, " dBm");
     reads("Serving Filtered RSRQ", _modem.reading().averageRsrq, 0.125, " dB");
 
-    ASSERT_EQ(_played.rows("Measured Neighbor Cells"), _modem.neighbours().size());
-    for (std::size_t i = 0; i < _modem.neighbours().size(); ++i) {
-        const LteNeighbour& cell = _modem.neighbours()[i];
+    ASSERT_EQ(_played.rows("Measured Neighbor Cells"), _modem.neighbors().size());
+    for (std::size_t i = 0; i < _modem.neighbors().size(); ++i) {
+        const LteNeighbor& cell = _modem.neighbors()[i];
         _section = "Measured Neighbor Cells/" + std::to_string(i);
         equals("Physical Cell ID", cell.physicalId);
         reads("Filtered RSRP", cell.reading.averageRsrp, 0.25, " dBm");
@@ -101,14 +101,14 @@ void LteShown::servingMeasurement() {
     equals("Measurement Rules", idle.rules);
 }
 
-void LteShown::neighbourMeasurement() {
+void LteShown::neighborMeasurement() {
     _section = "Neighbor Measurements";
     equals("Version", 1);
-    equals("E-ARFCN", _modem.neighboursCarrier().downlink);
-    equals("Qrxlevmin", std::to_string(_modem.neighboursMinimumLevel()) + " dBm");
-    ASSERT_EQ(_played.rows("Neighbor Cells List"), _modem.neighbours().size());
-    for (std::size_t i = 0; i < _modem.neighbours().size(); ++i) {
-        const LteNeighbour& cell = _modem.neighbours()[i];
+    equals("E-ARFCN", _modem.neighborsCarrier().downlink);
+    equals("Qrxlevmin", std::to_string(_modem.neighborsMinimumLevel()) + " dBm");
+    ASSERT_EQ(_played.rows("Neighbor Cells List"), _modem.neighbors().size());
+    for (std::size_t i = 0; i < _modem.neighbors().size(); ++i) {
+        const LteNeighbor& cell = _modem.neighbors()[i];
         _section = "Neighbor Cells List/" + std::to_string(i);
         equals("Physical Cell ID", cell.physicalId);
         reads("Measured RSSI", cell.reading.rssi, 0.5, " dBm");

@@ -17,7 +17,7 @@ private:
     void servingCell();
     void connectedMeasurement();
     void servingMeasurement();
-    void neighbourMeasurement();
+    void neighborMeasurement();
     void candidates();
     void candidate(const simulation::LteCandidate& candidate);
     void simFiles();

@@ -10,9 +10,9 @@
 #include <vector>
 
 #include "LogGenerator/LogGenerator.h"
-#include "platform/DirectoryResources.h"
-#include "platform/Environment.h"
-#include "platform/Technology.h"
+#include "platform/system/DirectoryResources.h"
+#include "platform/system/Environment.h"
+#include "platform/telephony/Technology.h"
 #include "telephony/simulation/Simulation.h"
 #include "tests/support/RecordingLog.h"
 

@@ -1,0 +1,15 @@
+#include "LogGenerator/PhoneServices/PDPContextList.h"
+
+#include "LogGenerator/PhoneServices/CellInfo.h"
+#include "platform/system/Environment.h"
+
+namespace kelvo {
+
+void PDPContextList::updateWithData(ByteView data, LogCode logCode) {
+    logLine(Level::Warning, "PDPContextList");
+    if (logCode != 0xff0002) return reportUnknown(logCode);
+    const Value contexts = payloadPropertyList(data);
+    if (contexts.array()) replaceArray(list(), {contexts.array()->begin(), contexts.array()->end()});
+}
+
+}  // namespace kelvo

@@ -7,6 +7,7 @@
 
 #include "LogGenerator/LogGenerator.h"
 #include "model/KelvoModelNode.h"
+#include "platform/encodings/PropertyList.h"
 #include "platform/system/MainQueue.h"
 #include "platform/system/MessagePorts.h"
 #include "platform/telephony/Telephony.h"
@@ -31,6 +32,8 @@ public:
         std::function<void()> updateViewControllerFromModel;
         /// The application's port name; another program that watches beside it brings its own.
         std::string portName = kLogChannelPortName;
+        /// How messages are encoded.
+        std::function<Result<Bytes>(const Value&)> encode = writeXmlPropertyList;
     };
 
     explicit KelvoModel(Services services);

@@ -73,10 +73,11 @@ protected:
     }
 
     std::unique_ptr<KelvoModel> newModel() {
-        return std::make_unique<KelvoModel>(KelvoModel::Services{
-            .queue = queue, .ports = ports, .telephony = telephony, .updateViewControllerFromModel = [this] {
-                ++updates;
-            }});
+        return std::make_unique<KelvoModel>(KelvoModel::Services{.queue = queue,
+                                                                 .ports = ports,
+                                                                 .telephony = telephony,
+                                                                 .updateViewControllerFromModel = [this] { ++updates; },
+                                                                 .encode = encode});
     }
 
     /// The program's standard output.
@@ -111,6 +112,7 @@ protected:
     Environment::Scope environment{
         {.log = &log, .clock = &clock, .resources = &resources, .standardOutput = output.file()}};
     int updates = 0;  // of the screens
+    std::function<Result<Bytes>(const Value&)> encode = writeXmlPropertyList;
     std::unique_ptr<KelvoModel> model = newModel();
 };
 

@@ -6,6 +6,7 @@
 #include <vector>
 
 #include "LogGenerator/LogGenerator.h"
+#include "model/Connection.h"
 #include "model/KelvoModelNode.h"
 #include "platform/system/MainQueue.h"
 #include "platform/system/MessagePorts.h"
@@ -27,10 +28,13 @@ public:
         MainQueue& queue;
         MessagePorts& ports;
         TelephonyClient& telephony;
-        /// Runs on the main queue when a tick found new data, or the connection lost and not there again.
+        /// Runs on the main queue when a tick found new data.
         std::function<void()> updateViewControllerFromModel;
         /// The application's port name; another program that watches beside it brings its own.
         std::string portName = kLogChannelPortName;
+        /// Runs on the main queue when the connection has come or gone, and when what `connectionText` says of it is
+        /// another than before: nobody has to ask again and again.
+        std::function<void()> connectionChanged = {};
     };
 
     explicit KelvoModel(Services services);
@@ -48,6 +52,8 @@ public:
 
     /// True while both ports are there.
     bool isConnected() const;
+    /// How far the monitor has come, and for how long nothing has.
+    Connection connection() const;
     /// The root of the display tree, built when it is not cached; none while there is no generator.
     NodeRef topLevelNodes();
     /// The node at `path`; none when the tree has no such node.
@@ -58,12 +64,21 @@ public:
     ArrayRef getSaveContents();
 
 private:
+    struct Told {
+        bool isConnected = false;
+        std::string text = connectionText({});
+        bool operator==(const Told&) const = default;
+    };
+
     bool createPorts();
     bool openLogChannel();
     void destroyPorts();
     void configureGenerator();
     void chooseGenerator(const Value& answer);
     bool startStreaming();
+    template <class... Args>
+    bool failed(Connection::State obstacle, const char* format, const Args&... args);
+    void tellConnection();
     void didReceive(std::int32_t id, ByteView data);
     void didInvalidate(const LocalPort& port);
     template <class Work>
@@ -79,6 +94,10 @@ private:
     std::unique_ptr<RemotePort> _sendPort;
     std::unique_ptr<RepeatingTimer> _displayUpdateTimer;  // its presence means that the monitor runs
     bool _updated = false;
+    Connection::State _obstacle = Connection::State::NotStarted;  // why the last start failed
+    bool _receiving = false;                                      // a record has come since the monitor runs
+    std::chrono::nanoseconds _silentSince{0};                     // when the last one came, or the monitor began to run
+    Told _told;                                                   // what the screens know of the connection
     const std::shared_ptr<bool> _alive = std::make_shared<bool>();  // its owners: tasks on the queue outlive the model
 };
 

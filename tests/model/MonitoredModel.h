@@ -73,10 +73,12 @@ protected:
     }
 
     std::unique_ptr<KelvoModel> newModel() {
-        return std::make_unique<KelvoModel>(KelvoModel::Services{
-            .queue = queue, .ports = ports, .telephony = telephony, .updateViewControllerFromModel = [this] {
-                ++updates;
-            }});
+        return std::make_unique<KelvoModel>(
+            KelvoModel::Services{.queue = queue,
+                                 .ports = ports,
+                                 .telephony = telephony,
+                                 .updateViewControllerFromModel = [this] { ++updates; },
+                                 .connectionChanged = [this] { told.push_back(connectionText(model->connection())); }});
     }
 
     /// The program's standard output.
@@ -111,6 +113,7 @@ protected:
     Environment::Scope environment{
         {.log = &log, .clock = &clock, .resources = &resources, .standardOutput = output.file()}};
     int updates = 0;  // of the screens
+    Texts told;       // what was to be said of the connection each time it changed
     std::unique_ptr<KelvoModel> model = newModel();
 };
 

@@ -171,7 +171,7 @@ bool KelvoModel::startStreaming() {
 }
 
 void KelvoModel::refresh() {
-    if (_sendPort && _recvPort && !_sendPort->isValid()) _recvPort->invalidate();  // whose callback restarts
+    if (_sendPort && _recvPort && !_sendPort->isValid()) loseService();
     if (_displayUpdateTimer) tellConnection();
     if (!_updated) return;
     _updated = false;
@@ -181,6 +181,13 @@ void KelvoModel::refresh() {
 }
 
 void KelvoModel::refresh(const Value&) { refresh(); }
+
+/// The port that the service delivered to ends with it, as if it had ended by itself.
+void KelvoModel::loseService() {
+    _recvPort->setInvalidationCallback(nullptr);
+    _recvPort->invalidate();
+    didInvalidate(*_recvPort);
+}
 
 bool KelvoModel::isConnected() const { return _recvPort && _sendPort; }
 
@@ -199,14 +206,18 @@ void KelvoModel::tellConnection() {
 }
 
 NodeRef KelvoModel::topLevelNodes() {
-    if (!_nodes && _logGenerator) {
-        _nodes = KelvoModelNode::makeTreeFromObject(_logGenerator->generateLogUsingState(*_state), _nodesByPath);
-    }
+    if (!_nodes) rebuildNodes();
     return _nodes;
 }
 
+void KelvoModel::rebuildNodes() {
+    if (!_logGenerator) return;
+    const Value display = _logGenerator->generateLogUsingState(*_state);  // which takes a snapshot
+    _nodes = KelvoModelNode::makeTreeFromObject(display, _nodesByPath);
+}
+
 NodeRef KelvoModel::nodeAtPath(const std::string& path) {
-    if (!_nodes) topLevelNodes();
+    if (!_nodes) rebuildNodes();
     return _nodesByPath.find(path);
 }
 

@@ -54,9 +54,10 @@ public:
     bool isConnected() const;
     /// How far the monitor has come, and for how long nothing has.
     Connection connection() const;
-    /// The root of the display tree, built when it is not cached; none while there is no generator.
+    /// The root of the display tree; none while there is no generator. The first call after a tick with new data builds
+    /// the tree anew, and with it adds a snapshot to the history.
     NodeRef topLevelNodes();
-    /// The node at `path`; none when the tree has no such node.
+    /// The node at `path`, of a tree built as for `topLevelNodes`; none when the tree has no such node.
     NodeRef nodeAtPath(const std::string& path);
     /// Hands one message of the log channel to the generator.
     void updateWithData(ByteView data);
@@ -79,6 +80,8 @@ private:
     template <class... Args>
     bool failed(Connection::State obstacle, const char* format, const Args&... args);
     void tellConnection();
+    void loseService();
+    void rebuildNodes();
     void didReceive(std::int32_t id, ByteView data);
     void didInvalidate(const LocalPort& port);
     template <class Work>
@@ -86,7 +89,7 @@ private:
 
     const Services _services;
     const DictionaryRef _state = Dictionary::make();                 // outlives every restart and every generator
-    std::vector<std::unique_ptr<LogGenerator>> _replacedGenerators;  // intended: one that was replaced is kept as well
+    std::vector<std::unique_ptr<LogGenerator>> _replacedGenerators;  // none is released before the model goes
     std::unique_ptr<LogGenerator> _logGenerator;
     NodeRef _nodes;
     NodesByPath _nodesByPath;  // built with _nodes and empty without

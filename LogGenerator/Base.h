@@ -8,8 +8,8 @@
 #include <vector>
 
 #include "LogGenerator/CodeDictionary.h"
-#include "LogGenerator/FieldTable.h"
 #include "LogGenerator/LogCode.h"
+#include "LogGenerator/ShowFields.h"
 #include "platform/values/Bytes.h"
 #include "platform/values/Value.h"
 
@@ -56,6 +56,10 @@ protected:
     template <std::size_t N>
     bool show(ByteView data, const Layout<N>& layout) const {
         return showLayout(data, layout.size, layout.fields);
+    }
+    /// Takes a key off the screen.
+    void hide(Key key) const {
+        if (values()) values()->remove(key);
     }
     /// Writes "Received an unknown log message: %d".
     static void reportUnknown(LogCode logCode);

@@ -8,7 +8,7 @@ namespace kelvo {
 
 namespace {
 
-constexpr NumberFormat kReferencePilotLevel = "(ref pilot) %+.2f dB";
+constexpr ShownReal kReferencePilotLevel("(ref pilot) %+.2f", dB);
 
 /// What the levels of one active set are measured against.
 struct Scale {

@@ -30,7 +30,7 @@ constexpr ValueTable kSessionState({
     { 4, "Open [4]"             },
 }, "[Reserved %d]");
 
-constexpr Shown kLevel = whole(1, 0, "%+d dBm");
+constexpr Shown kLevel = whole(1, 0, dBm, "%+d");
 
 constexpr auto kReceiver = record(kSize, {
     // at             raw               lookup key            shown as
@@ -44,7 +44,7 @@ constexpr auto kWithAccess = record(kSize, {
     { 17,             i8,               "kTxAGC",             kLevel               },
 });
 constexpr auto kSession = record(kSize, {
-    { 18,             u16,              "kServingPNOffset",   whole(1, 0, "%d × 64chips").unless(65535, "Invalid Value") },
+    { 18,             u16,              "kServingPNOffset",   whole(1, 0, pnOffset).unless(65535, "Invalid Value") },
     { 37,             u8,               "kSessionState",      label(kSessionState) },
     { 38,             u32.bits( 0, 23), "kUATI24",            hexadecimal("0x%06x") },
     { 41,             u8,               "kColorCode",         decimal              },

@@ -28,7 +28,7 @@ constexpr ValueTable kRoamingIndicator({
     { 12, "Banner OFF [12]"                    },
 }, "ERI - %d");
 
-constexpr Shown kUnknownSystem{.how = Shown::How::Signed32, .format = "(unknown system type %d)"};
+constexpr Shown kUnknownSystem = Shown::Name{{}, "(unknown system type %d)"};
 
 constexpr auto kRoaming = record(kMinimum, {
     {  42, i32, "k1xRoamingHome",    label(kRoamingIndicator) },
@@ -38,8 +38,8 @@ constexpr auto kIds = record(kMinimum, {
     {  52, u16, "kNetworkId",        decimal                  },
 });
 constexpr auto kNoIds = record(kMinimum, {
-    {  46, u32, "kSystemId",         kUnknownSystem           },
-    {  46, u32, "kNetworkId",        kUnknownSystem           },
+    {  46, i32, "kSystemId",         kUnknownSystem           },
+    {  46, i32, "kNetworkId",        kUnknownSystem           },
 });
 constexpr auto kStation = record(kMinimum + 15, {  // intended: the base station lies past what a record must have
     { 131, u8,  "kPacketZoneId",     decimal                  },

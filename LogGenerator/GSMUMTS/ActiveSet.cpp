@@ -16,7 +16,7 @@ constexpr auto kCell = entry(kCellSize, {
 });
 // clang-format on
 constexpr Raw kSetType = u16.bits(13, 15);  // at 7 as well; 0 is the active set
-constexpr Shown kDecibel = whole(1, 0, "%d dB");
+constexpr Shown kDecibel = whole(1, 0, dB);
 constexpr Key kRSCP("RSCP");
 constexpr Key kEnergyPerChip("Energy Per Chip");
 

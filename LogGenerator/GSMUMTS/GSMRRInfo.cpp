@@ -33,24 +33,24 @@ constexpr ValueTable kStates({  // the blanks within 13, 19 and 21 are meant to 
 }, "Unknown");
 
 constexpr auto kState = record(17, {  // 0x512c
-    { 13, u8,  "RR State",         label(kStates)          },
-    { 14, u8,  "RR Sub State",     decimal                 },
-    { 15, u8,  "RR Status",        decimal                 },
-    { 16, u8,  "RR Mode",          flag("Data", "Voice")   },
+    { 13, u8,  "RR State",         label(kStates)        },
+    { 14, u8,  "RR Sub State",     decimal               },
+    { 15, u8,  "RR Status",        decimal               },
+    { 16, u8,  "RR Mode",          flag("Data", "Voice") },
 });
 
 constexpr auto kMeasurement = record(29, {  // 0x5137; GSM Serving Cell shows the same bytes in its own way
-    { 15, u8,  "Serving Rx Level", decimal                 },
-    { 16, u32, "Rx Quality Full",  asSigned                },
-    { 20, u32, "Rx Quality Sub",   asSigned                },
+    { 15, u8,  "Serving Rx Level", decimal  },
+    { 16, u32, "Rx Quality Full",  asSigned },
+    { 20, u32, "Rx Quality Sub",   asSigned },
 });
 
 constexpr auto kDTX = record(20, {  // 0x5072
-    { 19, u8,  "DTX Used",         flag("ON", "OFF")       },
+    { 19, u8,  "DTX Used",         flag("ON", "OFF") },
 });
 
 constexpr auto kDRX = record(24, {  // 0x51f6
-    { 16, u8,  "DRX Used",         whole(1, 0, "%d sec")   },
+    { 16, u8,  "DRX Used",         whole(1, 0, inSeconds) },
 });
 // clang-format on
 

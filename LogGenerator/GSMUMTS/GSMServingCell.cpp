@@ -10,19 +10,19 @@ namespace {
 
 // clang-format off
 constexpr auto kIdentity = record(26, {  // 0x5134
-    { 17, u16,             "Cell ID",            decimal               },
-    { 13, u16,             "ARFCN",              decimal               },
-    { 15, u16,             "BSIC",               decimal               },
+    { 17, u16,             "Cell ID",            decimal },
+    { 13, u16,             "ARFCN",              decimal },
+    { 15, u16,             "BSIC",               decimal },
 });
 
 constexpr auto kMeasurement = record(29, {  // 0x5137; GSM RR Info shows the same bytes whole
-    { 15, u8,              "RSSI",               whole(1, 0, "%d dBm") },
-    { 16, u32.bits(0, 15), "C1 Value",           decimal               },
-    { 20, u32.bits(0, 15), "C2 Value",           decimal               },
+    { 15, u8,              "RSSI",               whole(1, 0, dBm) },
+    { 16, u32.bits(0, 15), "C1 Value",           decimal          },
+    { 20, u32.bits(0, 15), "C2 Value",           decimal          },
 });
 
 constexpr auto kDedicated = record(17, {  // 0x5076
-    { 13, u16.bits(0, 7),  "MA Dedicated ARFCN", decimal               },  // the low byte alone, as intended
+    { 13, u16.bits(0, 7),  "MA Dedicated ARFCN", decimal },  // the low byte alone, as intended
 });
 
 constexpr CellField kCell[] = {

@@ -8,10 +8,10 @@ namespace {
 
 // clang-format off
 constexpr auto kCell = entry(7, {
-    { 0, u16, "ARFCN",         decimal               },
-    { 2, u16, "BSIC",          decimal               },
-    { 4, i8,  "RSSI",          whole(1, 0, "%d dBm") },
-    { 5, i16, "Ranking Value", decimal               },
+    { 0, u16, "ARFCN",         decimal          },
+    { 2, u16, "BSIC",          decimal          },
+    { 4, i8,  "RSSI",          whole(1, 0, dBm) },
+    { 5, i16, "Ranking Value", decimal          },
 });
 // clang-format on
 

@@ -17,8 +17,8 @@ constexpr auto kCell = entry(14, {  // 0x5137
 });
 
 constexpr CellField kNeighbor[] = {  // 32767 is no value
-    { kPLCellMonitorARFCN, "ARFCN", "NeighboringCells: Failed to retrieve ARFCN\n"                                          },
-    { kPLCellMonitorRSSI,  "RSSI",  "NeighboringCells: Failed to retrieve RSSI\n", whole(2, 0, "%d dBm").unless(32767, "") },
+    { kPLCellMonitorARFCN, "ARFCN", "NeighboringCells: Failed to retrieve ARFCN\n"                                    },
+    { kPLCellMonitorRSSI,  "RSSI",  "NeighboringCells: Failed to retrieve RSSI\n", whole(2, 0, dBm).unless(32767, "") },
 };
 // clang-format on
 

@@ -26,7 +26,6 @@ constexpr auto kCell = record(29, {  // 0x4127
     { 21, u32, "Cell ID",            asSigned                    },
     { 17, u32, "Downlink Frequency", asSigned                    },
     { 13, u32, "Uplink Frequency",   asSigned                    },
-    removed(   "UARFCN"                                          ),  // the cell array's key: these frequencies replace it
     { 25, u16, "URA ID",             decimal                     },
 });
 
@@ -41,7 +40,7 @@ constexpr CellField kServingCell[] = {
 };
 // clang-format on
 
-constexpr NumberFormat kTransmitPower = "%4.2lf dBm";
+constexpr ShownReal kTransmitPower("%4.2f", dBm);
 
 }  // namespace
 
@@ -50,7 +49,9 @@ void UMTSRRInfo::updateWithData(ByteView data, LogCode logCode) {
     switch (logCode) {
         case 0x4125: show(data, kState); break;
         case 0x4031: showTransmitPower(data); break;
-        case 0x4127: show(data, kCell); break;
+        case 0x4127:
+            if (show(data, kCell)) hide("UARFCN");  // the cell array's key: these frequencies replace it
+            break;
         case 0x4157: show(data, kCiphering); break;
         case 0xff0001: showServingCell(values(), data, kPLCellMonitorRadioAccessTechnologyUMTS, kServingCell); break;
         default: reportUnknown(logCode);

@@ -11,18 +11,18 @@ namespace {
 // clang-format off
 constexpr auto kCell = entry(10, {  // 0x4005
     { 2, u16, "Scrambling Code",    decimal                    },
-    { 4, i8,  "RSCP",               whole(1, -21, "%d dB")     },
-    { 7, i8,  "Energy Per Chip",    linear(0.5, 0.0, "%f dB")  },
+    { 4, i8,  "RSCP",               whole(1, -21, dB)          },
+    { 7, i8,  "Energy Per Chip",    linear(0.5, 0.0, "%f", dB) },
     { 0, i16, "Downlink Frequency", decimal                    },
     { 8, i16, "Ranking Value",      decimal                    },
-    { 5, i16, "Rank Cell RSCP",     whole(1, 0, "%d dB")       },
+    { 5, i16, "Rank Cell RSCP",     whole(1, 0, dB)            },
 });
 
 constexpr CellField kNeighbor[] = {  // RSCP in dBm, unlike 0x4005; 32767 is no value
-    { kPLCellMonitorUARFCN, "UARFCN",          "UMTSSet: Failed to retrieve UARFCN\n"                                                      },
-    { kPLCellMonitorSCN,    "Scrambling Code", "UMTSSet: Failed to retrieve Scrambling Code\n"                                             },
-    { kPLCellMonitorRSCP,   "RSCP",            "UMTSSet: Failed to retrieve RSCP\n",            whole(1, 0, "%d dBm").unless(32767, "") },
-    { kPLCellMonitorECN0,   "Energy Per Chip", "UMTSSet: Failed to retrieve Energy Per Chip\n", whole(1, 0, "%d dB").unless(32767, "")  },
+    { kPLCellMonitorUARFCN, "UARFCN",          "UMTSSet: Failed to retrieve UARFCN\n"                                              },
+    { kPLCellMonitorSCN,    "Scrambling Code", "UMTSSet: Failed to retrieve Scrambling Code\n"                                     },
+    { kPLCellMonitorRSCP,   "RSCP",            "UMTSSet: Failed to retrieve RSCP\n",            whole(1, 0, dBm).unless(32767, "") },
+    { kPLCellMonitorECN0,   "Energy Per Chip", "UMTSSet: Failed to retrieve Energy Per Chip\n", whole(1, 0, dB).unless(32767, "")  },
 };
 // clang-format on
 

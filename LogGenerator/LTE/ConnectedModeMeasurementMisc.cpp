@@ -11,8 +11,8 @@ constexpr auto kMeasurement = record(29, {
     { 17, u16, "E-ARFCN",                  decimal                             },
     { 19, u16, "Serving Physical Cell ID", decimal                             },
     { 21, u16, "Subframe Number",          decimal                             },
-    { 23, u16, "Serving Filtered RSRP",    linear(0.25,  -140.0, "%4.2f dBm")  },
-    { 25, u16, "Serving Filtered RSRQ",    linear(0.125,  -20.0, "%4.2f dB")   },
+    { 23, u16, "Serving Filtered RSRP",    linear(0.25,  -140.0, "%4.2f", dBm) },
+    { 25, u16, "Serving Filtered RSRQ",    linear(0.125,  -20.0, "%4.2f", dB)  },
 });
 // clang-format on
 

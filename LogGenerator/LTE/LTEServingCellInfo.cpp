@@ -23,7 +23,6 @@ constexpr auto kServingCell = record(38, {  // 0xB0C2
     {  14, u16, "Physical Cell ID",    decimal           },
     {  16, u16, "Download Frequency",  decimal           },
     {  18, u16, "Upload Frequency",    decimal           },
-    removed(    "UARFCN"                                 ),  // the cell array's key: these frequencies replace it
     {  20, u8,  "Download Bandwidth",  label(kBandwidth) },
     {  21, u8,  "Upload Bandwidth",    label(kBandwidth) },
     {  22, u32, "Cell Identity",       asSigned          },
@@ -49,7 +48,9 @@ constexpr CellField kCell[] = {
 void LTEServingCellInfo::updateWithData(ByteView data, LogCode logCode) {
     logLine(Level::Warning, "LTE Serving Cell Info");
     switch (logCode) {
-        case 0xB0C2: show(data, kServingCell); break;
+        case 0xB0C2:
+            if (show(data, kServingCell)) hide("UARFCN");  // the cell array's key: these frequencies replace it
+            break;
         case 0xB0C1:
             if (show(data, kAntennas)) reportUnknown(logCode);  // intended: shown and still reported
             break;

@@ -8,9 +8,9 @@ namespace {
 
 // clang-format off
 constexpr auto kCell = entry(6, {
-    { 0, u16, "Physical Cell ID", decimal                            },
-    { 2, u16, "Filtered RSRP",    linear(0.25,  -140.0, "%4.2f dBm") },
-    { 4, u16, "Filtered RSRQ",    linear(0.125,  -20.0, "%4.2f dB")  },
+    { 0, u16, "Physical Cell ID", decimal                             },
+    { 2, u16, "Filtered RSRP",    linear(0.25,  -140.0, "%4.2f", dBm) },
+    { 4, u16, "Filtered RSRQ",    linear(0.125,  -20.0, "%4.2f", dB)  },
 });
 // clang-format on
 

@@ -8,9 +8,9 @@ namespace {
 
 // clang-format off
 constexpr auto kMeasurement = record(21, {
-    { 13, u8,            "Version",   decimal                  },
-    { 17, u16,           "E-ARFCN",   decimal                  },
-    { 19, u8.bits(0, 5), "Qrxlevmin", whole(2, -140, "%d dBm") },
+    { 13, u8,            "Version",   decimal             },
+    { 17, u16,           "E-ARFCN",   decimal             },
+    { 19, u8.bits(0, 5), "Qrxlevmin", whole(2, -140, dBm) },
 });
 // clang-format on
 

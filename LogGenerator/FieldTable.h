@@ -5,6 +5,7 @@
 #include <cstdint>
 
 #include "LogGenerator/FieldChecks.h"
+#include "LogGenerator/LogCode.h"
 #include "LogGenerator/RecordView.h"
 #include "LogGenerator/Shown.h"
 #include "platform/values/Key.h"
@@ -26,23 +27,32 @@ struct Field {
     }
 };
 
-/// A layout: at least `size` bytes for a record, `size` bytes each for the entries of a list.
+/// A record of the kind `code`, at least `size` bytes long; offsets count from the log type byte.
 template <std::size_t N>
-struct Layout {
+struct RecordLayout {
+    LogCode code;
     std::size_t size;
     std::array<Field, N> fields;
 };
 
-/// A record of at least `minimum` bytes; offsets count from the log type byte.
+/// An entry of `size` bytes in a record's list; offsets count from the entry.
 template <std::size_t N>
-consteval Layout<N> record(std::size_t minimum, const Field (&fields)[N]) {
+struct EntryLayout {
+    std::size_t size;
+    std::array<Field, N> fields;
+
+    /// Entries that follow one another without gaps.
+    constexpr RecordEntries entries(std::size_t start, std::size_t count) const { return {start, size, count}; }
+};
+
+template <std::size_t N>
+consteval RecordLayout<N> record(const KnownCode& code, std::size_t minimum, const Field (&fields)[N]) {
     check::fields(minimum, fields);
-    return {minimum, std::to_array(fields)};
+    return {code, minimum, std::to_array(fields)};
 }
 
-/// An entry of `size` bytes in a list; offsets count from the entry.
 template <std::size_t N>
-consteval Layout<N> entry(std::size_t size, const Field (&fields)[N]) {
+consteval EntryLayout<N> entry(std::size_t size, const Field (&fields)[N]) {
     check::fields(size, fields);
     return {size, std::to_array(fields)};
 }

@@ -34,8 +34,8 @@ void showRows(const ArrayRef& list, ByteView data, const RecordEntries& entries,
 
 /// The same, for entries that follow one another without gaps from `start` on.
 template <std::size_t N>
-void showRows(const ArrayRef& list, ByteView data, std::size_t start, std::size_t count, const Layout<N>& layout) {
-    showRows(list, data, RecordEntries(start, layout.size, count), layout.fields);
+void showRows(const ArrayRef& list, ByteView data, std::size_t start, std::size_t count, const EntryLayout<N>& layout) {
+    showRows(list, data, layout.entries(start, count), layout.fields);
 }
 
 }  // namespace kelvo

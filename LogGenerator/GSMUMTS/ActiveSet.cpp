@@ -33,9 +33,9 @@ std::int64_t energyOf(RecordView record, std::size_t measurement) {
 
 void ActiveSet::updateWithData(ByteView data, LogCode logCode) {
     logLine(Level::Warning, "ActiveSet");
-    if (logCode != 0x417a) return reportUnknown(logCode);
+    if (logCode != code::kUMTSCellSets) return reportUnknown(logCode);
     if (data.size() < 16) return;
-    showActiveCells(data, static_cast<std::size_t>(RecordView(data).read(15, u8)));
+    showActiveCells(data, RecordView(data).count(15, u8));
 }
 
 void ActiveSet::showActiveCells(ByteView data, std::size_t count) const {

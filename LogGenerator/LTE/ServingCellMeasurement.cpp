@@ -7,7 +7,7 @@ namespace kelvo {
 namespace {
 
 // clang-format off
-constexpr auto kMeasurement = record(33, {
+constexpr auto kMeasurement = record(code::kLTEServingCellIdle, 33, {
     { 13, u8,               "Version",                                decimal                                      },
     { 17, u16,              "E-ARFCN",                                decimal                                      },
     { 19, u16.bits( 0,  8), "Physical Cell ID",                       decimal                                      },
@@ -33,8 +33,7 @@ constexpr auto kMeasurement = record(33, {
 
 void ServingCellMeasurement::updateWithData(ByteView data, LogCode logCode) {
     logLine(Level::Warning, "Serving Cell Measurements");
-    if (logCode != 0xB17F) return reportUnknown(logCode);
-    show(data, kMeasurement);
+    showOneOf(data, logCode, kMeasurement);
 }
 
 }  // namespace kelvo

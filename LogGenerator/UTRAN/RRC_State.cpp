@@ -35,7 +35,7 @@ std::string describe(const Dictionary& values) {
 
 void RRC_State::updateWithData(ByteView data, LogCode logCode) {
     logLine(Level::Warning, "RRC Info");
-    if (logCode != 0xD0E0) return;
+    if (logCode != code::kUTRANRRCState) return;
     if (data.size() < 15) {  // intended: said, and decoded all the same
         logLine(Level::Warning, "LogCode_0xD0E0 is length is %ld expected size %ld", data.size(), 15L);
     }

@@ -1,4 +1,4 @@
-#include "model/Snapshot.h"
+#include "platform/system/WriteFileInPlace.h"
 
 #include <gtest/gtest.h>
 #include <sys/stat.h>
@@ -14,9 +14,9 @@ namespace kelvo {
 namespace {
 
 struct WriteFileInPlace : testing::Test {
-    std::string failure(const std::string& path, std::string_view text, WriteOver over = WriteOver::OwnFile) const {
-        const auto failed = writeFileInPlace(path, bytesOf(text), over);
-        return failed ? failed->reason : "";
+    static std::string failure(const std::string& path, std::string_view text) {
+        const auto written = writeFileInPlace(path, bytesOf(text));
+        return written ? "" : written.error().reason;
     }
     static bool exists(const std::string& path) { return ::access(path.c_str(), F_OK) == 0; }
 
@@ -27,14 +27,11 @@ struct WriteFileInPlace : testing::Test {
 TEST_F(WriteFileInPlace, MakesAFileThatNobodyElseCanRead) {
     const mode_t mask = ::umask(0);
     EXPECT_EQ(failure(path, "secret"), "");
-    EXPECT_EQ(failure(directory.file("b.dlf"), "secret", WriteOver::Any), "");
     ::umask(mask);
-    for (const std::string& file : {path, directory.file("b.dlf")}) {
-        struct stat status {};
-        ASSERT_EQ(::stat(file.c_str(), &status), 0);
-        EXPECT_EQ(status.st_mode & 0777, 0600u);
-        EXPECT_EQ(test::contentsOf(file), "secret");
-    }
+    struct stat status {};
+    ASSERT_EQ(::stat(path.c_str(), &status), 0);
+    EXPECT_EQ(status.st_mode & 0777, 0600u);
+    EXPECT_EQ(test::contentsOf(path), "secret");
 }
 
 TEST_F(WriteFileInPlace, LeavesNoHalfFileOnAFullDisk) {
@@ -54,18 +51,11 @@ TEST_F(WriteFileInPlace, LeavesNoHalfFileInPlaceOfAnEarlierOne) {
     EXPECT_FALSE(exists(path));
 }
 
-TEST_F(WriteFileInPlace, KeepsADeviceThatIsFull) {
-    EXPECT_EQ(failure("/dev/full", "text", WriteOver::Any), "No space left on device");
-    EXPECT_TRUE(exists("/dev/full"));
-}
-
 TEST_F(WriteFileInPlace, FollowsNoLinkThatSomebodyLeftThere) {
     directory.write("victim", bytesOf("precious"));
     ASSERT_EQ(::symlink(directory.file("victim").c_str(), path.c_str()), 0);
     EXPECT_NE(failure(path, "snapshot"), "");
     EXPECT_EQ(test::contentsOf(directory.file("victim")), "precious");
-    EXPECT_EQ(failure(path, "snapshot", WriteOver::Any), "");  // on a command line a link is what the user asked for
-    EXPECT_EQ(test::contentsOf(directory.file("victim")), "snapshot");
 }
 
 TEST_F(WriteFileInPlace, WritesIntoNoPipeThatSomebodyLeftThere) {

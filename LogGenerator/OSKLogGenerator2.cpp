@@ -7,6 +7,7 @@
 #include "LogGenerator/Framing.h"
 #include "LogGenerator/UnknownDataException.h"
 #include "platform/system/Environment.h"
+#include "platform/telephony/LogChannelProtocol.h"
 
 namespace kelvo {
 
@@ -191,7 +192,8 @@ DictionaryRef OSKLogGenerator2::getStartCommand() {
             ordinary->append(code);
         }
     }
-    return Dictionary::make({{"SetState", "Streaming"}, {"SetOskraLogCodes", ordinary}, {"SetPlExtraCodes", extended}});
+    return Dictionary::make(
+        {{kPLSetState, kPLStateStreaming}, {kPLSetOskraLogCodes, ordinary}, {kPLSetPlExtraCodes, extended}});
 }
 
 }  // namespace kelvo

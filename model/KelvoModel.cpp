@@ -2,6 +2,7 @@
 
 #include "platform/encodings/PropertyList.h"
 #include "platform/system/Environment.h"
+#include "platform/telephony/LogChannelProtocol.h"
 #include "platform/telephony/TelephonyProtocol.h"
 
 namespace kelvo {
@@ -11,12 +12,13 @@ using State = Connection::State;
 
 namespace {
 
-constexpr std::int32_t kMessageId = 0;  // of every message on the log channel, in both directions
 constexpr auto kSendLimit = 1s;
 constexpr auto kReplyLimit = 1s;
 constexpr std::size_t kRawLogLimit = std::size_t{4} * 1024 * 1024;  // many times what a modem says in two seconds
 
-Result<Bytes> technologyQuery() { return writeXmlPropertyList(Dictionary::make({{"GetTechnology", "GetTechnology"}})); }
+Result<Bytes> technologyQuery() {
+    return writeXmlPropertyList(Dictionary::make({{kPLGetTechnology, kPLGetTechnology}}));
+}
 
 const void* addressOf(const auto& owner) { return static_cast<const void*>(owner.get()); }
 
@@ -95,7 +97,7 @@ void KelvoModel::configureGenerator() {
         logLine(Level::Error, " Could not generate GetTechnology command; cannot configure");
         return;
     }
-    const auto reply = _sendPort->request(kMessageId, *query, kSendLimit, kReplyLimit);
+    const auto reply = _sendPort->request(kPLLogChannelMessageId, *query, kSendLimit, kReplyLimit);
     if (!reply) {
         failed(State::NoAnswer, " ***** Could not send the GetTechnology command (got error=%d)",
                static_cast<int>(reply.error()));
@@ -115,7 +117,7 @@ void KelvoModel::configureGenerator() {
 
 void KelvoModel::chooseGenerator(const Value& answer) {
     _obstacle = State::UnknownTechnology;
-    const Value* technology = answer.dictionary() ? answer.dictionary()->find("GetTechnology") : nullptr;
+    const Value* technology = answer.dictionary() ? answer.dictionary()->find(kPLGetTechnology) : nullptr;
     if (technology == nullptr) {
         logLine(Level::Error, " ***** Reply to GetTechnology had no answer; cannot configure");
         return;
@@ -164,7 +166,7 @@ bool KelvoModel::startStreaming() {
         logLine(Level::Error, " Could not generate PLIST");
         return false;
     }
-    const auto sent = _sendPort->request(kMessageId, *command, kSendLimit, std::nullopt);
+    const auto sent = _sendPort->request(kPLLogChannelMessageId, *command, kSendLimit, std::nullopt);
     if (sent) return true;
     return failed(State::NoAnswer, " ***** Could not send the START command (got error=%d)",
                   static_cast<int>(sent.error()));
@@ -233,7 +235,7 @@ ArrayRef KelvoModel::getSaveContents() {
 }
 
 void KelvoModel::didReceive(std::int32_t id, ByteView data) {
-    if (id == kMessageId) updateWithData(data);
+    if (id == kPLLogChannelMessageId) updateWithData(data);
 }
 
 void KelvoModel::didInvalidate(const LocalPort& port) {

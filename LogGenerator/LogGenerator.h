@@ -1,8 +1,6 @@
 #pragma once
 
 #include <cstddef>
-#include <memory>
-#include <string_view>
 
 #include "platform/values/Bytes.h"
 #include "platform/values/Value.h"
@@ -34,9 +32,6 @@ public:
     virtual void limitRawLog(std::size_t /*bytes*/) {}
     /// The contents of a snapshot file.
     virtual ArrayRef getSaveContentsFromState(Dictionary& state) = 0;
-
-    /// The generator of a technology, by one of the kPLLogChannelTechnology_ identifiers; none for any other text.
-    static std::unique_ptr<LogGenerator> generatorFromTechnology(std::string_view technology);
 
     /// Appends a snapshot of the state to its "History" and drops the oldest beyond five.
     static void updateHistoryInState(Dictionary& state);

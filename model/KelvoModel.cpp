@@ -1,5 +1,6 @@
 #include "model/KelvoModel.h"
 
+#include "LogGenerator/Factory.h"
 #include "platform/encodings/PropertyList.h"
 #include "platform/system/Environment.h"
 #include "platform/telephony/LogChannelProtocol.h"
@@ -127,7 +128,7 @@ void KelvoModel::chooseGenerator(const Value& answer) {
         _replacedGenerators.push_back(std::move(_logGenerator));
     }
     const std::string* identifier = technology->string();
-    _logGenerator = identifier != nullptr ? LogGenerator::generatorFromTechnology(*identifier) : nullptr;
+    _logGenerator = identifier != nullptr ? generatorFromTechnology(*identifier) : nullptr;
     if (_logGenerator) _logGenerator->limitRawLog(kRawLogLimit);
     logLine(Level::Error, "Got log generated: %p", addressOf(_logGenerator));
 }

@@ -9,8 +9,7 @@ namespace {
 constexpr std::size_t kHistoryLimit = 5;
 }
 
-LogGenerator::LogGenerator(Built built) {
-    if (built == Built::Half) return;
+void LogGenerator::logCreation() const {
     logLine(Level::Warning, "Creating Log object: %p", static_cast<const void*>(this));
 }
 

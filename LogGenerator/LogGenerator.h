@@ -15,7 +15,6 @@ namespace kelvo {
 /// rebuild; cell-monitor generator: the tree as received) and "History" (array of snapshots, oldest first, at most 5).
 class LogGenerator {
 public:
-    LogGenerator() : LogGenerator(Built::Wholly) {}
     virtual ~LogGenerator() = default;
     LogGenerator(const LogGenerator&) = delete;
     LogGenerator& operator=(const LogGenerator&) = delete;
@@ -37,9 +36,9 @@ public:
     static void updateHistoryInState(Dictionary& state);
 
 protected:
-    /// A half-built generator lacks what it needs to decode; it is made without a word on the log.
-    enum class Built { Wholly, Half };
-    explicit LogGenerator(Built built);
+    LogGenerator() = default;
+    /// Writes the line that tells of a new generator, whose constructor knows at which point it is due.
+    void logCreation() const;
 };
 
 }  // namespace kelvo

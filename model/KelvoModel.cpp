@@ -1,7 +1,6 @@
 #include "model/KelvoModel.h"
 
 #include "LogGenerator/Factory.h"
-#include "platform/encodings/PropertyList.h"
 #include "platform/system/Environment.h"
 #include "platform/telephony/LogChannelProtocol.h"
 #include "platform/telephony/TelephonyProtocol.h"
@@ -17,9 +16,7 @@ constexpr auto kSendLimit = 1s;
 constexpr auto kReplyLimit = 1s;
 constexpr std::size_t kRawLogLimit = std::size_t{4} * 1024 * 1024;  // many times what a modem says in two seconds
 
-Result<Bytes> technologyQuery() {
-    return writeXmlPropertyList(Dictionary::make({{kPLGetTechnology, kPLGetTechnology}}));
-}
+Value technologyQuery() { return Dictionary::make({{kPLGetTechnology, kPLGetTechnology}}); }
 
 const void* addressOf(const auto& owner) { return static_cast<const void*>(owner.get()); }
 
@@ -93,7 +90,7 @@ void KelvoModel::destroyPorts() {
 }
 
 void KelvoModel::configureGenerator() {
-    const Result<Bytes> query = technologyQuery();
+    const Result<Bytes> query = _services.encode(technologyQuery());
     if (!query) {
         logLine(Level::Error, " Could not generate GetTechnology command; cannot configure");
         return;
@@ -162,7 +159,7 @@ bool KelvoModel::startStreaming() {
         logLine(Level::Error, "No log generator technology works");
         return false;
     }
-    const Result<Bytes> command = writeXmlPropertyList(_logGenerator->getStartCommand());
+    const Result<Bytes> command = _services.encode(_logGenerator->getStartCommand());
     if (!command) {
         logLine(Level::Error, " Could not generate PLIST");
         return false;

@@ -8,6 +8,7 @@
 #include "LogGenerator/LogGenerator.h"
 #include "model/Connection.h"
 #include "model/KelvoModelNode.h"
+#include "platform/encodings/PropertyList.h"
 #include "platform/system/MainQueue.h"
 #include "platform/system/MessagePorts.h"
 #include "platform/telephony/Telephony.h"
@@ -35,6 +36,8 @@ public:
         /// Runs on the main queue when the connection has come or gone, and when what `connectionText` says of it is
         /// another than before: nobody has to ask again and again.
         std::function<void()> connectionChanged = {};
+        /// How messages are encoded.
+        std::function<Result<Bytes>(const Value&)> encode = writeXmlPropertyList;
     };
 
     explicit KelvoModel(Services services);

@@ -78,7 +78,8 @@ protected:
                                  .ports = ports,
                                  .telephony = telephony,
                                  .updateViewControllerFromModel = [this] { ++updates; },
-                                 .connectionChanged = [this] { told.push_back(connectionText(model->connection())); }});
+                                 .connectionChanged = [this] { told.push_back(connectionText(model->connection())); },
+                                 .encode = encode});
     }
 
     /// The program's standard output.
@@ -113,7 +114,8 @@ protected:
     Environment::Scope environment{
         {.log = &log, .clock = &clock, .resources = &resources, .standardOutput = output.file()}};
     int updates = 0;  // of the screens
-    Texts told;       // what was to be said of the connection each time it changed
+    std::function<Result<Bytes>(const Value&)> encode = writeXmlPropertyList;
+    Texts told;  // what was to be said of the connection each time it changed
     std::unique_ptr<KelvoModel> model = newModel();
 };
 

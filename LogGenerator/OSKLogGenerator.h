@@ -22,8 +22,6 @@ public:
     static std::optional<Bytes> generateDlfFromState(const Dictionary& state);
 
 protected:
-    using LogGenerator::LogGenerator;
-
     /// Collects a record, unless it no longer fits.
     void keepRaw(ByteView record);
     /// Moves the collected records into the state's "DisplayState" and begins anew.

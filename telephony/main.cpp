@@ -45,7 +45,7 @@ int serve(const ServiceOptions& options) {
     PacedSource source(std::move(stream).value(), options.speed, queue, steadyNow);
     const UnixSignals handler({SIGINT, SIGTERM, SIGHUP}, [](int) { QCoreApplication::quit(); });
     TelephonyService service(ports, source);
-    if (const auto failure = service.open()) return fail(*failure);
+    if (const auto opened = service.open(); !opened) return fail(opened.error());
     if (!options.record.empty()) {
         auto recording = CaptureWriter::create(options.record, source.technology());
         if (!recording) return fail(recording.error());

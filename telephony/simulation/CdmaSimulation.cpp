@@ -39,7 +39,7 @@ CdmaSimulation::CdmaSimulation(Random random)
 
 void CdmaSimulation::step() {
     const PhoneUser::Activity activity = _user.at(now());
-    if (isDue(kMeasurement)) {
+    if (every(kMeasurement)) {
         _drive.moveTo(now());
         _oneX.measure(_drive);
         _evdo.measure(_drive, kMeasurement, _user.demand());
@@ -57,10 +57,10 @@ void CdmaSimulation::reportOneX() {
     const bool moved = isNews(_toldOneXPilots, members(status.referencePn, status.active));
     const bool changed = isNews(_toldOneX, status.state) || moved;
     // An idle phone measures when it wakes, which is a change.
-    if (changed || (traffic && isDue(500ms))) emit(oneXStatusRecord(now(), status));
-    if (isNews(_toldSystem, _oneX.system()) || isDue(30s)) emit(systemRecord(now(), _oneX.system()));
+    if (changed || (traffic && every(500ms))) emit(oneXStatusRecord(now(), status));
+    if (isNews(_toldSystem, _oneX.system()) || every(30s)) emit(systemRecord(now(), _oneX.system()));
     if (traffic) _oneX.receiveFrame();
-    if (traffic && isDue(100ms)) emit(trafficFrameRecord(now(), status.frameErased));  // the log has each fifth
+    if (traffic && every(100ms)) emit(trafficFrameRecord(now(), status.frameErased));  // the log has each fifth
 }
 
 void CdmaSimulation::reportEvdo() {
@@ -69,20 +69,20 @@ void CdmaSimulation::reportEvdo() {
     const bool moved = isNews(_toldEvdoPilots, members(status.servingPn, status.active));
     const bool negotiated = isNews(_toldSession, status.session);
     const bool changed = isNews(_toldEvdo, status.state) || moved || negotiated;
-    if (changed || isDue(connected ? 1s : 2s, 200ms)) emit(evdoStatusRecord(now(), status));
+    if (changed || every(connected ? 1s : 2s, 200ms)) emit(evdoStatusRecord(now(), status));
     const bool on = status.state != EvdoState::Inactive;
-    if (changed || (on && isDue(connected ? 500ms : 2s, 400ms))) emit(evdoPilotsRecord(now(), status.active));
-    if (changed || (on && isDue(connected ? 500ms : 2s, 300ms))) emit(fingersRecord(now(), status.fingers));
+    if (changed || (on && every(connected ? 500ms : 2s, 400ms))) emit(evdoPilotsRecord(now(), status.active));
+    if (changed || (on && every(connected ? 500ms : 2s, 300ms))) emit(fingersRecord(now(), status.fingers));
 }
 
 /// The first two records make the first rate; after that a link at rest is told of seldom.
 void CdmaSimulation::reportPackets() {
     const PacketCounters& counters = _evdo.counters();
     const bool first = now() == 500ms || now() == 1500ms;
-    const bool forward = isDue(2s, 500ms) && isNews(_toldForward, counters.forwardBits);
-    if (first || forward || isDue(10s, 500ms)) emit(forwardPacketsRecord(now(), counters));
-    const bool reverse = isDue(5s, 500ms) && isNews(_toldReverse, counters.reverseBits);
-    if (first || reverse || isDue(30s, 500ms)) emit(reversePacketsRecord(now(), counters));
+    const bool forward = every(2s, 500ms) && isNews(_toldForward, counters.forwardBits);
+    if (first || forward || every(10s, 500ms)) emit(forwardPacketsRecord(now(), counters));
+    const bool reverse = every(5s, 500ms) && isNews(_toldReverse, counters.reverseBits);
+    if (first || reverse || every(30s, 500ms)) emit(reversePacketsRecord(now(), counters));
 }
 
 }  // namespace kelvo::simulation

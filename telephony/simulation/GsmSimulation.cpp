@@ -29,7 +29,7 @@ Journey GsmSimulation::drawJourney(Random& random) {
 }
 
 void GsmSimulation::step() {
-    const bool isMeasurement = now() % kMeasurement == Time(0);
+    const bool isMeasurement = every(kMeasurement);
     if (isMeasurement) _air.measure(now());
     _phone.step(now(), isMeasurement);
     countSessions();
@@ -54,95 +54,95 @@ void GsmSimulation::countSessions() {
 
 void GsmSimulation::reportSim() {
     const auto& registered = _phone.registration().registered();
-    if (_sim.isDue(registered, now(), 60s)) {
+    if (_sim.isDue(now(), registered, 60s)) {
         const SimFiles files = registered ? testNetworkSim(registered->lac, registered->rac) : testNetworkSim();
-        emit(simFilesRecord(files, now()));
+        emit(simFilesRecord(now(), files));
     }
-    if (_contexts.isDue({_phone.use(), registered.has_value()}, now(), 60s)) {
-        emit(pdpContextsRecord(pdpContexts(world(), _dataSessions), now()));
+    if (_contexts.isDue(now(), {_phone.use(), registered.has_value()}, 60s)) {
+        emit(pdpContextsRecord(now(), pdpContexts(world(), _dataSessions)));
     }
 }
 
 /// When a move begins, too, so that where it goes has been told.
 void GsmSimulation::reportCells() {
-    if (_cells.isDue({cell(), _phone.isMoving()}, now(), 15s))
-        emit(cellInformationRecord(monitoredCells(world()), now()));
+    if (_cells.isDue(now(), {cell(), _phone.isMoving()}, 15s))
+        emit(cellInformationRecord(now(), monitoredCells(world())));
 }
 
 void GsmSimulation::reportMobility() {
-    if (_rrStatus.isDue(rrStatus(world()), now(), 480ms)) emit(rrStatusRecord(rrStatus(world()), now()));
+    if (_rrStatus.isDue(now(), rrStatus(world()), 480ms)) emit(rrStatusRecord(now(), rrStatus(world())));
     const Mobility& mobility = _phone.registration().mobility();
-    if (_mobility.isDue(mobility, now(), 1s)) {
-        emit(circuitStateRecord(mobility, now()));
-        emit(packetStateRecord(mobility, now()));
-        emit(registrationRecord(mobility, now()));
+    if (_mobility.isDue(now(), mobility, 1s)) {
+        emit(circuitStateRecord(now(), mobility));
+        emit(packetStateRecord(now(), mobility));
+        emit(registrationRecord(now(), mobility));
     }
     if (!_phone.isCamped()) return;
     const ServingNetwork network = servingNetwork(world());
-    if (_servingNetwork.isDue(network, now(), 4s)) emit(servingNetworkRecord(network, now()));
+    if (_servingNetwork.isDue(now(), network, 4s)) emit(servingNetworkRecord(now(), network));
     const auto plmns = equivalentPlmns(world());
-    if (_equivalents.isDue(plmns, now(), 20s)) emit(equivalentPlmnsRecord(plmns, now()));
+    if (_equivalents.isDue(now(), plmns, 20s)) emit(equivalentPlmnsRecord(now(), plmns));
 }
 
 /// Out of a connection, in turns of three: what is ranked of GSM, what of UMTS.
 void GsmSimulation::reportRanking() {
-    if (_phone.link() == Link::Open || !isDue(960ms, 240ms)) return;
+    if (_phone.link() == Link::Open || !every(960ms, 240ms)) return;
     const auto umts = rankedUmtsCells(world());
     const auto gsm = rankedGsmCells(world());
     const bool isGsmsTurn = umts.empty() || (!gsm.empty() && _rankings / 3 % 2 == 0);
     ++_rankings;
-    emit(isGsmsTurn ? gsmRankingRecord(gsm, now()) : umtsRankingRecord(umts, now()));
+    emit(isGsmsTurn ? gsmRankingRecord(now(), gsm) : umtsRankingRecord(now(), umts));
 }
 
 void GsmSimulation::reportGsm() {
     const GsmCell& serving = _network.gsm[_phone.serving()];
-    if (_servingGsm.isDue(cell(), now(), 4s)) emit(servingCellRecord(serving, now()));
-    if (_gprs.isDue(cell(), now(), 20s)) reportGprs(serving.gprs);
+    if (_servingGsm.isDue(now(), cell(), 4s)) emit(servingCellRecord(now(), serving));
+    if (_gprs.isDue(now(), cell(), 20s)) reportGprs(serving.gprs);
     const bool isDedicated = _phone.isDedicated(Rat::GSM);
-    if (isDue(isDedicated ? kSlowMeasurement / 2 : kSlowMeasurement, 320ms)) {
+    if (every(isDedicated ? kSlowMeasurement / 2 : kSlowMeasurement, 320ms)) {
         const GsmMeasurement measurement = gsmMeasurement(world());
-        if (_decoded.isDue(cell(), now(), 4s)) emit(decodedCellsRecord(measurement.neighbors, now()));
-        emit(measurementRecord(measurement, now()));
+        if (_decoded.isDue(now(), cell(), 4s)) emit(decodedCellsRecord(now(), measurement.neighbors));
+        emit(measurementRecord(now(), measurement));
     }
-    if (_allocation.isDue({cell(), isDedicated}, now(), 20s) && isDedicated)
-        emit(mobileAllocationRecord(serving, now()));
-    if (isDedicated && isDue(960ms, 480ms)) reportGsmChannel(serving);
+    if (_allocation.isDue(now(), {cell(), isDedicated}, 20s) && isDedicated)
+        emit(mobileAllocationRecord(now(), serving));
+    if (isDedicated && every(960ms, 480ms)) reportGsmChannel(serving);
 }
 
 void GsmSimulation::reportGprs(const GprsOptions& options) {
-    emit(si13PositionRecord(options, now()));
-    emit(si13Record(options, now()));
-    emit(cellOptionsRecord(options, now()));
-    emit(pbcchRecord(options, now()));
-    emit(packetStatusRecord(options, now()));
+    emit(si13PositionRecord(now(), options));
+    emit(si13Record(now(), options));
+    emit(cellOptionsRecord(now(), options));
+    emit(pbcchRecord(now(), options));
+    emit(packetStatusRecord(now(), options));
 }
 
 void GsmSimulation::reportGsmChannel(const GsmCell& cell) {
     const int hop = _random.between(0, static_cast<int>(cell.mobileAllocation.size()) - 1);
     _drawn.dedicatedArfcn = cell.mobileAllocation[static_cast<std::size_t>(hop)];
     _drawn.isDtxUsed = _phone.isSilent();
-    emit(dedicatedCarrierRecord(_drawn.dedicatedArfcn, now()));
-    emit(channelModeRecord(_drawn.isDtxUsed, now()));
+    emit(dedicatedCarrierRecord(now(), _drawn.dedicatedArfcn));
+    emit(channelModeRecord(now(), _drawn.isDtxUsed));
 }
 
 void GsmSimulation::reportUmts() {
-    if (_servingUmts.isDue(cell(), now(), 8s)) emit(rrcCellRecord(_network.umts[_phone.serving()], now()));
-    if (_rrcState.isDue(_phone.rrcState(), now(), 480ms)) emit(rrcStateRecord(_phone.rrcState(), now()));
+    if (_servingUmts.isDue(now(), cell(), 8s)) emit(rrcCellRecord(now(), _network.umts[_phone.serving()]));
+    if (_rrcState.isDue(now(), _phone.rrcState(), 480ms)) emit(rrcStateRecord(now(), _phone.rrcState()));
     const bool isCiphered = _phone.link() != Link::None && _phone.link() != Link::Opening;
-    if (_ciphering.isDue(isCiphered, now(), 8s)) emit(cipheringRecord(isCiphered, now()));
+    if (_ciphering.isDue(now(), isCiphered, 8s)) emit(cipheringRecord(now(), isCiphered));
     const bool isOpen = _phone.link() == Link::Open;
     const auto active = isOpen ? _phone.activeSet().members() : std::vector{_phone.serving()};
-    if (_activeCells.isDue(active, now(), isOpen ? 960ms : 1920ms)) {
-        emit(searcherRecord(_air.umtsRssi(), searchedCells(world()), now()));
+    if (_activeCells.isDue(now(), active, isOpen ? 960ms : 1920ms)) {
+        emit(searcherRecord(now(), _air.umtsRssi(), searchedCells(world())));
     }
     reportUmtsChannel();
 }
 
 void GsmSimulation::reportUmtsChannel() {
     if (!_phone.isDedicated(Rat::UMTS)) return;
-    if (isDue(480ms, 160ms)) {
+    if (every(480ms, 160ms)) {
         _drawn.transmitPower = drawTransmitPower(world(), _random);
-        emit(transmitPowerRecord(_drawn.transmitPower, now()));
+        emit(transmitPowerRecord(now(), _drawn.transmitPower));
     }
     if (!_blocks) _blocks = Window{now(), now() + kFirstBlocks};
     if (now() >= _blocks->end) reportBlocks(now() - _blocks->begin);
@@ -151,10 +151,10 @@ void GsmSimulation::reportUmtsChannel() {
 void GsmSimulation::reportBlocks(Time window) {
     _blocks = Window{now(), now() + kBlocks};
     _drawn.blockErrors = drawBlockErrors(world(), window, _random);
-    emit(blockErrorsRecord(_drawn.blockErrors, now()));
+    emit(blockErrorsRecord(now(), _drawn.blockErrors));
     if (_phone.use() != Use::Data) return;
     _drawn.hsdpa = drawHsdpaReport(world(), window, _random);
-    emit(hsdpaRecord(_drawn.hsdpa, now()));
+    emit(hsdpaRecord(now(), _drawn.hsdpa));
 }
 
 }  // namespace kelvo::simulation

@@ -3,6 +3,7 @@
 #include <optional>
 
 #include "telephony/simulation/GSMUMTS/Reports.h"
+#include "telephony/simulation/Reported.h"
 #include "telephony/simulation/Simulation.h"
 
 namespace kelvo::simulation {
@@ -34,21 +35,6 @@ public:
 private:
     static Journey drawJourney(Random& random);
 
-    /// What was last reported: a record is due when its content changes and when it has stood for a while.
-    template <class Content>
-    class Reported {
-    public:
-        bool isDue(const Content& content, Time now, Time period) {
-            if (_last && *_last == content && now - _at < period) return false;
-            _last = content;
-            _at = now;
-            return true;
-        }
-
-    private:
-        std::optional<Content> _last;
-        Time _at{0};
-    };
     struct Window {
         Time begin;
         Time end;

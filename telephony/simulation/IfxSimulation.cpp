@@ -26,11 +26,11 @@ IfxSimulation::IfxSimulation(Random random)
       _modem(_network, random.split()) {}
 
 void IfxSimulation::step() {
-    if (!isDue(kMeasurement)) return;
+    if (!every(kMeasurement)) return;
     const PhoneUser::Activity activity = _user.at(now());
     _drive.moveTo(now());
     _modem.measure(_drive, now(), activity, _user.demand());
-    if (!isNews() && !isDue(kReport, kFirstReport)) return;
+    if (!isNews() && !every(kReport, kFirstReport)) return;
     if (const auto tree = writeXmlPropertyList(ifx::monitorTree(_modem.status(), _network))) emit(*tree);
 }
 

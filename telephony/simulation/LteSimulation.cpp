@@ -28,7 +28,7 @@ void LteSimulation::step() {
 
 void LteSimulation::reportServingCell() {
     if (_modem.hasChangedCell()) emit(lteAntennasRecord(now(), _modem.serving()));
-    if (_modem.hasChangedCell() || isDue(kServingCellPeriod)) emit(lteServingCellRecord(now(), _modem.serving()));
+    if (_modem.hasChangedCell() || every(kServingCellPeriod)) emit(lteServingCellRecord(now(), _modem.serving()));
 }
 
 void LteSimulation::reportMeasurements() {
@@ -40,10 +40,10 @@ void LteSimulation::reportMeasurements() {
 }
 
 void LteSimulation::reportExtended() {
-    if (_modem.hasChangedCell() || isDue(kCellsPeriod, 1s)) emit(cellInformationRecord(monitoredCells(), now()));
-    if (_modem.hasChangedContexts() || isDue(kContextsPeriod)) emit(pdpContextsRecord(contexts(), now()));
-    if (_modem.hasRegistered() || isDue(kSimPeriod)) {
-        emit(simFilesRecord(testNetworkSim(_modem.registeredArea(), 1), now()));
+    if (_modem.hasChangedCell() || every(kCellsPeriod, 1s)) emit(cellInformationRecord(now(), monitoredCells()));
+    if (_modem.hasChangedContexts() || every(kContextsPeriod)) emit(pdpContextsRecord(now(), contexts()));
+    if (_modem.hasRegistered() || every(kSimPeriod)) {
+        emit(simFilesRecord(now(), testNetworkSim(_modem.registeredArea(), 1)));
     }
 }
 

@@ -23,7 +23,7 @@ constexpr int kRoutingArea = 1;
 
 void UtranSimulation::step() {
     _modem.moveTo(now());
-    if (_modem.hasChangedMode() || isDue(kModePeriod)) emit(utranModeRecord(now(), _modem.mode()));
+    if (_modem.hasChangedMode() || every(kModePeriod)) emit(utranModeRecord(now(), _modem.mode()));
     reportServingCell();
     reportMeasurements();
     reportExtended();
@@ -31,7 +31,7 @@ void UtranSimulation::step() {
 
 void UtranSimulation::reportServingCell() {
     const bool hasChanged = _modem.hasChangedCell() || _modem.hasRegistered();
-    if (hasChanged || isDue(kServingCellPeriod)) emit(utranServingCellRecord(now(), _modem));
+    if (hasChanged || every(kServingCellPeriod)) emit(utranServingCellRecord(now(), _modem));
 }
 
 // Without a dedicated connection there are no channels to tell of, which is told once.
@@ -46,10 +46,10 @@ void UtranSimulation::reportMeasurements() {
 }
 
 void UtranSimulation::reportExtended() {
-    if (_modem.hasChangedCell() || isDue(kCellsPeriod)) emit(cellInformationRecord(monitoredCells(), now()));
-    if (_modem.hasChangedContexts() || isDue(kContextsPeriod)) emit(pdpContextsRecord(contexts(), now()));
-    if (_modem.hasRegistered() || isDue(kSimPeriod)) {
-        emit(simFilesRecord(testNetworkSim(_modem.registeredArea(), kRoutingArea), now()));
+    if (_modem.hasChangedCell() || every(kCellsPeriod)) emit(cellInformationRecord(now(), monitoredCells()));
+    if (_modem.hasChangedContexts() || every(kContextsPeriod)) emit(pdpContextsRecord(now(), contexts()));
+    if (_modem.hasRegistered() || every(kSimPeriod)) {
+        emit(simFilesRecord(now(), testNetworkSim(_modem.registeredArea(), kRoutingArea)));
     }
 }
 

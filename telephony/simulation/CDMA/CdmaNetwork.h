@@ -4,6 +4,7 @@
 #include <vector>
 
 #include "telephony/simulation/CDMA/CdmaWorld.h"
+#include "telephony/simulation/Drive.h"
 #include "telephony/simulation/Town.h"
 
 namespace kelvo::simulation {

@@ -23,7 +23,7 @@ std::uint64_t wholeSeconds(Time time) {
 /// A record of sub-packets: how many at 14, the first at 17.
 class Subpackets {
 public:
-    Subpackets(std::uint32_t code, Time time) : _record(code, time, kFirst) { _record.u8(13, kVersion); }
+    Subpackets(Time time, std::uint32_t code) : _record(time, code, kFirst) { _record.u8(13, kVersion); }
 
     /// Appends a sub-packet of `size` bytes and returns where it begins: its number at 0, its size at 2.
     std::size_t add(std::uint8_t id, std::size_t size) {
@@ -93,7 +93,7 @@ void addActiveSet(Subpackets& packet, const OneXStatus& status) {
 }  // namespace
 
 Bytes oneXStatusRecord(Time time, const OneXStatus& status) {
-    Subpackets packet(0x119C, time);
+    Subpackets packet(time, 0x119C);
     addState(packet, status);
     addRadio(packet, status);
     addActiveSet(packet, status);
@@ -102,14 +102,14 @@ Bytes oneXStatusRecord(Time time, const OneXStatus& status) {
 }
 
 Bytes trafficFrameRecord(Time time, bool erased) {
-    Subpackets packet(0x119D, time);
+    Subpackets packet(time, 0x119D);
     const std::size_t at = packet.add(11, 28);
     packet.record().u8(at + 24, erased ? 1 : 0);
     return packet.record().finish();
 }
 
 Bytes systemRecord(Time time, const CdmaSystem& system) {
-    return RecordWriter(0x134F, time, 186)
+    return RecordWriter(time, 0x134F, 186)
         .u8(13, 2)  // version
         .i32(42, system.roamingIndicator)
         .i32(46, system.type)
@@ -122,7 +122,7 @@ Bytes systemRecord(Time time, const CdmaSystem& system) {
 }
 
 Bytes evdoStatusRecord(Time time, const EvdoStatus& status) {
-    return RecordWriter(0x1183, time, 50)
+    return RecordWriter(time, 0x1183, 50)
         .u16(13, kEvdoCarrier.bandClass << 11 | kEvdoCarrier.channel)
         .i8(15, dBm8(status.rx0))
         .i8(16, dBm8(status.rx1))
@@ -137,7 +137,7 @@ Bytes evdoStatusRecord(Time time, const EvdoStatus& status) {
 }
 
 Bytes evdoPilotsRecord(Time time, const std::vector<PilotReading>& active) {
-    RecordWriter record(0x12B6, time, 25 + 12 * active.size());
+    RecordWriter record(time, 0x12B6, 25 + 12 * active.size());
     record.u8(13, kVersion).u8(15, active.size());
     for (std::size_t i = 0; i < active.size(); ++i) {
         record.i16(25 + 12 * i, active[i].pn).i16(27 + 12 * i, ratio512(active[i].strength));
@@ -146,7 +146,7 @@ Bytes evdoPilotsRecord(Time time, const std::vector<PilotReading>& active) {
 }
 
 Bytes fingersRecord(Time time, const std::vector<Finger>& fingers) {
-    RecordWriter record(0x108A, time, 23 + 14 * fingers.size());
+    RecordWriter record(time, 0x108A, 23 + 14 * fingers.size());
     record.u8(13, kVersion).u8(22, fingers.size());
     for (std::size_t i = 0; i < fingers.size(); ++i) {
         record.i16(23 + 14 * i, fingers[i].pn);
@@ -156,7 +156,7 @@ Bytes fingersRecord(Time time, const std::vector<Finger>& fingers) {
 }
 
 Bytes forwardPacketsRecord(Time time, const PacketCounters& counters) {
-    RecordWriter record(0x1192, time, 241);
+    RecordWriter record(time, 0x1192, 241);
     record.u32(13, wholeSeconds(time));
     std::size_t at = 17;  // by format: packets received, by size; then those lost
     const auto put = [&record, &at](std::uint32_t packets) {
@@ -173,7 +173,7 @@ Bytes forwardPacketsRecord(Time time, const PacketCounters& counters) {
 }
 
 Bytes reversePacketsRecord(Time time, const PacketCounters& counters) {
-    RecordWriter record(0x127E, time, 1750);
+    RecordWriter record(time, 0x127E, 1750);
     record.u8(13, kVersion).u32(14, wholeSeconds(time));
     std::size_t at = 18;  // by mode, interlace and size: packets by the sub-packets they took; then those lost
     for (const auto* mode : {&counters.highCapacity, &counters.lowLatency}) {

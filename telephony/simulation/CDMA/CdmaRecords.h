@@ -2,7 +2,7 @@
 
 #include "platform/values/Bytes.h"
 #include "telephony/simulation/CDMA/CdmaWorld.h"
-#include "telephony/simulation/Journey.h"
+#include "telephony/simulation/Time.h"
 
 /// The log records of a CDMA2000 modem: one function a record, from what the modem knows to bytes. Values are rounded
 /// to the record's resolution and cut to its range.

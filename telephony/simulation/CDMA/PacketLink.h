@@ -1,8 +1,8 @@
 #pragma once
 
 #include "telephony/simulation/CDMA/CdmaWorld.h"
-#include "telephony/simulation/Journey.h"
 #include "telephony/simulation/Random.h"
+#include "telephony/simulation/Time.h"
 
 namespace kelvo::simulation {
 

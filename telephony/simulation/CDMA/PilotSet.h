@@ -3,6 +3,7 @@
 #include <vector>
 
 #include "telephony/simulation/CDMA/CdmaNetwork.h"
+#include "telephony/simulation/HeldFor.h"
 
 namespace kelvo::simulation {
 

@@ -15,16 +15,16 @@ int rxLev(double dBm) { return std::clamp(static_cast<int>(std::floor(dBm)) + 11
 
 // clang-format off
 
-Bytes servingCellRecord(const GsmCell& cell, Time time) {
-    return RecordWriter(0x5134, time, 26)
+Bytes servingCellRecord(Time time, const GsmCell& cell) {
+    return RecordWriter(time, 0x5134, 26)
         .u16(13, static_cast<unsigned>(cell.arfcn))
         .u16(15, static_cast<unsigned>(cell.bsic))
         .u16(17, static_cast<unsigned>(cell.cellId))
         .finish();
 }
 
-Bytes measurementRecord(const GsmMeasurement& measurement, Time time) {
-    RecordWriter record(0x5137, time, 29 + 14 * measurement.neighbors.size());
+Bytes measurementRecord(Time time, const GsmMeasurement& measurement) {
+    RecordWriter record(time, 0x5137, 29 + 14 * measurement.neighbors.size());
     record
         .i8 (15, rxLev(measurement.level))
         .i32(16, std::lround(measurement.c1))
@@ -42,8 +42,8 @@ Bytes measurementRecord(const GsmMeasurement& measurement, Time time) {
     return record.finish();
 }
 
-Bytes decodedCellsRecord(std::span<const GsmNeighbor> neighbors, Time time) {
-    RecordWriter record(0x51ff, time, 15);
+Bytes decodedCellsRecord(Time time, std::span<const GsmNeighbor> neighbors) {
+    RecordWriter record(time, 0x51ff, 15);
     record.u8(14, neighbors.size());
     std::size_t at = 15;
     for (const GsmNeighbor& neighbor : neighbors) {
@@ -56,8 +56,8 @@ Bytes decodedCellsRecord(std::span<const GsmNeighbor> neighbors, Time time) {
     return record.finish();
 }
 
-Bytes rrStatusRecord(const RrStatus& status, Time time) {
-    return RecordWriter(0x512c, time, 17)
+Bytes rrStatusRecord(Time time, const RrStatus& status) {
+    return RecordWriter(time, 0x512c, 17)
         .i8(13, static_cast<int>(status.state))
         .i8(14, status.subState)
         .i8(15, status.status)
@@ -65,16 +65,16 @@ Bytes rrStatusRecord(const RrStatus& status, Time time) {
         .finish();
 }
 
-Bytes dedicatedCarrierRecord(int arfcn, Time time) {
-    return RecordWriter(0x5076, time, 17).i16(13, arfcn).finish();
+Bytes dedicatedCarrierRecord(Time time, int arfcn) {
+    return RecordWriter(time, 0x5076, 17).i16(13, arfcn).finish();
 }
 
-Bytes channelModeRecord(bool isDtxUsed, Time time) {
-    return RecordWriter(0x5072, time, 20).u8(19, isDtxUsed).finish();
+Bytes channelModeRecord(Time time, bool isDtxUsed) {
+    return RecordWriter(time, 0x5072, 20).u8(19, isDtxUsed).finish();
 }
 
-Bytes mobileAllocationRecord(const GsmCell& cell, Time time) {
-    RecordWriter record(0x51f8, time, 15);
+Bytes mobileAllocationRecord(Time time, const GsmCell& cell) {
+    RecordWriter record(time, 0x51f8, 15);
     record
         .i8(13, cell.hoppingSequence)
         .u8(14, cell.mobileAllocation.size());
@@ -86,32 +86,32 @@ Bytes mobileAllocationRecord(const GsmCell& cell, Time time) {
     return record.finish();
 }
 
-Bytes si13PositionRecord(const GprsOptions& options, Time time) {
-    return RecordWriter(0x51f4, time, 15).u8(14, options.isSi13OnExtendedBcch).finish();
+Bytes si13PositionRecord(Time time, const GprsOptions& options) {
+    return RecordWriter(time, 0x51f4, 15).u8(14, options.isSi13OnExtendedBcch).finish();
 }
 
-Bytes si13Record(const GprsOptions& options, Time time) {
-    return RecordWriter(0x51f5, time, 18)
+Bytes si13Record(Time time, const GprsOptions& options) {
+    return RecordWriter(time, 0x51f5, 18)
         .u8(13, options.hasPacketFlowContexts)
         .i8(14, options.priorityAccessThreshold)
         .i8(15, options.networkControlOrder)
         .finish();
 }
 
-Bytes cellOptionsRecord(const GprsOptions& options, Time time) {
-    return RecordWriter(0x51f6, time, 24)
+Bytes cellOptionsRecord(Time time, const GprsOptions& options) {
+    return RecordWriter(time, 0x51f6, 24)
         .i8(15, options.t3192)
         .i8(16, options.drxTimerMax)
         .u8(17, options.longAccessBursts)
         .finish();
 }
 
-Bytes pbcchRecord(const GprsOptions& options, Time time) {
-    return RecordWriter(0x51fb, time, 34).u8(13, options.hasPbcch).finish();
+Bytes pbcchRecord(Time time, const GprsOptions& options) {
+    return RecordWriter(time, 0x51fb, 34).u8(13, options.hasPbcch).finish();
 }
 
-Bytes packetStatusRecord(const GprsOptions& options, Time time) {
-    return RecordWriter(0x51fd, time, 35)
+Bytes packetStatusRecord(Time time, const GprsOptions& options) {
+    return RecordWriter(time, 0x51fd, 35)
         .u8(13, options.hasPbcch)  // the PSI status is asked for on a PBCCH
         .i8(14, options.psiCountLow)
         .i8(15, options.psiCountHigh)

@@ -32,18 +32,18 @@ struct RrStatus {
     bool operator==(const RrStatus&) const = default;
 };
 
-Bytes servingCellRecord(const GsmCell& cell, Time time);                      // 0x5134
-Bytes measurementRecord(const GsmMeasurement& measurement, Time time);        // 0x5137
-Bytes decodedCellsRecord(std::span<const GsmNeighbor> neighbors, Time time);  // 0x51ff
-Bytes rrStatusRecord(const RrStatus& status, Time time);                      // 0x512c
-Bytes dedicatedCarrierRecord(int arfcn, Time time);                           // 0x5076
-Bytes channelModeRecord(bool isDtxUsed, Time time);                           // 0x5072
-Bytes mobileAllocationRecord(const GsmCell& cell, Time time);                 // 0x51f8
+Bytes servingCellRecord(Time time, const GsmCell& cell);                      // 0x5134
+Bytes measurementRecord(Time time, const GsmMeasurement& measurement);        // 0x5137
+Bytes decodedCellsRecord(Time time, std::span<const GsmNeighbor> neighbors);  // 0x51ff
+Bytes rrStatusRecord(Time time, const RrStatus& status);                      // 0x512c
+Bytes dedicatedCarrierRecord(Time time, int arfcn);                           // 0x5076
+Bytes channelModeRecord(Time time, bool isDtxUsed);                           // 0x5072
+Bytes mobileAllocationRecord(Time time, const GsmCell& cell);                 // 0x51f8
 
-Bytes si13PositionRecord(const GprsOptions& options, Time time);  // 0x51f4
-Bytes si13Record(const GprsOptions& options, Time time);          // 0x51f5
-Bytes cellOptionsRecord(const GprsOptions& options, Time time);   // 0x51f6
-Bytes pbcchRecord(const GprsOptions& options, Time time);         // 0x51fb
-Bytes packetStatusRecord(const GprsOptions& options, Time time);  // 0x51fd
+Bytes si13PositionRecord(Time time, const GprsOptions& options);  // 0x51f4
+Bytes si13Record(Time time, const GprsOptions& options);          // 0x51f5
+Bytes cellOptionsRecord(Time time, const GprsOptions& options);   // 0x51f6
+Bytes pbcchRecord(Time time, const GprsOptions& options);         // 0x51fb
+Bytes packetStatusRecord(Time time, const GprsOptions& options);  // 0x51fd
 
 }  // namespace kelvo::simulation::gsm

@@ -13,34 +13,34 @@ constexpr int kAutomatic = 0;
 
 // clang-format off
 
-Bytes packetStateRecord(const Mobility& mobility, Time time) {
-    return RecordWriter(0x7130, time, 16)
+Bytes packetStateRecord(Time time, const Mobility& mobility) {
+    return RecordWriter(time, 0x7130, 16)
         .i8(13, static_cast<int>(mobility.gmm))
         .i8(14, static_cast<int>(mobility.gmmSub))
         .i8(15, mobility.isRoutingUpdated ? kUpdated : kNotUpdated)
         .finish();
 }
 
-Bytes circuitStateRecord(const Mobility& mobility, Time time) {
-    return RecordWriter(0x7131, time, 16)
+Bytes circuitStateRecord(Time time, const Mobility& mobility) {
+    return RecordWriter(time, 0x7131, 16)
         .i8(13, static_cast<int>(mobility.mm))
         .i8(14, static_cast<int>(mobility.mmSub))
         .i8(15, mobility.isLocationUpdated ? kUpdated : kNotUpdated)
         .finish();
 }
 
-Bytes registrationRecord(const Mobility& mobility, Time time) {
-    return RecordWriter(0x7132, time, 16)
+Bytes registrationRecord(Time time, const Mobility& mobility) {
+    return RecordWriter(time, 0x7132, 16)
         .i8(13, static_cast<int>(mobility.registration))
         .i8(14, kAutomatic)
         .finish();
 }
 
-Bytes servingNetworkRecord(const ServingNetwork& network, Time time) {
+Bytes servingNetworkRecord(Time time, const ServingNetwork& network) {
     constexpr int kFiller = 0xf;  // in the place of a third digit of the network code
     const int mcc[] = {kMcc / 100, kMcc / 10 % 10, kMcc % 10};
     const int mnc[] = {kMnc / 10, kMnc % 10, kFiller};
-    return RecordWriter(0x7135, time, 32)
+    return RecordWriter(time, 0x7135, 32)
         .i8(13, network.operationMode)
         .i8(14, static_cast<int>(network.service))
         .i8(15, mcc[1] << 4 | mcc[0])
@@ -52,8 +52,8 @@ Bytes servingNetworkRecord(const ServingNetwork& network, Time time) {
         .finish();
 }
 
-Bytes equivalentPlmnsRecord(std::span<const Plmn> plmns, Time time) {
-    RecordWriter record(0x7150, time, 17);
+Bytes equivalentPlmnsRecord(Time time, std::span<const Plmn> plmns) {
+    RecordWriter record(time, 0x7150, 17);
     record.u8(16, plmns.size());
     std::size_t at = 17;
     for (const Plmn& plmn : plmns) {

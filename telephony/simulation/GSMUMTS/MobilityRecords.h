@@ -21,11 +21,11 @@ struct Plmn {
     bool operator==(const Plmn&) const = default;
 };
 
-Bytes packetStateRecord(const Mobility& mobility, Time time);          // 0x7130
-Bytes circuitStateRecord(const Mobility& mobility, Time time);         // 0x7131
-Bytes registrationRecord(const Mobility& mobility, Time time);         // 0x7132
-Bytes servingNetworkRecord(const ServingNetwork& network, Time time);  // 0x7135
+Bytes packetStateRecord(Time time, const Mobility& mobility);          // 0x7130
+Bytes circuitStateRecord(Time time, const Mobility& mobility);         // 0x7131
+Bytes registrationRecord(Time time, const Mobility& mobility);         // 0x7132
+Bytes servingNetworkRecord(Time time, const ServingNetwork& network);  // 0x7135
 /// At most one: the entries of more would lie over one another. 0x7150
-Bytes equivalentPlmnsRecord(std::span<const Plmn> plmns, Time time);
+Bytes equivalentPlmnsRecord(Time time, std::span<const Plmn> plmns);
 
 }  // namespace kelvo::simulation::gsm

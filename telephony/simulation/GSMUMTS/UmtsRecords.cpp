@@ -25,10 +25,10 @@ long transmittedPower(double dBm) {
 
 // clang-format off
 
-Bytes searcherRecord(double rssi, std::span<const SearchedCell> cells, Time time) {
+Bytes searcherRecord(Time time, double rssi, std::span<const SearchedCell> cells) {
     constexpr double kSecondPath = -4;  // dB to the first
     constexpr double kThirdPath  = -8;
-    RecordWriter record(0x417a, time, 16 + (15 + 44) * cells.size());
+    RecordWriter record(time, 0x417a, 16 + (15 + 44) * cells.size());
     record
         .i16(13, receivedPower(rssi))
         .u8 (15, cells.size());
@@ -48,8 +48,8 @@ Bytes searcherRecord(double rssi, std::span<const SearchedCell> cells, Time time
 }
 
 // Both kinds of entries have their place at 15: a record holds the cells of one system only.
-Bytes umtsRankingRecord(std::span<const RankedUmtsCell> cells, Time time) {
-    RecordWriter record(0x4005, time, 15);
+Bytes umtsRankingRecord(Time time, std::span<const RankedUmtsCell> cells) {
+    RecordWriter record(time, 0x4005, 15);
     record
         .u8(13, cells.size())
         .u8(14, 0);
@@ -67,8 +67,8 @@ Bytes umtsRankingRecord(std::span<const RankedUmtsCell> cells, Time time) {
     return record.finish();
 }
 
-Bytes gsmRankingRecord(std::span<const RankedGsmCell> cells, Time time) {
-    RecordWriter record(0x4005, time, 15);
+Bytes gsmRankingRecord(Time time, std::span<const RankedGsmCell> cells) {
+    RecordWriter record(time, 0x4005, 15);
     record
         .u8(13, 0)
         .u8(14, cells.size());
@@ -84,12 +84,12 @@ Bytes gsmRankingRecord(std::span<const RankedGsmCell> cells, Time time) {
     return record.finish();
 }
 
-Bytes rrcStateRecord(RrcState state, Time time) {
-    return RecordWriter(0x4125, time, 14).i8(13, static_cast<int>(state)).finish();
+Bytes rrcStateRecord(Time time, RrcState state) {
+    return RecordWriter(time, 0x4125, 14).i8(13, static_cast<int>(state)).finish();
 }
 
-Bytes rrcCellRecord(const UmtsCell& cell, Time time) {
-    return RecordWriter(0x4127, time, 29)
+Bytes rrcCellRecord(Time time, const UmtsCell& cell) {
+    return RecordWriter(time, 0x4127, 29)
         .i32(13, kUplinkUarfcn)
         .i32(17, kDownlinkUarfcn)
         .i32(21, cell.cellId)
@@ -97,12 +97,12 @@ Bytes rrcCellRecord(const UmtsCell& cell, Time time) {
         .finish();
 }
 
-Bytes cipheringRecord(bool isCiphered, Time time) {
-    return RecordWriter(0x4157, time, 19).u8(13, isCiphered).finish();
+Bytes cipheringRecord(Time time, bool isCiphered) {
+    return RecordWriter(time, 0x4157, 19).u8(13, isCiphered).finish();
 }
 
-Bytes transmitPowerRecord(std::span<const std::optional<double>> slots, Time time) {
-    RecordWriter record(0x4031, time, 16 + 14 * slots.size());
+Bytes transmitPowerRecord(Time time, std::span<const std::optional<double>> slots) {
+    RecordWriter record(time, 0x4031, 16 + 14 * slots.size());
     record.u8(14, slots.size());
     std::size_t at = 16;
     for (const auto& dBm : slots) {
@@ -112,8 +112,8 @@ Bytes transmitPowerRecord(std::span<const std::optional<double>> slots, Time tim
     return record.finish();
 }
 
-Bytes blockErrorsRecord(const BlockErrors& errors, Time time) {
-    RecordWriter record(0x4116, time, 16);
+Bytes blockErrorsRecord(Time time, const BlockErrors& errors) {
+    RecordWriter record(time, 0x4116, 16);
     record
         .u8 (13, errors.channels.size())
         .i16(14, errors.windowSize);
@@ -143,11 +143,11 @@ void writeProcesses(RecordWriter& record, std::size_t at, std::span<const HarqPr
 
 }  // namespace
 
-Bytes hsdpaRecord(const HsdpaReport& report, Time time) {
+Bytes hsdpaRecord(Time time, const HsdpaReport& report) {
     constexpr int kVersion = 2;
     constexpr int kDualCarrier = 2;
     const std::size_t primaries = report.primary.size();
-    RecordWriter record(0x4221, time, 18);
+    RecordWriter record(time, 0x4221, 18);
     record
         .i8 (13, kVersion)
         .i16(14, report.subFrames | (report.hasTwoCarriers ? kDualCarrier << 10 : 0))

@@ -57,15 +57,15 @@ struct HsdpaReport {
     std::vector<HarqProcess> secondary = {};
 };
 
-Bytes searcherRecord(double rssi, std::span<const SearchedCell> cells, Time time);  // 0x417a; dBm
-Bytes umtsRankingRecord(std::span<const RankedUmtsCell> cells, Time time);          // 0x4005
-Bytes gsmRankingRecord(std::span<const RankedGsmCell> cells, Time time);            // 0x4005
-Bytes rrcStateRecord(RrcState state, Time time);                                    // 0x4125
-Bytes rrcCellRecord(const UmtsCell& cell, Time time);                               // 0x4127
-Bytes cipheringRecord(bool isCiphered, Time time);                                  // 0x4157
+Bytes searcherRecord(Time time, double rssi, std::span<const SearchedCell> cells);  // 0x417a; dBm
+Bytes umtsRankingRecord(Time time, std::span<const RankedUmtsCell> cells);          // 0x4005
+Bytes gsmRankingRecord(Time time, std::span<const RankedGsmCell> cells);            // 0x4005
+Bytes rrcStateRecord(Time time, RrcState state);                                    // 0x4125
+Bytes rrcCellRecord(Time time, const UmtsCell& cell);                               // 0x4127
+Bytes cipheringRecord(Time time, bool isCiphered);                                  // 0x4157
 /// dBm in each slot; none where nothing is sent. 0x4031
-Bytes transmitPowerRecord(std::span<const std::optional<double>> slots, Time time);
-Bytes blockErrorsRecord(const BlockErrors& errors, Time time);  // 0x4116
-Bytes hsdpaRecord(const HsdpaReport& report, Time time);        // 0x4221
+Bytes transmitPowerRecord(Time time, std::span<const std::optional<double>> slots);
+Bytes blockErrorsRecord(Time time, const BlockErrors& errors);  // 0x4116
+Bytes hsdpaRecord(Time time, const HsdpaReport& report);        // 0x4221
 
 }  // namespace kelvo::simulation::gsm

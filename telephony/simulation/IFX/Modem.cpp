@@ -48,12 +48,10 @@ std::vector<std::size_t> those(std::vector<std::size_t> cells, const std::functi
     return cells;
 }
 
-double lost(double signalToRest, double needed) { return 0.002 + 0.5 / (1 + std::exp(signalToRest - needed)); }
+double lost(double sinr, double needed) { return 0.002 + 0.5 / (1 + std::exp(sinr - needed)); }
 
 /// Blocks of data lost when first sent: those that the choice of a scheme puts up with, and what more the scheme loses.
-double lostAtFirst(double signalToRest, double needed) {
-    return kAimedErrors + (1 - kAimedErrors) * lost(signalToRest, needed);
-}
+double lostAtFirst(double sinr, double needed) { return kAimedErrors + (1 - kAimedErrors) * lost(sinr, needed); }
 
 }  // namespace
 
@@ -200,7 +198,7 @@ void Modem::connectOnGsm(double demand) {
     _status.codingScheme = static_cast<int>(std::max<std::ptrdiff_t>(scheme, 1));
     const double offered = kEgprsRates[static_cast<std::size_t>(_status.codingScheme - 1)];
     const bool call = _status.connection == Connection::Call;
-    _status.errors = call ? lost(ratio, 6) : lostAtFirst(ratio, neededRatio(kSlotKHz, offered) - kSchemeMargin);
+    _status.errors = call ? lost(ratio, 6) : lostAtFirst(ratio, neededSinr(kSlotKHz, offered) - kSchemeMargin);
     _status.throughput = call ? 0 : offered * kTimeSlots * demand * (1 - _status.errors);
 }
 

@@ -3,6 +3,7 @@
 #include <map>
 #include <vector>
 
+#include "telephony/simulation/HeldFor.h"
 #include "telephony/simulation/IFX/Air.h"
 #include "telephony/simulation/PhoneUser.h"
 

@@ -2,6 +2,7 @@
 
 #include <functional>
 
+#include "telephony/simulation/HeldFor.h"
 #include "telephony/simulation/LTE/LteReceiver.h"
 
 namespace kelvo::simulation {

@@ -3,6 +3,7 @@
 #include <optional>
 #include <vector>
 
+#include "telephony/simulation/Drive.h"
 #include "telephony/simulation/LTE/LteNetwork.h"
 
 namespace kelvo::simulation {

@@ -66,7 +66,7 @@ void writeCandidate(RecordWriter& record, std::size_t at, const LteCandidate& ca
 }  // namespace
 
 Bytes lteServingCellRecord(Time time, const LteCell& cell) {
-    return RecordWriter(0xB0C2, time, 38)
+    return RecordWriter(time, 0xB0C2, 38)
         .u16(14, cell.physicalId)
         .u16(16, cell.carrier.downlink)
         .u16(18, cell.carrier.uplink)
@@ -79,11 +79,11 @@ Bytes lteServingCellRecord(Time time, const LteCell& cell) {
 }
 
 Bytes lteAntennasRecord(Time time, const LteCell& cell) {
-    return RecordWriter(0xB0C1, time, 22).u8(20, cell.antennas).finish();
+    return RecordWriter(time, 0xB0C1, 22).u8(20, cell.antennas).finish();
 }
 
 Bytes lteConnectedMeasurementRecord(Time time, const LteModem& modem) {
-    RecordWriter record(0xB179, time, 29);
+    RecordWriter record(time, 0xB179, 29);
     record.u16(17, modem.serving().carrier.downlink).u16(19, modem.serving().physicalId).u16(21, modem.subframe());
     writeConnected(record, 23, modem.reading());
     record.u8(27, modem.neighbors().size()).u8(28, modem.detected().size());
@@ -99,7 +99,7 @@ Bytes lteConnectedMeasurementRecord(Time time, const LteModem& modem) {
 Bytes lteServingMeasurementRecord(Time time, const LteCell& cell, const LteReading& reading, const LteIdleState& idle) {
     const std::uint32_t maximumPower = cell.maximumPower ? steps(*cell.maximumPower, -30, 1, 6) : kAbsentPower;
     // clang-format off
-    return RecordWriter(0xB17F, time, 33)
+    return RecordWriter(time, 0xB17F, 33)
         .u8 (13, kVersion)
         .u16(17, cell.carrier.downlink)
         .u16(19, cell.physicalId                                     // bits  0-8
@@ -125,7 +125,7 @@ Bytes lteServingMeasurementRecord(Time time, const LteCell& cell, const LteReadi
 Bytes lteNeighborMeasurementRecord(Time time, const LteModem& modem) {
     const auto& cells = modem.neighbors();
     const std::size_t count = std::min(cells.size(), kMostNeighbors);
-    RecordWriter record(0xB180, time, 21);
+    RecordWriter record(time, 0xB180, 21);
     record.u8(13, kVersion)
         .u16(17, modem.neighborsCarrier().downlink)
         .u16(19, minimumLevel(modem.neighborsMinimumLevel()) | (count - 1) << 6);  // bits 0-5, bits 6-10
@@ -135,7 +135,7 @@ Bytes lteNeighborMeasurementRecord(Time time, const LteModem& modem) {
 
 Bytes lteCandidatesRecord(Time time, const LteModem& modem) {
     const auto& candidate = modem.candidate();
-    RecordWriter record(0xB186, time, 21);
+    RecordWriter record(time, 0xB186, 21);
     record.u8(13, kVersion)
         .u16(15, modem.serving().carrier.downlink)
         .u16(17, modem.serving().physicalId)

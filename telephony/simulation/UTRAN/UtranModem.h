@@ -4,6 +4,8 @@
 #include <optional>
 #include <vector>
 
+#include "telephony/simulation/Drive.h"
+#include "telephony/simulation/HeldFor.h"
 #include "telephony/simulation/UTRAN/UtranNetwork.h"
 
 namespace kelvo::simulation {

@@ -23,7 +23,7 @@ int utranBlerLevel(double share) {
 int utranSirLevel(double dB) { return floorStep(dB, -11, 0.5, 63); }
 
 Bytes utranModeRecord(Time time, UtranMode mode) {
-    return RecordWriter(0xD0E0, time, 15)
+    return RecordWriter(time, 0xD0E0, 15)
         .u8(13, 1)  // the mode is known
         .u8(14, static_cast<std::uint64_t>(mode))
         .finish();
@@ -31,7 +31,7 @@ Bytes utranModeRecord(Time time, UtranMode mode) {
 
 Bytes utranServingCellRecord(Time time, const UtranModem& modem) {
     const UtranCell& cell = modem.serving();
-    return RecordWriter(0xD0E2, time, 26)
+    return RecordWriter(time, 0xD0E2, 26)
         .u8(14, cell.barredClasses)
         .u8(15, cell.registrationArea)
         .u16(17, cell.uarfcn)  // uplink
@@ -42,7 +42,7 @@ Bytes utranServingCellRecord(Time time, const UtranModem& modem) {
 }
 
 Bytes utranCellsRecord(Time time, const UtranModem& modem) {
-    RecordWriter record(0xD00A, time, 168);
+    RecordWriter record(time, 0xD00A, 168);
     record.u8(16, modem.measurements().size() << 1);
     for (const UtranMeasurement& measured : modem.measurements()) {
         const UtranCell& cell = modem.cells()[measured.cell];
@@ -59,7 +59,7 @@ Bytes utranCellsRecord(Time time, const UtranModem& modem) {
 }
 
 Bytes utranGsmCellsRecord(Time time, const UtranModem& modem) {
-    RecordWriter record(0xD00E, time, 17);
+    RecordWriter record(time, 0xD00E, 17);
     record.u8(16, modem.gsmMeasurements().size());
     for (const UtranGsmMeasurement& measured : modem.gsmMeasurements()) {
         const UtranCell& cell = modem.cells()[measured.cell];
@@ -77,7 +77,7 @@ Bytes utranGsmCellsRecord(Time time, const UtranModem& modem) {
 Bytes utranChannelsRecord(Time time, const UtranModem& modem) {
     const auto& channels = modem.transportChannels();
     const auto& composites = modem.composites();
-    RecordWriter record(0xD00C, time, 17);
+    RecordWriter record(time, 0xD00C, 17);
     record.u16(14, channels.size() << 6 | composites.size() << 12);
     for (std::size_t i = 0; i < channels.size(); ++i) {
         record.u8(17 + 2 * i, channels[i].id).u8(18 + 2 * i, utranBlerLevel(channels[i].blockErrors));

@@ -90,10 +90,12 @@ UnixPort::UnixPort(std::filesystem::path path) : _path(std::move(path)) {
 std::optional<Failure> UnixPort::plugIn() {
     const QString path = QString::fromStdString(_path.string());
     std::error_code error;
-    if (std::filesystem::is_socket(_path, error)) {
+    if (std::filesystem::exists(std::filesystem::symlink_status(_path, error))) {  // which listen() would replace
         QLocalSocket someone;
-        someone.connectToServer(path);
-        if (someone.error() == QLocalSocket::ConnectionRefusedError) QLocalServer::removeServer(path);
+        if (std::filesystem::is_socket(_path, error)) someone.connectToServer(path);
+        if (someone.error() != QLocalSocket::ConnectionRefusedError)
+            return Failure{_path.string() + " is there and no socket that a modem has left"};
+        QLocalServer::removeServer(path);
     }
     if (!_server.listen(path))
         return Failure{

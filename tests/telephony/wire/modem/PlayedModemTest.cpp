@@ -143,9 +143,9 @@ TEST_F(PlayedModemTest, TellsHowManyRecordsWait) {
     setMask();
     now += 250ms + 299 * 100ms;
     const Bytes all = read();
-    EXPECT_EQ(Bytes(all.begin(), all.begin() + 24), recordFrame(records[0], 255));
-    EXPECT_EQ(Bytes(all.end() - 24, all.end()), recordFrame(records[0], 0));
-    EXPECT_EQ(Bytes(all.end() - 72, all.end() - 48), recordFrame(records[0], 2));
+    EXPECT_EQ(Bytes(all.begin(), all.begin() + 23), recordFrame(records[0], 255));
+    EXPECT_EQ(Bytes(all.end() - 23, all.end()), recordFrame(records[0], 0));
+    EXPECT_EQ(Bytes(all.end() - 69, all.end() - 46), recordFrame(records[0], 2));
 }
 
 TEST_F(PlayedModemTest, KeepsABoundedNumberOfRecordsForAReaderThatDoesNotRead) {
@@ -156,7 +156,7 @@ TEST_F(PlayedModemTest, KeepsABoundedNumberOfRecordsForAReaderThatDoesNotRead) {
     read();
     EXPECT_EQ(_modem->tally().whole[0] + _modem->tally().notSent, 5000U);
     EXPECT_GE(_modem->tally().whole[0], 4096U);
-    EXPECT_LE(_modem->tally().whole[0], 4096U + 4096 / 24 + 1);  // as many again as are on their way
+    EXPECT_LE(_modem->tally().whole[0], 4096U + 4096 / 23 + 1);  // as many again as are on their way
 }
 
 TEST_F(PlayedModemTest, ForgetsItsReaderWhenThePlugIsPulled) {

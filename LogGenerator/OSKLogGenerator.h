@@ -25,8 +25,6 @@ public:
                                                      std::size_t reportSize = kDLFVersionReportSize);
 
 protected:
-    using LogGenerator::LogGenerator;
-
     /// Collects a record, unless it no longer fits.
     void keepRaw(ByteView record);
     /// Moves the collected records into the state's "DisplayState" and begins anew.

@@ -1,6 +1,8 @@
 #include "model/KelvoModel.h"
 
+#include "LogGenerator/Factory.h"
 #include "platform/system/Environment.h"
+#include "platform/telephony/LogChannelProtocol.h"
 #include "platform/telephony/TelephonyProtocol.h"
 
 namespace kelvo {
@@ -10,12 +12,11 @@ using State = Connection::State;
 
 namespace {
 
-constexpr std::int32_t kMessageId = 0;  // of every message on the log channel, in both directions
 constexpr auto kSendLimit = 1s;
 constexpr auto kReplyLimit = 1s;
 constexpr std::size_t kRawLogLimit = std::size_t{4} * 1024 * 1024;  // many times what a modem says in two seconds
 
-Value technologyQuery() { return Dictionary::make({{"GetTechnology", "GetTechnology"}}); }
+Value technologyQuery() { return Dictionary::make({{kPLGetTechnology, kPLGetTechnology}}); }
 
 const void* addressOf(const auto& owner) { return static_cast<const void*>(owner.get()); }
 
@@ -94,7 +95,7 @@ void KelvoModel::configureGenerator() {
         logLine(Level::Error, " Could not generate GetTechnology command; cannot configure");
         return;
     }
-    const auto reply = _sendPort->request(kMessageId, *query, kSendLimit, kReplyLimit);
+    const auto reply = _sendPort->request(kPLLogChannelMessageId, *query, kSendLimit, kReplyLimit);
     if (!reply) {
         failed(State::NoAnswer, " ***** Could not send the GetTechnology command (got error=%d)",
                static_cast<int>(reply.error()));
@@ -114,7 +115,7 @@ void KelvoModel::configureGenerator() {
 
 void KelvoModel::chooseGenerator(const Value& answer) {
     _obstacle = State::UnknownTechnology;
-    const Value* technology = answer.dictionary() ? answer.dictionary()->find("GetTechnology") : nullptr;
+    const Value* technology = answer.dictionary() ? answer.dictionary()->find(kPLGetTechnology) : nullptr;
     if (technology == nullptr) {
         logLine(Level::Error, " ***** Reply to GetTechnology had no answer; cannot configure");
         return;
@@ -124,7 +125,7 @@ void KelvoModel::chooseGenerator(const Value& answer) {
         _replacedGenerators.push_back(std::move(_logGenerator));
     }
     const std::string* identifier = technology->string();
-    _logGenerator = identifier != nullptr ? LogGenerator::generatorFromTechnology(*identifier) : nullptr;
+    _logGenerator = identifier != nullptr ? generatorFromTechnology(*identifier) : nullptr;
     if (_logGenerator) _logGenerator->limitRawLog(kRawLogLimit);
     logLine(Level::Error, "Got log generated: %p", addressOf(_logGenerator));
 }
@@ -163,7 +164,7 @@ bool KelvoModel::startStreaming() {
         logLine(Level::Error, " Could not generate PLIST");
         return false;
     }
-    const auto sent = _sendPort->request(kMessageId, *command, kSendLimit, std::nullopt);
+    const auto sent = _sendPort->request(kPLLogChannelMessageId, *command, kSendLimit, std::nullopt);
     if (sent) return true;
     return failed(State::NoAnswer, " ***** Could not send the START command (got error=%d)",
                   static_cast<int>(sent.error()));
@@ -232,7 +233,7 @@ ArrayRef KelvoModel::getSaveContents() {
 }
 
 void KelvoModel::didReceive(std::int32_t id, ByteView data) {
-    if (id == kMessageId) updateWithData(data);
+    if (id == kPLLogChannelMessageId) updateWithData(data);
 }
 
 void KelvoModel::didInvalidate(const LocalPort& port) {

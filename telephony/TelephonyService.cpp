@@ -103,7 +103,7 @@ bool TelephonyService::hasRoomFor(const std::string& clientName) const {
 }
 
 bool TelephonyService::take(ByteView record) {
-    _rates.count(_source.technology() == Technology::IFX ? std::nullopt : codeOf(record));
+    _rates.count(hasCodes(_source.technology()) ? codeOf(record) : std::nullopt);
     bool taken = false;
     for (LogChannel& channel : _channels) taken |= channel.take(record);
     return taken;

@@ -3,6 +3,7 @@
 #include <fmt/printf.h>
 #include <gtest/gtest.h>
 
+#include "LogGenerator/Factory.h"
 #include "platform/telephony/TelephonyConstants.h"
 #include "tests/support/C2KScreen.h"
 #include "tests/support/FakeResources.h"
@@ -54,9 +55,9 @@ TEST_F(C2KGeneratorState, BeginsWithALineAboutItsGenerator) {
 }
 
 TEST_F(C2KGeneratorState, BelongsToTheGeneratorOfItsTechnology) {
-    const auto generator = LogGenerator::generatorFromTechnology(kPLLogChannelTechnology_Oskra_CDMA);
+    const auto generator = generatorFromTechnology(kPLLogChannelTechnology_Oskra_CDMA);
     EXPECT_NE(dynamic_cast<C2KLogGenerator*>(generator.get()), nullptr);
-    EXPECT_EQ(LogGenerator::generatorFromTechnology("kPLLogChannelTechnology_Oskra_CDM"), nullptr);
+    EXPECT_EQ(generatorFromTechnology("kPLLogChannelTechnology_Oskra_CDM"), nullptr);
 }
 
 TEST_F(C2KGeneratorState, IsFedByTheEightCodesOfTheStartCommandInTheirOrder) {

@@ -4,6 +4,7 @@
 #include <memory>
 #include <optional>
 
+#include "platform/system/Lifetime.h"
 #include "platform/system/MainQueue.h"
 #include "telephony/RecordSource.h"
 #include "telephony/RecordStream.h"
@@ -21,7 +22,6 @@ public:
 
     /// `queue` outlives the source.
     PacedSource(std::unique_ptr<RecordStream> stream, Speed speed, MainQueue& queue, SteadyTime now);
-    ~PacedSource() override { *_alive = false; }
 
     /// Writes every record that a client takes to `recording` as well, with its time in the stream.
     void recordTo(Recording recording) { _recording = std::move(recording); }
@@ -46,12 +46,12 @@ private:
     const SteadyTime _now;
     std::optional<Recording> _recording;
     RecordSink* _sink = nullptr;
-    std::optional<CapturePacket> _next;                           // read and not yet given
-    std::optional<CaptureTime> _last;                             // the time of the packet read last
-    nanoseconds _due{0};                                          // of _next, and before that of the packet before
-    int _refused = 0;                                             // in a row
-    bool _waiting = false;                                        // pump() is on the queue
-    std::shared_ptr<bool> _alive = std::make_shared<bool>(true);  // tasks on the queue outlive the source
+    std::optional<CapturePacket> _next;  // read and not yet given
+    std::optional<CaptureTime> _last;    // the time of the packet read last
+    nanoseconds _due{0};                 // of _next, and before that of the packet before
+    int _refused = 0;                    // in a row
+    bool _waiting = false;               // pump() is on the queue
+    const Lifetime _lifetime;            // tasks on the queue outlive the source
 };
 
 }  // namespace kelvo

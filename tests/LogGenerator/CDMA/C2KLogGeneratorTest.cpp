@@ -1,5 +1,6 @@
 #include "LogGenerator/CDMA/C2KLogGenerator.h"
 
+#include <fmt/printf.h>
 #include <gtest/gtest.h>
 
 #include "LogGenerator/Factory.h"
@@ -47,6 +48,11 @@ Bytes joined(std::initializer_list<Bytes> parts) {
 }
 
 Bytes prefixed(const Record& record) { return joined({{0x81, 0x55}, record.bytes()}); }
+
+TEST_F(C2KGeneratorState, BeginsWithALineAboutItsGenerator) {
+    const auto generator = C2KLogGenerator::generator();
+    EXPECT_EQ(lines(), (Lines{{4, fmt::sprintf("Creating Log object: %p", static_cast<void*>(generator.get()))}}));
+}
 
 TEST_F(C2KGeneratorState, BelongsToTheGeneratorOfItsTechnology) {
     const auto generator = generatorFromTechnology(kPLLogChannelTechnology_Oskra_CDMA);

@@ -42,6 +42,7 @@ void KelvoApp::getSaveButtonPref() {
 void KelvoApp::updateStatusForViewController(KelvoPaneController& pane) {
     const bool isConnected = _model && _model->isConnected();
     pane.setStatus(QString::fromStdString(statusText(isConnected, _updateMessage.toStdString())), !isConnected);
+    if (_model) pane.setConnection(_model->connection());
 }
 
 void KelvoApp::updateViewControllerFromModel() {
@@ -53,7 +54,8 @@ void KelvoApp::updateViewControllerFromModel() {
 
 void KelvoApp::connectionChanged() {
     KelvoPaneController& top = _navController->topViewController();
-    if (!_model->isConnected() && !top.isLoading()) updateStatusForViewController(top);
+    if (!_model->isConnected() && !top.isLoading()) return updateStatusForViewController(top);
+    top.setConnection(_model->connection());
 }
 
 void KelvoApp::reloadPanes() {

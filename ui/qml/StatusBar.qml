@@ -24,6 +24,7 @@ Rectangle {
     }
 
     FigureText {
+        id: status
         objectName: "status"
         anchors.verticalCenter: parent.verticalCenter
         x: bar.column.x + inset
@@ -39,6 +40,20 @@ Rectangle {
         Behavior on inset {
             NumberAnimation { duration: 160; easing.type: Easing.OutCubic }
         }
+    }
+
+    // Below the status text, which keeps its place whether this is there or not.
+    FigureText {
+        objectName: "note"
+        anchors { left: status.left; top: status.bottom; topMargin: -1 }
+        maximumWidth: status.maximumWidth
+        text: bar.pane.note
+        visible: text !== ""
+        color: Theme.secondaryText
+        font.pixelSize: 11
+        Accessible.ignored: !enabled
+        Accessible.role: Accessible.StaticText
+        Accessible.name: text
     }
 
     BarButton {

@@ -1,20 +1,22 @@
 #include "model/KelvoModel.h"
 
-#include "platform/encodings/PropertyList.h"
+#include "LogGenerator/Factory.h"
 #include "platform/system/Environment.h"
+#include "platform/telephony/LogChannelProtocol.h"
+#include "platform/telephony/TelephonyProtocol.h"
 
 namespace kelvo {
 
 using namespace std::chrono_literals;
+using State = Connection::State;
 
 namespace {
 
-constexpr std::int32_t kMessageId = 0;  // of every message on the log channel, in both directions
 constexpr auto kSendLimit = 1s;
 constexpr auto kReplyLimit = 1s;
 constexpr std::size_t kRawLogLimit = std::size_t{4} * 1024 * 1024;  // many times what a modem says in two seconds
 
-Result<Bytes> technologyQuery() { return writeXmlPropertyList(Dictionary::make({{"GetTechnology", "GetTechnology"}})); }
+Value technologyQuery() { return Dictionary::make({{kPLGetTechnology, kPLGetTechnology}}); }
 
 const void* addressOf(const auto& owner) { return static_cast<const void*>(owner.get()); }
 
@@ -32,20 +34,22 @@ KelvoModel::KelvoModel(Services services) : _services(std::move(services)) {}
 
 KelvoModel::~KelvoModel() { destroyPorts(); }
 
+/// Writes the line that tells of a failure, and keeps in mind what it was. Always false.
+template <class... Args>
+bool KelvoModel::failed(State obstacle, const char* format, const Args&... args) {
+    _obstacle = obstacle;
+    logLine(Level::Error, format, args...);
+    return false;
+}
+
 bool KelvoModel::createPorts() {
     MessagePorts::Local local = _services.ports.createLocal(_services.portName, [this](std::int32_t id, ByteView data) {
         didReceive(id, data);
         return Bytes();
     });
     _recvPort = std::move(local.port);
-    if (local.alreadyExisted) {
-        logLine(Level::Error, "Local messsage port already exists");
-        return false;
-    }
-    if (!_recvPort) {
-        logLine(Level::Error, "Could not create local message port");
-        return false;
-    }
+    if (local.alreadyExisted) return failed(State::PortTaken, "Local messsage port already exists");
+    if (!_recvPort) return failed(State::NoPort, "Could not create local message port");
     _recvPort->schedule();
     _recvPort->setInvalidationCallback(whileAlive([this](LocalPort& port) { didInvalidate(port); }));
     return openLogChannel();
@@ -53,26 +57,19 @@ bool KelvoModel::createPorts() {
 
 bool KelvoModel::openLogChannel() {
     auto server = _services.telephony.createServerConnection(whileAlive([this](std::string_view) { refresh(); }));
-    if (!server) {
-        logLine(Level::Error, "Could not create PLServerConnection");
-        return false;
-    }
+    if (!server) return failed(State::NoService, "Could not create PLServerConnection");
     const PLLogChannel channel = PLServerConnectionNetworkMonitorCreateLogChannel(*server, _services.portName);
     server.reset();
     if (channel.error.error != 0) {
-        logLine(Level::Error, "_PLServerConnectionNetworkMonitorCreateLogChannel returns error: %ld!",
-                channel.error.error);
-        return false;
+        const bool answered = channel.error.domain != kPLErrorDomainClient;
+        return failed(answered ? State::Refused : State::NoAnswer,
+                      "_PLServerConnectionNetworkMonitorCreateLogChannel returns error: %ld!", channel.error.error);
     }
     if (channel.portName.empty()) {
-        logLine(Level::Error, "Could not create a log channel (PL returned null port)!");
-        return false;
+        return failed(State::Refused, "Could not create a log channel (PL returned null port)!");
     }
     _sendPort = _services.ports.openRemote(channel.portName);
-    if (!_sendPort) {
-        logLine(Level::Error, "Could not create the remote port!");
-        return false;
-    }
+    if (!_sendPort) return failed(State::NoAnswer, "Could not create the remote port!");
     logLine(Level::Error, " ***** Created ports (send=%p, recv=%p)", addressOf(_sendPort), addressOf(_recvPort));
     return true;
 }
@@ -93,31 +90,32 @@ void KelvoModel::destroyPorts() {
 }
 
 void KelvoModel::configureGenerator() {
-    const Result<Bytes> query = technologyQuery();
+    const Result<Bytes> query = _services.encode(technologyQuery());
     if (!query) {
         logLine(Level::Error, " Could not generate GetTechnology command; cannot configure");
         return;
     }
-    const auto reply = _sendPort->request(kMessageId, *query, kSendLimit, kReplyLimit);
+    const auto reply = _sendPort->request(kPLLogChannelMessageId, *query, kSendLimit, kReplyLimit);
     if (!reply) {
-        logLine(Level::Error, " ***** Could not send the GetTechnology command (got error=%d)",
-                static_cast<int>(reply.error()));
+        failed(State::NoAnswer, " ***** Could not send the GetTechnology command (got error=%d)",
+               static_cast<int>(reply.error()));
         return;
     }
     if (reply->empty()) {
-        logLine(Level::Error, " ***** No response to GetTechnology; cannot configure");
+        failed(State::NoAnswer, " ***** No response to GetTechnology; cannot configure");
         return;
     }
     const Result<Value> answer = readPropertyList(*reply);
     if (!answer) {
-        logLine(Level::Error, " ***** Could not parse reply to GetTechnology; cannot configure");
+        failed(State::UnknownTechnology, " ***** Could not parse reply to GetTechnology; cannot configure");
         return;
     }
     chooseGenerator(*answer);
 }
 
 void KelvoModel::chooseGenerator(const Value& answer) {
-    const Value* technology = answer.dictionary() ? answer.dictionary()->find("GetTechnology") : nullptr;
+    _obstacle = State::UnknownTechnology;
+    const Value* technology = answer.dictionary() ? answer.dictionary()->find(kPLGetTechnology) : nullptr;
     if (technology == nullptr) {
         logLine(Level::Error, " ***** Reply to GetTechnology had no answer; cannot configure");
         return;
@@ -127,7 +125,7 @@ void KelvoModel::chooseGenerator(const Value& answer) {
         _replacedGenerators.push_back(std::move(_logGenerator));
     }
     const std::string* identifier = technology->string();
-    _logGenerator = identifier != nullptr ? LogGenerator::generatorFromTechnology(*identifier) : nullptr;
+    _logGenerator = identifier != nullptr ? generatorFromTechnology(*identifier) : nullptr;
     if (_logGenerator) _logGenerator->limitRawLog(kRawLogLimit);
     logLine(Level::Error, "Got log generated: %p", addressOf(_logGenerator));
 }
@@ -142,10 +140,13 @@ void KelvoModel::startMonitor() {
     if (!startStreaming()) {
         destroyPorts();
         _services.queue.postAfter(5s, whileAlive([this] { startMonitor(); }));
-        return;
+        return tellConnection();
     }
     logLine(Level::Error, "Starting the display update timer");
     _displayUpdateTimer = _services.queue.repeat(2s, whileAlive([this] { refresh(); }));
+    _receiving = false;
+    _silentSince = _services.queue.now();
+    tellConnection();
 }
 
 bool KelvoModel::startStreaming() {
@@ -158,53 +159,73 @@ bool KelvoModel::startStreaming() {
         logLine(Level::Error, "No log generator technology works");
         return false;
     }
-    const Result<Bytes> command = writeXmlPropertyList(_logGenerator->getStartCommand());
+    const Result<Bytes> command = _services.encode(_logGenerator->getStartCommand());
     if (!command) {
         logLine(Level::Error, " Could not generate PLIST");
         return false;
     }
-    const auto sent = _sendPort->request(kMessageId, *command, kSendLimit, std::nullopt);
-    if (!sent) {
-        logLine(Level::Error, " ***** Could not send the START command (got error=%d)", static_cast<int>(sent.error()));
-    }
-    return static_cast<bool>(sent);
+    const auto sent = _sendPort->request(kPLLogChannelMessageId, *command, kSendLimit, std::nullopt);
+    if (sent) return true;
+    return failed(State::NoAnswer, " ***** Could not send the START command (got error=%d)",
+                  static_cast<int>(sent.error()));
 }
 
 void KelvoModel::refresh() {
-    bool lost = false;
-    if (_sendPort && _recvPort && !_sendPort->isValid()) {
-        _recvPort->invalidate();  // whose callback restarts
-        lost = !isConnected();
-    }
-    if (!_updated && !(lost && _nodes)) return;
-    if (_updated) {
-        _updated = false;
-        _nodes.reset();
-        _nodesByPath.clear();
-    }
-    // A lost connection is told even when nothing new has come: screens with values must not pass for current.
+    if (_sendPort && _recvPort && !_sendPort->isValid()) loseService();
+    if (_displayUpdateTimer) tellConnection();
+    if (!_updated) return;
+    _updated = false;
+    _nodes.reset();
+    _nodesByPath.clear();
     _services.queue.post(whileAlive([this] { _services.updateViewControllerFromModel(); }));
 }
 
 void KelvoModel::refresh(const Value&) { refresh(); }
 
+/// The port that the service delivered to ends with it, as if it had ended by itself.
+void KelvoModel::loseService() {
+    _recvPort->setInvalidationCallback(nullptr);
+    _recvPort->invalidate();
+    didInvalidate(*_recvPort);
+}
+
 bool KelvoModel::isConnected() const { return _recvPort && _sendPort; }
 
+Connection KelvoModel::connection() const {
+    if (!_displayUpdateTimer) return {.state = _obstacle};
+    return {.state = _receiving ? State::Receiving : State::NoRecordYet,
+            .silence = _services.queue.now() - _silentSince};
+}
+
+void KelvoModel::tellConnection() {
+    const Connection now = connection();
+    Told told{.isConnected = now.isConnected(), .text = connectionText(now)};
+    if (told == _told) return;
+    _told = std::move(told);
+    if (_services.connectionChanged) _services.queue.post(whileAlive([this] { _services.connectionChanged(); }));
+}
+
 NodeRef KelvoModel::topLevelNodes() {
-    if (!_nodes && _logGenerator) {
-        _nodes = KelvoModelNode::makeTreeFromObject(_logGenerator->generateLogUsingState(*_state), _nodesByPath);
-    }
+    if (!_nodes) rebuildNodes();
     return _nodes;
 }
 
+void KelvoModel::rebuildNodes() {
+    if (!_logGenerator) return;
+    const Value display = _logGenerator->generateLogUsingState(*_state);  // which takes a snapshot
+    _nodes = KelvoModelNode::makeTreeFromObject(display, _nodesByPath);
+}
+
 NodeRef KelvoModel::nodeAtPath(const std::string& path) {
-    if (!_nodes) topLevelNodes();
+    if (!_nodes) rebuildNodes();
     return _nodesByPath.find(path);
 }
 
 void KelvoModel::updateWithData(ByteView data) {
     if (_logGenerator) _logGenerator->updateState(*_state, data);
     _updated = true;
+    _receiving = true;
+    _silentSince = _services.queue.now();
 }
 
 ArrayRef KelvoModel::getSaveContents() {
@@ -212,7 +233,7 @@ ArrayRef KelvoModel::getSaveContents() {
 }
 
 void KelvoModel::didReceive(std::int32_t id, ByteView data) {
-    if (id == kMessageId) updateWithData(data);
+    if (id == kPLLogChannelMessageId) updateWithData(data);
 }
 
 void KelvoModel::didInvalidate(const LocalPort& port) {

@@ -6,7 +6,9 @@
 #include <vector>
 
 #include "LogGenerator/LogGenerator.h"
+#include "model/Connection.h"
 #include "model/KelvoModelNode.h"
+#include "platform/encodings/PropertyList.h"
 #include "platform/system/MainQueue.h"
 #include "platform/system/MessagePorts.h"
 #include "platform/telephony/Telephony.h"
@@ -27,10 +29,15 @@ public:
         MainQueue& queue;
         MessagePorts& ports;
         TelephonyClient& telephony;
-        /// Runs on the main queue when a tick found new data, or the connection lost and not there again.
+        /// Runs on the main queue when a tick found new data.
         std::function<void()> updateViewControllerFromModel;
         /// The application's port name; another program that watches beside it brings its own.
         std::string portName = kLogChannelPortName;
+        /// Runs on the main queue when the connection has come or gone, and when what `connectionText` says of it is
+        /// another than before: nobody has to ask again and again.
+        std::function<void()> connectionChanged = {};
+        /// How messages are encoded.
+        std::function<Result<Bytes>(const Value&)> encode = writeXmlPropertyList;
     };
 
     explicit KelvoModel(Services services);
@@ -48,9 +55,12 @@ public:
 
     /// True while both ports are there.
     bool isConnected() const;
-    /// The root of the display tree, built when it is not cached; none while there is no generator.
+    /// How far the monitor has come, and for how long nothing has.
+    Connection connection() const;
+    /// The root of the display tree; none while there is no generator. The first call after a tick with new data builds
+    /// the tree anew, and with it adds a snapshot to the history.
     NodeRef topLevelNodes();
-    /// The node at `path`; none when the tree has no such node.
+    /// The node at `path`, of a tree built as for `topLevelNodes`; none when the tree has no such node.
     NodeRef nodeAtPath(const std::string& path);
     /// Hands one message of the log channel to the generator.
     void updateWithData(ByteView data);
@@ -58,12 +68,23 @@ public:
     ArrayRef getSaveContents();
 
 private:
+    struct Told {
+        bool isConnected = false;
+        std::string text = connectionText({});
+        bool operator==(const Told&) const = default;
+    };
+
     bool createPorts();
     bool openLogChannel();
     void destroyPorts();
     void configureGenerator();
     void chooseGenerator(const Value& answer);
     bool startStreaming();
+    template <class... Args>
+    bool failed(Connection::State obstacle, const char* format, const Args&... args);
+    void tellConnection();
+    void loseService();
+    void rebuildNodes();
     void didReceive(std::int32_t id, ByteView data);
     void didInvalidate(const LocalPort& port);
     template <class Work>
@@ -71,7 +92,7 @@ private:
 
     const Services _services;
     const DictionaryRef _state = Dictionary::make();                 // outlives every restart and every generator
-    std::vector<std::unique_ptr<LogGenerator>> _replacedGenerators;  // intended: one that was replaced is kept as well
+    std::vector<std::unique_ptr<LogGenerator>> _replacedGenerators;  // none is released before the model goes
     std::unique_ptr<LogGenerator> _logGenerator;
     NodeRef _nodes;
     NodesByPath _nodesByPath;  // built with _nodes and empty without
@@ -79,6 +100,10 @@ private:
     std::unique_ptr<RemotePort> _sendPort;
     std::unique_ptr<RepeatingTimer> _displayUpdateTimer;  // its presence means that the monitor runs
     bool _updated = false;
+    Connection::State _obstacle = Connection::State::NotStarted;  // why the last start failed
+    bool _receiving = false;                                      // a record has come since the monitor runs
+    std::chrono::nanoseconds _silentSince{0};                     // when the last one came, or the monitor began to run
+    Told _told;                                                   // what the screens know of the connection
     const std::shared_ptr<bool> _alive = std::make_shared<bool>();  // its owners: tasks on the queue outlive the model
 };
 

@@ -3,6 +3,7 @@
 #include <fmt/format.h>
 
 #include "platform/encodings/PropertyList.h"
+#include "platform/telephony/LogChannelProtocol.h"
 
 namespace kelvo {
 namespace {
@@ -31,12 +32,13 @@ std::optional<Failure> readCodes(const Dictionary::Entry& entry, CodesRef& into)
 bool isText(const Value& value, std::string_view text) { return value.string() != nullptr && *value.string() == text; }
 
 std::optional<Failure> readEntry(const Dictionary::Entry& entry, ChannelCommand& into) {
-    if (entry.key == "SetOskraLogCodes") return readCodes(entry, into.ordinaryCodes);
-    if (entry.key == "SetPlExtraCodes") return readCodes(entry, into.extendedCodes);
-    if (entry.key == "GetTechnology") {
+    if (entry.key == kPLSetOskraLogCodes) return readCodes(entry, into.ordinaryCodes);
+    if (entry.key == kPLSetPlExtraCodes) return readCodes(entry, into.extendedCodes);
+    if (entry.key == kPLGetTechnology) {
         into.getTechnology = true;
-    } else if (entry.key == "SetState") {
-        if (!isText(entry.value, "Streaming")) return Failure{"SetState is not \"Streaming\""};
+    } else if (entry.key == kPLSetState) {
+        if (!isText(entry.value, kPLStateStreaming))
+            return Failure{fmt::format("{} is not \"{}\"", kPLSetState, kPLStateStreaming)};
         into.startStreaming = true;
     } else {
         ++into.unknownKeys;

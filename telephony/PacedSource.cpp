@@ -3,8 +3,6 @@
 #include <algorithm>
 #include <utility>
 
-#include "platform/system/Environment.h"
-
 namespace kelvo {
 namespace {
 
@@ -66,21 +64,13 @@ bool PacedSource::readNext() {
 
 void PacedSource::give() {
     if (_sink->take(_next->bytes)) {
-        record(*_next);
+        if (_recording) _recording->append(technology(), *_next);
         _refused = 0;
     } else if (++_refused == kRefusedBeforeRest) {
         _refused = 0;
         if (!_speed) _due = _now() + 1s;  // a client that wants none of it stays hungry: no reason to spin
     }
     _next.reset();
-}
-
-void PacedSource::record(const CapturePacket& packet) {
-    if (!_recording) return;
-    if (const auto failure = _recording->append(packet.time, packet.bytes)) {
-        logLine(Level::Error, "The recording ends here: %s", failure->reason);
-        _recording.reset();
-    }
 }
 
 nanoseconds PacedSource::scaled(nanoseconds interval) const {

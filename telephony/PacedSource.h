@@ -7,6 +7,7 @@
 #include "platform/system/MainQueue.h"
 #include "telephony/RecordSource.h"
 #include "telephony/RecordStream.h"
+#include "telephony/Recording.h"
 #include "telephony/SteadyTime.h"
 
 namespace kelvo {
@@ -22,9 +23,8 @@ public:
     PacedSource(std::unique_ptr<RecordStream> stream, Speed speed, MainQueue& queue, SteadyTime now);
     ~PacedSource() override { *_alive = false; }
 
-    /// Writes every record that a client takes to `recording`, with its time in the stream. A failure (a full disk) is
-    /// told in one line, ends the recording and leaves the streaming alone.
-    void recordTo(CaptureWriter recording) { _recording = std::move(recording); }
+    /// Writes every record that a client takes to `recording` as well, with its time in the stream.
+    void recordTo(Recording recording) { _recording = std::move(recording); }
 
     Technology technology() const override { return _stream->technology(); }
     std::string description() const override { return _stream->description(); }
@@ -38,14 +38,13 @@ private:
     void pump();
     bool readNext();
     void give();
-    void record(const CapturePacket& packet);
     nanoseconds scaled(nanoseconds interval) const;
 
     const std::unique_ptr<RecordStream> _stream;
     const Speed _speed;
     MainQueue& _queue;
     const SteadyTime _now;
-    std::optional<CaptureWriter> _recording;
+    std::optional<Recording> _recording;
     RecordSink* _sink = nullptr;
     std::optional<CapturePacket> _next;                           // read and not yet given
     std::optional<CaptureTime> _last;                             // the time of the packet read last

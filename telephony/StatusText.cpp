@@ -2,6 +2,8 @@
 
 #include <fmt/format.h>
 
+#include "LogGenerator/CodeNames.h"
+
 namespace kelvo {
 namespace {
 
@@ -18,7 +20,8 @@ std::string textOf(const Dictionary& entry, std::string_view key) {
 std::string codeLine(const Dictionary& rate) {
     const Number* code = rate["Code"].number();
     const Number* perSecond = rate["PerSecond"].number();
-    return fmt::format("  {:<10}{:>11.1f}{:>14}\n", code != nullptr ? fmt::format("0x{:04x}", code->integer()) : "none",
+    return fmt::format("  {:<46}{:>11.1f}{:>14}\n",
+                       code != nullptr ? describeCode(static_cast<LogCode>(code->integer())) : "none",
                        perSecond != nullptr ? perSecond->real() : 0, integerOf(rate, "Records"));
 }
 
@@ -46,7 +49,7 @@ Result<std::string> statusText(const Value& answer) {
     const ArrayRef& codes = status["Codes"].array();
     const ArrayRef& clients = status["Clients"].array();
     if (!codes || !clients) return Failure{"the answer is no status"};
-    return fmt::format("Source      {}\nTechnology  {}\nRecords     {}\n\n  {:<10}{:>11}{:>14}\n{}\nClients\n{}",
+    return fmt::format("Source      {}\nTechnology  {}\nRecords     {}\n\n  {:<46}{:>11}{:>14}\n{}\nClients\n{}",
                        textOf(status, "Source"), textOf(status, "Technology"), integerOf(status, "Records"), "Log code",
                        "per second", "in all", linesOf(codes, codeLine), linesOf(clients, clientLine));
 }

@@ -28,10 +28,6 @@ namespace kelvo {
 
 namespace {
 
-using namespace std::chrono_literals;
-
-constexpr const char* kConnecting = "Connecting...";
-
 Terminal* terminalToRestore = nullptr;  // for the terminate handler, which nothing can be handed to
 
 /// What ends the program, a record or a full disk, does so from within the event loop; the terminal must survive it.
@@ -46,9 +42,12 @@ class Watch {
 public:
     Watch(MainQueue& queue, MessagePorts& ports, TelephonyClient& telephony, WatchView& view)
         : _view(view),
-          _model({queue, ports, telephony, [this] { update(); },
-                  fmt::format("{}.watch.{}", KelvoModel::kLogChannelPortName, getpid())}),
-          _statusTimer(queue.repeat(2s, [this] { updateStatus(); })) {
+          _model({.queue = queue,
+                  .ports = ports,
+                  .telephony = telephony,
+                  .updateViewControllerFromModel = [this] { update(); },
+                  .portName = fmt::format("{}.watch.{}", KelvoModel::kLogChannelPortName, getpid()),
+                  .connectionChanged = [this] { updateStatus(); }}) {
         queue.post([this] { _model.restartMonitor(); });
         _view.showStatus(_shownStatus);
     }
@@ -64,19 +63,17 @@ private:
         _view.showDisplay(root ? displayLines(*root) : std::vector<std::string>(), _shownStatus);
     }
 
-    /// The model does not tell when its ports come and go.
     void updateStatus() {
-        const std::string& status = _model.isConnected() ? _updateMessage : kConnecting;
+        const std::string status = statusText(_model.isConnected(), _updateMessage);
         if (status == _shownStatus) return;
         _shownStatus = status;
         _view.showStatus(status);
     }
 
     WatchView& _view;
-    std::string _updateMessage = kConnecting;
-    std::string _shownStatus = kConnecting;
+    std::string _updateMessage = statusText(false, {});  // until the first update
+    std::string _shownStatus = _updateMessage;
     KelvoModel _model;
-    const std::unique_ptr<RepeatingTimer> _statusTimer;
 };
 
 /// Qt complains on standard error about a locale that is not UTF-8, which a bare shell on a router board has.

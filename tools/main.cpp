@@ -38,6 +38,7 @@ int main(int argc, char** argv) {
 
     CLI::App app("Kelvo in the terminal: the screens of a phone's radio, of captures and of snapshots.", "kelvoctl");
     app.require_subcommand(1);
+    app.set_version_flag("--version", "kelvoctl " KELVO_VERSION);
     app.footer("\"kelvoctl COMMAND --help\" tells more about a command.");
     kelvo::addDecodeCommand(app);
     kelvo::addWatchCommand(app);

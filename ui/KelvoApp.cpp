@@ -14,8 +14,12 @@ KelvoApp::~KelvoApp() { *_alive = false; }
 void KelvoApp::applicationDidFinishLaunching() {
     getSaveButtonPref();
     _window = _services.createWindow();
-    _model = std::make_unique<KelvoModel>(KelvoModel::Services{_services.queue, _services.ports, _services.telephony,
-                                                               [this] { updateViewControllerFromModel(); }});
+    _model = std::make_unique<KelvoModel>(
+        KelvoModel::Services{.queue = _services.queue,
+                             .ports = _services.ports,
+                             .telephony = _services.telephony,
+                             .updateViewControllerFromModel = [this] { updateViewControllerFromModel(); },
+                             .connectionChanged = [this] { connectionChanged(); }});
     setUpdateMessage(QStringLiteral("Connecting..."));
     _dateFormatter = std::make_unique<DateFormatter>(QStringLiteral("'Updated' yyyy-MM-dd 'at' HH:mm:ss"));
     auto root = std::make_unique<KelvoPaneController>(nullptr, "/", *this);
@@ -36,11 +40,9 @@ void KelvoApp::getSaveButtonPref() {
 }
 
 void KelvoApp::updateStatusForViewController(KelvoPaneController& pane) {
-    if (_model && _model->isConnected()) {
-        pane.setStatus(_updateMessage, false);
-    } else {
-        pane.setStatus(QStringLiteral("Connecting..."), true);
-    }
+    const bool isConnected = _model && _model->isConnected();
+    pane.setStatus(QString::fromStdString(statusText(isConnected, _updateMessage.toStdString())), !isConnected);
+    if (_model) pane.setConnection(_model->connection());
 }
 
 void KelvoApp::updateViewControllerFromModel() {
@@ -48,6 +50,12 @@ void KelvoApp::updateViewControllerFromModel() {
     reloadPanes();
     if (_model->isConnected()) setUpdateMessage(_dateFormatter->stringFromDate(clock().now()));
     updateStatusForViewController(_navController->topViewController());
+}
+
+void KelvoApp::connectionChanged() {
+    KelvoPaneController& top = _navController->topViewController();
+    if (!_model->isConnected() && !top.isLoading()) return updateStatusForViewController(top);
+    top.setConnection(_model->connection());
 }
 
 void KelvoApp::reloadPanes() {

@@ -33,7 +33,7 @@ void KelvoPaneController::reloadWithNode(NodeRef node) {
     setTitle();
     reloadData(rowsOf(_nodes));
     createToolbarItems();
-    Q_EMIT reloaded();
+    Q_EMIT hintsChanged();
 }
 
 void KelvoPaneController::setTitle() {
@@ -139,6 +139,11 @@ void KelvoPaneController::setStatus(const QString& status, bool isLoading) {
     createToolbarItems();
 }
 
+void KelvoPaneController::setConnection(const Connection& connection) {
+    _connection = connection;
+    Q_EMIT hintsChanged();
+}
+
 void KelvoPaneController::createToolbarItems() {
     using Kind = ToolbarItem::Kind;
     std::vector<ToolbarItem> items = {
@@ -178,13 +183,20 @@ void KelvoPaneController::didSelectRow(int row) {
     if (child->childNodes() == nullptr) return selectRow(-1);
     auto pane = std::make_unique<KelvoPaneController>(child, pathByAppending(_keyPath, child->displayName()), _host);
     pane->setStatus(_status, _isLoading);
+    pane->setConnection(_connection);
     if (_navigationController != nullptr) _navigationController->pushViewController(std::move(pane), true);
 }
 
 QString KelvoPaneController::emptyText() const {
     if (!_rows.empty()) return {};
-    if (!_nodes) return QStringLiteral("Waiting for the modem");
+    if (!_nodes) return QString::fromStdString(waitingText(_connection));
     return _nodes->childNodes() != nullptr ? QStringLiteral("None reported") : QStringLiteral("Nothing reported yet");
+}
+
+QString KelvoPaneController::note() const {
+    const bool saidInPlaceOfRows = !_nodes && !_connection.isConnected();
+    const bool calm = _connection.isConnected() && !_connection.isSilent();
+    return calm || saidInPlaceOfRows ? QString() : QString::fromStdString(connectionText(_connection));
 }
 
 int KelvoPaneController::rowCount(const QModelIndex& parent) const {

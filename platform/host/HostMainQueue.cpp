@@ -51,4 +51,6 @@ std::unique_ptr<RepeatingTimer> HostMainQueue::repeat(std::chrono::nanoseconds i
     return std::make_unique<HostTimer>(wholeMilliseconds(interval), std::move(task));
 }
 
+std::chrono::nanoseconds HostMainQueue::now() const { return std::chrono::steady_clock::now().time_since_epoch(); }
+
 }  // namespace kelvo

@@ -13,6 +13,7 @@ public:
     void post(Task task) override;
     void postAfter(std::chrono::nanoseconds delay, Task task) override;
     std::unique_ptr<RepeatingTimer> repeat(std::chrono::nanoseconds interval, Task task) override;
+    std::chrono::nanoseconds now() const override;
 
 private:
     QObject _context;

@@ -1,5 +1,6 @@
 #include "platform/host/HostSystemLog.h"
 
+#include <spdlog/details/os.h>
 #include <spdlog/sinks/base_sink.h>
 #include <spdlog/sinks/stdout_sinks.h>
 #include <syslog.h>
@@ -8,6 +9,7 @@
 #include <algorithm>
 
 #include "platform/encodings/Utf8.h"
+#include "platform/host/SyslogSocket.h"
 
 namespace kelvo {
 namespace {
@@ -21,7 +23,7 @@ spdlog::level::level_enum levelFor(Level level) {
     }
 }
 
-int priorityFor(spdlog::level::level_enum level) {
+int severityFor(spdlog::level::level_enum level) {
     switch (level) {
         case spdlog::level::warn: return LOG_WARNING;
         case spdlog::level::info: return LOG_NOTICE;
@@ -33,23 +35,22 @@ using OneThread = spdlog::details::null_mutex;  // the worker alone writes
 
 class SyslogSink final : public spdlog::sinks::base_sink<OneThread> {
 public:
-    explicit SyslogSink(std::string program) : _program(std::move(program)) {
-        ::openlog(_program.c_str(), LOG_PID, LOG_USER);
-    }
-    ~SyslogSink() override { ::closelog(); }
+    SyslogSink(const std::filesystem::path& socket, const std::string& program) : _socket(socket, program) {}
 
 private:
     void sink_it_(const spdlog::details::log_msg& line) override {
-        ::syslog(priorityFor(line.level), "%.*s", static_cast<int>(line.payload.size()), line.payload.data());
+        const std::tm time = spdlog::details::os::localtime(spdlog::log_clock::to_time_t(line.time));
+        _socket.send(severityFor(line.level), time, std::string_view(line.payload.data(), line.payload.size()));
     }
     void flush_() override {}
 
-    const std::string _program;  // syslog keeps a pointer to it
+    SyslogSocket _socket;
 };
 
-std::shared_ptr<spdlog::sinks::sink> sinkFor(HostSystemLog::To destination, const std::string& program) {
-    if (destination == HostSystemLog::To::System && ::access("/dev/log", W_OK) == 0)
-        return std::make_shared<SyslogSink>(program);
+std::shared_ptr<spdlog::sinks::sink> sinkFor(HostSystemLog::To destination, const std::string& program,
+                                             const std::filesystem::path& socket) {
+    if (destination == HostSystemLog::To::System && ::access(socket.c_str(), W_OK) == 0)
+        return std::make_shared<SyslogSink>(socket, program);
     auto sink = std::make_shared<spdlog::sinks::stderr_sink_st>();
     sink->set_pattern("%H:%M:%S.%e " + program + ": %v");
     return sink;
@@ -57,8 +58,8 @@ std::shared_ptr<spdlog::sinks::sink> sinkFor(HostSystemLog::To destination, cons
 
 }  // namespace
 
-HostSystemLog::HostSystemLog(const std::string& program, To destination)
-    : HostSystemLog(sinkFor(destination, program)) {}
+HostSystemLog::HostSystemLog(const std::string& program, To destination, const std::filesystem::path& socket)
+    : HostSystemLog(sinkFor(destination, program, socket)) {}
 
 HostSystemLog::HostSystemLog(std::shared_ptr<spdlog::sinks::sink> destination, std::size_t queueLength)
     : _destination(std::move(destination)), _queue(queueLength), _writer([this] { writeOut(); }) {}

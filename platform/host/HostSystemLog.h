@@ -3,6 +3,7 @@
 #include <spdlog/fwd.h>
 
 #include <cstddef>
+#include <filesystem>
 #include <memory>
 #include <string>
 #include <thread>
@@ -24,7 +25,9 @@ public:
     enum class To { System, StandardError };
 
     /// `program` stands in front of every line. A system without syslog has its lines on standard error, too.
-    explicit HostSystemLog(const std::string& program, To destination = To::System);
+    /// `socket` is where its syslog listens.
+    explicit HostSystemLog(const std::string& program, To destination = To::System,
+                           const std::filesystem::path& socket = "/dev/log");
     /// For a destination of the caller's choice, which is used on the log's own thread only.
     explicit HostSystemLog(std::shared_ptr<spdlog::sinks::sink> destination, std::size_t queueLength = kQueueLength);
     ~HostSystemLog() override;

@@ -26,6 +26,9 @@ public:
     /// Runs `task` every `interval`, first one interval from now, until the timer is destroyed. The task may destroy
     /// it.
     virtual std::unique_ptr<RepeatingTimer> repeat(std::chrono::nanoseconds interval, Task task) = 0;
+
+    /// The time by which the queue waits: it only goes forward, from any beginning.
+    virtual std::chrono::nanoseconds now() const = 0;
 };
 
 }  // namespace kelvo

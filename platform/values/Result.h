@@ -1,5 +1,6 @@
 #pragma once
 
+#include <optional>
 #include <string>
 #include <utility>
 #include <variant>
@@ -11,10 +12,11 @@ struct Failure {
     std::string reason;
 };
 
-/// Either the value that was asked for or the error that prevented it.
+/// Either the value that was asked for or the error that prevented it: the one way in which an operation says that it
+/// failed. `E` is another type only where the caller acts upon the kind of failure.
 /// `value()` and `error()` may only be called on the matching kind.
 template <class T, class E = Failure>
-class Result {
+class [[nodiscard]] Result {
 public:
     Result(T value) : _content(std::in_place_index<0>, std::move(value)) {}
     Result(E error) : _content(std::in_place_index<1>, std::move(error)) {}
@@ -32,6 +34,20 @@ public:
 
 private:
     std::variant<T, E> _content;
+};
+
+/// Of an operation that has nothing to give: `return {};` says that it went well.
+template <class E>
+class [[nodiscard]] Result<void, E> {
+public:
+    Result() = default;
+    Result(E error) : _error(std::move(error)) {}
+
+    explicit operator bool() const { return !_error; }
+    const E& error() const { return _error.value(); }
+
+private:
+    std::optional<E> _error;
 };
 
 }  // namespace kelvo

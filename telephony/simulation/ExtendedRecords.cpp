@@ -95,10 +95,10 @@ Value dictionaryOf(const PdpContext& context) {
 }
 
 template <class Entry>
-Bytes arrayRecord(std::uint32_t code, std::span<const Entry> entries, Time time) {
+Bytes arrayRecord(Time time, std::uint32_t code, std::span<const Entry> entries) {
     const auto array = Array::make();
     for (const Entry& entry : entries) array->append(dictionaryOf(entry));
-    return propertyListRecord(code, time, array);
+    return propertyListRecord(time, code, array);
 }
 
 std::string hexadecimal(int value, int digits) {
@@ -141,20 +141,20 @@ SimFiles testNetworkSim() {
     return simFiles(0xfffe, 0xff, UpdateStatus::NotUpdated);  // both "deleted": 3GPP TS 23.003, 4.1 and 4.2
 }
 
-Bytes simFilesRecord(const SimFiles& files, Time time) {
+Bytes simFilesRecord(Time time, const SimFiles& files) {
     const auto dictionary = Dictionary::make();
     for (const auto& [key, text] : kSimFiles) {
         if (!(files.*text).empty()) dictionary->set(key, files.*text);
     }
-    return propertyListRecord(0xff0000, time, dictionary);
+    return propertyListRecord(time, 0xff0000, dictionary);
 }
 
-Bytes cellInformationRecord(std::span<const MonitoredCell> cells, Time time) {
-    return arrayRecord(0xff0001, cells, time);
+Bytes cellInformationRecord(Time time, std::span<const MonitoredCell> cells) {
+    return arrayRecord(time, 0xff0001, cells);
 }
 
-Bytes pdpContextsRecord(std::span<const PdpContext> contexts, Time time) {
-    return arrayRecord(0xff0002, contexts, time);
+Bytes pdpContextsRecord(Time time, std::span<const PdpContext> contexts) {
+    return arrayRecord(time, 0xff0002, contexts);
 }
 
 }  // namespace kelvo::simulation

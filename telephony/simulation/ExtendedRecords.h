@@ -5,7 +5,7 @@
 #include <string>
 
 #include "platform/values/Bytes.h"
-#include "telephony/simulation/Journey.h"
+#include "telephony/simulation/Time.h"
 
 namespace kelvo::simulation {
 
@@ -35,7 +35,7 @@ SimFiles testNetworkSim(int locationAreaCode, int routingAreaCode);
 SimFiles testNetworkSim();
 
 /// Record 0xff0000.
-Bytes simFilesRecord(const SimFiles& files, Time time);
+Bytes simFilesRecord(Time time, const SimFiles& files);
 
 /// One cell as the telephony service's cell monitor words it. A value that is none is not in the record.
 struct MonitoredCell {
@@ -60,7 +60,7 @@ struct MonitoredCell {
 };
 
 /// Record 0xff0001: the cells in this order.
-Bytes cellInformationRecord(std::span<const MonitoredCell> cells, Time time);
+Bytes cellInformationRecord(Time time, std::span<const MonitoredCell> cells);
 
 /// One packet data protocol context; all texts as shown, an empty one is not in the record.
 struct PdpContext {
@@ -73,6 +73,6 @@ struct PdpContext {
 };
 
 /// Record 0xff0002: the contexts in this order.
-Bytes pdpContextsRecord(std::span<const PdpContext> contexts, Time time);
+Bytes pdpContextsRecord(Time time, std::span<const PdpContext> contexts);
 
 }  // namespace kelvo::simulation

@@ -1,7 +1,7 @@
 #pragma once
 
-#include "telephony/simulation/Journey.h"
 #include "telephony/simulation/Random.h"
+#include "telephony/simulation/Time.h"
 
 namespace kelvo::simulation {
 

@@ -41,11 +41,11 @@ double toMilliwatts(double dBm) { return std::pow(10, dBm / 10); }
 
 double toDecibels(double ratio) { return 10 * std::log10(ratio); }
 
-double linkCapacity(double bandwidth, double signalToRest) {
-    return kAttenuation * bandwidth * std::log2(1 + toMilliwatts(signalToRest));
+double linkCapacity(double bandwidth, double sinr) {
+    return kAttenuation * bandwidth * std::log2(1 + toMilliwatts(sinr));
 }
 
-double neededRatio(double bandwidth, double capacity) {
+double neededSinr(double bandwidth, double capacity) {
     return toDecibels(std::exp2(capacity / (kAttenuation * bandwidth)) - 1);
 }
 

@@ -37,10 +37,10 @@ double rayleighFading(Random& random);
 double toMilliwatts(double dBm);
 double toDecibels(double ratio);
 
-/// What a link carries at a signal-to-interference ratio in dB: 0.6 of what Shannon allows (3GPP TR 36.942, annex A.1),
-/// per second in bits for a bandwidth in Hz.
-double linkCapacity(double bandwidth, double signalToRest);
-/// The ratio that a link needs to carry that much: the other way about.
-double neededRatio(double bandwidth, double capacity);
+/// What a link carries at this SINR (signal to interference and noise) in dB: 0.6 of what Shannon allows (3GPP
+/// TR 36.942, annex A.1), per second in bits for a bandwidth in Hz.
+double linkCapacity(double bandwidth, double sinr);
+/// The SINR in dB that a link needs to carry that much.
+double neededSinr(double bandwidth, double capacity);
 
 }  // namespace kelvo::simulation

@@ -19,7 +19,7 @@ std::uint64_t modemTime(Time time) {
 
 }  // namespace
 
-RecordWriter::RecordWriter(std::uint32_t code, Time time, std::size_t length)
+RecordWriter::RecordWriter(Time time, std::uint32_t code, std::size_t length)
     : _bytes(kPrefix + std::max(length, kHeader)) {
     _bytes[0] = kPrefixMark;
     u8(0, code >= kExtended ? 255 : 1).u16(3, code).put(5, modemTime(time), 8);
@@ -43,8 +43,8 @@ Bytes RecordWriter::finish() const {
     return std::move(whole._bytes);
 }
 
-Bytes propertyListRecord(std::uint32_t code, Time time, const Value& payload) {
-    RecordWriter record(code, time);
+Bytes propertyListRecord(Time time, std::uint32_t code, const Value& payload) {
+    RecordWriter record(time, code);
     if (const auto encoded = writeXmlPropertyList(payload)) record.bytes(RecordWriter::kHeader, *encoded);
     return record.finish();
 }

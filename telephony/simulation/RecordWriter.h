@@ -4,7 +4,7 @@
 
 #include "platform/values/Bytes.h"
 #include "platform/values/Value.h"
-#include "telephony/simulation/Journey.h"
+#include "telephony/simulation/Time.h"
 
 namespace kelvo::simulation {
 
@@ -15,7 +15,7 @@ class RecordWriter {
 public:
     /// A record of `length` bytes, header included, taken at `time`. `code` is 16 bits wide, or 0xff0000 and more for
     /// an extended record (log type 255).
-    RecordWriter(std::uint32_t code, Time time, std::size_t length = kHeader);
+    RecordWriter(Time time, std::uint32_t code, std::size_t length = kHeader);
 
     static constexpr std::size_t kHeader = 13;
 
@@ -39,6 +39,6 @@ private:
 };
 
 /// An extended record whose payload is `payload` as a property list.
-Bytes propertyListRecord(std::uint32_t code, Time time, const Value& payload);
+Bytes propertyListRecord(Time time, std::uint32_t code, const Value& payload);
 
 }  // namespace kelvo::simulation

@@ -5,11 +5,11 @@
 
 #include "platform/telephony/Technology.h"
 #include "platform/values/Bytes.h"
-#include "telephony/simulation/Journey.h"
+#include "telephony/simulation/Time.h"
 
 namespace kelvo::simulation {
 
-/// A modem that never was: its phone drives through a town without end, and it writes the log that a modem would.
+/// A simulated modem: its phone drives through a town without end, and it writes the log that a modem would.
 /// The same seed gives the same messages at the same times, byte for byte.
 class Simulation {
 public:
@@ -35,7 +35,7 @@ protected:
 
     Time now() const { return _now; }
     /// True once in each `period`, a whole number of steps, at `phase` into it.
-    bool isDue(Time period, Time phase = Time(0)) const { return _now % period == phase; }
+    bool every(Time period, Time phase = Time(0)) const { return _now % period == phase; }
     void emit(Bytes message) { _waiting.push_back({_now, std::move(message)}); }
 
     /// Moves the world on to now() and emits what the modem reports of it.

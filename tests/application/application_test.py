@@ -36,16 +36,20 @@ class ApplicationTest(unittest.TestCase):
     def test_a_day_in_its_life(self):
         self.waits_for_a_service()
         service = self.session.start_service()
-        application, window = self.session.start_application()
+        why_no_saving = self.session.why_no_saving()
+        application, window = self.session.start_application(internal=not why_no_saving)
         self.shows_the_drive(window)
         self.follows_the_desktops_colours(window)
         self.survives_the_service(window, service)
-        self.saves_a_snapshot(window)
+        if why_no_saving:
+            print(f"left out: saving a snapshot in the whole application ({why_no_saving})")
+        else:
+            self.saves_a_snapshot(window)
         self.quits(window, application)
 
     def waits_for_a_service(self):
         application, window = self.session.start_application(internal=False)
-        window.wait("Waiting for the modem")
+        window.wait("No telephony service is running")
         window.wait(lambda text: text.startswith("Connecting"))
         self.assertIsNone(window.find("Save"))
         application.terminate()

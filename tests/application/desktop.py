@@ -1,7 +1,6 @@
 """A desktop of its own for programs under test: an X server without a screen, a session bus with the portal that tells
 the colour scheme, and eyes and hands: what a window shows is read as a screen reader reads it, and typed and clicked
-into as a person does. Nothing of the user's session is touched. Needs the packages of the groups "internal"
-and "window"."""
+into as a person does. Nothing of the user's session is touched. Needs the packages of the group "window"."""
 import os
 import shutil
 import subprocess
@@ -14,7 +13,7 @@ from jeepney import DBusAddress, HeaderFields, MessageType, new_error, new_metho
 from jeepney.bus_messages import message_bus
 from jeepney.io.blocking import open_dbus_connection
 
-PROGRAMS = ("Xvfb", "dbus-daemon", "/usr/libexec/at-spi-bus-launcher", "xdotool", "import", "bwrap")
+PROGRAMS = ("Xvfb", "dbus-daemon", "/usr/libexec/at-spi-bus-launcher", "xdotool", "import")
 PATIENCE = 30  # seconds; every wait ends as soon as its condition holds
 
 

@@ -1,4 +1,6 @@
-"""The telephony service and the application, whole, on a desktop of their own."""
+"""The telephony service and the application, whole, on a desktop of their own. Saving needs the package of the group
+"internal" and a system that lets it make a view of the file system."""
+import subprocess
 from pathlib import Path
 
 from desktop import Desktop, Window, wait_for
@@ -38,6 +40,14 @@ class Session:
         view = self._internal_view() if internal else []
         application = self.desktop.start(*view, self._programs / "kelvo")
         return application, Window(self.desktop, self._size)
+
+    def why_no_saving(self):
+        """Why the application cannot be started as on an internal installation here; None when it can."""
+        try:
+            tried = subprocess.run([*self._internal_view(), "true"], capture_output=True, text=True, check=False)
+        except FileNotFoundError:
+            return "bwrap is not installed"
+        return None if tried.returncode == 0 else (tried.stderr.strip() or "bwrap fails").splitlines()[-1]
 
     def _internal_view(self):
         """A view of the file system with the marker that permits saving, and with a place for snapshots."""

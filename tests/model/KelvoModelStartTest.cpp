@@ -233,6 +233,31 @@ TEST_F(KelvoModelStart, RetriesWhenTheStartCommandCannotBeSent) {
     EXPECT_EQ(std::count(texts.begin(), texts.end(), "Starting the display update timer"), 0);
 }
 
+/// Encodes every message but those that have `key`.
+auto encodesAllBut(const char* key) {
+    return [key](const Value& message) -> Result<Bytes> {
+        if (message.dictionary()->find(key) != nullptr) return Failure{"not today"};
+        return writeXmlPropertyList(message);
+    };
+}
+
+TEST_F(KelvoModelStart, RetriesWhenTheQueryCannotBeEncoded) {
+    ports.onRequest = test::speaking(kLte);
+    encode = encodesAllBut("GetTechnology");
+    EXPECT_EQ(errorsOfFailedStart(), (Texts{" ***** Created ports (send=%p, recv=%p)",
+                                            " Could not generate GetTechnology command; cannot configure",
+                                            "No log generator technology works"}));
+    EXPECT_TRUE(ports.sent.empty());
+}
+
+TEST_F(KelvoModelStart, RetriesWhenTheStartCommandCannotBeEncoded) {
+    ports.onRequest = test::speaking(kLte);
+    encode = encodesAllBut("SetState");
+    const Texts texts = errorsOfFailedStart();
+    EXPECT_EQ(texts.back(), " Could not generate PLIST");
+    EXPECT_EQ(ports.sent.size(), queries());  // the query alone, at each try
+}
+
 TEST_F(KelvoModelStart, RetriesWithoutLimitAndWithoutBackingOff) {
     telephony.reachable = false;
     model->restartMonitor();

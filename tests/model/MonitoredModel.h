@@ -73,10 +73,13 @@ protected:
     }
 
     std::unique_ptr<KelvoModel> newModel() {
-        return std::make_unique<KelvoModel>(KelvoModel::Services{
-            .queue = queue, .ports = ports, .telephony = telephony, .updateViewControllerFromModel = [this] {
-                ++updates;
-            }});
+        return std::make_unique<KelvoModel>(
+            KelvoModel::Services{.queue = queue,
+                                 .ports = ports,
+                                 .telephony = telephony,
+                                 .updateViewControllerFromModel = [this] { ++updates; },
+                                 .connectionChanged = [this] { told.push_back(connectionText(model->connection())); },
+                                 .encode = encode});
     }
 
     /// The program's standard output.
@@ -111,6 +114,8 @@ protected:
     Environment::Scope environment{
         {.log = &log, .clock = &clock, .resources = &resources, .standardOutput = output.file()}};
     int updates = 0;  // of the screens
+    std::function<Result<Bytes>(const Value&)> encode = writeXmlPropertyList;
+    Texts told;  // what was to be said of the connection each time it changed
     std::unique_ptr<KelvoModel> model = newModel();
 };
 

@@ -53,7 +53,7 @@ public:
         _now = end;
     }
 
-    nanoseconds now() const { return _now; }
+    nanoseconds now() const override { return _now; }
 
 private:
     struct Timer final : RepeatingTimer {

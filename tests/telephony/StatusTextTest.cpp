@@ -11,6 +11,8 @@ TEST(StatusText, ListsCodesAndClients) {
          {"Records", 1234},
          {"Codes", Array::make({Dictionary::make({{"Records", 3}, {"PerSecond", 0.04}}),
                                 Dictionary::make({{"Code", 0x5134}, {"Records", 1200}, {"PerSecond", 19.96}}),
+                                Dictionary::make({{"Code", 0x5B34}, {"Records", 2}, {"PerSecond", 0.1}}),
+                                Dictionary::make({{"Code", 0x1234}, {"Records", 5}, {"PerSecond", 0.2}}),
                                 Dictionary::make({{"Code", 0xFF0001}, {"Records", 31}, {"PerSecond", 0.5}})})},
          {"Clients",
           Array::make(
@@ -23,10 +25,12 @@ TEST(StatusText, ListsCodesAndClients) {
               "Technology  GSM\n"
               "Records     1234\n"
               "\n"
-              "  Log code   per second        in all\n"
-              "  none              0.0             3\n"
-              "  0x5134           20.0          1200\n"
-              "  0xff0001          0.5            31\n"
+              "  Log code                                       per second        in all\n"
+              "  none                                                  0.0             3\n"
+              "  0x5134  GSM serving cell                             20.0          1200\n"
+              "  0x5b34  GSM serving cell, dual SIM                    0.1             2\n"
+              "  0x1234                                                0.2             5\n"
+              "  0xff0001  Cell information                            0.5            31\n"
               "\n"
               "Clients\n"
               "  window: streaming, 1200 delivered, 30 waiting, 4 dropped\n"

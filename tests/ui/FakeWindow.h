@@ -31,10 +31,12 @@ class FakePreferences final : public Preferences {
 public:
     explicit FakePreferences(Events& events) : _events(events) {}
 
+    bool writable = true;
+
     bool set(std::string_view domain, std::string_view key, const Value& value) override {
         const std::string text = value.boolean() == nullptr ? "?" : *value.boolean() ? "true" : "false";
         _events.push_back("set " + std::string(domain) + " " + std::string(key) + " " + text);
-        return true;
+        return writable;
     }
     void broadcastChange(std::string_view domain, std::string_view key) override {
         _events.push_back("broadcast " + std::string(domain) + " " + std::string(key));

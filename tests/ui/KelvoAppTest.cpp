@@ -117,6 +117,16 @@ TEST_F(App, TerminatesInItsOrder) {
     EXPECT_EQ(world.ports.openLocals(), 0U);
 }
 
+TEST_F(App, TellsOfThePreferenceAlsoWhenItCouldNotBeWritten) {
+    launch();
+    world.events.clear();
+    world.preferences.writable = false;
+    app->applicationWillTerminate();
+    ASSERT_GE(world.events.size(), 2U);
+    EXPECT_EQ(world.events[0], "set com.zorvik.dockmere DMShowGSMRSSI false");
+    EXPECT_EQ(world.events[1], "broadcast com.zorvik.dockmere DMShowGSMRSSI");
+}
+
 TEST_F(App, TerminatesOnce) {
     launch();
     app->applicationWillTerminate();

@@ -3,6 +3,7 @@
 #include <vector>
 
 #include "telephony/simulation/GSMUMTS/Air.h"
+#include "telephony/simulation/HeldFor.h"
 
 namespace kelvo::simulation::gsm {
 

@@ -2,6 +2,7 @@
 
 #include <vector>
 
+#include "telephony/simulation/Drive.h"
 #include "telephony/simulation/GSMUMTS/Network.h"
 
 namespace kelvo::simulation::gsm {

@@ -3,6 +3,7 @@
 #include <optional>
 
 #include "telephony/simulation/GSMUMTS/Network.h"
+#include "telephony/simulation/Time.h"
 
 namespace kelvo::simulation::gsm {
 

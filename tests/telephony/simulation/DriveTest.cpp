@@ -2,7 +2,8 @@
 
 #include <cmath>
 
-#include "telephony/simulation/Town.h"
+#include "telephony/simulation/Drive.h"
+#include "telephony/simulation/HeldFor.h"
 
 using namespace kelvo::simulation;
 using namespace std::chrono_literals;
@@ -101,7 +102,7 @@ TEST(RayleighFading, HasTheMeanPowerOfOne) {
 TEST(LinkCapacity, IsThreeFifthsOfShannonsBound) {
     EXPECT_DOUBLE_EQ(linkCapacity(1000, 0), 600);                     // log2 of 2
     EXPECT_NEAR(linkCapacity(1000, 10 * std::log10(3)), 1200, 1e-9);  // log2 of 4
-    EXPECT_NEAR(neededRatio(1000, 1200), 10 * std::log10(3), 1e-9);
+    EXPECT_NEAR(neededSinr(1000, 1200), 10 * std::log10(3), 1e-9);
 }
 
 TEST(Town, HasThreeSectorsASiteOneThirdOfATurnApart) {

@@ -21,13 +21,13 @@ Value payloadOf(const Bytes& record, std::uint8_t code) {
 }  // namespace
 
 TEST(SimFilesRecord, HoldsTheFilesUnderTheirNamesAndNoEmptyOne) {
-    const Value payload = payloadOf(simFilesRecord({.iccid = "8900101", .oplmnAct = "00F110C080"}, 1s), 0);
+    const Value payload = payloadOf(simFilesRecord(1s, {.iccid = "8900101", .oplmnAct = "00F110C080"}), 0);
     const Value expected = Dictionary::make({{"kSimFile_ICCID", "8900101"}, {"kSimFile_OPLMNAcT", "00F110C080"}});
     EXPECT_EQ(payload, expected);
 }
 
 TEST(SimFilesRecord, HoldsAllFourteenFilesOfTheTestNetwork) {
-    const Value payload = payloadOf(simFilesRecord(testNetworkSim(0x1234, 0x0A), 1s), 0);
+    const Value payload = payloadOf(simFilesRecord(1s, testNetworkSim(0x1234, 0x0A)), 0);
     const auto& files = payload.dictionary();
     ASSERT_TRUE(files);
     for (const char* name : {"ICCID", "MSISDN", "MBDN", "HPPLMN", "LOCI", "PSLOCI", "ACC", "AD", "FPLMN", "AHPLMN",
@@ -40,7 +40,7 @@ TEST(SimFilesRecord, HoldsAllFourteenFilesOfTheTestNetwork) {
 }
 
 TEST(SimFilesRecord, SaysNotUpdatedAndNoAreaOfASimThatIsRegisteredNowhere) {
-    const Value payload = payloadOf(simFilesRecord(testNetworkSim(), 1s), 0);
+    const Value payload = payloadOf(simFilesRecord(1s, testNetworkSim()), 0);
     const auto& files = payload.dictionary();
     ASSERT_TRUE(files);
     EXPECT_EQ((*files)["kSimFile_LOCI"], Value("3A9C41D700F110FFFEFF01"));
@@ -54,7 +54,7 @@ TEST(CellInformationRecord, GivesEachCellOnlyTheKeysItHas) {
         {.technology = GSM, .arfcn = 62, .rssi = -50},
         {.technology = UTRAN2, .lac = 9, .scn = 100, .bandInfo = 1, .rscp = MonitoredCell::kNoValue, .ecn0 = -7},
     };
-    const Value payload = payloadOf(cellInformationRecord(cells, 1s), 1);
+    const Value payload = payloadOf(cellInformationRecord(1s, cells), 1);
     const Value expected = Array::make({
         Dictionary::make({
             {"kPLCellMonitorCellRadioAccessTechnology", "kPLCellMonitorRadioAccessTechnologyLTE"},
@@ -86,7 +86,7 @@ TEST(CellInformationRecord, GivesEachCellOnlyTheKeysItHas) {
 TEST(CellInformationRecord, NamesNetworkAreaAndUmtsCells) {
     const MonitoredCell cells[] = {
         {.technology = MonitoredCell::Technology::UMTS, .isServing = true, .mcc = 1, .mnc = 1, .lac = 4096}};
-    const Value payload = payloadOf(cellInformationRecord(cells, 1s), 1);
+    const Value payload = payloadOf(cellInformationRecord(1s, cells), 1);
     const Value expected = Array::make({Dictionary::make({
         {"kPLCellMonitorCellRadioAccessTechnology", "kPLCellMonitorRadioAccessTechnologyUMTS"},
         {"kPLCellMonitorCellType", "kPLCellMonitorCellTypeServing"},
@@ -100,7 +100,7 @@ TEST(CellInformationRecord, NamesNetworkAreaAndUmtsCells) {
 TEST(PdpContextsRecord, WordsEveryValueAsTextForTheScreen) {
     const PdpContext contexts[] = {{.apn = "internet", .type = "IPv4", .state = "Active", .address = "10.1.2.3"},
                                    {.id = 6, .apn = "mms"}};
-    const Value payload = payloadOf(pdpContextsRecord(contexts, 1s), 2);
+    const Value payload = payloadOf(pdpContextsRecord(1s, contexts), 2);
     const Value expected = Array::make({
         Dictionary::make({{"Context ID", "5"},
                           {"APN", "internet"},
@@ -113,5 +113,5 @@ TEST(PdpContextsRecord, WordsEveryValueAsTextForTheScreen) {
 }
 
 TEST(PdpContextsRecord, HoldsAnEmptyArrayWhenThereAreNone) {
-    EXPECT_EQ(payloadOf(pdpContextsRecord({}, 1s), 2), Value(Array::make()));
+    EXPECT_EQ(payloadOf(pdpContextsRecord(1s, {}), 2), Value(Array::make()));
 }

@@ -1,9 +1,10 @@
 #include <gtest/gtest.h>
 
+#include "telephony/simulation/GSMUMTS/Records.h"
 #include "telephony/simulation/GSMUMTS/Registration.h"
-#include "telephony/simulation/GSMUMTS/UmtsRecords.h"
 
 using namespace kelvo;
+using namespace kelvo::simulation;
 using namespace kelvo::simulation::gsm;
 using namespace std::chrono_literals;
 
@@ -85,9 +86,9 @@ TEST(Registration, SuspendsPacketDataDuringACallInGsmOnly) {
 }
 
 TEST(SearcherRecord, TellsTheSetOfEachCellAboveThirteenBitsOfItsCode) {
-    const SearchedCell cells[] = {{.scramblingCode = 0x1ab, .set = CellSet::Active, .ecNo = 0},
-                                  {.scramblingCode = 0x0cd, .set = CellSet::VirtualActive, .ecNo = -10}};
-    const Bytes message = searcherRecord(-70, cells, 0s);
+    const SearchedCell cells[] = {{.scramblingCode = Psc(0x1ab), .set = CellSet::Active, .ecNo = 0},
+                                  {.scramblingCode = Psc(0x0cd), .set = CellSet::VirtualActive, .ecNo = -10}};
+    const Bytes message = searcherRecord(0s, -70, cells);
     const ByteView record = ByteView(message).subspan(2);
     ASSERT_EQ(record.size(), 16U + 2 * 15 + 2 * 44);
     EXPECT_EQ(record[13] | record[14] << 8, (-70 + 106) * 10 - 512 + 0x10000);
@@ -102,7 +103,7 @@ TEST(SearcherRecord, TellsTheSetOfEachCellAboveThirteenBitsOfItsCode) {
 
 TEST(TransmitPowerRecord, TellsAPowerThatLooksLikeOffAsItsNeighbor) {
     const std::optional<double> slots[] = {-18.8, std::nullopt};
-    const Bytes message = transmitPowerRecord(slots, 0s);
+    const Bytes message = transmitPowerRecord(0s, slots);
     EXPECT_EQ(message[2 + 14], 2);
     EXPECT_EQ(message[2 + 16 + 4], 1);
     EXPECT_EQ(message[2 + 30 + 4], 0);

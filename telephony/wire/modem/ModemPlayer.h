@@ -1,0 +1,49 @@
+#pragma once
+
+#include <functional>
+#include <memory>
+#include <optional>
+
+#include "platform/system/MainQueue.h"
+#include "telephony/SteadyTime.h"
+#include "telephony/wire/modem/ModemPort.h"
+#include "telephony/wire/modem/PlayedModem.h"
+
+namespace kelvo::modem {
+
+/// Plays a modem at a port: carries bytes between them, in time, and takes the port away while the modem is unplugged.
+/// Main queue only.
+class ModemPlayer {
+public:
+    /// `queue` outlives the player. `onPlace` hears where the port is each time that it appears.
+    ModemPlayer(std::unique_ptr<PlayedModem> modem, std::unique_ptr<ModemPort> port, MainQueue& queue, SteadyTime now,
+                std::function<void(const std::string& place)> onPlace);
+    ~ModemPlayer() { *_alive = false; }
+    ModemPlayer(const ModemPlayer&) = delete;
+    ModemPlayer& operator=(const ModemPlayer&) = delete;
+
+    /// Plugs the modem in; the reason when its port cannot be made.
+    std::optional<Failure> start();
+    /// Pulls the plug, or puts it back.
+    void togglePlug();
+
+    const Tally& tally() const { return _modem->tally(); }
+
+private:
+    using nanoseconds = std::chrono::nanoseconds;
+
+    std::optional<Failure> followPlug();
+    void pump();
+    void pumpAt(nanoseconds time);
+
+    const std::unique_ptr<PlayedModem> _modem;
+    const std::unique_ptr<ModemPort> _port;
+    MainQueue& _queue;
+    const SteadyTime _now;
+    const std::function<void(const std::string&)> _onPlace;
+    bool _portIsThere = false;
+    std::optional<nanoseconds> _nextPump;
+    std::shared_ptr<bool> _alive = std::make_shared<bool>(true);  // tasks on the queue outlive the player
+};
+
+}  // namespace kelvo::modem

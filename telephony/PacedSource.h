@@ -6,10 +6,10 @@
 
 #include "platform/system/Lifetime.h"
 #include "platform/system/MainQueue.h"
+#include "platform/system/SteadyTime.h"
 #include "telephony/RecordSource.h"
 #include "telephony/RecordStream.h"
 #include "telephony/Recording.h"
-#include "telephony/SteadyTime.h"
 
 namespace kelvo {
 

@@ -28,15 +28,4 @@ struct Snapshot {
     static std::string pathInDirectory(std::string_view directory, Clock::TimePoint now);
 };
 
-/// Whose files may be written over.
-enum class WriteOver {
-    Any,      ///< whatever the user names: links, devices and pipes too
-    OwnFile,  ///< a plain file of this user, where others may have put something: anything else fails and stays as it
-              ///< is
-};
-
-/// Writes `bytes` to `path` in place, over what was there. A new file is for this user alone (mode 0600). The error
-/// names the reason; a file that could not be written to its end is removed, so that none passes for whole.
-std::optional<Failure> writeFileInPlace(const std::string& path, ByteView bytes, WriteOver over = WriteOver::Any);
-
 }  // namespace kelvo

@@ -3,8 +3,6 @@
 #include <algorithm>
 #include <utility>
 
-#include "platform/system/Environment.h"
-
 namespace kelvo {
 namespace {
 
@@ -32,11 +30,10 @@ void PacedSource::feed() {
 
 void PacedSource::pumpAfter(nanoseconds delay) {
     _waiting = true;
-    const auto run = [this, alive = _alive] {
-        if (!*alive) return;
+    const auto run = _lifetime.whileAlive([this] {
         _waiting = false;
         pump();
-    };
+    });
     if (delay > 0ns) {
         _queue.postAfter(delay, run);
     } else {
@@ -66,21 +63,13 @@ bool PacedSource::readNext() {
 
 void PacedSource::give() {
     if (_sink->take(_next->bytes)) {
-        record(*_next);
+        if (_recording) _recording->append(technology(), *_next);
         _refused = 0;
     } else if (++_refused == kRefusedBeforeRest) {
         _refused = 0;
         if (!_speed) _due = _now() + 1s;  // a client that wants none of it stays hungry: no reason to spin
     }
     _next.reset();
-}
-
-void PacedSource::record(const CapturePacket& packet) {
-    if (!_recording) return;
-    if (const auto failure = _recording->append(packet.time, packet.bytes)) {
-        logLine(Level::Error, "The recording ends here: %s", failure->reason);
-        _recording.reset();
-    }
 }
 
 nanoseconds PacedSource::scaled(nanoseconds interval) const {

@@ -4,10 +4,12 @@
 #include <memory>
 #include <optional>
 
+#include "platform/system/Lifetime.h"
 #include "platform/system/MainQueue.h"
+#include "platform/system/SteadyTime.h"
 #include "telephony/RecordSource.h"
 #include "telephony/RecordStream.h"
-#include "telephony/SteadyTime.h"
+#include "telephony/Recording.h"
 
 namespace kelvo {
 
@@ -20,11 +22,9 @@ public:
 
     /// `queue` outlives the source.
     PacedSource(std::unique_ptr<RecordStream> stream, Speed speed, MainQueue& queue, SteadyTime now);
-    ~PacedSource() override { *_alive = false; }
 
-    /// Writes every record that a client takes to `recording`, with its time in the stream. A failure (a full disk) is
-    /// told in one line, ends the recording and leaves the streaming alone.
-    void recordTo(CaptureWriter recording) { _recording = std::move(recording); }
+    /// Writes every record that a client takes to `recording` as well, with its time in the stream.
+    void recordTo(Recording recording) { _recording = std::move(recording); }
 
     Technology technology() const override { return _stream->technology(); }
     std::string description() const override { return _stream->description(); }
@@ -38,21 +38,20 @@ private:
     void pump();
     bool readNext();
     void give();
-    void record(const CapturePacket& packet);
     nanoseconds scaled(nanoseconds interval) const;
 
     const std::unique_ptr<RecordStream> _stream;
     const Speed _speed;
     MainQueue& _queue;
     const SteadyTime _now;
-    std::optional<CaptureWriter> _recording;
+    std::optional<Recording> _recording;
     RecordSink* _sink = nullptr;
-    std::optional<CapturePacket> _next;                           // read and not yet given
-    std::optional<CaptureTime> _last;                             // the time of the packet read last
-    nanoseconds _due{0};                                          // of _next, and before that of the packet before
-    int _refused = 0;                                             // in a row
-    bool _waiting = false;                                        // pump() is on the queue
-    std::shared_ptr<bool> _alive = std::make_shared<bool>(true);  // tasks on the queue outlive the source
+    std::optional<CapturePacket> _next;  // read and not yet given
+    std::optional<CaptureTime> _last;    // the time of the packet read last
+    nanoseconds _due{0};                 // of _next, and before that of the packet before
+    int _refused = 0;                    // in a row
+    bool _waiting = false;               // pump() is on the queue
+    const Lifetime _lifetime;            // tasks on the queue outlive the source
 };
 
 }  // namespace kelvo

@@ -17,6 +17,7 @@ struct ServiceOptions {
     std::uint64_t seed = 1;
     PacedSource::Speed speed = 1.0;
     std::filesystem::path record;  ///< empty: nothing is recorded
+    bool force = false;            ///< a file that is there gives way to the recording
 };
 
 /// Options to work with, or the status to exit with at once.

@@ -43,14 +43,14 @@ int serve(const ServiceOptions& options) {
     auto stream = openStream(options);
     if (!stream) return fail(stream.error());
     PacedSource source(std::move(stream).value(), options.speed, queue, steadyNow);
+    if (!options.record.empty()) {
+        auto file = OutputFile::create(options.record, {.replace = options.force, .beingRead = {options.replay}});
+        if (!file) return fail(file.error());
+        source.recordTo(Recording(std::move(file).value()));
+    }
     const UnixSignals handler({SIGINT, SIGTERM, SIGHUP}, [](int) { QCoreApplication::quit(); });
     TelephonyService service(ports, source);
-    if (const auto failure = service.open()) return fail(*failure);
-    if (!options.record.empty()) {
-        auto recording = CaptureWriter::create(options.record, source.technology());
-        if (!recording) return fail(recording.error());
-        source.recordTo(std::move(recording).value());
-    }
+    if (const auto opened = service.open(); !opened) return fail(opened.error());
     logLine(Level::Notice, "Serving %s, the log of a modem that speaks %s", source.description(),
             namesOf(source.technology()).name);
     return HostEventLoop::run(QCoreApplication::exec);

@@ -22,6 +22,11 @@ T orFail(Result<T> result) {
     return std::move(result).value();
 }
 
+/// The same for what gives nothing.
+inline void orFail(const Result<void>& result) {
+    if (!result) throw CommandFailure(result.error());
+}
+
 /// What the exception being handled says of itself, or its type's name when it says nothing. Only in a catch block.
 std::string currentExceptionText();
 

@@ -2,16 +2,21 @@
 
 #include <fmt/format.h>
 
+#include <cstdio>
 #include <memory>
 #include <optional>
+#include <utility>
 
-#include "LogGenerator/LogGenerator.h"
+#include "LogGenerator/Factory.h"
 #include "model/Snapshot.h"
 #include "platform/host/Capture.h"
 #include "platform/system/Environment.h"
+#include "platform/system/OutputFile.h"
 #include "tools/CommandFailure.h"
 #include "tools/DisplayJson.h"
 #include "tools/DisplayText.h"
+#include "tools/FamilyCodes.h"
+#include "tools/NumberOption.h"
 #include "tools/StandardOutput.h"
 #include "tools/TechnologyOption.h"
 
@@ -22,10 +27,11 @@ namespace {
 struct Options {
     std::string file;
     std::optional<Technology> technology;
-    std::size_t refreshEvery = 0;  ///< messages; 0: at the end alone
+    std::optional<std::uint64_t> refreshEvery;  ///< messages; none: at the end alone
     std::optional<std::string> save;
     bool log = false;
     bool json = false;
+    bool force = false;
 };
 
 /// Keeps every line in order.
@@ -58,7 +64,9 @@ private:
 
 struct Decoded {
     std::size_t messages = 0;
+    std::size_t understood = 0;  ///< of them: records of the family
     Value display;
+    std::optional<Failure> breakOff;  ///< where the capture can be read no further, and why
 };
 
 Technology technologyOf(const Options& options, const CaptureReader& reader) {
@@ -79,16 +87,26 @@ void orTell(const Options& options, std::size_t packet, Work work) {
 }
 
 Decoded decodeAll(const Options& options, CaptureReader& reader, LogGenerator& generator, Dictionary& state) {
+    const FamilyCodes codes(*generator.getStartCommand());
     Decoded decoded;
-    while (const auto packet = orFail(reader.next())) {
-        ++decoded.messages;
-        orTell(options, decoded.messages, [&] {
-            generator.updateState(state, packet->bytes);
-            if (options.refreshEvery != 0 && decoded.messages % options.refreshEvery == 0) {
-                generator.generateLogUsingState(state);
-            }
-        });
+    while (!decoded.breakOff) {
+        const auto packet = reader.next();
+        if (!packet) {
+            decoded.breakOff = packet.error();
+        } else if (!*packet) {
+            break;
+        } else {
+            ++decoded.messages;
+            decoded.understood += codes.include((*packet)->bytes) ? 1 : 0;
+            orTell(options, decoded.messages, [&] {
+                generator.updateState(state, (*packet)->bytes);
+                if (options.refreshEvery && decoded.messages % *options.refreshEvery == 0) {
+                    generator.generateLogUsingState(state);
+                }
+            });
+        }
     }
+    if (decoded.breakOff && decoded.messages == 0) throw CommandFailure(*decoded.breakOff);
     orTell(options, decoded.messages, [&] { decoded.display = generator.generateLogUsingState(state); });
     if (decoded.messages != 0 && !decoded.display) {
         throw CommandFailure("the display's template cannot be loaded; the installation is not complete");
@@ -96,27 +114,48 @@ Decoded decodeAll(const Options& options, CaptureReader& reader, LogGenerator& g
     return decoded;
 }
 
-void save(const std::string& path, LogGenerator& generator, Dictionary& state) {
+void save(OutputFile& file, LogGenerator& generator, Dictionary& state) {
     const Snapshot snapshot{clock().now(), generator.getSaveContentsFromState(state), std::string()};
-    const Bytes bytes = orFail(snapshot.propertyList());
-    const auto failure = writeFileInPlace(path, bytes);
-    if (failure) throw CommandFailure(path + " cannot be written: " + failure->reason);
+    orFail(file.write(orFail(snapshot.propertyList())));
+    orFail(file.appear());
+}
+
+std::string grouped(std::size_t number) {
+    std::string text = std::to_string(number);
+    for (std::size_t at = text.size(); at > 3; at -= 3) text.insert(at - 3, 1, ',');
+    return text;
+}
+
+/// Screens of another family than the capture's are empty or, worse, look right.
+void warnOfOtherFamily(const Options& options, const Decoded& decoded, const CaptureReader& reader) {
+    const bool named = options.technology && reader.technology() && *options.technology != *reader.technology();
+    if (decoded.messages == 0 || (decoded.understood != 0 && !named)) return;
+    std::string line = fmt::format(
+        "{} of {} record{} {} of this family", decoded.understood != 0 ? grouped(decoded.understood) : "none",
+        grouped(decoded.messages), decoded.messages != 1 ? "s" : "", decoded.understood > 1 ? "are" : "is");
+    if (named) {
+        line += fmt::format("; the link type says {}, not {}", namesOf(*reader.technology()).name,
+                            namesOf(*options.technology).name);
+    }
+    fmt::print(stderr, "kelvoctl: {}: {}\n", printable(options.file), line);
 }
 
 void decode(const Options& options) {
     CaptureReader reader = orFail(CaptureReader::open(options.file));
     const TechnologyNames& names = namesOf(technologyOf(options, reader));
+    std::optional<OutputFile> output;
+    if (options.save) output = orFail(OutputFile::create(*options.save, {options.force, {options.file}}));
 
     CollectedLog log;
     Environment environment = Environment::current();
     environment.log = options.log ? &log : nullptr;
     const Environment::Scope scope(environment);
 
-    const auto generator = LogGenerator::generatorFromTechnology(names.identifier);
+    const auto generator = generatorFromTechnology(names.identifier);
     if (!generator) throw CommandFailure(fmt::format("no generator decodes {}", names.name));
     const DictionaryRef state = Dictionary::make();
     const Decoded decoded = decodeAll(options, reader, *generator, *state);
-    if (options.save) save(*options.save, *generator, *state);
+    if (output) save(*output, *generator, *state);
 
     if (options.json) {
         nlohmann::ordered_json json = {
@@ -126,13 +165,8 @@ void decode(const Options& options) {
     } else {
         writeToStandardOutput(log.text() + displayText(decoded.display));
     }
-}
-
-/// What is wrong with a count; nothing when it is one.
-std::string countFromOne(const std::string& text) {
-    const bool digits = text.find_first_not_of("0123456789") == text.npos;
-    const bool positive = text.find_first_not_of('0') != text.npos;
-    return digits && positive ? "" : text + " is not a whole number from 1";
+    warnOfOtherFamily(options, decoded, reader);
+    if (decoded.breakOff) throw CommandFailure(*decoded.breakOff);
 }
 
 }  // namespace
@@ -142,17 +176,19 @@ void addDecodeCommand(CLI::App& app) {
     const auto options = std::make_shared<Options>();
     command.add_option("FILE", options->file, "A classic pcap file, one log message a packet")->required();
     addTechnologyOption(command, options->technology, "Decodes as this technology, whatever the link type says");
-    command
-        .add_option("--refresh-every", options->refreshEvery,
-                    "Rebuilds the display, and so records a snapshot, after every N messages too")
-        ->type_name("N")
-        ->check(countFromOne);
-    command.add_option("--save", options->save, "Writes the snapshot that the save screen would write")
-        ->type_name("OUT.kelvo");
+    addNumberOption(command, "--refresh-every", options->refreshEvery, 1,
+                    "Rebuilds the display, and so records a snapshot, after every N messages too");
+    CLI::Option* save =
+        command.add_option("--save", options->save, "Writes the snapshot that the save screen would write")
+            ->type_name("OUT.kelvo");
+    command.add_flag("--force", options->force, "Replaces a file that is there already")->needs(save);
     command.add_flag("--log", options->log, "Shows the system log's lines as well, before the display");
     command.add_flag("--json", options->json,
                      "Prints one JSON object: technology, messages, display and, with --log, log");
     command.footer(
+        "Of a capture that breaks off, the good part is shown; then one line tells where it ends, and the status is "
+        "1.\n"
+        "A warning on standard error tells when the records are of another family.\n\n"
         "Examples:\n"
         "  kelvoctl decode drive.pcap\n"
         "  kelvoctl decode --json drive.pcap | jq .display\n"

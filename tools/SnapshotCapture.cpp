@@ -5,6 +5,7 @@
 #include <ctime>
 #include <limits>
 #include <optional>
+#include <utility>
 
 #include "platform/encodings/PropertyList.h"
 #include "platform/host/Capture.h"
@@ -54,24 +55,25 @@ std::vector<Bytes> messagesOf(const SnapshotFile::Entry& entry, bool asTree, con
 
 }  // namespace
 
-std::size_t writeSnapshotCapture(const SnapshotFile& snapshot, Technology technology, const std::string& path,
+std::size_t writeSnapshotCapture(const SnapshotFile& snapshot, Technology technology, OutputFile file,
                                  std::vector<std::string>& odd) {
     std::optional<CaptureWriter> writer;
     std::size_t total = 0;
     CaptureTime end{};
     for (std::size_t i = 0; i < snapshot.entries.size(); ++i) {
         const SnapshotFile::Entry& entry = snapshot.entries[i];
-        const auto messages = messagesOf(entry, technology == Technology::IFX, fmt::format("entry {}", i + 1), odd);
+        const auto messages = messagesOf(entry, !hasCodes(technology), fmt::format("entry {}", i + 1), odd);
         end = std::max(end + kRefresh, timeOf(entry).value_or(CaptureTime()));
         for (std::size_t m = 0; m < messages.size(); ++m) {
-            if (!writer) writer.emplace(orFail(CaptureWriter::create(path, technology)));
+            if (!writer) writer.emplace(orFail(CaptureWriter::create(std::move(file), technology)));
             const std::chrono::nanoseconds before =
                 std::chrono::nanoseconds(kRefresh) * (messages.size() - m) / static_cast<long>(messages.size());
-            if (const auto failure = writer->append(end - before, messages[m])) throw CommandFailure(*failure);
+            orFail(writer->append(end - before, messages[m]));
             ++total;
         }
     }
     if (total == 0) throw CommandFailure("the snapshot holds no raw records");
+    orFail(writer->appear());
     return total;
 }
 

@@ -4,6 +4,7 @@
 #include <string>
 #include <vector>
 
+#include "platform/system/OutputFile.h"
 #include "platform/telephony/Technology.h"
 #include "tools/SnapshotFile.h"
 
@@ -13,7 +14,7 @@ namespace kelvo {
 /// messages it holds. The snapshot keeps no times of its messages: those of one entry are spread evenly over the two
 /// seconds, one refresh, before the entry's date. Records that cannot be told apart are told in `odd`.
 /// Throws CommandFailure when there is no message at all or the file cannot be written.
-std::size_t writeSnapshotCapture(const SnapshotFile& snapshot, Technology technology, const std::string& path,
+std::size_t writeSnapshotCapture(const SnapshotFile& snapshot, Technology technology, OutputFile file,
                                  std::vector<std::string>& odd);
 
 }  // namespace kelvo

@@ -4,11 +4,13 @@
 
 #include <cstdio>
 #include <memory>
+#include <utility>
 
-#include "model/Snapshot.h"
+#include "platform/system/OutputFile.h"
 #include "tools/CommandFailure.h"
 #include "tools/DisplayJson.h"
 #include "tools/DisplayText.h"
+#include "tools/NumberOption.h"
 #include "tools/SnapshotCapture.h"
 #include "tools/SnapshotFile.h"
 #include "tools/StandardOutput.h"
@@ -20,12 +22,15 @@ namespace {
 
 struct Options {
     std::string file;
-    std::optional<std::size_t> entry;  ///< from 1
+    std::optional<std::uint64_t> entry;  ///< from 1
     std::optional<std::string> dlf;
     std::optional<std::string> capture;
     std::optional<Technology> technology;
     bool json = false;
+    bool force = false;
 };
+
+OutputTerms outputTerms(const Options& options) { return {options.force, {options.file}}; }
 
 std::string sizeText(const SnapshotFile::Entry& entry) {
     const Bytes* data = entry.dlf ? entry.dlf.data() : entry.displayState.data();
@@ -47,8 +52,8 @@ std::string listing(const SnapshotFile& snapshot) {
 }
 
 std::string entryDisplay(const SnapshotFile& snapshot, const Options& options) {
-    const std::size_t number = *options.entry;
-    if (number == 0 || number > snapshot.entries.size()) {
+    const std::uint64_t number = *options.entry;
+    if (number > snapshot.entries.size()) {
         throw CommandFailure(
             fmt::format("{} has {} entries, and no entry {}", options.file, snapshot.entries.size(), number));
     }
@@ -61,9 +66,7 @@ std::string extractDlf(const SnapshotFile& snapshot, const Options& options) {
     for (const SnapshotFile::Entry& entry : snapshot.entries) {
         const Bytes* dlf = entry.dlf.data();
         if (dlf == nullptr) continue;
-        if (const auto failure = writeFileInPlace(*options.dlf, *dlf)) {
-            throw CommandFailure(*options.dlf + " cannot be written: " + failure->reason);
-        }
+        orFail(writeFile(*options.dlf, *dlf, outputTerms(options)));
         return fmt::format("{} bytes written to {}\n", dlf->size(), *options.dlf);
     }
     throw CommandFailure(options.file + " holds no DLF");
@@ -81,8 +84,8 @@ void showSnapshot(const Options& options) {
     if (options.entry) text += entryDisplay(snapshot, options);
     if (options.dlf) text += extractDlf(snapshot, options);
     if (options.capture) {
-        const std::size_t messages =
-            writeSnapshotCapture(snapshot, *options.technology, *options.capture, snapshot.odd);
+        OutputFile file = orFail(OutputFile::create(*options.capture, outputTerms(options)));
+        const std::size_t messages = writeSnapshotCapture(snapshot, *options.technology, std::move(file), snapshot.odd);
         text += fmt::format("{} messages written to {}\n", messages, *options.capture);
     }
     if (text.empty()) text = listing(snapshot);
@@ -98,8 +101,7 @@ void addSnapshotCommand(CLI::App& app) {
     const auto options = std::make_shared<Options>();
     command.add_option("FILE", options->file, "A snapshot file, KelvoSnapshot-….kelvo")->required();
     CLI::Option* entry =
-        command.add_option("--entry", options->entry, "Shows the display of entry N as the screens were")
-            ->type_name("N");
+        addNumberOption(command, "--entry", options->entry, 1, "Shows the display of entry N as the screens were");
     command.add_flag("--json", options->json, "Shows that display as JSON")->needs(entry);
     command.add_option("--dlf", options->dlf, "Writes the DLF log to OUT")->type_name("OUT");
     CLI::Option* capture =
@@ -109,6 +111,7 @@ void addSnapshotCommand(CLI::App& app) {
                                                   "The technology of the raw records, which the file does not say");
     capture->needs(technology);
     technology->needs(capture);
+    command.add_flag("--force", options->force, "Replaces a file that is there already");
     command.footer(
         "A snapshot keeps the last five refreshes; a capture made of it replays what arrived in that time.\n\n"
         "Examples:\n"

@@ -9,6 +9,7 @@
 #include "tools/CommandFailure.h"
 #include "tools/DecodeCommand.h"
 #include "tools/DisplayText.h"
+#include "tools/DoctorCommand.h"
 #include "tools/SnapshotCommand.h"
 #include "tools/StartCommandCommand.h"
 #include "tools/WatchCommand.h"
@@ -38,11 +39,13 @@ int main(int argc, char** argv) {
 
     CLI::App app("Kelvo in the terminal: the screens of a phone's radio, of captures and of snapshots.", "kelvoctl");
     app.require_subcommand(1);
+    app.set_version_flag("--version", "kelvoctl " KELVO_VERSION);
     app.footer("\"kelvoctl COMMAND --help\" tells more about a command.");
     kelvo::addDecodeCommand(app);
     kelvo::addWatchCommand(app);
     kelvo::addSnapshotCommand(app);
     kelvo::addStartCommandCommand(app);
+    kelvo::addDoctorCommand(app);
     try {
         app.parse(argc, argv);
         return 0;

@@ -5,6 +5,7 @@
 
 #include "model/Snapshot.h"
 #include "platform/system/Environment.h"
+#include "platform/system/WriteFileInPlace.h"
 #include "ui/ScreenHost.h"
 
 namespace kelvo {
@@ -33,16 +34,18 @@ void KelvoSaveViewController::writeSnapshot() {
     const auto written = std::make_shared<bool>(false);
     const auto write = [written, path, snapshot = Snapshot{_timeStamp, _saveHistory, _saveDescription}] {
         const Result<Bytes> bytes = snapshot.propertyList();
-        *written = bytes && !writeFileInPlace(path, *bytes, WriteOver::OwnFile);
+        *written = bytes && writeFileInPlace(path, *bytes);
     };
-    const auto finish = [written, path, services = _services, alive = std::weak_ptr(_alive)] {
-        if (!*written) logLine(Level::Error, "Unable to write snapshot to %s", path);
-        if (alive.expired()) return;  // the program has ended over it
+    const auto leave = _lifetime.whileAlive([written, services = _services] {
         if (!*written) {
             services.host.showAlert(QStringLiteral("File Error"), QStringLiteral("Unable to write file to disk"),
                                     QStringLiteral("Close"));
         }
         close(services);
+    });
+    const auto finish = [written, path, leave] {
+        if (!*written) logLine(Level::Error, "Unable to write snapshot to %s", path);
+        leave();  // unless the program has ended meanwhile
     };
     _services.worker.run(write, finish);
 }

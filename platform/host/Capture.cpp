@@ -1,12 +1,12 @@
 #include "platform/host/Capture.h"
 
-#include <fcntl.h>
 #include <fmt/format.h>
 #include <pcap/pcap.h>
 #include <unistd.h>
 
 #include <array>
 #include <cerrno>
+#include <cstdio>
 #include <system_error>
 
 #include "platform/system/MessagePorts.h"
@@ -75,26 +75,24 @@ Result<std::optional<CapturePacket>> CaptureReader::next() {
 
 void CaptureWriter::DumperCloser::operator()(pcap_dumper* dumper) const { pcap_dump_close(dumper); }
 
-Result<CaptureWriter> CaptureWriter::create(const std::filesystem::path& path, Technology technology) {
-    std::string name = path.string();
-    const int fd = ::open(name.c_str(), O_WRONLY | O_CREAT | O_TRUNC | O_CLOEXEC, S_IRUSR | S_IWUSR);
-    std::FILE* file = fd < 0 ? nullptr : ::fdopen(fd, "wb");
-    if (file == nullptr) return Failure{fmt::format("{} cannot be created: {}", name, errorText(errno))};
-    std::setvbuf(file, nullptr, _IONBF, 0);  // a full disk shows at the packet that no longer fits, not at the end
+Result<CaptureWriter> CaptureWriter::create(OutputFile file, Technology technology) {
+    const auto stream = file.stream();
+    if (!stream) return stream.error();
+    std::setvbuf(*stream, nullptr, _IONBF, 0);  // a full disk shows at the packet that no longer fits, not at the end
     detail::PcapHandle handle(pcap_open_dead(namesOf(technology).linkType, static_cast<int>(kMaxMessageSize)));
-    std::unique_ptr<pcap_dumper, DumperCloser> dumper(pcap_dump_fopen(handle.get(), file));
-    if (!dumper) {  // the header did not fit; libpcap has closed the file
-        return Failure{fmt::format("{} cannot be written: {}", name, pcap_geterr(handle.get()))};
+    std::unique_ptr<pcap_dumper, DumperCloser> dumper(pcap_dump_fopen(handle.get(), *stream));
+    if (!dumper) {  // the header did not fit; libpcap has closed the stream
+        return Failure{fmt::format("{} cannot be written: {}", file.path(), pcap_geterr(handle.get()))};
     }
-    CaptureWriter writer(std::move(name), std::move(handle), std::move(dumper));
-    if (const auto failure = writer.flush()) return *failure;
+    CaptureWriter writer(std::move(file), std::move(handle), std::move(dumper));
+    if (const auto flushed = writer.flush(); !flushed) return flushed.error();
     return writer;
 }
 
-std::optional<Failure> CaptureWriter::append(CaptureTime time, ByteView bytes) {
+Result<void> CaptureWriter::append(CaptureTime time, ByteView bytes) {
     if (bytes.size() > kMaxMessageSize) {
         return Failure{
-            fmt::format("{} takes messages of at most {} bytes, not {}", _name, kMaxMessageSize, bytes.size())};
+            fmt::format("{} takes messages of at most {} bytes, not {}", _file.path(), kMaxMessageSize, bytes.size())};
     }
     const auto seconds = std::chrono::floor<std::chrono::seconds>(time);
     pcap_pkthdr header{};
@@ -105,13 +103,13 @@ std::optional<Failure> CaptureWriter::append(CaptureTime time, ByteView bytes) {
     return flush();
 }
 
-std::optional<Failure> CaptureWriter::flush() {
+Result<void> CaptureWriter::flush() {
     std::FILE* file = pcap_dump_file(_dumper.get());
     if (std::ferror(file) == 0) {
         _length = std::ftell(file);
-        return std::nullopt;
+        return {};
     }
-    Failure failure{fmt::format("{} cannot be written: {}", _name, errorText(errno))};
+    Failure failure{fmt::format("{} cannot be written: {}", _file.path(), errorText(errno))};
     // A packet that only half fits would make the whole file end in an error, so its beginning goes again. What cannot
     // be cut, a pipe or a device, stays as it is.
     std::clearerr(file);

@@ -1,11 +1,11 @@
 #pragma once
 
 #include <chrono>
-#include <cstdio>
 #include <filesystem>
 #include <memory>
 #include <optional>
 
+#include "platform/system/OutputFile.h"
 #include "platform/telephony/Technology.h"
 #include "platform/values/Bytes.h"
 #include "platform/values/Result.h"
@@ -59,24 +59,26 @@ private:
 /// Moves, never copies. Any thread, one at a time. A failure's reason names the file.
 class CaptureWriter {
 public:
-    /// Creates the file, for this user alone (mode 0600), or empties the one that is there, and writes its header.
-    static Result<CaptureWriter> create(const std::filesystem::path& path, Technology technology);
+    /// Begins the capture in `file` with its header.
+    static Result<CaptureWriter> create(OutputFile file, Technology technology);
     CaptureWriter(CaptureWriter&&) noexcept = default;
     CaptureWriter& operator=(CaptureWriter&&) noexcept = default;
 
-    /// Appends one packet; it has reached the file when this returns none. On a failure (a full disk, a message longer
-    /// than any the service delivers) the file keeps the packets before it, whole.
-    std::optional<Failure> append(CaptureTime time, ByteView bytes);
+    /// Appends one packet; it has reached the file when this succeeds. On a failure (a full disk, a message longer than
+    /// any the service delivers) the file keeps the packets before it, whole.
+    Result<void> append(CaptureTime time, ByteView bytes);
+    /// Gives the file its name, when it is whole or as early as others may read along.
+    Result<void> appear() { return _file.appear(); }
 
 private:
     struct DumperCloser {
         void operator()(pcap_dumper* dumper) const;
     };
-    CaptureWriter(std::string name, detail::PcapHandle handle, std::unique_ptr<pcap_dumper, DumperCloser> dumper)
-        : _name(std::move(name)), _handle(std::move(handle)), _dumper(std::move(dumper)) {}
-    std::optional<Failure> flush();
+    CaptureWriter(OutputFile file, detail::PcapHandle handle, std::unique_ptr<pcap_dumper, DumperCloser> dumper)
+        : _file(std::move(file)), _handle(std::move(handle)), _dumper(std::move(dumper)) {}
+    Result<void> flush();
 
-    std::string _name;
+    OutputFile _file;
     detail::PcapHandle _handle;
     std::unique_ptr<pcap_dumper, DumperCloser> _dumper;
     long _length = 0;  // of the file, up to the end of its last whole packet

@@ -2,6 +2,10 @@
 
 #include "platform/host/Capture.h"
 
+#include <fmt/format.h>
+#include <unistd.h>
+
+#include <string>
 #include <vector>
 
 #include "platform/system/MessagePorts.h"
@@ -30,10 +34,15 @@ std::vector<Bytes> readAll(const std::string& path) {
 extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size) {
     const std::vector<Bytes> packets = readAll(fuzz::InMemoryFile({data, size}).path());
     if (packets.empty()) return 0;
-    const fuzz::InMemoryFile copy{ByteView()};
-    auto writer = CaptureWriter::create(copy.path(), Technology::LTE);
+    const std::string copy = fmt::format("/dev/shm/kelvo-capture-fuzz.{}", ::getpid());  // never reaches a disk
+    auto writer = CaptureWriter::create(OutputFile::create(copy).value(), Technology::LTE);
     fuzz::require(static_cast<bool>(writer), "no copy can be made");
-    for (const Bytes& packet : packets) fuzz::require(!writer->append({}, packet), "a packet cannot be written");
-    fuzz::require(readAll(copy.path()) == packets, "what was written reads back as something else");
+    for (const Bytes& packet : packets) {
+        fuzz::require(static_cast<bool>(writer->append({}, packet)), "a packet cannot be written");
+    }
+    fuzz::require(static_cast<bool>(writer->appear()), "the copy does not appear");
+    const bool same = readAll(copy) == packets;
+    ::unlink(copy.c_str());
+    fuzz::require(same, "what was written reads back as something else");
     return 0;
 }

@@ -6,9 +6,9 @@
 #include <algorithm>
 
 #include "platform/encodings/PropertyList.h"
-#include "platform/host/Capture.h"
 #include "platform/host/HostMessagePorts.h"
 #include "platform/host/HostTelephonyClient.h"
+#include "tests/support/CaptureFile.h"
 #include "tests/support/EventLoop.h"
 #include "tests/support/TemporaryDirectory.h"
 
@@ -44,9 +44,9 @@ struct Client {
 class DaemonTest : public testing::Test {
 protected:
     void SetUp() override {
-        auto writer = CaptureWriter::create(_capture, Technology::IFX);
+        CaptureWriter writer = test::captureAt(_capture, Technology::IFX);
         for (int i = 0; i < 3; ++i)
-            ASSERT_FALSE(writer->append(CaptureTime(std::chrono::hours(i)), bytesOf("tree " + std::to_string(i))));
+            ASSERT_TRUE(writer.append(CaptureTime(std::chrono::hours(i)), bytesOf("tree " + std::to_string(i))));
     }
     static void prepare(QProcess& process, const std::filesystem::path& runtime) {
         QProcessEnvironment environment = QProcessEnvironment::systemEnvironment();
@@ -128,6 +128,30 @@ TEST_F(DaemonTest, RecordsWhatItStreams) {
     EXPECT_EQ(records, client.records);
 }
 
+TEST_F(DaemonTest, RecordsOverNothingUnlessForcedAndNeverOverWhatItReplays) {
+    const QString capture = QString::fromStdString(_capture);
+    const std::string before = test::contentsOf(_capture);
+    const std::filesystem::path link = _temporary.path() / "again.pcap";
+    std::filesystem::create_hard_link(_capture, link);
+    const QString earlier = QString::fromStdString(_temporary.write("earlier.pcap", bytesOf("earlier")));
+    using Failed = std::pair<int, std::string>;
+    EXPECT_EQ(run({"--replay", capture, "--record", capture, "--force"}),
+              Failed(1, "kelvo-telephonyd: " + _capture.string() + " is the file being read\n"));
+    EXPECT_EQ(run({"--replay", capture, "--record", QString::fromStdString(link), "--force"}),
+              Failed(1, "kelvo-telephonyd: " + link.string() + " is the file being read\n"));
+    EXPECT_EQ(run({"--replay", capture, "--record", earlier}),
+              Failed(1, "kelvo-telephonyd: " + earlier.toStdString() + " exists already; --force replaces it\n"));
+    EXPECT_EQ(test::contentsOf(_capture), before);
+
+    startDaemon({"--replay", capture, "--speed", "max", "--record", earlier, "--force"});
+    EXPECT_EQ(test::contentsOf(earlier.toStdString()), "earlier");  // it stays until there is something to record
+    Client client(_ports, *_connection);
+    client.stream();
+    ASSERT_TRUE(runUntil([&] { return client.records.size() == 3; }));
+    stopDaemon();
+    EXPECT_EQ(test::contentsOf(earlier.toStdString()).size(), before.size());  // the same packets, an hour less apart
+}
+
 TEST_F(DaemonTest, EndsCleanlyOnAnInterrupt) {
     startDaemon();
     ::kill(static_cast<pid_t>(_daemon.processId()), SIGINT);
@@ -182,7 +206,7 @@ TEST_F(DaemonTest, SaysInOneLineWhatIsWrongWithItsCommandLine) {
           QStringList{"--simulate", "lte", "--loop"}, QStringList{"--simulate", "lte", "--seed", "-1"},
           QStringList{"--simulate", "lte", "--record", "/nowhere/at.all"}, QStringList{"--status"},
           QStringList{"--status", "--record", "x"}, QStringList{"--status", "--simulate", "lte"},
-          QStringList{"--replay", "/proc/self/mem"}}) {
+          QStringList{"--simulate", "lte", "--force"}, QStringList{"--replay", "/proc/self/mem"}}) {
         const auto [status, error] = run(arguments);
         EXPECT_EQ(status, 1);
         EXPECT_EQ(std::count(error.begin(), error.end(), '\n'), 1) << error;
@@ -190,10 +214,31 @@ TEST_F(DaemonTest, SaysInOneLineWhatIsWrongWithItsCommandLine) {
     }
 }
 
+TEST_F(DaemonTest, SaysPlainlyWhatIsWrongWithASeed) {
+    const std::pair<const char*, const char*> wrong[] = {
+        {"-1", "-1 is not a whole number from 0"},
+        {"abc", "abc is not a whole number from 0"},
+        {"18446744073709551616", "18446744073709551616 is too large; the largest number is 18446744073709551615"},
+    };
+    for (const auto& [seed, reason] : wrong) {
+        const auto [status, error] = run({"--simulate", "lte", "--seed", seed});
+        EXPECT_EQ(status, 1);
+        EXPECT_EQ(error, std::string("kelvo-telephonyd: --seed: ") + reason + "\n");
+    }
+}
+
+TEST_F(DaemonTest, TellsItsVersion) {
+    const auto [status, error] = run({"--version"});
+    EXPECT_EQ(status, 0);
+    EXPECT_EQ(error, "");
+    EXPECT_EQ(_output, "kelvo-telephonyd " KELVO_VERSION "\n");
+}
+
 TEST_F(DaemonTest, HelpsOnStandardOutput) {
     const auto [status, error] = run({"--help"});
     EXPECT_EQ(status, 0);
     EXPECT_EQ(error, "");
-    for (const char* word : {"--replay", "--loop", "--speed", "--simulate", "--seed", "--record", "--status"})
+    for (const char* word :
+         {"--replay", "--loop", "--speed", "--simulate", "--seed", "--record", "--force", "--status", "--version"})
         EXPECT_NE(_output.find(word), std::string::npos);
 }

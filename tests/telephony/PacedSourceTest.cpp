@@ -8,6 +8,7 @@
 
 #include "platform/system/Environment.h"
 #include "telephony/CaptureStream.h"
+#include "tests/support/CaptureFile.h"
 #include "tests/support/EventLoop.h"
 #include "tests/support/FileSizeLimit.h"
 #include "tests/support/ManualQueue.h"
@@ -47,11 +48,10 @@ class PacedSourceTest : public testing::Test {
 protected:
     // A capture of packets "a", "b", … taken at these times (milliseconds from some day on).
     void capture(const std::vector<int>& times, Technology technology = Technology::LTE) {
-        auto writer = CaptureWriter::create(_path, technology);
-        ASSERT_TRUE(writer);
+        CaptureWriter writer = test::captureAt(_path, technology);
         std::string text = "a";
         for (const int ms : times) {
-            ASSERT_FALSE(writer->append(CaptureTime(1'600'000'000s + std::chrono::milliseconds(ms)), bytesOf(text)));
+            ASSERT_TRUE(writer.append(CaptureTime(1'600'000'000s + std::chrono::milliseconds(ms)), bytesOf(text)));
             ++text[0];
         }
     }
@@ -252,6 +252,8 @@ TEST_F(PacedSourceTest, LeavesNothingOnTheQueueThatOutlivesIt) {
 namespace {
 
 // Everything that a capture holds, as "time in milliseconds since its first packet, text".
+Recording recordingAt(const std::filesystem::path& path) { return Recording(OutputFile::create(path).value()); }
+
 Notes readCapture(const std::filesystem::path& path) {
     auto reader = CaptureReader::open(path);
     Notes notes;
@@ -269,7 +271,7 @@ TEST_F(PacedSourceTest, RecordsWhatAClientTakesWithItsTimeInTheStream) {
     capture({0, 100, 400});
     const auto recorded = _temporary.path() / "recorded.pcap";
     open({.loop = true, .speed = 10.0});
-    _source->recordTo(CaptureWriter::create(recorded, Technology::LTE).value());
+    _source->recordTo(recordingAt(recorded));
     _source->start(_sink);
     _queue.advance(25ms);
     _sink.wanted = false;
@@ -284,7 +286,7 @@ TEST_F(PacedSourceTest, StreamsOnWhenTheRecordingFails) {
     capture({0, 100, 200});
     const auto recorded = _temporary.path() / "recorded.pcap";
     open();
-    _source->recordTo(CaptureWriter::create(recorded, Technology::LTE).value());
+    _source->recordTo(recordingAt(recorded));
     {
         const test::FileSizeLimit full(24 + 16 + 1 + 10);  // the file's header and one packet, not two
         _source->start(_sink);
@@ -295,4 +297,32 @@ TEST_F(PacedSourceTest, StreamsOnWhenTheRecordingFails) {
     ASSERT_EQ(_log.lines().size(), 1U);
     EXPECT_EQ(_log.lines()[0].second,
               "The recording ends here: " + recorded.string() + " cannot be written: File too large");
+}
+
+TEST_F(PacedSourceTest, ARecordingAppearsWithItsFirstRecord) {
+    capture({100, 200});
+    const auto recorded = _temporary.path() / "recorded.pcap";
+    open();
+    _source->recordTo(recordingAt(recorded));
+    _sink.wanted = false;
+    _source->start(_sink);
+    _queue.run();
+    EXPECT_FALSE(std::filesystem::exists(recorded));
+    _sink.wanted = true;
+    _queue.advance(100ms);
+    EXPECT_EQ(readCapture(recorded), Notes{"0b"});
+}
+
+TEST_F(PacedSourceTest, ARecordingLeavesAFileAloneThatCameMeanwhile) {
+    capture({0, 100});
+    const std::string recorded = _temporary.file("recorded.pcap");
+    open();
+    _source->recordTo(recordingAt(recorded));
+    _temporary.write("recorded.pcap", bytesOf("somebody else's"));
+    _source->start(_sink);
+    _queue.advance(1s);
+    EXPECT_EQ(_sink.notes, (Notes{"0a", "100b"}));
+    EXPECT_EQ(test::contentsOf(recorded), "somebody else's");
+    ASSERT_EQ(_log.lines().size(), 1U);
+    EXPECT_EQ(_log.lines()[0].second, "The recording ends here: " + recorded + " exists already; --force replaces it");
 }

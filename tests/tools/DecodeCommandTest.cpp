@@ -105,15 +105,54 @@ TEST_F(DecodeCommand, SaysInOneLineWhyAFileCannotBeRead) {
     expectFailure(kelvoctl({"decode", text}), text + " is not a pcap file: unknown file format");
 }
 
-TEST_F(DecodeCommand, ATruncatedCaptureEndsInAFailureAndNoHalfAnswer) {
-    std::string bytes = contentsOf(capture(Technology::LTE, {servingCell(1), servingCell(2)}));
+TEST_F(DecodeCommand, ShowsTheGoodPartOfATruncatedCaptureAndTellsWhereItBreaksOff) {
+    std::string bytes = contentsOf(capture(Technology::LTE, {servingCell(1), servingCell(2), servingCell(3)}));
     bytes.resize(bytes.size() - 5);
     const std::string file = directory.write("cut.pcap", bytesOf(bytes));
-    const Finished done = kelvoctl({"decode", "--json", file});
+    const Finished done = kelvoctl({"decode", "--json", "--save", path("out.kelvo"), file});
+    EXPECT_EQ(done.status, 1);
+    const auto shown = nlohmann::ordered_json::parse(done.output, nullptr, false);
+    ASSERT_FALSE(shown.is_discarded()) << done.output;
+    EXPECT_EQ(shown["messages"], 2);
+    EXPECT_EQ(shown["display"]["Serving Cell Info"]["Physical Cell ID"], "2");
+    EXPECT_EQ(done.errors.find("kelvoctl: " + file + " cannot be read at packet 3: "), 0U);
+    EXPECT_EQ(std::count(done.errors.begin(), done.errors.end(), '\n'), 1);
+    EXPECT_TRUE(std::filesystem::exists(path("out.kelvo")));
+}
+
+TEST_F(DecodeCommand, ShowsNothingOfACaptureWithoutAGoodPacket) {
+    std::string bytes = contentsOf(capture(Technology::LTE, {servingCell(1)}));
+    bytes.pop_back();
+    const std::string file = directory.write("cut.pcap", bytesOf(bytes));
+    const Finished done = kelvoctl({"decode", file});
     EXPECT_EQ(done.status, 1);
     EXPECT_EQ(done.output, "");
-    EXPECT_EQ(done.errors.find("kelvoctl: " + file + " cannot be read at packet 2: "), 0U);
-    EXPECT_EQ(std::count(done.errors.begin(), done.errors.end(), '\n'), 1);
+    EXPECT_EQ(done.errors.find("kelvoctl: " + file + " cannot be read at packet 1: "), 0U);
+}
+
+TEST_F(DecodeCommand, WarnsWhenNoRecordIsOfTheFamily) {
+    const std::string file = capture(Technology::LTE, std::vector<Bytes>(1498, test::Record(0x1234, 20).bytes()));
+    const Finished done = kelvoctl({"decode", file});
+    EXPECT_EQ(done.status, 0);
+    EXPECT_NE(done.output.find("Serving Cell Info\n"), std::string::npos);
+    EXPECT_EQ(done.errors, "kelvoctl: " + file + ": none of 1,498 records is of this family\n");
+}
+
+TEST_F(DecodeCommand, WarnsWhenTheNamedTechnologyIsNotTheLinkTypes) {
+    const auto errors = [this](std::vector<Bytes> messages, const char* technology) {
+        const Finished done = kelvoctl({"decode", "--technology", technology, capture(Technology::LTE, messages)});
+        EXPECT_EQ(done.status, 0);
+        return done.errors;
+    };
+    const std::string start = "kelvoctl: " + path("in.pcap") + ": ";
+    EXPECT_EQ(errors({servingCell(1)}, "lte"), "");
+    EXPECT_EQ(errors({}, "gsm"), "");
+    EXPECT_EQ(errors({servingCell(1)}, "gsm"),
+              start + "none of 1 record is of this family; the link type says LTE, not GSM\n");
+    const Bytes gsm = test::Record(0x5134, 30).bytes();
+    const Bytes ofNoKind = {2, 30, 0, 0x34, 0x51, 0, 0, 0, 0, 0, 0, 0, 0, 0};  // log type 2: nobody takes it
+    EXPECT_EQ(errors({servingCell(1), gsm, ofNoKind}, "gsm"),
+              start + "1 of 3 records is of this family; the link type says LTE, not GSM\n");
 }
 
 TEST_F(DecodeCommand, TellsWhichRecordEndsTheProgramAndWhy) {
@@ -135,7 +174,7 @@ TEST_F(DecodeCommand, RefusesWhatItDoesNotKnow) {
     expectFailure(kelvoctl({"decode", "--fast", file}),
                   "The following argument was not expected: --fast (kelvoctl --help tells what there is)");
     expectFailure(kelvoctl({"decode"}), "FILE is required (kelvoctl --help tells what there is)");
-    for (const char* count : {"0", "1.5", "many"}) {
+    for (const char* count : {"0", "1.5", "many", "-1"}) {
         expectFailure(kelvoctl({"decode", "--refresh-every", count, file}),
                       std::string("--refresh-every: ") + count +
                           " is not a whole number from 1 (kelvoctl --help tells what there is)");
@@ -145,7 +184,7 @@ TEST_F(DecodeCommand, RefusesWhatItDoesNotKnow) {
 TEST_F(DecodeCommand, RebuildsAtTheEndOnlyUnlessAsked) {
     const std::string file = capture(Technology::LTE, {servingCell(1), servingCell(2), servingCell(3), servingCell(4)});
     const auto entries = [&](std::vector<std::string> options) {
-        options.insert(options.begin(), {"decode", "--save", path("out.kelvo"), file});
+        options.insert(options.begin(), {"decode", "--save", path("out.kelvo"), "--force", file});
         EXPECT_EQ(kelvoctl(options).status, 0);
         const std::string bytes = contentsOf(path("out.kelvo"));
         return (*readPropertyList(bytesOf(bytes))->dictionary())["Data"].array()->size() - 1;  // less the DLF
@@ -179,6 +218,23 @@ TEST_F(DecodeCommand, SaysWhyASnapshotCannotBeSaved) {
     expectFailure(done, path("none/out") + " cannot be written: No such file or directory");
 }
 
+TEST_F(DecodeCommand, ReplacesNoSnapshotUnlessForcedAndNeverTheCapture) {
+    const std::string file = capture(Technology::LTE, {servingCell(1)});
+    const std::string before = contentsOf(file);
+    const std::string earlier = directory.write("out.kelvo", bytesOf("earlier"));
+    expectFailure(kelvoctl({"decode", "--save", earlier, file}), earlier + " exists already; --force replaces it");
+    EXPECT_EQ(contentsOf(earlier), "earlier");
+    EXPECT_EQ(kelvoctl({"decode", "--save", earlier, "--force", file}).status, 0);
+    EXPECT_EQ(contentsOf(earlier).find("<?xml"), 0U);
+
+    std::filesystem::create_hard_link(file, path("again.pcap"));
+    expectFailure(kelvoctl({"decode", "--save", path("again.pcap"), "--force", file}),
+                  path("again.pcap") + " is the file being read");
+    EXPECT_EQ(contentsOf(file), before);
+    expectFailure(kelvoctl({"decode", "--force", file}),
+                  "--force requires --save (kelvoctl --help tells what there is)");
+}
+
 TEST_F(DecodeCommand, PrintsTheStartCommand) {
     const Finished done = kelvoctl({"start-command", "--technology", "lte"});
     EXPECT_EQ(done.status, 0);
@@ -188,6 +244,13 @@ TEST_F(DecodeCommand, PrintsTheStartCommand) {
     const Array& codes = *(*command->dictionary())["SetOskraLogCodes"].array();
     EXPECT_EQ(std::count(codes.begin(), codes.end(), Value(0xB0C2)), 1);
     EXPECT_TRUE((*command->dictionary())["SetPlExtraCodes"].array());
+}
+
+TEST_F(DecodeCommand, TellsItsVersion) {
+    const Finished done = kelvoctl({"--version"});
+    EXPECT_EQ(done.status, 0);
+    EXPECT_EQ(done.output, "kelvoctl " KELVO_VERSION "\n");
+    EXPECT_EQ(done.errors, "");
 }
 
 TEST_F(DecodeCommand, HelpTellsOfEveryCommandOnStandardOutput) {

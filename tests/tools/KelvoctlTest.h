@@ -4,7 +4,7 @@
 
 #include <nlohmann/json.hpp>
 
-#include "platform/host/Capture.h"
+#include "tests/support/CaptureFile.h"
 #include "tests/support/Record.h"
 #include "tests/support/RunProgram.h"
 
@@ -16,10 +16,9 @@ struct KelvoctlTest : testing::Test {
 
     /// Writes a capture of these messages, a second apart, and says where it lies.
     std::string capture(Technology technology, const std::vector<Bytes>& messages) {
-        auto writer = CaptureWriter::create(path("in.pcap"), technology);
+        CaptureWriter writer = captureAt(path("in.pcap"), technology);
         for (std::size_t i = 0; i < messages.size(); ++i) {
-            const auto failure = writer->append(CaptureTime(std::chrono::seconds(i)), messages[i]);
-            EXPECT_FALSE(failure);
+            EXPECT_TRUE(writer.append(CaptureTime(std::chrono::seconds(i)), messages[i]));
         }
         return path("in.pcap");
     }

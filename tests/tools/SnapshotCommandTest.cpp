@@ -18,7 +18,8 @@ struct SnapshotCommand : KelvoctlTest {
     }
     /// The snapshot of a capture, saved by the program itself.
     std::string saved(const std::vector<Bytes>& messages) {
-        kelvoctl({"decode", "--refresh-every", "2", "--save", path("saved.kelvo"), capture(Technology::LTE, messages)});
+        kelvoctl({"decode", "--refresh-every", "2", "--save", path("saved.kelvo"), "--force",
+                  capture(Technology::LTE, messages)});
         return path("saved.kelvo");
     }
 };
@@ -53,8 +54,12 @@ TEST_F(SnapshotCommand, ShowsAnEntryAsTreeAndAsJson) {
 TEST_F(SnapshotCommand, RefusesAnEntryThatIsNotThere) {
     const std::string file = saved({servingCell(1)});
     expectFailure(kelvoctl({"snapshot", file, "--entry", "3"}), file + " has 2 entries, and no entry 3");
-    expectFailure(kelvoctl({"snapshot", file, "--entry", "0"}), file + " has 2 entries, and no entry 0");
     expectFailure(kelvoctl({"snapshot", file, "--entry", "2"}), "entry 2 of " + file + " holds no display");
+    for (const char* entry : {"0", "-1", "two"}) {
+        expectFailure(
+            kelvoctl({"snapshot", file, "--entry", entry}),
+            std::string("--entry: ") + entry + " is not a whole number from 1 (kelvoctl --help tells what there is)");
+    }
 }
 
 TEST_F(SnapshotCommand, ExtractsTheDlf) {
@@ -64,6 +69,28 @@ TEST_F(SnapshotCommand, ExtractsTheDlf) {
     ASSERT_EQ(dlf.size(), 161U + 37);
     EXPECT_EQ(dlf.substr(0, 4), std::string("\xa1\x00\xfd\x1f", 4));    // 161 bytes, 0x1ffd
     EXPECT_EQ(dlf.substr(161, 4), std::string("\x25\x00\xc2\xb0", 4));  // 37 bytes, 0xB0C2
+}
+
+TEST_F(SnapshotCommand, ReplacesNoFileUnlessForcedAndNeverTheSnapshot) {
+    const std::string file = saved({servingCell(1)});
+    const std::string before = contentsOf(file);
+    for (const std::vector<std::string>& output :
+         {std::vector<std::string>{"--dlf"}, {"--technology", "lte", "--capture"}}) {
+        const auto write = [&](const std::string& to, bool force) {
+            std::vector<std::string> arguments{"snapshot", file};
+            if (force) arguments.push_back("--force");
+            arguments.insert(arguments.end(), output.begin(), output.end());
+            arguments.push_back(to);
+            return kelvoctl(arguments);
+        };
+        const std::string earlier = directory.write("earlier", bytesOf("earlier"));
+        expectFailure(write(earlier, false), earlier + " exists already; --force replaces it");
+        EXPECT_EQ(contentsOf(earlier), "earlier");
+        EXPECT_EQ(write(earlier, true).status, 0);
+        EXPECT_NE(contentsOf(earlier), "earlier");
+        expectFailure(write(file, true), file + " is the file being read");
+        EXPECT_EQ(contentsOf(file), before);
+    }
 }
 
 TEST_F(SnapshotCommand, SaysWhenThereIsNoDlf) {

@@ -6,6 +6,7 @@
 #include <filesystem>
 
 #include "platform/system/MessagePorts.h"
+#include "tests/support/CaptureFile.h"
 #include "tests/support/FileSizeLimit.h"
 #include "tests/support/TemporaryDirectory.h"
 
@@ -169,10 +170,11 @@ TEST_F(Capture, ALyingPacketLengthFails) {
 
 TEST_F(Capture, WritesAFileByteForByte) {
     {
-        auto writer = CaptureWriter::create(path(), Technology::UTRAN);
+        auto writer = CaptureWriter::create(OutputFile::create(path()).value(), Technology::UTRAN);
         ASSERT_TRUE(writer);
-        EXPECT_FALSE(writer->append(CaptureTime(1000s + 250us + 999ns), Bytes{1, 2, 3}));
-        EXPECT_FALSE(writer->append(CaptureTime(1001s), Bytes{}));
+        EXPECT_TRUE(writer->append(CaptureTime(1000s + 250us + 999ns), Bytes{1, 2, 3}));
+        EXPECT_TRUE(writer->append(CaptureTime(1001s), Bytes{}));
+        EXPECT_TRUE(writer->appear());
     }
     Bytes expected = fileHeader(151, 0xa1b2c3d4, 131072);
     addPacket(expected, 1000, 250, Bytes{1, 2, 3});
@@ -181,58 +183,56 @@ TEST_F(Capture, WritesAFileByteForByte) {
 }
 
 TEST_F(Capture, AWrittenPacketIsInTheFileAtOnce) {
-    auto writer = CaptureWriter::create(path(), Technology::LTE);
-    ASSERT_TRUE(writer);
+    CaptureWriter writer = test::captureAt(path(), Technology::LTE);
     EXPECT_EQ(contentsOf(path()).size(), 24U);
-    EXPECT_FALSE(writer->append(CaptureTime(1s), Bytes{1, 2, 3}));
+    EXPECT_TRUE(writer.append(CaptureTime(1s), Bytes{1, 2, 3}));
     EXPECT_EQ(contentsOf(path()).size(), 24U + 16 + 3);
 }
 
-TEST_F(Capture, SaysWhyAFileCannotBeCreated) {
-    const std::string inNoDirectory = directory.file("none/file.pcap");
-    const auto writer = CaptureWriter::create(inNoDirectory, Technology::LTE);
-    ASSERT_FALSE(writer);
-    EXPECT_EQ(writer.error().reason, inNoDirectory + " cannot be created: No such file or directory");
+TEST_F(Capture, DoesNotAppearUntilItIsTold) {
+    {
+        auto writer = CaptureWriter::create(OutputFile::create(path()).value(), Technology::LTE);
+        EXPECT_TRUE(writer->append(CaptureTime(1s), Bytes{1, 2, 3}));
+        EXPECT_FALSE(std::filesystem::exists(path()));
+    }
+    EXPECT_TRUE(std::filesystem::is_empty(directory.path()));
 }
 
 TEST_F(Capture, MakesAFileThatNobodyElseCanRead) {
     const mode_t mask = ::umask(0);
-    const bool made = static_cast<bool>(CaptureWriter::create(path(), Technology::LTE));
+    test::captureAt(path(), Technology::LTE);
     ::umask(mask);
-    ASSERT_TRUE(made);
     EXPECT_EQ(std::filesystem::status(path()).permissions(), std::filesystem::perms(0600));
 }
 
 TEST_F(Capture, SaysThatTheDiskIsFull) {
-    const auto writer = CaptureWriter::create("/dev/full", Technology::LTE);
+    const auto writer = CaptureWriter::create(OutputFile::create("/dev/full").value(), Technology::LTE);
     ASSERT_FALSE(writer);
     EXPECT_EQ(writer.error().reason, "/dev/full cannot be written: Can't write to stream: No space left on device");
 }
 
 TEST_F(Capture, KeepsThePacketsBeforeTheOneThatDidNotFit) {
-    auto writer = CaptureWriter::create(path(), Technology::LTE);
-    ASSERT_TRUE(writer);
-    EXPECT_FALSE(writer->append(CaptureTime(1s), Bytes{1, 2, 3}));
+    CaptureWriter writer = test::captureAt(path(), Technology::LTE);
+    EXPECT_TRUE(writer.append(CaptureTime(1s), Bytes{1, 2, 3}));
     const std::string before = contentsOf(path());
 
-    const auto failure = [&] {
+    const auto appended = [&] {
         const test::FileSizeLimit full(before.size() + 20);
-        return writer->append(CaptureTime(2s), Bytes(100));
+        return writer.append(CaptureTime(2s), Bytes(100));
     }();
 
-    ASSERT_TRUE(failure);
-    EXPECT_EQ(failure->reason, path() + " cannot be written: File too large");
+    ASSERT_FALSE(appended);
+    EXPECT_EQ(appended.error().reason, path() + " cannot be written: File too large");
     EXPECT_EQ(contentsOf(path()), before);
-    EXPECT_FALSE(writer->append(CaptureTime(3s), Bytes{4}));
+    EXPECT_TRUE(writer.append(CaptureTime(3s), Bytes{4}));
     EXPECT_EQ(contentsOf(path()).size(), before.size() + 16 + 1);
 }
 
 TEST_F(Capture, RefusesToWriteWhatNoReaderWouldTake) {
-    auto writer = CaptureWriter::create(path(), Technology::LTE);
-    ASSERT_TRUE(writer);
-    const auto failure = writer->append(CaptureTime(1s), Bytes(kMaxMessageSize + 1));
-    ASSERT_TRUE(failure);
-    EXPECT_EQ(failure->reason, path() + " takes messages of at most 131072 bytes, not 131073");
+    CaptureWriter writer = test::captureAt(path(), Technology::LTE);
+    const auto appended = writer.append(CaptureTime(1s), Bytes(kMaxMessageSize + 1));
+    ASSERT_FALSE(appended);
+    EXPECT_EQ(appended.error().reason, path() + " takes messages of at most 131072 bytes, not 131073");
     EXPECT_EQ(contentsOf(path()).size(), 24U);
 }
 

@@ -121,13 +121,11 @@ private:
     class ShownReading {
     public:
         explicit ShownReading(const Reading& reading) : _reading(reading) {}
-        ShownReading(const ShownReading& other) : _reading(other._reading) {}
-        ShownReading(ShownReading&&) = default;
-        ShownReading& operator=(const ShownReading& other) {
+        ShownReading(const ShownReading& other) noexcept : _reading(other._reading) {}
+        ShownReading& operator=(const ShownReading& other) noexcept {
             set(other._reading);
             return *this;
         }
-        ShownReading& operator=(ShownReading&&) = default;
         ~ShownReading() = default;
 
         const Reading& reading() const { return _reading; }

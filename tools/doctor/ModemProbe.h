@@ -5,7 +5,7 @@
 #include <string>
 
 #include "platform/values/Bytes.h"
-#include "telephony/SteadyTime.h"
+#include "platform/system/SteadyTime.h"
 #include "telephony/wire/RecordConfiguration.h"
 
 namespace kelvo {

@@ -5,7 +5,7 @@
 #include <optional>
 
 #include "platform/system/MainQueue.h"
-#include "telephony/SteadyTime.h"
+#include "platform/system/SteadyTime.h"
 #include "telephony/wire/modem/ModemPort.h"
 #include "telephony/wire/modem/PlayedModem.h"
 

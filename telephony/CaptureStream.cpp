@@ -32,14 +32,14 @@ std::optional<CapturePacket> CaptureStream::next() {
 std::optional<CapturePacket> CaptureStream::readPacket() {
     auto read = _reader.next();
     if (read) return *read;
-    if (!std::exchange(_toldFailure, true)) logLine(Level::Error, read.error().reason);
+    tell(read.error());
     return std::nullopt;
 }
 
 bool CaptureStream::beginNextPass() {
     auto reader = CaptureReader::open(_path);
     if (!reader) {
-        logLine(Level::Error, reader.error().reason);
+        tell(reader.error());
         return false;
     }
     _reader = std::move(reader).value();
@@ -48,6 +48,17 @@ bool CaptureStream::beginNextPass() {
     _played = 0ns;
     _firstPass = false;
     return true;
+}
+
+// Once, however often the capture is played.
+void CaptureStream::tell(const Failure& failure) {
+    if (failure.reason == _failure) return;
+    _failure = failure.reason;
+    logLine(Level::Error, _failure);
+}
+
+std::string CaptureStream::ending() const {
+    return _failure.empty() ? "the capture has ended" : "the capture has ended: " + _failure;
 }
 
 CaptureTime CaptureStream::place(CaptureTime captured) {

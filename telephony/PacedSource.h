@@ -28,6 +28,7 @@ public:
 
     Technology technology() const override { return _stream->technology(); }
     std::string description() const override { return _stream->description(); }
+    std::string state() const override { return _ended ? _stream->ending() : std::string(); }
     void start(RecordSink& sink) override;
     void feed() override;
 
@@ -49,6 +50,7 @@ private:
     std::optional<CapturePacket> _next;                           // read and not yet given
     std::optional<CaptureTime> _last;                             // the time of the packet read last
     nanoseconds _due{0};                                          // of _next, and before that of the packet before
+    bool _ended = false;                                          // the stream gives no more
     int _refused = 0;                                             // in a row
     bool _waiting = false;                                        // pump() is on the queue
     std::shared_ptr<bool> _alive = std::make_shared<bool>(true);  // tasks on the queue outlive the source

@@ -27,6 +27,8 @@ public:
     virtual Technology technology() const = 0;
     /// What it is, for people: "the capture drive.pcap".
     virtual std::string description() const = 0;
+    /// What there is to say of it at the moment, for people: "the capture has ended"; empty when there is nothing.
+    virtual std::string state() const { return {}; }
     /// Gives records to `sink`, which outlives the source's work, from now on. Called once, when the first client
     /// streams.
     virtual void start(RecordSink& sink) = 0;

@@ -49,9 +49,10 @@ Result<std::string> statusText(const Value& answer) {
     const ArrayRef& codes = status["Codes"].array();
     const ArrayRef& clients = status["Clients"].array();
     if (!codes || !clients) return Failure{"the answer is no status"};
-    return fmt::format("Source      {}\nTechnology  {}\nRecords     {}\n\n  {:<46}{:>11}{:>14}\n{}\nClients\n{}",
-                       textOf(status, "Source"), textOf(status, "Technology"), integerOf(status, "Records"), "Log code",
-                       "per second", "in all", linesOf(codes, codeLine), linesOf(clients, clientLine));
+    const std::string state = status["State"] ? fmt::format("State       {}\n", textOf(status, "State")) : "";
+    return fmt::format("Source      {}\n{}Technology  {}\nRecords     {}\n\n  {:<46}{:>11}{:>14}\n{}\nClients\n{}",
+                       textOf(status, "Source"), state, textOf(status, "Technology"), integerOf(status, "Records"),
+                       "Log code", "per second", "in all", linesOf(codes, codeLine), linesOf(clients, clientLine));
 }
 
 }  // namespace kelvo

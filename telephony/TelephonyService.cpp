@@ -48,7 +48,10 @@ TelephonyService::TelephonyService(MessagePorts& ports, RecordSource& source, Li
 std::optional<Failure> TelephonyService::open() {
     auto made = _ports.createLocal(kPLTelephonyServicePort,
                                    [this](std::int32_t id, ByteView message) { return handle(id, message); });
-    if (made.alreadyExisted) return Failure{"another telephony service is running"};
+    if (made.alreadyExisted) {
+        return Failure{"another telephony service is running" +
+                       (made.owner > 0 ? fmt::format(" (process {})", made.owner) : "")};
+    }
     if (!made.port) return Failure{fmt::format("cannot make the port {}", kPLTelephonyServicePort)};
     _controlPort = std::move(made.port);
     _controlPort->schedule();
@@ -72,11 +75,13 @@ Bytes TelephonyService::status() const {
     }
     const auto clients = Array::make({});
     for (const LogChannel& channel : _channels) clients->append(describe(channel));
-    return encodeAnswer({{"Source", _source.description()},
-                         {"Technology", namesOf(_source.technology()).name},
-                         {"Records", static_cast<std::int64_t>(records)},
-                         {"Codes", codes},
-                         {"Clients", clients}});
+    const auto answer = Dictionary::make({{"Source", _source.description()},
+                                          {"Technology", namesOf(_source.technology()).name},
+                                          {"Records", static_cast<std::int64_t>(records)},
+                                          {"Codes", codes},
+                                          {"Clients", clients}});
+    if (const std::string state = _source.state(); !state.empty()) answer->set("State", state);
+    return encodeAnswer(answer);
 }
 
 Bytes TelephonyService::createLogChannel(const std::string& clientName) {

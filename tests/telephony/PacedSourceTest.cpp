@@ -203,6 +203,30 @@ TEST_F(PacedSourceTest, LetsOtherWorkRunAmongManyPackets) {
     EXPECT_LE(before, 256U);
 }
 
+TEST_F(PacedSourceTest, SaysWhenTheCaptureHasEnded) {
+    capture({0, 100});
+    play();
+    EXPECT_EQ(_source->state(), "");
+    _queue.advance(100ms);
+    EXPECT_EQ(_source->state(), "the capture has ended");
+}
+
+TEST_F(PacedSourceTest, SaysWhereADamagedCaptureHasEnded) {
+    capture({0, 100});
+    std::filesystem::resize_file(_path, std::filesystem::file_size(_path) - 1);
+    play();
+    EXPECT_EQ(_sink.notes, Notes{"0a"});
+    const std::string expected = "the capture has ended: " + _path.string() + " cannot be read at packet 2: ";
+    EXPECT_EQ(_source->state().substr(0, expected.size()), expected);
+}
+
+TEST_F(PacedSourceTest, ACaptureInALoopDoesNotEnd) {
+    capture({0, 100});
+    play({.loop = true});
+    _queue.advance(10s);
+    EXPECT_EQ(_source->state(), "");
+}
+
 TEST_F(PacedSourceTest, TellsOfADamagedCaptureOnceAndPlaysWhatIsWhole) {
     capture({0, 100, 200});
     std::filesystem::resize_file(_path, std::filesystem::file_size(_path) - 1);

@@ -179,7 +179,7 @@ TEST_F(TelephonyServiceTest, IsOneOfAKind) {
     TelephonyService second(_ports, _source);
     const auto failure = second.open();
     ASSERT_TRUE(failure);
-    EXPECT_EQ(failure->reason, "another telephony service is running");
+    EXPECT_EQ(failure->reason, "another telephony service is running (process " + std::to_string(::getpid()) + ")");
 }
 
 TEST_F(TelephonyServiceTest, LeavesNoPortsBehind) {

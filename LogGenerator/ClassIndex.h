@@ -23,8 +23,8 @@ public:
     const CodeDictionary::Subscribers* getSubscribers(LogCode code) const { return codeDictionary.find(code); }
     /// Writes two diagnostic lines about the section dictionary.
     void status() const;
-    /// Every subscribed log code as a decimal string.
-    std::vector<std::string> getAllLogCodes() const { return codeDictionary.allKeys(); }
+    /// Every subscribed log code, in the order of first subscriptions.
+    const std::vector<LogCode>& getAllLogCodes() const { return codeDictionary.allCodes(); }
     /// Every section name.
     std::vector<std::string_view> getAllNames() const;
 

@@ -1,7 +1,5 @@
 #include "LogGenerator/CodeDictionary.h"
 
-#include <cstdint>
-
 namespace kelvo {
 
 void CodeDictionary::subscribe(LogCode code, Base& section) {
@@ -13,13 +11,6 @@ void CodeDictionary::subscribe(LogCode code, Base& section) {
 const CodeDictionary::Subscribers* CodeDictionary::find(LogCode code) const {
     const auto at = _subscribers.find(code);
     return at != _subscribers.end() ? &at->second : nullptr;
-}
-
-std::vector<std::string> CodeDictionary::allKeys() const {
-    std::vector<std::string> keys;
-    keys.reserve(_order.size());
-    for (LogCode code : _order) keys.push_back(std::to_string(static_cast<std::int32_t>(code)));
-    return keys;
 }
 
 }  // namespace kelvo

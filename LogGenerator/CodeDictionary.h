@@ -1,6 +1,5 @@
 #pragma once
 
-#include <string>
 #include <unordered_map>
 #include <vector>
 
@@ -10,8 +9,7 @@ namespace kelvo {
 
 class Base;
 
-/// Log code to the sections that subscribe to it, in the order in which they did. A code is addressed by its number
-/// and named by its decimal string.
+/// Log code to the sections that subscribe to it, in the order in which they did.
 class CodeDictionary {
 public:
     using Subscribers = std::vector<Base*>;
@@ -20,8 +18,8 @@ public:
     void subscribe(LogCode code, Base& section);
     /// Null when nobody subscribed.
     const Subscribers* find(LogCode code) const;
-    /// The codes as signed decimal strings, in the order of their first subscription.
-    std::vector<std::string> allKeys() const;
+    /// The codes, in the order of their first subscription.
+    const std::vector<LogCode>& allCodes() const { return _order; }
 
 private:
     std::unordered_map<LogCode, Subscribers> _subscribers;

@@ -1,13 +1,7 @@
 #include "LogGenerator/LogGenerator.h"
 
-#include "LogGenerator/CDMA/C2KLogGenerator.h"
-#include "LogGenerator/GSMUMTS/OSK_GSMLogGenerator.h"
-#include "LogGenerator/IFX/GSMLogGenerator.h"
-#include "LogGenerator/LTE/LTELogGenerator.h"
-#include "LogGenerator/UTRAN/UTRANLogGenerator.h"
 #include "platform/system/DateText.h"
 #include "platform/system/Environment.h"
-#include "platform/telephony/TelephonyConstants.h"
 
 namespace kelvo {
 
@@ -15,18 +9,8 @@ namespace {
 constexpr std::size_t kHistoryLimit = 5;
 }
 
-LogGenerator::LogGenerator(Built built) {
-    if (built == Built::Half) return;
+void LogGenerator::logCreation() const {
     logLine(Level::Warning, "Creating Log object: %p", static_cast<const void*>(this));
-}
-
-std::unique_ptr<LogGenerator> LogGenerator::generatorFromTechnology(std::string_view technology) {
-    if (technology == kPLLogChannelTechnology_IFX) return GSMLogGenerator::generator();
-    if (technology == kPLLogChannelTechnology_Oskra_GSM) return OSK_GSMLogGenerator::generator();
-    if (technology == kPLLogChannelTechnology_Oskra_CDMA) return C2KLogGenerator::generator();
-    if (technology == kPLLogChannelTechnology_Oskra_LTE) return LTELogGenerator::generator();
-    if (technology == kPLLogChannelTechnology_Oskra_UTRAN2) return UTRANLogGenerator::generator();
-    return nullptr;
 }
 
 void LogGenerator::updateHistoryInState(Dictionary& state) {

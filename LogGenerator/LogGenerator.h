@@ -1,8 +1,6 @@
 #pragma once
 
 #include <cstddef>
-#include <memory>
-#include <string_view>
 
 #include "platform/values/Bytes.h"
 #include "platform/values/Value.h"
@@ -17,7 +15,6 @@ namespace kelvo {
 /// rebuild; cell-monitor generator: the tree as received) and "History" (array of snapshots, oldest first, at most 5).
 class LogGenerator {
 public:
-    LogGenerator() : LogGenerator(Built::Wholly) {}
     virtual ~LogGenerator() = default;
     LogGenerator(const LogGenerator&) = delete;
     LogGenerator& operator=(const LogGenerator&) = delete;
@@ -35,16 +32,13 @@ public:
     /// The contents of a snapshot file.
     virtual ArrayRef getSaveContentsFromState(Dictionary& state) = 0;
 
-    /// The generator of a technology, by one of the kPLLogChannelTechnology_ identifiers; none for any other text.
-    static std::unique_ptr<LogGenerator> generatorFromTechnology(std::string_view technology);
-
     /// Appends a snapshot of the state to its "History" and drops the oldest beyond five.
     static void updateHistoryInState(Dictionary& state);
 
 protected:
-    /// A half-built generator lacks what it needs to decode; it is made without a word on the log.
-    enum class Built { Wholly, Half };
-    explicit LogGenerator(Built built);
+    LogGenerator() = default;
+    /// Writes the line that tells of a new generator, whose constructor knows at which point it is due.
+    void logCreation() const;
 };
 
 }  // namespace kelvo

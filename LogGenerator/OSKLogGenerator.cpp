@@ -4,7 +4,6 @@
 
 #include <utility>
 
-#include "LogGenerator/DLFVersionReport.h"
 #include "platform/system/Environment.h"
 
 namespace kelvo {
@@ -28,8 +27,8 @@ DLFTimeRecord currentTime() {
 
 }  // namespace
 
-std::optional<Bytes> OSKLogGenerator::generateDlfFromState(const Dictionary& state) {
-    Bytes dlf(kDLFVersionReportSize);
+std::optional<Bytes> OSKLogGenerator::generateDlfFromState(const Dictionary& state, std::size_t reportSize) {
+    Bytes dlf(reportSize);
     std::size_t written = 0;
     const DLFStatus result = DLFAddVersionReport(dlf.data(), dlf.size(), written, 1, 1, versionText(),
                                                  "EXECUTABLE_NAME", kBuildDate, currentTime());

@@ -6,6 +6,7 @@
 #include <optional>
 #include <string_view>
 
+#include "LogGenerator/DLFVersionReport.h"
 #include "LogGenerator/LogGenerator.h"
 
 namespace kelvo {
@@ -18,12 +19,12 @@ public:
     ArrayRef getSaveContentsFromState(Dictionary& state) override;
     void limitRawLog(std::size_t bytes) override;
 
-    /// One version report followed by the raw records of the history, oldest first; none after one log line.
-    static std::optional<Bytes> generateDlfFromState(const Dictionary& state);
+    /// One version report followed by the raw records of the history, oldest first; none after one log line. The
+    /// report's place is `reportSize` bytes long.
+    static std::optional<Bytes> generateDlfFromState(const Dictionary& state,
+                                                     std::size_t reportSize = kDLFVersionReportSize);
 
 protected:
-    using LogGenerator::LogGenerator;
-
     /// Collects a record, unless it no longer fits.
     void keepRaw(ByteView record);
     /// Moves the collected records into the state's "DisplayState" and begins anew.

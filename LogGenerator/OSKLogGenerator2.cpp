@@ -1,12 +1,12 @@
 #include "LogGenerator/OSKLogGenerator2.h"
 
-#include <charconv>
 #include <set>
 #include <stdexcept>
 
 #include "LogGenerator/Framing.h"
 #include "LogGenerator/UnknownDataException.h"
 #include "platform/system/Environment.h"
+#include "platform/telephony/LogChannelProtocol.h"
 
 namespace kelvo {
 
@@ -40,21 +40,11 @@ Value storable(Value processed) {
 }  // namespace
 
 OSKLogGenerator2::OSKLogGenerator2(std::string name, std::unique_ptr<ClassIndex> cIndexObj)
-    : OSKLogGenerator2(announce(std::move(cIndexObj)), std::move(name)) {}
-
-// The line comes before the base class's own, so it is written while the arguments are made.
-OSKLogGenerator2::Announced OSKLogGenerator2::announce(std::unique_ptr<ClassIndex> classIndex) {
-    if (classIndex) {
-        logLine(Level::Error, "Creating OSKLogGenerator2 object with %p", static_cast<const void*>(classIndex.get()));
-    }
-    return {std::move(classIndex)};
-}
-
-OSKLogGenerator2::OSKLogGenerator2(Announced announced, std::string name)
-    : OSKLogGenerator(announced.classIndex ? Built::Wholly : Built::Half),
-      pListName(std::move(name)),
-      cIndex(std::move(announced.classIndex)) {
-    if (cIndex) logLine(Level::Error, "Class Index: %ld", 1L);  // its owners: this generator alone
+    : pListName(std::move(name)), cIndex(std::move(cIndexObj)) {
+    if (!cIndex) return;
+    logLine(Level::Error, "Creating OSKLogGenerator2 object with %p", static_cast<const void*>(cIndex.get()));
+    logCreation();
+    logLine(Level::Error, "Class Index: %ld", 1L);  // its owners: this generator alone
 }
 
 OSKLogGenerator2::~OSKLogGenerator2() {
@@ -62,7 +52,7 @@ OSKLogGenerator2::~OSKLogGenerator2() {
 }
 
 void OSKLogGenerator2::updateState(Dictionary& state, ByteView data) {
-    prepareDisplay(state);
+    getDisplayFromState(state);
     updateWithData(data);
     keepRaw(data);
 }
@@ -87,17 +77,14 @@ void OSKLogGenerator2::updateWithData(ByteView data) {
     }
 }
 
-Value OSKLogGenerator2::getDisplayFromState(Dictionary& state) {
-    return prepareDisplay(state) ? state[kDisplay] : Value();
-}
-
-bool OSKLogGenerator2::prepareDisplay(Dictionary& state) {
-    if (const Value& display = state[kDisplay]) {
-        if (cIndex && display.dictionary() != _boundDisplay.dictionary()) adoptDisplay(display);
-        return true;
+const Value& OSKLogGenerator2::getDisplayFromState(Dictionary& state) {
+    const Value& before = state[kDisplay];  // stays none when the display is built now
+    if (!before) {
+        buildDisplay(state);
+    } else if (cIndex && before.dictionary() != _boundDisplay.dictionary()) {
+        adoptDisplay(before);
     }
-    buildDisplay(state);
-    return false;
+    return before;
 }
 
 bool OSKLogGenerator2::loadTemplate(Dictionary& state) const {
@@ -182,16 +169,15 @@ Value OSKLogGenerator2::generateLogUsingState(Dictionary& state) {
 DictionaryRef OSKLogGenerator2::getStartCommand() {
     const ArrayRef ordinary = Array::make();
     const ArrayRef extended = Array::make();
-    for (const std::string& key : cIndex ? cIndex->getAllLogCodes() : std::vector<std::string>()) {
-        std::int64_t code = 0;
-        std::from_chars(key.data(), key.data() + key.size(), code);
+    for (const LogCode code : cIndex ? cIndex->getAllLogCodes() : std::vector<LogCode>()) {
         if (code >= kExtendedLogCodes) {
-            extended->append(code - kExtendedLogCodes);
+            extended->append(std::int64_t{code - kExtendedLogCodes});
         } else {
-            ordinary->append(code);
+            ordinary->append(std::int64_t{code});
         }
     }
-    return Dictionary::make({{"SetState", "Streaming"}, {"SetOskraLogCodes", ordinary}, {"SetPlExtraCodes", extended}});
+    return Dictionary::make(
+        {{kPLSetState, kPLStateStreaming}, {kPLSetOskraLogCodes, ordinary}, {kPLSetPlExtraCodes, extended}});
 }
 
 }  // namespace kelvo

@@ -14,7 +14,7 @@ namespace kelvo {
 class OSKLogGenerator2 : public OSKLogGenerator {
 public:
     /// `pListName` is the base name of a template resource of type "plist". Without a class index the generator stays
-    /// half built: it has no template, decodes nothing and only collects the raw records.
+    /// half built, which no log line tells: it has no template, decodes nothing and only collects the raw records.
     OSKLogGenerator2(std::string pListName, std::unique_ptr<ClassIndex> cIndexObj);
     ~OSKLogGenerator2() override;
 
@@ -30,18 +30,11 @@ public:
     Value processTemplate(const Value& node);
     /// Checks that a processed node holds nothing but dictionaries, arrays and strings.
     void printDict(const Value& node) const;
-    /// The state's display. The call that has to build it returns none; later ones return it.
-    Value getDisplayFromState(Dictionary& state);
+    /// Makes sure that the state has a display and the sections their parts of it, and returns the display that was
+    /// there before: none when this call is what builds it. The reference holds until the state changes.
+    const Value& getDisplayFromState(Dictionary& state);
 
 private:
-    struct Announced {
-        std::unique_ptr<ClassIndex> classIndex;
-    };
-    static Announced announce(std::unique_ptr<ClassIndex> classIndex);
-    OSKLogGenerator2(Announced announced, std::string pListName);
-
-    /// Makes sure that the state has a display and the sections their parts of it; false when it had none.
-    bool prepareDisplay(Dictionary& state);
     bool loadTemplate(Dictionary& state) const;
     void buildDisplay(Dictionary& state);
     void adoptDisplay(const Value& display);

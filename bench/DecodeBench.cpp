@@ -10,6 +10,7 @@
 #include <deque>
 #include <optional>
 
+#include "LogGenerator/Factory.h"
 #include "bench/Families.h"
 #include "platform/host/HostSystemLog.h"
 #include "platform/system/DirectoryResources.h"
@@ -41,7 +42,7 @@ void decode(benchmark::State& state, bool logs, std::deque<Receiver>& receivers)
         const Bytes* message;
     };
     for (Receiver& receiver : receivers) {
-        receiver.generator = LogGenerator::generatorFromTechnology(receiver.technology);
+        receiver.generator = generatorFromTechnology(receiver.technology);
         // The display is there, and its lists have grown.
         for (const Bytes& message : receiver.messages) receiver.generator->updateState(receiver.state, message);
     }

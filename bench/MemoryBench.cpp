@@ -12,6 +12,7 @@
 #include <new>
 #include <string>
 
+#include "LogGenerator/Factory.h"
 #include "bench/Families.h"
 #include "model/KelvoModelNode.h"
 #include "platform/system/DirectoryResources.h"
@@ -48,8 +49,7 @@ long residentKilobytes() {
 
 struct Stream {
     explicit Stream(const bench::Family& family)
-        : generator(LogGenerator::generatorFromTechnology(family.technology)),
-          messages(family.traffic.front().messages) {}
+        : generator(generatorFromTechnology(family.technology)), messages(family.traffic.front().messages) {}
 
     void step() { generator->updateState(state, messages[next++ % messages.size()]); }
     void rebuild() {

@@ -3,6 +3,7 @@
 
 #include <benchmark/benchmark.h>
 
+#include "LogGenerator/Factory.h"
 #include "bench/Families.h"
 #include "model/KelvoModelNode.h"
 #include "platform/system/DirectoryResources.h"
@@ -22,7 +23,7 @@ std::size_t countOf(const KelvoModelNode& node) {
 void rebuild(benchmark::State& state, std::string_view technology, const std::vector<Bytes>& messages) {
     const DirectoryResources resources(KELVO_RESOURCE_DIR);
     const Environment::Scope environment({.resources = &resources});
-    const auto generator = LogGenerator::generatorFromTechnology(technology);
+    const auto generator = generatorFromTechnology(technology);
     Dictionary kept;
     NodeRef tree;
     NodesByPath nodes;

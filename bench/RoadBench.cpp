@@ -169,7 +169,7 @@ int serve(const std::filesystem::path& directory, const Run& run) {
     HostMessagePorts ports(directory);
     LteSource source(queue, run);
     TelephonyService service(ports, source);
-    if (service.open()) return 1;
+    if (!service.open()) return 1;
     const auto untilClientsLeave = queue.repeat(100ms, [&, seen = false]() mutable {
         seen = seen || service.channelCount() > 0;
         if (seen && service.channelCount() == 0) QCoreApplication::quit();

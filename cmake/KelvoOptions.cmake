@@ -31,6 +31,9 @@ add_compile_options(-Wall -Wextra -Wpedantic -Wconversion -Wno-sign-conversion -
 if(CMAKE_CXX_COMPILER_ID STREQUAL "GNU")
     add_compile_options(-Wno-restrict)  # GCC 12 sees overlaps in std::string's operator+ that are not there
 endif()
+if(CMAKE_CXX_COMPILER_ID STREQUAL "Clang")
+    add_compile_options(-Wthread-safety)  # data that a lock guards is touched under it (platform/system/Mutex.h)
+endif()
 if(KELVO_WERROR)
     add_compile_options(-Werror)
 endif()

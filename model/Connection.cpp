@@ -8,7 +8,7 @@ using namespace std::chrono_literals;
 
 namespace {
 
-constexpr auto kRemarkableSilence = 10s;
+constexpr const char* kWaiting = "Waiting for the modem";
 
 std::string silenceText(std::chrono::nanoseconds silence) {
     const auto seconds = std::chrono::floor<std::chrono::seconds>(silence);
@@ -19,7 +19,7 @@ std::string silenceText(std::chrono::nanoseconds silence) {
 }  // namespace
 
 std::string connectionText(const Connection& connection) {
-    if (connection.isConnected() && connection.silence >= kRemarkableSilence) return silenceText(connection.silence);
+    if (connection.isSilent()) return silenceText(connection.silence);
     switch (connection.state) {
         case Connection::State::NoPort: return "Kelvo cannot open its port";
         case Connection::State::PortTaken: return "Kelvo is already open";
@@ -28,10 +28,16 @@ std::string connectionText(const Connection& connection) {
         case Connection::State::NoAnswer: return "The telephony service does not answer";
         case Connection::State::UnknownTechnology: return "The modem's technology is unknown";
         case Connection::State::NotStarted:
-        case Connection::State::NoRecordYet: return "Waiting for the modem";
+        case Connection::State::NoRecordYet: return kWaiting;
         case Connection::State::Receiving: return "";
     }
     return "";
+}
+
+std::string waitingText(const Connection& connection) {
+    if (!connection.isConnected()) return connectionText(connection);
+    return connection.isSilent() && connection.state == Connection::State::NoRecordYet ? "The modem sends nothing"
+                                                                                       : kWaiting;
 }
 
 std::string statusText(bool isConnected, std::string_view updateMessage) {

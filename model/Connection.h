@@ -25,11 +25,18 @@ struct Connection {
     std::chrono::nanoseconds silence{0};
 
     bool isConnected() const { return state == State::NoRecordYet || state == State::Receiving; }
+    /// Connected, and nothing has come for so long that it must be told.
+    bool isSilent() const { return isConnected() && silence >= std::chrono::seconds(10); }
 };
 
 /// What screens say about the connection, "No telephony service is running" or "No records for 24 s" (from 10 s on; in
 /// minutes from two on): in place of rows while there are none, and beside the status else. Empty while records come.
 std::string connectionText(const Connection& connection);
+
+/// What a screen without any reading says in place of rows: the reason why there are none. As `connectionText`, but
+/// that a modem which keeps silent from the start is called so: the length of the silence stands beside the status.
+/// Never empty.
+std::string waitingText(const Connection& connection);
 
 /// The status text of every screen: when its values are from, as `updateMessage` says, or that there is no connection.
 std::string statusText(bool isConnected, std::string_view updateMessage);

@@ -1,6 +1,8 @@
 #include "model/KelvoModel.h"
 
+#include "LogGenerator/Factory.h"
 #include "platform/system/Environment.h"
+#include "platform/telephony/LogChannelProtocol.h"
 #include "platform/telephony/TelephonyProtocol.h"
 
 namespace kelvo {
@@ -10,24 +12,15 @@ using State = Connection::State;
 
 namespace {
 
-constexpr std::int32_t kMessageId = 0;  // of every message on the log channel, in both directions
 constexpr auto kSendLimit = 1s;
 constexpr auto kReplyLimit = 1s;
 constexpr std::size_t kRawLogLimit = std::size_t{4} * 1024 * 1024;  // many times what a modem says in two seconds
 
-Value technologyQuery() { return Dictionary::make({{"GetTechnology", "GetTechnology"}}); }
+Value technologyQuery() { return Dictionary::make({{kPLGetTechnology, kPLGetTechnology}}); }
 
 const void* addressOf(const auto& owner) { return static_cast<const void*>(owner.get()); }
 
 }  // namespace
-
-/// `work` as a callback that others may keep for as long as they like: it does nothing once the model has gone.
-template <class Work>
-auto KelvoModel::whileAlive(Work work) const {
-    return [alive = std::weak_ptr(_alive), work](auto&&... arguments) {
-        if (!alive.expired()) work(arguments...);
-    };
-}
 
 KelvoModel::KelvoModel(Services services) : _services(std::move(services)) {}
 
@@ -50,12 +43,13 @@ bool KelvoModel::createPorts() {
     if (local.alreadyExisted) return failed(State::PortTaken, "Local messsage port already exists");
     if (!_recvPort) return failed(State::NoPort, "Could not create local message port");
     _recvPort->schedule();
-    _recvPort->setInvalidationCallback(whileAlive([this](LocalPort& port) { didInvalidate(port); }));
+    _recvPort->setInvalidationCallback(_lifetime.whileAlive([this](LocalPort& port) { didInvalidate(port); }));
     return openLogChannel();
 }
 
 bool KelvoModel::openLogChannel() {
-    auto server = _services.telephony.createServerConnection(whileAlive([this](std::string_view) { refresh(); }));
+    auto server =
+        _services.telephony.createServerConnection(_lifetime.whileAlive([this](std::string_view) { refresh(); }));
     if (!server) return failed(State::NoService, "Could not create PLServerConnection");
     const PLLogChannel channel = PLServerConnectionNetworkMonitorCreateLogChannel(*server, _services.portName);
     server.reset();
@@ -94,7 +88,7 @@ void KelvoModel::configureGenerator() {
         logLine(Level::Error, " Could not generate GetTechnology command; cannot configure");
         return;
     }
-    const auto reply = _sendPort->request(kMessageId, *query, kSendLimit, kReplyLimit);
+    const auto reply = _sendPort->request(kPLLogChannelMessageId, *query, kSendLimit, kReplyLimit);
     if (!reply) {
         failed(State::NoAnswer, " ***** Could not send the GetTechnology command (got error=%d)",
                static_cast<int>(reply.error()));
@@ -114,7 +108,7 @@ void KelvoModel::configureGenerator() {
 
 void KelvoModel::chooseGenerator(const Value& answer) {
     _obstacle = State::UnknownTechnology;
-    const Value* technology = answer.dictionary() ? answer.dictionary()->find("GetTechnology") : nullptr;
+    const Value* technology = answer.dictionary() ? answer.dictionary()->find(kPLGetTechnology) : nullptr;
     if (technology == nullptr) {
         logLine(Level::Error, " ***** Reply to GetTechnology had no answer; cannot configure");
         return;
@@ -124,7 +118,7 @@ void KelvoModel::chooseGenerator(const Value& answer) {
         _replacedGenerators.push_back(std::move(_logGenerator));
     }
     const std::string* identifier = technology->string();
-    _logGenerator = identifier != nullptr ? LogGenerator::generatorFromTechnology(*identifier) : nullptr;
+    _logGenerator = identifier != nullptr ? generatorFromTechnology(*identifier) : nullptr;
     if (_logGenerator) _logGenerator->limitRawLog(kRawLogLimit);
     logLine(Level::Error, "Got log generated: %p", addressOf(_logGenerator));
 }
@@ -138,11 +132,11 @@ void KelvoModel::startMonitor() {
     if (_displayUpdateTimer) return;
     if (!startStreaming()) {
         destroyPorts();
-        _services.queue.postAfter(5s, whileAlive([this] { startMonitor(); }));
+        _services.queue.postAfter(5s, _lifetime.whileAlive([this] { startMonitor(); }));
         return tellConnection();
     }
     logLine(Level::Error, "Starting the display update timer");
-    _displayUpdateTimer = _services.queue.repeat(2s, whileAlive([this] { refresh(); }));
+    _displayUpdateTimer = _services.queue.repeat(2s, _lifetime.whileAlive([this] { refresh(); }));
     _receiving = false;
     _silentSince = _services.queue.now();
     tellConnection();
@@ -163,7 +157,7 @@ bool KelvoModel::startStreaming() {
         logLine(Level::Error, " Could not generate PLIST");
         return false;
     }
-    const auto sent = _sendPort->request(kMessageId, *command, kSendLimit, std::nullopt);
+    const auto sent = _sendPort->request(kPLLogChannelMessageId, *command, kSendLimit, std::nullopt);
     if (sent) return true;
     return failed(State::NoAnswer, " ***** Could not send the START command (got error=%d)",
                   static_cast<int>(sent.error()));
@@ -176,7 +170,7 @@ void KelvoModel::refresh() {
     _updated = false;
     _nodes.reset();
     _nodesByPath.clear();
-    _services.queue.post(whileAlive([this] { _services.updateViewControllerFromModel(); }));
+    _services.queue.post(_lifetime.whileAlive([this] { _services.updateViewControllerFromModel(); }));
 }
 
 void KelvoModel::refresh(const Value&) { refresh(); }
@@ -201,7 +195,8 @@ void KelvoModel::tellConnection() {
     Told told{.isConnected = now.isConnected(), .text = connectionText(now)};
     if (told == _told) return;
     _told = std::move(told);
-    if (_services.connectionChanged) _services.queue.post(whileAlive([this] { _services.connectionChanged(); }));
+    if (_services.connectionChanged)
+        _services.queue.post(_lifetime.whileAlive([this] { _services.connectionChanged(); }));
 }
 
 NodeRef KelvoModel::topLevelNodes() {
@@ -232,7 +227,7 @@ ArrayRef KelvoModel::getSaveContents() {
 }
 
 void KelvoModel::didReceive(std::int32_t id, ByteView data) {
-    if (id == kMessageId) updateWithData(data);
+    if (id == kPLLogChannelMessageId) updateWithData(data);
 }
 
 void KelvoModel::didInvalidate(const LocalPort& port) {

@@ -9,12 +9,13 @@
 
 namespace kelvo {
 
-/// What one message from a client asks of its log channel. A message may ask for several things at once.
+/// What one message from a client asks of its log channel (platform/telephony/LogChannelProtocol.h). A message may ask
+/// for several things at once.
 struct ChannelCommand {
-    bool getTechnology = false;                                ///< "GetTechnology"
-    bool startStreaming = false;                               ///< "SetState" = "Streaming"
-    std::shared_ptr<const RecordFilter::Codes> ordinaryCodes;  ///< "SetOskraLogCodes"; none: not mentioned
-    std::shared_ptr<const RecordFilter::Codes> extendedCodes;  ///< "SetPlExtraCodes"; none: not mentioned
+    bool getTechnology = false;
+    bool startStreaming = false;
+    std::shared_ptr<const RecordFilter::Codes> ordinaryCodes;  ///< none: not mentioned
+    std::shared_ptr<const RecordFilter::Codes> extendedCodes;  ///< none: not mentioned
     std::size_t unknownKeys = 0;                               ///< what a newer client may ask for; ignored
 
     /// Reads a message. One that is no dictionary, asks for nothing that is known here, or has a value of the wrong

@@ -3,6 +3,7 @@
 #include <utility>
 
 #include "platform/system/Environment.h"
+#include "platform/telephony/LogChannelProtocol.h"
 #include "telephony/Answer.h"
 #include "telephony/ChannelCommand.h"
 
@@ -20,7 +21,7 @@ LogChannel::LogChannel(Technology technology, std::string clientName, std::uniqu
       _client(std::move(client)),
       _owner(owner),
       _queue(limits) {
-    if (technology == Technology::IFX) _filter.passEverything();  // its records are trees, without codes
+    if (!hasCodes(technology)) _filter.passEverything();
     _client->setInvalidationCallback([this](RemotePort&) { _owner.channelLostClient(*this); });
 }
 
@@ -33,7 +34,7 @@ bool LogChannel::open(MessagePorts& ports, const std::string& name) {
 }
 
 Bytes LogChannel::handle(std::int32_t id, ByteView message) {
-    if (id != 0) return refuse(fmt::format("its id is {}", id));
+    if (id != kPLLogChannelMessageId) return refuse(fmt::format("its id is {}", id));
     const auto command = ChannelCommand::parse(message);
     if (!command) return refuse(command.error().reason);
     if (command->unknownKeys > 0)
@@ -45,7 +46,7 @@ Bytes LogChannel::handle(std::int32_t id, ByteView message) {
         _owner.channelStreams(*this);
     }
     if (!command->getTechnology) return {};
-    return encodeAnswer({{"GetTechnology", namesOf(_technology).identifier}});
+    return encodeAnswer({{kPLGetTechnology, namesOf(_technology).identifier}});
 }
 
 Bytes LogChannel::refuse(const std::string& reason) {
@@ -61,7 +62,7 @@ bool LogChannel::take(ByteView record) {
 
 // False when the client has to read first; then flush() goes on once it has.
 bool LogChannel::send(ByteView record) {
-    const auto sent = _client->request(0, record, {}, std::nullopt);
+    const auto sent = _client->request(kPLLogChannelMessageId, record, {}, std::nullopt);
     if (sent) ++_delivered;
     if (sent || sent.error() == RemotePort::Error::Invalid) return true;  // a client that has gone reports itself
     if (sent.error() == RemotePort::Error::TooLong) {

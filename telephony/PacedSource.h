@@ -4,11 +4,12 @@
 #include <memory>
 #include <optional>
 
+#include "platform/system/Lifetime.h"
 #include "platform/system/MainQueue.h"
+#include "platform/system/SteadyTime.h"
 #include "telephony/RecordSource.h"
 #include "telephony/RecordStream.h"
 #include "telephony/Recording.h"
-#include "telephony/SteadyTime.h"
 
 namespace kelvo {
 
@@ -21,7 +22,6 @@ public:
 
     /// `queue` outlives the source.
     PacedSource(std::unique_ptr<RecordStream> stream, Speed speed, MainQueue& queue, SteadyTime now);
-    ~PacedSource() override { *_alive = false; }
 
     /// Writes every record that a client takes to `recording` as well, with its time in the stream.
     void recordTo(Recording recording) { _recording = std::move(recording); }
@@ -47,13 +47,13 @@ private:
     const SteadyTime _now;
     std::optional<Recording> _recording;
     RecordSink* _sink = nullptr;
-    std::optional<CapturePacket> _next;                           // read and not yet given
-    std::optional<CaptureTime> _last;                             // the time of the packet read last
-    nanoseconds _due{0};                                          // of _next, and before that of the packet before
-    bool _ended = false;                                          // the stream gives no more
-    int _refused = 0;                                             // in a row
-    bool _waiting = false;                                        // pump() is on the queue
-    std::shared_ptr<bool> _alive = std::make_shared<bool>(true);  // tasks on the queue outlive the source
+    std::optional<CapturePacket> _next;  // read and not yet given
+    std::optional<CaptureTime> _last;    // the time of the packet read last
+    nanoseconds _due{0};                 // of _next, and before that of the packet before
+    bool _ended = false;                 // the stream gives no more
+    int _refused = 0;                    // in a row
+    bool _waiting = false;               // pump() is on the queue
+    const Lifetime _lifetime;            // tasks on the queue outlive the source
 };
 
 }  // namespace kelvo

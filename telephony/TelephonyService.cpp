@@ -45,7 +45,7 @@ Bytes refuse(long error, const char* reason) {
 TelephonyService::TelephonyService(MessagePorts& ports, RecordSource& source, Limits limits, SteadyTime now)
     : _ports(ports), _source(source), _limits(limits), _rates(std::move(now)) {}
 
-std::optional<Failure> TelephonyService::open() {
+Result<void> TelephonyService::open() {
     auto made = _ports.createLocal(kPLTelephonyServicePort,
                                    [this](std::int32_t id, ByteView message) { return handle(id, message); });
     if (made.alreadyExisted) {
@@ -55,7 +55,7 @@ std::optional<Failure> TelephonyService::open() {
     if (!made.port) return Failure{fmt::format("cannot make the port {}", kPLTelephonyServicePort)};
     _controlPort = std::move(made.port);
     _controlPort->schedule();
-    return std::nullopt;
+    return {};
 }
 
 Bytes TelephonyService::handle(std::int32_t id, ByteView message) {
@@ -108,7 +108,7 @@ bool TelephonyService::hasRoomFor(const std::string& clientName) const {
 }
 
 bool TelephonyService::take(ByteView record) {
-    _rates.count(_source.technology() == Technology::IFX ? std::nullopt : codeOf(record));
+    _rates.count(hasCodes(_source.technology()) ? codeOf(record) : std::nullopt);
     bool taken = false;
     for (LogChannel& channel : _channels) taken |= channel.take(record);
     return taken;

@@ -2,7 +2,6 @@
 
 #include <list>
 #include <memory>
-#include <optional>
 #include <string>
 
 #include "platform/system/MessagePorts.h"
@@ -27,7 +26,7 @@ public:
     TelephonyService(MessagePorts& ports, RecordSource& source) : TelephonyService(ports, source, Limits()) {}
 
     /// Makes the control port; says why when it cannot be had.
-    std::optional<Failure> open();
+    Result<void> open();
 
     std::size_t channelCount() const { return _channels.size(); }
 

@@ -50,7 +50,7 @@ int serve(const ServiceOptions& options) {
     }
     const UnixSignals handler({SIGINT, SIGTERM, SIGHUP}, [](int) { QCoreApplication::quit(); });
     TelephonyService service(ports, source);
-    if (const auto failure = service.open()) return fail(*failure);
+    if (const auto opened = service.open(); !opened) return fail(opened.error());
     logLine(Level::Notice, "Serving %s, the log of a modem that speaks %s", source.description(),
             namesOf(source.technology()).name);
     return HostEventLoop::run(QCoreApplication::exec);

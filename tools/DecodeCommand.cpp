@@ -7,7 +7,7 @@
 #include <optional>
 #include <utility>
 
-#include "LogGenerator/LogGenerator.h"
+#include "LogGenerator/Factory.h"
 #include "model/Snapshot.h"
 #include "platform/host/Capture.h"
 #include "platform/system/Environment.h"
@@ -151,7 +151,7 @@ void decode(const Options& options) {
     environment.log = options.log ? &log : nullptr;
     const Environment::Scope scope(environment);
 
-    const auto generator = LogGenerator::generatorFromTechnology(names.identifier);
+    const auto generator = generatorFromTechnology(names.identifier);
     if (!generator) throw CommandFailure(fmt::format("no generator decodes {}", names.name));
     const DictionaryRef state = Dictionary::make();
     const Decoded decoded = decodeAll(options, reader, *generator, *state);

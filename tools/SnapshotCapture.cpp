@@ -62,7 +62,7 @@ std::size_t writeSnapshotCapture(const SnapshotFile& snapshot, Technology techno
     CaptureTime end{};
     for (std::size_t i = 0; i < snapshot.entries.size(); ++i) {
         const SnapshotFile::Entry& entry = snapshot.entries[i];
-        const auto messages = messagesOf(entry, technology == Technology::IFX, fmt::format("entry {}", i + 1), odd);
+        const auto messages = messagesOf(entry, !hasCodes(technology), fmt::format("entry {}", i + 1), odd);
         end = std::max(end + kRefresh, timeOf(entry).value_or(CaptureTime()));
         for (std::size_t m = 0; m < messages.size(); ++m) {
             if (!writer) writer.emplace(orFail(CaptureWriter::create(std::move(file), technology)));

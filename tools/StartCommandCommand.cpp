@@ -4,7 +4,7 @@
 
 #include <memory>
 
-#include "LogGenerator/LogGenerator.h"
+#include "LogGenerator/Factory.h"
 #include "platform/encodings/PropertyList.h"
 #include "tools/CommandFailure.h"
 #include "tools/StandardOutput.h"
@@ -15,7 +15,7 @@ namespace kelvo {
 namespace {
 
 void printStartCommand(Technology technology) {
-    const auto generator = LogGenerator::generatorFromTechnology(namesOf(technology).identifier);
+    const auto generator = generatorFromTechnology(namesOf(technology).identifier);
     if (!generator) throw CommandFailure(fmt::format("no generator decodes {}", namesOf(technology).name));
     writeToStandardOutput(textOf(orFail(writeXmlPropertyList(generator->getStartCommand()))));
 }

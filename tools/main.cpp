@@ -9,6 +9,7 @@
 #include "tools/CommandFailure.h"
 #include "tools/DecodeCommand.h"
 #include "tools/DisplayText.h"
+#include "tools/DoctorCommand.h"
 #include "tools/SnapshotCommand.h"
 #include "tools/StartCommandCommand.h"
 #include "tools/WatchCommand.h"
@@ -44,6 +45,7 @@ int main(int argc, char** argv) {
     kelvo::addWatchCommand(app);
     kelvo::addSnapshotCommand(app);
     kelvo::addStartCommandCommand(app);
+    kelvo::addDoctorCommand(app);
     try {
         app.parse(argc, argv);
         return 0;

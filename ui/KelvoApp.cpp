@@ -9,7 +9,7 @@ namespace kelvo {
 
 KelvoApp::KelvoApp(Services services) : _services(std::move(services)) {}
 
-KelvoApp::~KelvoApp() { *_alive = false; }
+KelvoApp::~KelvoApp() = default;
 
 void KelvoApp::applicationDidFinishLaunching() {
     getSaveButtonPref();
@@ -29,9 +29,9 @@ void KelvoApp::applicationDidFinishLaunching() {
     _window->setRootScreen(*this);
     _navController->viewWillAppear();
     _window->makeKeyAndVisible();
-    _services.queue.post([this, alive = _alive] {
-        if (*alive && _model) _model->restartMonitor();
-    });
+    _services.queue.post(_lifetime.whileAlive([this] {
+        if (_model) _model->restartMonitor();
+    }));
 }
 
 void KelvoApp::getSaveButtonPref() {
@@ -42,6 +42,7 @@ void KelvoApp::getSaveButtonPref() {
 void KelvoApp::updateStatusForViewController(KelvoPaneController& pane) {
     const bool isConnected = _model && _model->isConnected();
     pane.setStatus(QString::fromStdString(statusText(isConnected, _updateMessage.toStdString())), !isConnected);
+    if (_model) pane.setConnection(_model->connection());
 }
 
 void KelvoApp::updateViewControllerFromModel() {
@@ -53,7 +54,8 @@ void KelvoApp::updateViewControllerFromModel() {
 
 void KelvoApp::connectionChanged() {
     KelvoPaneController& top = _navController->topViewController();
-    if (!_model->isConnected() && !top.isLoading()) updateStatusForViewController(top);
+    if (!_model->isConnected() && !top.isLoading()) return updateStatusForViewController(top);
+    top.setConnection(_model->connection());
 }
 
 void KelvoApp::reloadPanes() {

@@ -9,6 +9,7 @@
 #include <vector>
 
 #include "model/KelvoModel.h"
+#include "platform/system/Lifetime.h"
 #include "platform/system/Preferences.h"
 #include "ui/DateFormatter.h"
 #include "ui/KelvoSaveViewController.h"
@@ -64,7 +65,8 @@ public:
     void updateStatusForViewController(KelvoPaneController& pane);
     /// Reloads every pane from the model, bottom first; a pane whose path is gone takes itself and all above with it.
     void updateViewControllerFromModel();
-    /// A lost connection is told even when nothing new has come: screens with values must not pass for current.
+    /// A lost connection is told even when nothing new has come, and so are records that stay away: screens with values
+    /// must not pass for current.
     void connectionChanged();
     void willShowViewController(KelvoPaneController& pane, bool animated) override;
 
@@ -103,8 +105,8 @@ private:
     QString _alertMessage;
     QString _alertButton;
     bool _terminated = false;
-    std::shared_ptr<bool> _alive = std::make_shared<bool>(true);  // tasks on the queue outlive the application
-    std::unique_ptr<Window> _window;                              // last, so that nothing it draws goes before it
+    std::unique_ptr<Window> _window;  // behind the rest, so that nothing it draws goes before it
+    const Lifetime _lifetime;         // tasks on the queue outlive the application
 };
 
 }  // namespace kelvo

@@ -1,6 +1,5 @@
 #include "ui/KelvoPaneController.h"
 
-#include <QPointer>
 #include <algorithm>
 #include <utility>
 
@@ -33,7 +32,7 @@ void KelvoPaneController::reloadWithNode(NodeRef node) {
     setTitle();
     reloadData(rowsOf(_nodes));
     createToolbarItems();
-    Q_EMIT reloaded();
+    Q_EMIT hintsChanged();
 }
 
 void KelvoPaneController::setTitle() {
@@ -117,9 +116,9 @@ void KelvoPaneController::updateValues(const std::vector<Row>& rows) {
     }
     ++_reloads;
     if (!anyFresh) return;
-    _host.queue().postAfter(kFreshTime, [pane = QPointer(this), reload = _reloads] {
-        if (pane && pane->_reloads == reload) pane->letFreshRowsAge();
-    });
+    _host.queue().postAfter(kFreshTime, _lifetime.whileAlive([this, reload = _reloads] {
+        if (_reloads == reload) letFreshRowsAge();
+    }));
 }
 
 void KelvoPaneController::letFreshRowsAge() {
@@ -137,6 +136,11 @@ void KelvoPaneController::setStatus(const QString& status, bool isLoading) {
     _status = status.isNull() ? QStringLiteral("") : status;
     _isLoading = isLoading;
     createToolbarItems();
+}
+
+void KelvoPaneController::setConnection(const Connection& connection) {
+    _connection = connection;
+    Q_EMIT hintsChanged();
 }
 
 void KelvoPaneController::createToolbarItems() {
@@ -178,13 +182,20 @@ void KelvoPaneController::didSelectRow(int row) {
     if (child->childNodes() == nullptr) return selectRow(-1);
     auto pane = std::make_unique<KelvoPaneController>(child, pathByAppending(_keyPath, child->displayName()), _host);
     pane->setStatus(_status, _isLoading);
+    pane->setConnection(_connection);
     if (_navigationController != nullptr) _navigationController->pushViewController(std::move(pane), true);
 }
 
 QString KelvoPaneController::emptyText() const {
     if (!_rows.empty()) return {};
-    if (!_nodes) return QStringLiteral("Waiting for the modem");
+    if (!_nodes) return QString::fromStdString(waitingText(_connection));
     return _nodes->childNodes() != nullptr ? QStringLiteral("None reported") : QStringLiteral("Nothing reported yet");
+}
+
+QString KelvoPaneController::note() const {
+    const bool saidInPlaceOfRows = !_nodes && !_connection.isConnected();
+    const bool calm = _connection.isConnected() && !_connection.isSilent();
+    return calm || saidInPlaceOfRows ? QString() : QString::fromStdString(connectionText(_connection));
 }
 
 int KelvoPaneController::rowCount(const QModelIndex& parent) const {

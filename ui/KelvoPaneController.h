@@ -7,7 +7,9 @@
 #include <chrono>
 #include <vector>
 
+#include "model/Connection.h"
 #include "model/KelvoModelNode.h"
+#include "platform/system/Lifetime.h"
 
 namespace kelvo {
 
@@ -31,7 +33,8 @@ class KelvoPaneController : public QAbstractListModel {
     QML_UNCREATABLE("The application makes its panes")
     Q_PROPERTY(QString title READ title NOTIFY titleChanged)
     Q_PROPERTY(QString backTitle READ backTitle CONSTANT)
-    Q_PROPERTY(QString emptyText READ emptyText NOTIFY reloaded)
+    Q_PROPERTY(QString emptyText READ emptyText NOTIFY hintsChanged)
+    Q_PROPERTY(QString note READ note NOTIFY hintsChanged)
     Q_PROPERTY(int selectedRow READ selectedRow NOTIFY selectedRowChanged)
     Q_PROPERTY(QString status READ status NOTIFY toolbarChanged)
     Q_PROPERTY(bool loading READ isLoading NOTIFY toolbarChanged)
@@ -48,12 +51,17 @@ public:
     const std::string& path() const { return _keyPath; }
     const QString& title() const { return _title; }          ///< the node's name, "Kelvo" while there is none
     const QString& backTitle() const { return _backTitle; }  ///< the pane below; empty at the bottom of the stack
-    QString emptyText() const;                        ///< what to say in place of rows; empty while there are some
+    QString emptyText() const;  ///< what to say in place of rows; empty while there are some
+    /// A quiet line beside the status: that no records come, or why there is no connection where there are values
+    /// still.
+    QString note() const;
     int selectedRow() const { return _selectedRow; }  ///< the highlighted row, -1 for none
 
     /// Replaces the node. Only the rows that differ change, so that fingers and scroll positions stay where they are.
     void reloadWithNode(NodeRef node);
     void setStatus(const QString& status, bool isLoading);
+    /// What `emptyText` and `note` tell of.
+    void setConnection(const Connection& connection);
     void viewWillAppear();
     void viewWillDisappear();
 
@@ -73,7 +81,7 @@ public:
 
 Q_SIGNALS:
     void titleChanged();
-    void reloaded();
+    void hintsChanged();
     void selectedRowChanged();
     void toolbarChanged();
     void resignFirstResponder();  ///< the keyboard is no longer the pane's
@@ -108,6 +116,7 @@ private:
     const std::string _keyPath;
     QString _status = QStringLiteral("");
     bool _isLoading = true;
+    Connection _connection;
     ScreenHost& _host;
     NavigationStack* _navigationController = nullptr;
     QString _title;
@@ -116,6 +125,7 @@ private:
     std::vector<Row> _rows;
     int _reloads = 0;
     std::vector<ToolbarItem> _toolbarItems;
+    const Lifetime _lifetime;  // tasks on the queue outlive the pane
 };
 
 }  // namespace kelvo

@@ -36,14 +36,16 @@ void KelvoSaveViewController::writeSnapshot() {
         const Result<Bytes> bytes = snapshot.propertyList();
         *written = bytes && writeFileInPlace(path, *bytes);
     };
-    const auto finish = [written, path, services = _services, alive = std::weak_ptr(_alive)] {
-        if (!*written) logLine(Level::Error, "Unable to write snapshot to %s", path);
-        if (alive.expired()) return;  // the program has ended over it
+    const auto leave = _lifetime.whileAlive([written, services = _services] {
         if (!*written) {
             services.host.showAlert(QStringLiteral("File Error"), QStringLiteral("Unable to write file to disk"),
                                     QStringLiteral("Close"));
         }
         close(services);
+    });
+    const auto finish = [written, path, leave] {
+        if (!*written) logLine(Level::Error, "Unable to write snapshot to %s", path);
+        leave();  // unless the program has ended meanwhile
     };
     _services.worker.run(write, finish);
 }

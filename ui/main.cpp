@@ -21,6 +21,7 @@
 #include "platform/system/DirectoryResources.h"
 #include "platform/system/Environment.h"
 #include "ui/KelvoApp.h"
+#include "ui/PlatformStart.h"
 #include "ui/QuickWindow.h"
 #include "ui/Theme.h"
 
@@ -39,8 +40,10 @@ void followDesktop(HostColorScheme::Scheme scheme) {
 
 int runApplication(int argc, char** argv) {
     ::mallopt(M_MMAP_THRESHOLD, kOwnMappingFrom);
+    std::optional<PlatformStart> start(std::in_place);
     QuickWindow::chooseSceneGraph();
     QGuiApplication application(argc, argv);
+    if (QGuiApplication::screens().isEmpty()) PlatformStart::fail(QStringLiteral("there is no screen"));
     QGuiApplication::setApplicationName(QStringLiteral("kelvo"));
     QGuiApplication::setApplicationDisplayName(QStringLiteral("Kelvo"));
     QGuiApplication::setDesktopFileName(QStringLiteral("org.kelvo.Kelvo"));
@@ -63,6 +66,7 @@ int runApplication(int argc, char** argv) {
     HostWorker worker;
     KelvoApp app({queue, ports, telephony, preferences, worker, [] { return std::make_unique<QuickWindow>(); }});
     app.applicationDidFinishLaunching();
+    start.reset();  // a first frame was drawn
 
     // Closing the window and the signals above end the program the same way.
     QObject::connect(&application, &QGuiApplication::aboutToQuit, &app,

@@ -11,6 +11,7 @@
 #include "LogGenerator/CDMA/C2KTrafficFER.h"
 #include "LogGenerator/Framing.h"
 #include "platform/system/Environment.h"
+#include "platform/telephony/LogChannelProtocol.h"
 
 namespace kelvo {
 
@@ -59,7 +60,7 @@ void addBinding(std::string_view lookupKey, std::string_view displayKey, const D
 DictionaryRef C2KLogGenerator::getStartCommand() {
     const ArrayRef codes = Array::make();
     for (const Decoder& decoder : kDecoders) codes->append(std::int64_t{decoder.code});
-    return Dictionary::make({{"SetState", "Streaming"}, {"SetOskraLogCodes", codes}});
+    return Dictionary::make({{kPLSetState, kPLStateStreaming}, {kPLSetOskraLogCodes, codes}});
 }
 
 void C2KLogGenerator::processTemplate(const Dictionary& templateDict, const DictionaryRef& storeDisplayIntoDict,

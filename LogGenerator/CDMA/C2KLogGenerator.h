@@ -12,6 +12,7 @@ namespace kelvo {
 /// the running values of the data rates and the frame error rate; the generator itself keeps the raw packets alone.
 class C2KLogGenerator final : public OSKLogGenerator {
 public:
+    C2KLogGenerator() { logCreation(); }
     static std::unique_ptr<LogGenerator> generator() { return std::make_unique<C2KLogGenerator>(); }
 
     void updateState(Dictionary& state, ByteView data) override;

@@ -2,6 +2,7 @@
 
 #include "LogGenerator/AssertionFailure.h"
 #include "platform/encodings/PropertyList.h"
+#include "platform/telephony/LogChannelProtocol.h"
 
 namespace kelvo {
 
@@ -56,7 +57,7 @@ Value GSMLogGenerator::generateLogUsingState(Dictionary& state) {
     return state["Display"];
 }
 
-DictionaryRef GSMLogGenerator::getStartCommand() { return Dictionary::make({{"SetState", "Streaming"}}); }
+DictionaryRef GSMLogGenerator::getStartCommand() { return Dictionary::make({{kPLSetState, kPLStateStreaming}}); }
 
 ArrayRef GSMLogGenerator::getSaveContentsFromState(Dictionary& state) {
     const ArrayRef& history = state["History"].array();

@@ -9,6 +9,7 @@ namespace kelvo {
 /// keeps nothing: all is in the state.
 class GSMLogGenerator final : public LogGenerator {
 public:
+    GSMLogGenerator() { logCreation(); }
     static std::unique_ptr<LogGenerator> generator() { return std::make_unique<GSMLogGenerator>(); }
 
     /// The tree without its one-entry dictionaries below the top, and without the first element of every array.

@@ -39,7 +39,8 @@ void RRC_State::updateWithData(ByteView data, LogCode logCode) {
         logLine(Level::Warning, "LogCode_0xD0E0 is length is %ld expected size %ld", data.size(), 15L);
     }
     const RecordView record(data);
-    const std::int64_t mode = record.read(13, u8) == 1 ? record.read(14, u8) : kUnknownMode;
+    const bool tellsMode = record.read(13, u8) == 1 && record.size() > 14;
+    const std::int64_t mode = tellsMode ? record.read(14, u8) : kUnknownMode;
     std::string name;
     print(name, mode, label(kMode));
     if (values()) values()->set("State", name);

@@ -10,17 +10,19 @@ namespace kelvo {
 
 namespace {
 
-bool mentionsUtran(std::string_view path) {
+bool mentionsUtran(std::string_view name) {
     constexpr std::string_view kName = "utran";
     const auto sameLetter = [](char a, char b) { return (a >= 'A' && a <= 'Z' ? a - 'A' + 'a' : a) == b; };
-    return std::search(path.begin(), path.end(), kName.begin(), kName.end(), sameLetter) != path.end();
+    return std::search(name.begin(), name.end(), kName.begin(), kName.end(), sameLetter) != name.end();
 }
 
 std::optional<std::string> findTemplate() {
     const Resources* resources = Environment::current().resources;
     if (resources == nullptr) return std::nullopt;
     for (const std::string& path : resources->pathsOfType("plist")) {
-        if (mentionsUtran(path)) return std::filesystem::path(path).stem().string();
+        // The name alone: where the program is installed says nothing about its templates.
+        std::string name = std::filesystem::path(path).stem().string();
+        if (mentionsUtran(name)) return name;
     }
     return std::nullopt;
 }

@@ -1,8 +1,5 @@
 #include "platform/host/HostMessagePorts.h"
 
-#include <cerrno>
-#include <cstring>
-
 #include "platform/host/HostLocalPort.h"
 #include "platform/host/HostPaths.h"
 #include "platform/host/HostRemotePort.h"
@@ -43,9 +40,9 @@ MessagePorts::Local HostMessagePorts::createLocal(std::string_view name, Message
     if (!directory) return {};
     auto claim = PortClaim::take(std::move(directory), std::string(name));
     if (!claim) {
-        const bool taken = claim.error() == PortClaim::Refusal::Taken;
-        if (!taken) logLine(Level::Error, "Cannot make port %s: %s", name, std::strerror(errno));
-        return {nullptr, taken, taken ? ownerOf(_directory, name) : 0};
+        const PortRefusal& refusal = claim.error();
+        if (!refusal.isTaken) logLine(Level::Error, "Cannot make port %s: %s", name, refusal.reason);
+        return {nullptr, refusal.isTaken, refusal.isTaken ? ownerOf(_directory, name) : 0};
     }
     auto server = std::make_shared<PortServer>(std::move(claim).value(), std::string(name), std::move(callback));
     return {std::make_unique<HostLocalPort>(std::move(server)), false};

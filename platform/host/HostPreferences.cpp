@@ -49,7 +49,7 @@ Result<DictionaryRef> load(const QString& path) {
     return read->dictionary();
 }
 
-Result<bool> save(const QString& path, const DictionaryRef& preferences) {
+Result<void> save(const QString& path, const DictionaryRef& preferences) {
     const auto encoded = writeXmlPropertyList(preferences);
     if (!encoded) return Failure{"cannot write " + path.toStdString() + ": " + encoded.error().reason};
     QSaveFile file(path);
@@ -57,10 +57,10 @@ Result<bool> save(const QString& path, const DictionaryRef& preferences) {
     if (!file.open(QIODevice::WriteOnly) || !file.setPermissions(QFile::ReadOwner | QFile::WriteOwner) ||
         file.write(reinterpret_cast<const char*>(encoded->data()), size) != size || !file.commit())
         return failed("write", file);
-    return true;
+    return {};
 }
 
-Result<bool> change(const std::filesystem::path& directory, std::string_view domain, std::string_view key,
+Result<void> change(const std::filesystem::path& directory, std::string_view domain, std::string_view key,
                     const Value& value) {
     if (!isDomain(domain)) return Failure{"the domain is no file name"};
     const QString folder = QString::fromStdString(directory);

@@ -28,17 +28,17 @@ Result<Bytes, RemotePort::Error> HostRemotePort::request(std::int32_t id, ByteVi
     header.flags = replyLimit ? PortHeader::WantsReply : PortHeader::NoFlags;
     header.id = id;
     header.sequence = ++_sequence;
-    if (const auto failure = send(header, data, sendLimit)) return *failure;
+    if (const auto sent = send(header, data, sendLimit); !sent) return sent.error();
     if (!replyLimit) return Bytes{};
     return awaitReply(header.sequence, std::chrono::steady_clock::now() + *replyLimit);
 }
 
-std::optional<RemotePort::Error> HostRemotePort::send(const PortHeader& header, ByteView data,
-                                                      std::chrono::nanoseconds limit) {
+Result<void, RemotePort::Error> HostRemotePort::send(const PortHeader& header, ByteView data,
+                                                     std::chrono::nanoseconds limit) {
     Deadline deadline;  // known once the first try has failed: most messages never ask for the time
     for (bool isFirst = true;; isFirst = false) {
         const PortSent sent = sendPortMessage(_connection.get(), header, data);
-        if (sent == PortSent::Sent) return std::nullopt;
+        if (sent == PortSent::Sent) return {};
         if (sent == PortSent::Gone) return Error::Invalid;
         if (isFirst) deadline = std::chrono::steady_clock::now() + limit;
         if (!waitForPort(_connection.get(), POLLOUT, deadline)) return Error::SendTimedOut;

@@ -25,7 +25,7 @@ public:
 private:
     using Deadline = std::chrono::steady_clock::time_point;
 
-    std::optional<Error> send(const PortHeader& header, ByteView data, std::chrono::nanoseconds limit);
+    Result<void, Error> send(const PortHeader& header, ByteView data, std::chrono::nanoseconds limit);
     Result<Bytes, Error> awaitReply(std::uint32_t sequence, Deadline deadline);
     void readUnexpected();
 

@@ -33,7 +33,7 @@ void LineQueue::Batch::clear() {
 void LineQueue::add(Level level, std::string_view text) {
     std::size_t size = 0;
     {
-        const std::lock_guard lock(_mutex);
+        const MutexHeld lock(_mutex);
         if (_batch.size() == _length) _batch.dropOldest();
         _batch.add(level, text);
         size = _batch.size();
@@ -43,16 +43,17 @@ void LineQueue::add(Level level, std::string_view text) {
 
 bool LineQueue::take(Batch& batch) {
     batch.clear();
-    std::unique_lock lock(_mutex);
-    _changed.wait(lock, [this] { return _batch.size() > 0 || _closed; });
-    _changed.wait_for(lock, kGathering, [this] { return _batch.size() >= _length / 2 || _closed; });
+    MutexHeld lock(_mutex);
+    lock.wait(_changed, [this]() KELVO_NEEDS(_mutex) { return _batch.size() > 0 || _closed; });
+    lock.waitFor(_changed, kGathering,
+                 [this]() KELVO_NEEDS(_mutex) { return _batch.size() >= _length / 2 || _closed; });
     std::swap(batch, _batch);
     return batch.size() > 0;
 }
 
 void LineQueue::close() {
     {
-        const std::lock_guard lock(_mutex);
+        const MutexHeld lock(_mutex);
         _closed = true;
     }
     _changed.notify_one();

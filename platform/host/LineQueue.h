@@ -2,11 +2,11 @@
 
 #include <condition_variable>
 #include <cstddef>
-#include <mutex>
 #include <string>
 #include <string_view>
 #include <vector>
 
+#include "platform/system/Mutex.h"
 #include "platform/system/SystemLog.h"
 
 namespace kelvo {
@@ -15,7 +15,7 @@ namespace kelvo {
 /// its text and never waits for the taker, and the taker is woken once for many lines.
 class LineQueue {
 public:
-    /// A heap of lines, side by side in one text.
+    /// Lines in their order, side by side in one text.
     class Batch {
     public:
         std::size_t size() const { return _lines.size() - _dropped; }
@@ -59,10 +59,10 @@ public:
 
 private:
     const std::size_t _length;
-    std::mutex _mutex;
+    Mutex _mutex;
     std::condition_variable _changed;
-    Batch _batch;
-    bool _closed = false;
+    Batch _batch KELVO_GUARDED_BY(_mutex);
+    bool _closed KELVO_GUARDED_BY(_mutex) = false;
 };
 
 }  // namespace kelvo

@@ -31,6 +31,6 @@ struct PortDatagram {
 
 /// Reads a whole datagram, which may hold anything; says in a few words what is wrong with one that is no message
 /// between ports. The data stay the caller's.
-Result<PortDatagram, const char*> parsePortDatagram(ByteView datagram);
+Result<PortDatagram> parsePortDatagram(ByteView datagram);
 
 }  // namespace kelvo

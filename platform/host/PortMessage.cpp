@@ -8,6 +8,7 @@
 #include <array>
 #include <cerrno>
 #include <cstring>
+#include <utility>
 
 #include "platform/system/MessagePorts.h"
 
@@ -81,14 +82,14 @@ PortReader::Outcome PortReader::read(int fd) {
 PortReader::Outcome PortReader::check(std::size_t received) {
     if (received > _buffer.size()) return refuse("it is too long");
     const auto datagram = parsePortDatagram(ByteView(_buffer).first(received));
-    if (!datagram) return refuse(datagram.error());
+    if (!datagram) return refuse(datagram.error().reason);
     _datagram = *datagram;
     return Outcome::Message;
 }
 
-PortReader::Outcome PortReader::refuse(const char* problem) {
+PortReader::Outcome PortReader::refuse(std::string problem) {
     _datagram = {};
-    _problem = problem;
+    _problem = std::move(problem);
     return Outcome::Garbage;
 }
 

@@ -1,6 +1,7 @@
 #pragma once
 
 #include <chrono>
+#include <string>
 
 #include "platform/host/PortDatagram.h"
 #include "platform/values/Bytes.h"
@@ -33,15 +34,15 @@ public:
 
     const PortHeader& header() const { return _datagram.header; }
     ByteView data() const { return _datagram.data; }
-    const char* problem() const { return _problem; }
+    const std::string& problem() const { return _problem; }
 
 private:
     Outcome check(std::size_t received);
-    Outcome refuse(const char* problem);
+    Outcome refuse(std::string problem);
 
     Bytes _buffer;  // made at the first read
     PortDatagram _datagram;
-    const char* _problem = "";
+    std::string _problem;
 };
 
 }  // namespace kelvo

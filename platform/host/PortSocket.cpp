@@ -46,6 +46,9 @@ bool isSameFile(int fd, int directory, const std::string& name) {
            opened.st_dev == named.st_dev && opened.st_ino == named.st_ino;
 }
 
+// A lock that another process holds is all that would block.
+PortRefusal refusal(int error) { return {error == EWOULDBLOCK, std::strerror(error)}; }
+
 }  // namespace
 
 bool isPortName(std::string_view name) {
@@ -73,11 +76,10 @@ pid_t processOfPeer(int fd) {
     return peer ? peer->pid : 0;
 }
 
-Result<PortClaim, PortClaim::Refusal> PortClaim::take(UniqueFd directory, std::string name) {
+Result<PortClaim, PortRefusal> PortClaim::take(UniqueFd directory, std::string name) {
     PortClaim claim(std::move(directory), std::move(name));
-    const auto locked = claim.lock();
-    if (!locked) return locked.error();
-    if (!claim.listen()) return Refusal::Failed;
+    if (const auto locked = claim.lock(); !locked) return locked.error();
+    if (const auto listening = claim.listen(); !listening) return listening.error();
     return claim;
 }
 
@@ -87,26 +89,27 @@ PortClaim::~PortClaim() {
     ::unlinkat(_directory.get(), (_name + ".lock").c_str(), 0);
 }
 
-Result<bool, PortClaim::Refusal> PortClaim::lock() {
+Result<void, PortRefusal> PortClaim::lock() {
     const std::string file = _name + ".lock";
     while (true) {
         UniqueFd opened(::openat(_directory.get(), file.c_str(), O_RDWR | O_CREAT | O_NOFOLLOW | O_CLOEXEC, 0600));
-        if (!opened) return Refusal::Failed;
-        if (::flock(opened.get(), LOCK_EX | LOCK_NB) != 0)
-            return errno == EWOULDBLOCK ? Refusal::Taken : Refusal::Failed;
+        if (!opened) return refusal(errno);
+        if (::flock(opened.get(), LOCK_EX | LOCK_NB) != 0) return refusal(errno);
         // The owner before may have removed the file between the opening and the locking: then the lock is on nothing.
         if (!isSameFile(opened.get(), _directory.get(), file)) continue;
         _lock = std::move(opened);
-        return true;
+        return {};
     }
 }
 
-bool PortClaim::listen() {
+Result<void, PortRefusal> PortClaim::listen() {
     ::unlinkat(_directory.get(), (_name + ".port").c_str(), 0);
     _listener = makeSocket();
     const sockaddr_un address = addressOf(_directory.get(), _name);
-    return _listener && ::bind(_listener.get(), reinterpret_cast<const sockaddr*>(&address), sizeof address) == 0 &&
-           ::listen(_listener.get(), kBacklog) == 0;
+    if (!_listener || ::bind(_listener.get(), reinterpret_cast<const sockaddr*>(&address), sizeof address) != 0 ||
+        ::listen(_listener.get(), kBacklog) != 0)
+        return refusal(errno);
+    return {};
 }
 
 }  // namespace kelvo

@@ -24,13 +24,17 @@ bool isPeerOfThisUser(int fd);
 /// The process at the other end; 0 when it cannot be told.
 pid_t processOfPeer(int fd);
 
+/// Why a port's name is not to be had.
+struct PortRefusal {
+    bool isTaken = false;  ///< a live owner has it; else the system refused
+    std::string reason;
+};
+
 /// The right to a port's name, and the socket that listens under it: `<name>.port` beside `<name>.lock`, which is held
 /// locked for as long as the owner lives. A lock that is free therefore marks what a dead owner left behind.
 class PortClaim {
 public:
-    enum class Refusal { Taken, Failed };  ///< a live owner has it; the system refused, errno says why
-
-    static Result<PortClaim, Refusal> take(UniqueFd directory, std::string name);
+    static Result<PortClaim, PortRefusal> take(UniqueFd directory, std::string name);
     PortClaim(PortClaim&&) = default;
     PortClaim& operator=(PortClaim&&) = delete;
     ~PortClaim();  ///< removes both files
@@ -39,8 +43,8 @@ public:
 
 private:
     PortClaim(UniqueFd directory, std::string name) : _directory(std::move(directory)), _name(std::move(name)) {}
-    Result<bool, Refusal> lock();
-    bool listen();
+    Result<void, PortRefusal> lock();
+    Result<void, PortRefusal> listen();
 
     UniqueFd _directory;
     std::string _name;

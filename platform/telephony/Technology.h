@@ -34,6 +34,9 @@ constexpr const TechnologyNames& namesOf(Technology technology) {
     return kTechnologies[static_cast<std::size_t>(technology)];
 }
 
+/// Whether the family's records carry log codes. Without, each is a tree, and nobody can ask for some of them alone.
+constexpr bool hasCodes(Technology technology) { return technology != Technology::IFX; }
+
 /// The family whose `field` is `wanted`, none when there is none: `technologyBy(&TechnologyNames::word, "lte")`.
 template <class Field>
 constexpr std::optional<Technology> technologyBy(Field TechnologyNames::*field, const Field& wanted) {

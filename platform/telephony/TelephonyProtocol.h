@@ -6,7 +6,8 @@
 /// once. Both are XML property lists:
 ///     request  { "CreateLogChannel": <name of the client's local port> }
 ///     answer   { "Error": n, "ErrorDomain": n, "PortName": <name of the service's port> }
-/// Error and ErrorDomain are 0, and PortName is there, when the channel exists.
+/// Error and ErrorDomain are 0, and PortName is there, when the channel exists; LogChannelProtocol.h goes on from
+/// there.
 ///
 /// And how anybody asks what it does:
 ///     request  { "GetStatus": "GetStatus" }

@@ -1,22 +1,22 @@
 #include "telephony/simulation/MakeSimulation.h"
 
-#include "telephony/simulation/CdmaSimulation.h"
-#include "telephony/simulation/GsmSimulation.h"
-#include "telephony/simulation/IfxSimulation.h"
-#include "telephony/simulation/LteSimulation.h"
-#include "telephony/simulation/UtranSimulation.h"
+#include "telephony/simulation/CDMA/Simulation.h"
+#include "telephony/simulation/GSMUMTS/Simulation.h"
+#include "telephony/simulation/IFX/Simulation.h"
+#include "telephony/simulation/LTE/Simulation.h"
+#include "telephony/simulation/UTRAN/Simulation.h"
 
 namespace kelvo::simulation {
 
 std::unique_ptr<Simulation> makeSimulation(Technology technology, std::uint64_t seed) {
     switch (technology) {
-        case Technology::IFX: return std::make_unique<IfxSimulation>(seed);
-        case Technology::GSM: return std::make_unique<GsmSimulation>(seed);
-        case Technology::CDMA: return std::make_unique<CdmaSimulation>(seed);
-        case Technology::UTRAN: return std::make_unique<UtranSimulation>(seed);
+        case Technology::IFX: return std::make_unique<ifx::Simulation>(seed);
+        case Technology::GSM: return std::make_unique<gsm::Simulation>(seed);
+        case Technology::CDMA: return std::make_unique<cdma::Simulation>(seed);
+        case Technology::UTRAN: return std::make_unique<utran::Simulation>(seed);
         case Technology::LTE: break;
     }
-    return std::make_unique<LteSimulation>(seed);
+    return std::make_unique<lte::Simulation>(seed);
 }
 
 }  // namespace kelvo::simulation

@@ -44,6 +44,10 @@ std::vector<Sector> buildSectors(const TownPlan& plan, Random& random) {
     return sectors;
 }
 
+int sliceOf(Point place, int slices, double turn) {
+    return static_cast<int>((bearing({}, place) + turn) * slices / 360) % slices;
+}
+
 std::vector<std::size_t> byStrength(const std::vector<double>& levels) {
     std::vector<std::size_t> order(levels.size());
     std::iota(order.begin(), order.end(), std::size_t{0});

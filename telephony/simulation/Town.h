@@ -16,6 +16,10 @@ struct Sector {
     double carrierMHz = 2100;
 };
 
+/// The operator of every network: the test network of ITU-T E.212, MCC 001 and MNC 01.
+inline constexpr int kMcc = 1;
+inline constexpr int kMnc = 1;
+
 /// How a network was built.
 struct TownPlan {
     double radius = 2500;       ///< metres: sites up to here
@@ -27,6 +31,10 @@ struct TownPlan {
 /// Three-sector base stations on a slightly irregular hexagonal grid, in order of their distance from the centre:
 /// sectors 0 to 2 are the first site's.
 std::vector<Sector> buildSectors(const TownPlan& plan, Random& random);
+
+/// The town in as many equal slices, numbered clockwise from 0, which begins `turn` degrees before north: where a place
+/// is.
+int sliceOf(Point place, int slices, double turn = 0);
 
 /// The indices of `levels`, the strongest first; of equals the first.
 std::vector<std::size_t> byStrength(const std::vector<double>& levels);

@@ -57,6 +57,13 @@ std::optional<MutableBytes> FrameReader::next(MutableBytes& input) {
     return std::nullopt;
 }
 
+void FrameReader::reset() {
+    if (std::exchange(_handedOut, false)) _kept.clear();
+    if (!_kept.empty()) refuse(_counts.unfinished);
+    _skipping = false;
+    _first = true;
+}
+
 void FrameReader::keep(MutableBytes beginning) {
     if (_skipping) return;
     if (_kept.size() + beginning.size() > kLongestContent) {

@@ -26,8 +26,9 @@ public:
         std::uint64_t badEscapes = 0;    ///< 0x7D with neither 0x5D nor 0x5E behind it
         std::uint64_t badChecksums = 0;  ///< the checksum is that of other bytes
         std::uint64_t oversized = 0;     ///< longer than kLongestFrame
+        std::uint64_t unfinished = 0;    ///< their end had not come when the stream ended
 
-        std::uint64_t damaged() const { return tooShort + badEscapes + badChecksums + oversized; }
+        std::uint64_t damaged() const { return tooShort + badEscapes + badChecksums + oversized + unfinished; }
         bool operator==(const Counts&) const = default;
     };
 
@@ -37,6 +38,9 @@ public:
     std::optional<MutableBytes> next(MutableBytes& input);
 
     const Counts& counts() const { return _counts; }
+
+    /// The stream has ended, and another begins. The counts go on.
+    void reset();
 
 private:
     void keep(MutableBytes beginning);

@@ -1,11 +1,15 @@
 #pragma once
 
+#include <bitset>
 #include <cstdint>
 
 #include "LogGenerator/LogCode.h"
 #include "platform/values/Bytes.h"
 
 namespace kelvo::wire {
+
+/// A set of record codes: 8 KiB.
+using RecordCodes = std::bitset<65536>;
 
 inline constexpr std::uint32_t kEquipmentIds = 16;
 inline constexpr std::uint32_t kMostItems = 4096;  ///< of one equipment: an item is the lower 12 bits of a code

@@ -75,7 +75,7 @@ TEST(ClassIndex, SubscribesASectionTwiceThatListsACodeTwice) {
 
 TEST(ClassIndex, NamesEveryCodeOnceInDecimal) {
     const TwoSections index;
-    EXPECT_EQ(index.getAllLogCodes(), (std::vector<std::string>{"16762", "16711681", "28978"}));
+    EXPECT_EQ(index.getAllLogCodes(), (std::vector<LogCode>{0x417a, 0xff0001, 0x7132}));
 }
 
 TEST(ClassIndex, WritesItsProgressToTheLog) {

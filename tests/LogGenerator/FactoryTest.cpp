@@ -1,3 +1,5 @@
+#include "LogGenerator/Factory.h"
+
 #include <gtest/gtest.h>
 
 #include "LogGenerator/CDMA/C2KLogGenerator.h"
@@ -11,7 +13,7 @@ namespace {
 
 template <class Generator>
 bool makes(std::string_view technology) {
-    const auto generator = LogGenerator::generatorFromTechnology(technology);
+    const auto generator = generatorFromTechnology(technology);
     return dynamic_cast<Generator*>(generator.get()) != nullptr;
 }
 
@@ -25,7 +27,7 @@ TEST(Factory, MakesTheGeneratorOfATechnology) {
 
 TEST(Factory, MakesNoneForAnythingElse) {
     for (const char* technology : {"", "LTE", "kPLLogChannelTechnology_Oskra_LTE ", "kPLLogChannelTechnology_ifx"}) {
-        EXPECT_EQ(LogGenerator::generatorFromTechnology(technology), nullptr) << technology;
+        EXPECT_EQ(generatorFromTechnology(technology), nullptr) << technology;
     }
 }
 

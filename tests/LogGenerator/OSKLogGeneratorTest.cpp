@@ -117,6 +117,13 @@ TEST_F(Dlf, IsAbandonedWhenASnapshotHoldsNoData) {
     EXPECT_EQ(Value(generator.getSaveContentsFromState(state)), Value(history));  // the snapshots are still saved
 }
 
+TEST_F(Dlf, IsNotMadeWithoutRoomForItsVersionReport) {
+    history->append(snapshot(Bytes{1, 2, 3}));
+    state.set("History", history);
+    EXPECT_EQ(OSKLogGenerator::generateDlfFromState(state, 160), std::nullopt);
+    EXPECT_EQ(log.lines(), (Lines{{16, "Could not write DLF header (result=3)"}}));
+}
+
 TEST_F(Dlf, FollowsTheHistoryInTheSaveContents) {
     Generator generator;
     ArrayRef contents = generator.getSaveContentsFromState(state);

@@ -49,7 +49,7 @@ class ApplicationTest(unittest.TestCase):
 
     def waits_for_a_service(self):
         application, window = self.session.start_application(internal=False)
-        window.wait("Waiting for the modem")
+        window.wait("No telephony service is running")
         window.wait(lambda text: text.startswith("Connecting"))
         self.assertIsNone(window.find("Save"))
         application.terminate()

@@ -11,7 +11,7 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size
     using namespace kelvo;
     const auto parsed = parsePortDatagram({data, size});
     if (!parsed) {
-        fuzz::require(parsed.error() != nullptr && parsed.error()[0] != '\0', "refused without a reason");
+        fuzz::require(!parsed.error().reason.empty(), "refused without a reason");
         return 0;
     }
     Bytes again(sizeof parsed->header);

@@ -39,6 +39,20 @@ TEST(ConnectionText, NamesTheObstacle) {
     EXPECT_EQ(connectionText({State::UnknownTechnology}), "The modem's technology is unknown");
 }
 
+TEST(WaitingText, NamesAModemThatSendsNothingFromTheStart) {
+    EXPECT_EQ(waitingText({}), "Waiting for the modem");
+    EXPECT_EQ(waitingText({State::NoRecordYet, 10s - 1ns}), "Waiting for the modem");
+    EXPECT_EQ(waitingText({State::NoRecordYet, 10s}), "The modem sends nothing");
+    EXPECT_EQ(waitingText({State::Receiving, 0s}), "Waiting for the modem");  // for the refresh that shows it
+    EXPECT_EQ(waitingText({State::Receiving, 60s}), "Waiting for the modem");
+}
+
+TEST(WaitingText, NamesTheObstacle) {
+    EXPECT_EQ(waitingText({State::NoService}), "No telephony service is running");
+    EXPECT_EQ(waitingText({State::PortTaken}), "Kelvo is already open");
+    EXPECT_EQ(waitingText({State::NoAnswer}), "The telephony service does not answer");
+}
+
 TEST(StatusText, IsTheUpdateMessageWhileConnected) {
     EXPECT_EQ(statusText(true, "Updated 2011-03-04 at 09:15:02"), "Updated 2011-03-04 at 09:15:02");
     EXPECT_EQ(statusText(false, "Updated 2011-03-04 at 09:15:02"), "Connecting...");

@@ -72,6 +72,7 @@ public:
     std::unique_ptr<RepeatingTimer> repeat(std::chrono::nanoseconds, Task) override {
         return std::make_unique<Timer>(_steps);
     }
+    std::chrono::nanoseconds now() const override { return {}; }
 
 private:
     struct Timer final : RepeatingTimer {

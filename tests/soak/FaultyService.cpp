@@ -8,6 +8,7 @@
 #include <algorithm>
 #include <chrono>
 #include <thread>
+#include <tuple>
 
 #include "platform/encodings/PropertyList.h"
 #include "platform/host/HostPaths.h"
@@ -132,16 +133,16 @@ void FaultyService::flood(Client& client) {
 }
 
 void FaultyService::annoy(Client& client) {
-    for (int i = 0; i < 40; ++i) client.records->request(0, mutilated(), {}, std::nullopt);
+    for (int i = 0; i < 40; ++i) std::ignore = client.records->request(0, mutilated(), {}, std::nullopt);
     for (int i = 0; i < 5; ++i)
-        client.records->request(static_cast<std::int32_t>(_random()), mutilated(), {}, std::nullopt);
+        std::ignore = client.records->request(static_cast<std::int32_t>(_random()), mutilated(), {}, std::nullopt);
     const UniqueFd directory(::open(HostPaths::portDirectory().c_str(), O_RDONLY | O_DIRECTORY | O_CLOEXEC));
     const UniqueFd raw = connectToPort(directory.get(), client.name);
     for (int i = 0; raw && i < 10; ++i) {
         const Bytes datagram = anything(below(200));
         ::send(raw.get(), datagram.data(), datagram.size(), MSG_DONTWAIT | MSG_NOSIGNAL);
     }
-    client.records->request(0, _messages.front(), {}, 0ns);  // a reply that nobody waits for
+    std::ignore = client.records->request(0, _messages.front(), {}, 0ns);  // a reply that nobody waits for
 }
 
 /// A message of the capture with bytes changed, cut off or added behind its header.

@@ -177,9 +177,10 @@ TEST_F(TelephonyServiceTest, TellsTheSourceWhenAClientHasCaughtUp) {
 TEST_F(TelephonyServiceTest, IsOneOfAKind) {
     start();
     TelephonyService second(_ports, _source);
-    const auto failure = second.open();
-    ASSERT_TRUE(failure);
-    EXPECT_EQ(failure->reason, "another telephony service is running (process " + std::to_string(::getpid()) + ")");
+    const Result<void> opened = second.open();
+    ASSERT_FALSE(opened);
+    EXPECT_EQ(opened.error().reason,
+              "another telephony service is running (process " + std::to_string(::getpid()) + ")");
 }
 
 TEST_F(TelephonyServiceTest, LeavesNoPortsBehind) {

@@ -1,6 +1,5 @@
 // Every capture in tests/captures has a twin, the JSON that decoding it must give. A new pair is a new case without
-// code;
-// "--rebless" writes the twins anew.
+// code; "--rebless" writes the twins anew.
 #include <gtest/gtest.h>
 
 #include <algorithm>

@@ -26,6 +26,7 @@ Item {
 
     Glyph {
         id: check
+        objectName: "check"
         anchors { right: parent.right; rightMargin: 14; verticalCenter: parent.verticalCenter }
         shape: Glyph.Check
         color: Theme.accent

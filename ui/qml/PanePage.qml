@@ -103,6 +103,7 @@ FocusScope {
         anchors { left: parent.left; right: parent.right; top: parent.top }
         title: page.pane.title
         backTitle: page.pane.backTitle
+        column: list
         onBack: page.navigation.popViewController()
     }
 
@@ -111,6 +112,7 @@ FocusScope {
         anchors { left: parent.left; right: parent.right; bottom: parent.bottom }
         visible: !page.navigation.toolbarHidden
         pane: page.pane
+        column: list
     }
 
     Connections {

@@ -9,17 +9,31 @@ KelvoCell {
     required property bool fresh
     required property KelvoPaneController pane
     readonly property bool marked: ListView.isCurrentItem && ListView.view.activeFocus
+    readonly property real valueWidth: valueFrame.width
+    property real lastValueWidth: 0
+    // Values are measured bold and drawn regular: what is drawn may fit although what was measured does not.
+    readonly property real drawnEnd: shownValue !== "" ? value.x + value.implicitWidth : name.x + name.width
+    readonly property real areaWidth: width - 22 - (opens ? 18 : 0)
 
     signal touched
 
     height: 50
-    contentArea: Qt.rect(0, 0, content.width, content.height)
+    contentArea: Qt.rect(0, 0, areaWidth, content.height)
 
     function scrollSideways(by: real): bool {
         if (!strip.interactive)
             return false;
         strip.contentX = Math.max(0, Math.min(strip.contentWidth - strip.width, strip.contentX + by));
         return true;
+    }
+
+    // What was swiped to has gone with a value that is shorter than the one before; a finger on the row keeps it.
+    onValueWidthChanged: {
+        if (valueWidth < lastValueWidth && !strip.dragging) {
+            strip.cancelFlick();
+            strip.contentX = 0;
+        }
+        lastValueWidth = valueWidth;
     }
 
     ListView.onPooled: {
@@ -44,8 +58,9 @@ KelvoCell {
         id: content
 
         x: 6
-        width: row.width - 22 - (row.opens ? 18 : 0)
+        width: row.areaWidth + (row.opens ? 0 : 10)  // what ends in the margin is seen
         height: row.height
+        clip: strip.interactive
 
         Flickable {
             id: strip
@@ -53,16 +68,16 @@ KelvoCell {
 
             x: row.viewFrame.x
             y: row.viewFrame.y
-            width: row.opens || row.viewFrame.width === 0 ? content.width : row.viewFrame.width
+            width: row.opens || row.viewFrame.width === 0 ? row.areaWidth : row.viewFrame.width
             height: content.height
             contentWidth: row.viewContentSize.width
             contentHeight: height
             flickableDirection: Flickable.HorizontalFlick
             interactive: !row.opens && contentWidth > width  // a row that showed a long value before may open now
             onInteractiveChanged: if (!interactive) contentX = 0
-            clip: interactive
 
             Text {
+                id: name
                 x: row.keyFrame.x
                 y: row.keyFrame.y
                 // A name that no strip can scroll ends before the arrow.
@@ -84,13 +99,25 @@ KelvoCell {
                 color: Theme.secondaryText
                 font.pixelSize: 15
             }
+
+            Rectangle {
+                id: mark
+                objectName: "mark"
+                x: value.x
+                y: value.y + value.implicitHeight + 1
+                width: value.implicitWidth
+                height: 2
+                color: Theme.accent
+                opacity: 0
+            }
         }
 
         // More of the value lies to the right.
         Rectangle {
+            objectName: "fade"
             anchors { right: parent.right; top: parent.top; bottom: parent.bottom; bottomMargin: 1 }
             width: 28
-            visible: strip.interactive && row.valueFrame.x + row.valueFrame.width - strip.contentX > strip.width
+            visible: strip.interactive && row.drawnEnd - strip.contentX > content.width
             gradient: Gradient {
                 orientation: Gradient.Horizontal
                 GradientStop { position: 0; color: Qt.rgba(Theme.row.r, Theme.row.g, Theme.row.b, 0) }
@@ -100,6 +127,7 @@ KelvoCell {
     }
 
     Glyph {
+        objectName: "disclosure"
         anchors { right: parent.right; rightMargin: 14; verticalCenter: parent.verticalCenter }
         visible: row.opens
         width: 14
@@ -120,15 +148,17 @@ KelvoCell {
         border { width: 2; color: Theme.accent }
     }
 
-    // A value that changed stands out at once and calms down slowly.
+    // A value that changed stands out at once and calms down slowly. The line under it is for the sun and for eyes that
+    // tell colours apart badly: accent and text colour differ in their hue alone.
     states: State {
         name: "fresh"
         when: row.fresh
-        PropertyChanges { value.color: Theme.accent }
+        PropertyChanges { value.color: Theme.accent; mark.opacity: 1 }
     }
     transitions: Transition {
         from: "fresh"
         ColorAnimation { duration: 400 }
+        NumberAnimation { target: mark; property: "opacity"; duration: 400 }
     }
 
     TapHandler {

@@ -63,6 +63,20 @@ FocusScope {
         onTapped: screen.application.navigation.popViewController()
     }
 
+    // A swipe from the left edge leads back, with a finger or with the mouse's button held down. What lies under the edge
+    // takes every tap there, and every swipe up and down.
+    Item {
+        width: 24
+        height: stack.height
+
+        DragHandler {
+            target: null
+            enabled: stack.enabled && stack.depth > 1 && !stack.busy
+            yAxis.enabled: false
+            onActiveTranslationChanged: if (activeTranslation.x > 64) screen.application.navigation.popViewController()
+        }
+    }
+
     Component {
         id: page
         PanePage {

@@ -6,6 +6,7 @@ Rectangle {
     id: bar
 
     required property KelvoPaneController pane
+    required property Item column  // where the rows are
 
     height: 50
     color: Theme.bar
@@ -16,29 +17,49 @@ Rectangle {
 
     ActivityIndicator {
         id: indicator
-        anchors { left: parent.left; leftMargin: 16; verticalCenter: parent.verticalCenter }
+        x: bar.column.x + 16
+        anchors.verticalCenter: parent.verticalCenter
         running: bar.pane.loading
         color: Theme.secondaryText
     }
 
     FigureText {
+        id: status
+        objectName: "status"
         anchors.verticalCenter: parent.verticalCenter
-        x: indicator.running ? 44 : 16
-        maximumWidth: bar.width - x - (save.visible ? save.width + 4 : 16)
+        x: bar.column.x + inset
+        maximumWidth: bar.column.width - inset - (save.visible ? save.width + 4 : 16)
         text: bar.pane.status
         color: Theme.text
         font.pixelSize: 14
         Accessible.ignored: !enabled
         Accessible.role: Accessible.StaticText
         Accessible.name: text
-        Behavior on x {
+
+        property real inset: indicator.running ? 44 : 16
+        Behavior on inset {
             NumberAnimation { duration: 160; easing.type: Easing.OutCubic }
         }
     }
 
+    // Below the status text, which keeps its place whether this is there or not.
+    FigureText {
+        objectName: "note"
+        anchors { left: status.left; top: status.bottom; topMargin: -1 }
+        maximumWidth: status.maximumWidth
+        text: bar.pane.note
+        visible: text !== ""
+        color: Theme.secondaryText
+        font.pixelSize: 12
+        Accessible.ignored: !enabled
+        Accessible.role: Accessible.StaticText
+        Accessible.name: text
+    }
+
     BarButton {
         id: save
-        anchors { right: parent.right; rightMargin: 4; verticalCenter: parent.verticalCenter }
+        x: bar.column.x + bar.column.width - 4 - width
+        anchors.verticalCenter: parent.verticalCenter
         visible: bar.pane.offersSave
         text: qsTr("Save")
         onClicked: bar.pane.saveButtonPressed()

@@ -7,6 +7,7 @@ Rectangle {
 
     required property string title
     required property string backTitle
+    required property Item column  // where the rows are
 
     signal back
 
@@ -15,14 +16,18 @@ Rectangle {
 
     BarButton {
         id: backButton
+        objectName: "back"
+
+        readonly property real smallest: 44  // for a thumb
 
         // A title that needs the room first becomes smaller, and then leaves the way back its arrow alone.
-        // A third of the bar, or all that a title in its middle leaves.
-        readonly property real named: Math.min(implicitWidth, Math.max(bar.width / 3, (bar.width - title.implicitWidth) / 2 - x - 4))
-        readonly property bool roomForName: x + named + 4 + title.implicitWidth * 14 / 17 <= bar.width - 16
+        // A third of the column, or all that a title in its middle leaves.
+        readonly property real named: Math.max(smallest, Math.min(implicitWidth, Math.max(bar.column.width / 3, (bar.column.width - title.implicitWidth) / 2 - 8)))
+        readonly property bool roomForName: 4 + named + 4 + title.implicitWidth * 14 / 17 <= bar.column.width - 16
 
-        anchors { left: parent.left; leftMargin: 4; verticalCenter: parent.verticalCenter }
-        width: roomForName ? named : 40
+        x: bar.column.x + 4
+        anchors.verticalCenter: parent.verticalCenter
+        width: roomForName ? named : smallest
         visible: bar.backTitle !== ""
         text: bar.backTitle
         textHidden: !roomForName
@@ -34,11 +39,11 @@ Rectangle {
     Text {
         id: title
 
-        readonly property real side: backButton.visible ? backButton.x + backButton.width + 4 : 16
-        readonly property bool centred: implicitWidth <= bar.width - 2 * side
+        readonly property real side: backButton.visible ? 4 + backButton.width + 4 : 16
+        readonly property bool centred: implicitWidth <= bar.column.width - 2 * side
 
-        x: centred ? (bar.width - implicitWidth) / 2 : side
-        width: centred ? implicitWidth : bar.width - side - 16
+        x: bar.column.x + (centred ? (bar.column.width - implicitWidth) / 2 : side)
+        width: centred ? implicitWidth : bar.column.width - side - 16
         horizontalAlignment: Text.AlignHCenter
         anchors.verticalCenter: parent.verticalCenter
         text: bar.title

@@ -3,13 +3,13 @@
 #include <algorithm>
 #include <utility>
 
-namespace kelvo::simulation {
+namespace kelvo::simulation::cdma {
 namespace {
 
 using namespace std::chrono_literals;
 
 // Pilot bursts go out with all of a sector's power. The carrier lies higher than the one that the drive was built for.
-const CdmaLoading kLoading{
+const Loading kLoading{
     .gain = pathLoss(1000, kOneXCarrier.downlinkMHz) - pathLoss(1000, kEvdoCarrier.downlinkMHz), .pilot = 1, .all = 1};
 constexpr double kTurnaround = -76;      // dB: mean output power is this less the input
 constexpr double kMostPower = 23;        // dBm
@@ -29,7 +29,7 @@ double carrierToInterference(double strength) {
 
 }  // namespace
 
-EvdoModem::EvdoModem(const CdmaNetwork& network, Random random)
+EvdoModem::EvdoModem(const Network& network, Random random)
     : _network(network), _random(std::move(random)), _link(_random.split()) {}
 
 void EvdoModem::measure(const Drive& drive, Time duration, double demand) {
@@ -82,7 +82,7 @@ void EvdoModem::begin(EvdoState state, Time now, Time duration) {
 
 void EvdoModem::idle(Time now, bool browse) {
     _pilots.reselect(_air, now);
-    const bool moved = static_cast<int>(_network.sectors[_pilots.reference()].zone) != _sessionZone;
+    const bool moved = static_cast<int>(_network.cells[_pilots.reference()].zone) != _sessionZone;
     if (moved || _status.session != SessionState::Open) _status.session = SessionState::AddressSetup;
     if (browse || _status.session != SessionState::Open) begin(EvdoState::Access, now, 400ms);
 }
@@ -91,15 +91,15 @@ void EvdoModem::idle(Time now, bool browse) {
 /// network.
 void EvdoModem::setUpAddress() {
     _status.session = _sessionZone < 0 ? SessionState::PhoneNegotiates : SessionState::NetworkNegotiates;
-    const std::size_t zone = _network.sectors[_pilots.reference()].zone;
+    const std::size_t zone = _network.cells[_pilots.reference()].zone;
     _sessionZone = static_cast<int>(zone);
-    _status.colorCode = kCdmaZones[zone].colorCode;
+    _status.colorCode = kZones[zone].colorCode;
     _status.uati = static_cast<std::uint32_t>(_random.between(0, 0xFFFFFF));
 }
 
 void EvdoModem::readPilots() {
     _status.active = _pilots.readings(_air, _network);
-    _status.servingPn = _pilots.empty() ? EvdoStatus::kNoPn : _network.sectors[_pilots.reference()].pn;
+    _status.servingPn = _pilots.empty() ? std::nullopt : std::optional(_network.cells[_pilots.reference()].pn);
 }
 
 void EvdoModem::placeFingers() {
@@ -115,7 +115,7 @@ void EvdoModem::placeFingers() {
         }
     }
     if (_status.fingers.size() > kFingers) _status.fingers.resize(kFingers);
-    while (!_status.fingers.empty() && _status.fingers.back().pn == Finger::kFree) _status.fingers.pop_back();
+    while (!_status.fingers.empty() && !_status.fingers.back().pn) _status.fingers.pop_back();
 }
 
-}  // namespace kelvo::simulation
+}  // namespace kelvo::simulation::cdma

@@ -3,12 +3,12 @@
 #include "telephony/simulation/CDMA/PacketLink.h"
 #include "telephony/simulation/CDMA/PilotSet.h"
 
-namespace kelvo::simulation {
+namespace kelvo::simulation::cdma {
 
 /// The EV-DO half of the modem: works while 1x leaves it the receiver.
 class EvdoModem {
 public:
-    EvdoModem(const CdmaNetwork& network, Random random);
+    EvdoModem(const Network& network, Random random);
 
     /// Reads the air, and receives and sends the packets of `duration` when connected; `demand` is the part of the
     /// link that the user asks for, 0 to 1.
@@ -27,9 +27,9 @@ private:
     void readPilots();
     void placeFingers();
 
-    const CdmaNetwork& _network;
+    const Network& _network;
     Random _random;
-    CdmaAir _air;
+    Air _air;
     PilotSet _pilots{kEvdoRules};
     std::vector<std::size_t> _followed;  // the pilots that the fingers were placed for
     PacketLink _link;
@@ -38,4 +38,4 @@ private:
     int _sessionZone = -1;
 };
 
-}  // namespace kelvo::simulation
+}  // namespace kelvo::simulation::cdma

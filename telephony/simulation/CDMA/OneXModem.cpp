@@ -3,12 +3,12 @@
 #include <algorithm>
 #include <cmath>
 
-namespace kelvo::simulation {
+namespace kelvo::simulation::cdma {
 namespace {
 
 using namespace std::chrono_literals;
 
-constexpr CdmaLoading kLoading{.gain = 0, .pilot = 0.2, .all = 0.65};
+constexpr Loading kLoading{.gain = 0, .pilot = 0.2, .all = 0.65};
 constexpr Time kSlotCycle = 2560ms;  // SLOT_CYCLE_INDEX 1
 constexpr Time kAwake = 480ms;       // of each cycle, for the paging slot and a look at the neighbors
 constexpr Time kOverhead = 300ms;
@@ -25,7 +25,7 @@ double frameErrors(double strength) { return 0.01 + 0.6 / (1 + std::exp(strength
 
 }  // namespace
 
-OneXModem::OneXModem(const CdmaNetwork& network, Random random) : _network(network), _random(std::move(random)) {}
+OneXModem::OneXModem(const Network& network, Random random) : _network(network), _random(std::move(random)) {}
 
 bool OneXModem::isIdle() const {
     return _status.state == OneXState::Sleep || (_status.state == OneXState::Paging && _task != Task::Access);
@@ -90,7 +90,7 @@ void OneXModem::finishTask() {
         case Task::None: break;
         case Task::Overhead: _system = _network.systemOf(_pilots.reference()); break;
         case Task::Registration:
-            _registeredZone = static_cast<int>(_network.sectors[_pilots.reference()].zone);
+            _registeredZone = static_cast<int>(_network.cells[_pilots.reference()].zone);
             ++_registrations;
             break;
         case Task::Access: _status.state = OneXState::Traffic; break;
@@ -100,8 +100,8 @@ void OneXModem::finishTask() {
 
 void OneXModem::idle(Time now, bool talk) {
     if (_status.state == OneXState::Traffic) return;
-    const CdmaSector& sector = _network.sectors[_pilots.reference()];
-    if (static_cast<int>(sector.zone) != _registeredZone) return begin(Task::Registration, now, kRegistration);
+    const Cell& cell = _network.cells[_pilots.reference()];
+    if (static_cast<int>(cell.zone) != _registeredZone) return begin(Task::Registration, now, kRegistration);
     if (talk) return begin(Task::Access, now, kAccess);
     const bool awake = now % kSlotCycle < kAwake;
     _status.state = awake ? OneXState::Paging : OneXState::Sleep;
@@ -110,7 +110,7 @@ void OneXModem::idle(Time now, bool talk) {
 
 void OneXModem::readPilots() {
     _status.active = _pilots.readings(_air, _network);
-    _status.referencePn = _pilots.empty() ? 0 : _network.sectors[_pilots.reference()].pn;
+    _status.referencePn = _pilots.empty() ? PnOffset() : _network.cells[_pilots.reference()].pn;
 }
 
-}  // namespace kelvo::simulation
+}  // namespace kelvo::simulation::cdma

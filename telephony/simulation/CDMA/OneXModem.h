@@ -2,12 +2,12 @@
 
 #include "telephony/simulation/CDMA/PilotSet.h"
 
-namespace kelvo::simulation {
+namespace kelvo::simulation::cdma {
 
 /// The 1x half of the modem: finds the system, sleeps between its paging slots, hands off, registers, talks.
 class OneXModem {
 public:
-    OneXModem(const CdmaNetwork& network, Random random);
+    OneXModem(const Network& network, Random random);
 
     /// Reads the air; all of the status but its state is as read last.
     void measure(const Drive& drive);
@@ -18,7 +18,7 @@ public:
 
     const OneXStatus& status() const { return _status; }
     /// Of the last sector whose overhead messages have been read.
-    const CdmaSystem& system() const { return _system; }
+    const System& system() const { return _system; }
     int registrations() const { return _registrations; }
     /// The receiver is free for EV-DO.
     bool isIdle() const;
@@ -34,16 +34,16 @@ private:
     void idle(Time now, bool talk);
     void readPilots();
 
-    const CdmaNetwork& _network;
+    const Network& _network;
     Random _random;
-    CdmaAir _air;
+    Air _air;
     PilotSet _pilots{kOneXRules};
     OneXStatus _status;
-    CdmaSystem _system;
+    System _system;
     Task _task = Task::None;
     Time _until = std::chrono::milliseconds(100);
     int _registeredZone = -1;
     int _registrations = 0;
 };
 
-}  // namespace kelvo::simulation
+}  // namespace kelvo::simulation::cdma

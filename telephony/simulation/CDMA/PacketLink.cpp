@@ -5,7 +5,7 @@
 
 #include "telephony/simulation/Propagation.h"
 
-namespace kelvo::simulation {
+namespace kelvo::simulation::cdma {
 namespace {
 
 constexpr double kSlotsPerSecond = 600;
@@ -78,4 +78,4 @@ void PacketLink::sendPacket(std::size_t size) {
     _counters.reverseBits += static_cast<std::uint64_t>(kReverseBits[size]);
 }
 
-}  // namespace kelvo::simulation
+}  // namespace kelvo::simulation::cdma

@@ -1,10 +1,10 @@
 #pragma once
 
-#include "telephony/simulation/CDMA/CdmaWorld.h"
+#include "telephony/simulation/CDMA/Reports.h"
 #include "telephony/simulation/Random.h"
 #include "telephony/simulation/Time.h"
 
-namespace kelvo::simulation {
+namespace kelvo::simulation::cdma {
 
 /// The packets of an EV-DO connection, counted for as long as the modem runs.
 class PacketLink {
@@ -30,4 +30,4 @@ private:
     int _interlace = 0;
 };
 
-}  // namespace kelvo::simulation
+}  // namespace kelvo::simulation::cdma

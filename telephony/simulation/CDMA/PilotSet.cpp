@@ -2,7 +2,7 @@
 
 #include <algorithm>
 
-namespace kelvo::simulation {
+namespace kelvo::simulation::cdma {
 
 void PilotSet::follow(std::size_t sector) {
     _members.assign(1, member(sector));
@@ -10,7 +10,7 @@ void PilotSet::follow(std::size_t sector) {
     _better.restart();
 }
 
-bool PilotSet::reselect(const CdmaAir& air, Time now) {
+bool PilotSet::reselect(const Air& air, Time now) {
     const std::size_t best = air.strongest();
     const double margin = air.pilots[best] - air.pilots[_reference];
     const bool lost = margin > 0 && air.pilots[_reference] < _rules.drop;
@@ -19,7 +19,7 @@ bool PilotSet::reselect(const CdmaAir& air, Time now) {
     return true;
 }
 
-void PilotSet::update(const CdmaAir& air, Time now) {
+void PilotSet::update(const Air& air, Time now) {
     dropWeak(air, now);
     const auto strength = [&air](const Member& member) { return air.pilots[member.sector]; };
     const Member& best = *std::ranges::max_element(_members, {}, strength);
@@ -29,11 +29,11 @@ void PilotSet::update(const CdmaAir& air, Time now) {
     }
 }
 
-std::vector<PilotReading> PilotSet::readings(const CdmaAir& air, const CdmaNetwork& network) const {
+std::vector<PilotReading> PilotSet::readings(const Air& air, const Network& network) const {
     std::vector<PilotReading> readings;
     readings.reserve(_members.size());
     for (const Member& member : _members) {
-        readings.push_back({network.sectors[member.sector].pn, air.pilots[member.sector]});
+        readings.push_back({network.cells[member.sector].pn, air.pilots[member.sector]});
     }
     return readings;
 }
@@ -48,7 +48,7 @@ bool PilotSet::contains(std::size_t sector) const {
     return std::ranges::find(_members, sector, &Member::sector) != _members.end();
 }
 
-void PilotSet::dropWeak(const CdmaAir& air, Time now) {
+void PilotSet::dropWeak(const Air& air, Time now) {
     const auto lost = [this, &air, now](Member& member) {
         return member.weak(air.pilots[member.sector] < _rules.drop, member.sector, now);
     };
@@ -57,7 +57,7 @@ void PilotSet::dropWeak(const CdmaAir& air, Time now) {
     if (_members.empty()) _members.push_back(last);  // the last one is held on to: the call drops or recovers
 }
 
-void PilotSet::offer(std::size_t sector, const CdmaAir& air) {
+void PilotSet::offer(std::size_t sector, const Air& air) {
     if (_members.size() < kMost) {
         _members.push_back(member(sector));
         return;
@@ -68,4 +68,4 @@ void PilotSet::offer(std::size_t sector, const CdmaAir& air) {
     if (air.pilots[sector] > strength(weakest) + _rules.compare) weakest = member(sector);
 }
 
-}  // namespace kelvo::simulation
+}  // namespace kelvo::simulation::cdma

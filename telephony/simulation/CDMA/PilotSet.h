@@ -2,10 +2,12 @@
 
 #include <vector>
 
-#include "telephony/simulation/CDMA/CdmaNetwork.h"
+#include "telephony/simulation/CDMA/Air.h"
+#include "telephony/simulation/CDMA/Network.h"
+#include "telephony/simulation/CDMA/Reports.h"
 #include "telephony/simulation/HeldFor.h"
 
-namespace kelvo::simulation {
+namespace kelvo::simulation::cdma {
 
 /// When a pilot joins and leaves the active set of a connected phone.
 struct PilotRules {
@@ -37,12 +39,12 @@ public:
     /// Leaves all but this one.
     void follow(std::size_t sector);
     /// Idle: moves to another pilot when it should, at once when its own is too weak. True when it did.
-    bool reselect(const CdmaAir& air, Time now);
+    bool reselect(const Air& air, Time now);
     /// Connected: drops, adds and replaces.
-    void update(const CdmaAir& air, Time now);
+    void update(const Air& air, Time now);
 
     /// The members as read last, in the order in which they joined.
-    std::vector<PilotReading> readings(const CdmaAir& air, const CdmaNetwork& network) const;
+    std::vector<PilotReading> readings(const Air& air, const Network& network) const;
     std::vector<std::size_t> sectors() const;
 
 private:
@@ -52,8 +54,8 @@ private:
     };
     Member member(std::size_t sector) const { return {sector, HeldFor(_rules.dropTime)}; }
     bool contains(std::size_t sector) const;
-    void dropWeak(const CdmaAir& air, Time now);
-    void offer(std::size_t sector, const CdmaAir& air);
+    void dropWeak(const Air& air, Time now);
+    void offer(std::size_t sector, const Air& air);
 
     PilotRules _rules;
     std::vector<Member> _members;
@@ -61,4 +63,4 @@ private:
     HeldFor _better{kIdleHold};
 };
 
-}  // namespace kelvo::simulation
+}  // namespace kelvo::simulation::cdma

@@ -21,8 +21,8 @@ Air::Air(const Network& network, const Journey& journey, Random random)
       _gsm(network.gsmSectors, journey, random.split()),
       _umts(network.umtsSectors, journey, random.split()),
       _random(random.split()),
-      _gsmLevels(network.gsm.size()),
-      _ecNo(network.umts.size()) {}
+      _gsmLevels(network.gsmCells.size()),
+      _ecNo(network.umtsCells.size()) {}
 
 void Air::measure(Time time) {
     _gsm.moveTo(time);
@@ -39,7 +39,8 @@ void Air::measureGsm() {
     }
     _gsmByLevel = byStrength(_gsmLevels);
     std::set<int> heard;
-    std::erase_if(_gsmByLevel, [&](std::size_t sector) { return !heard.insert(_network.gsm[sector].arfcn).second; });
+    std::erase_if(_gsmByLevel,
+                  [&](std::size_t sector) { return !heard.insert(_network.gsmCells[sector].arfcn).second; });
 }
 
 void Air::measureUmts() {

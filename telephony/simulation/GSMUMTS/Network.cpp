@@ -20,18 +20,18 @@ constexpr int kRnc = 100;
 
 /// Four districts, so that a round trip crosses their borders; the inner and the outer part of each is a routing area.
 Area areaAt(Point place, int firstLac) {
-    const int district = static_cast<int>((bearing({}, place) + 60) / 90) % 4;
+    const int district = sliceOf(place, 4, 60);
     return {firstLac + district, distance({}, place) < 1500 ? 1 : 2};
 }
 
 /// Gives each sector a carrier of which the nearest other user is as far away as can be.
 class CarrierPlan {
 public:
-    int choose(Point site) {
+    Arfcn choose(Point site) {
         const auto farthest = std::ranges::max_element(_users, {}, [&](const auto& users) { return gap(users, site); });
         _colour = static_cast<int>(farthest->size()) % 8;
         farthest->push_back(site);
-        return kFirstBcch + static_cast<int>(farthest - _users.begin());
+        return Arfcn(kFirstBcch + static_cast<int>(farthest - _users.begin()));
     }
     /// Tells the last sector from the others on its carrier.
     int colour() const { return _colour; }
@@ -66,15 +66,15 @@ GprsOptions drawGprsOptions(const Area& area, Random& random) {
     };
 }
 
-GsmCell drawGsmCell(const Sector& sector, int index, int arfcn, int colour, Random& random) {
+GsmCell drawGsmCell(const Sector& sector, int index, Arfcn arfcn, int colour, Random& random) {
     GsmCell cell{.cellId = (sector.siteNumber + 1) * 10 + index % 3 + 1,
                  .arfcn = arfcn,
-                 .bsic = kNetworkColour * 8 + colour,
+                 .bsic = Bsic(kNetworkColour * 8 + colour),
                  .area = areaAt(sector.site, 0x1101),
                  .reselectOffset = random.chance(0.25) ? 4.0 : 0.0,
                  .hoppingSequence = random.between(1, 63)};
     for (int i = 0; i < kHoppingCarriers; ++i) {
-        cell.mobileAllocation.push_back(kFirstTraffic + index % kTrafficGroups + kTrafficGroups * i);
+        cell.mobileAllocation.emplace_back(kFirstTraffic + index % kTrafficGroups + kTrafficGroups * i);
     }
     cell.gprs = drawGprsOptions(cell.area, random);
     return cell;
@@ -83,7 +83,7 @@ GsmCell drawGsmCell(const Sector& sector, int index, int arfcn, int colour, Rand
 UmtsCell umtsCell(const Sector& sector, int index) {
     const Area area = areaAt(sector.site, 0x2101);
     return {.cellId = kRnc << 16 | ((sector.siteNumber + 1) * 10 + index % 3 + 1),
-            .scramblingCode = (index * 7 + 16) % 512,
+            .scramblingCode = Psc((index * 7 + 16) % (Psc::kMax + 1)),
             .area = area,
             .uraId = area.lac - 0x2100,
             .hasTwoCarriers = sector.siteNumber % 3 == 0};
@@ -95,11 +95,11 @@ Network::Network(Random& random)
     : gsmSectors(buildSectors(kGsmPlan, random)), umtsSectors(buildSectors(kUmtsPlan, random)) {
     CarrierPlan carriers;
     for (Sector& sector : gsmSectors) {
-        const int arfcn = carriers.choose(sector.site);
+        const Arfcn arfcn = carriers.choose(sector.site);
         sector.carrierMHz = 935 + 0.2 * arfcn;
-        gsm.push_back(drawGsmCell(sector, static_cast<int>(gsm.size()), arfcn, carriers.colour(), random));
+        gsmCells.push_back(drawGsmCell(sector, static_cast<int>(gsmCells.size()), arfcn, carriers.colour(), random));
     }
-    for (const Sector& sector : umtsSectors) umts.push_back(umtsCell(sector, static_cast<int>(umts.size())));
+    for (const Sector& sector : umtsSectors) umtsCells.push_back(umtsCell(sector, static_cast<int>(umtsCells.size())));
 }
 
 }  // namespace kelvo::simulation::gsm

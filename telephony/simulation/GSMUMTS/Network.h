@@ -3,14 +3,12 @@
 #include <cstddef>
 #include <vector>
 
+#include "telephony/simulation/RadioNumbers.h"
 #include "telephony/simulation/Town.h"
 
 namespace kelvo::simulation::gsm {
 
 enum class Rat { GSM, UMTS };
-
-inline constexpr int kMcc = 1;  // the test network of ITU-T E.212: MCC 001, MNC 01
-inline constexpr int kMnc = 1;
 
 /// A location area and the routing area within it.
 struct Area {
@@ -39,25 +37,25 @@ struct GprsOptions {
 
 struct GsmCell {
     int cellId = 0;
-    int arfcn = 0;  ///< of the BCCH; primary GSM 900 band
-    int bsic = 0;
+    Arfcn arfcn;  ///< of the BCCH; primary GSM 900 band
+    Bsic bsic;
     Area area = {};
     double reselectOffset = 0;  ///< CELL_RESELECT_OFFSET, dB
     int hoppingSequence = 0;
-    std::vector<int> mobileAllocation = {};  ///< ARFCNs of the traffic channels
+    std::vector<Arfcn> mobileAllocation = {};  ///< the carriers of the traffic channels
     GprsOptions gprs = {};
 };
 
 struct UmtsCell {
     int cellId = 0;  ///< 28 bits: RNC and cell
-    int scramblingCode = 0;
+    Psc scramblingCode;
     Area area = {};
     int uraId = 0;
     bool hasTwoCarriers = false;
 };
 
-inline constexpr int kDownlinkUarfcn = 10562;  // 2112.4 MHz, band I
-inline constexpr int kUplinkUarfcn = 9612;
+inline constexpr Uarfcn kDownlinkUarfcn{10562};  // 2112.4 MHz, band I
+inline constexpr Uarfcn kUplinkUarfcn{9612};
 
 /// Two layers of one operator: GSM over the whole town, UMTS from small cells in its centre. Cells have the indices of
 /// their layer's sectors. All of one district are in one location area, a GSM and a UMTS one.
@@ -66,8 +64,8 @@ struct Network {
 
     std::vector<Sector> gsmSectors;
     std::vector<Sector> umtsSectors;
-    std::vector<GsmCell> gsm;
-    std::vector<UmtsCell> umts;
+    std::vector<GsmCell> gsmCells;
+    std::vector<UmtsCell> umtsCells;
 };
 
 inline constexpr double kTownRadius = 2500;    // metres

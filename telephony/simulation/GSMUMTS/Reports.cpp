@@ -18,13 +18,13 @@ constexpr int kSignallingChannel = 24;
 constexpr int kSlots = 3;
 
 GsmNeighbor gsmNeighbor(const World& world, std::size_t sector) {
-    const GsmCell& cell = world.network.gsm[sector];
-    return {cell.arfcn, cell.bsic, world.air.gsmLevel(sector), world.phone.c1(sector)};
+    const GsmCell& cell = world.network.gsmCells[sector];
+    return {cell.arfcn, cell.bsic, world.air.gsmLevel(sector), world.modem.c1(sector)};
 }
 
 MonitoredCell monitoredGsmCell(const World& world, std::size_t sector) {
     return {.technology = MonitoredCell::Technology::GSM,
-            .arfcn = world.network.gsm[sector].arfcn,
+            .arfcn = world.network.gsmCells[sector].arfcn,
             .rssi = static_cast<int>(std::lround(world.air.gsmLevel(sector) / 2))};
 }
 
@@ -33,29 +33,29 @@ MonitoredCell monitoredUmtsCell(const World& world, std::size_t sector) {
     const bool isFound = air.isFound(sector);
     return {.technology = MonitoredCell::Technology::UMTS,
             .uarfcn = kDownlinkUarfcn,
-            .scn = world.network.umts[sector].scramblingCode,
+            .scn = world.network.umtsCells[sector].scramblingCode,
             .rscp = isFound ? static_cast<int>(std::lround(air.rscp(sector))) : MonitoredCell::kNoValue,
             .ecn0 = isFound ? static_cast<int>(std::lround(air.ecNo(sector))) : MonitoredCell::kNoValue};
 }
 
 MonitoredCell servingCell(const World& world) {
-    const std::size_t sector = world.phone.serving();
-    const bool isGsm = world.phone.rat() == Rat::GSM;
+    const std::size_t sector = world.modem.serving();
+    const bool isGsm = world.modem.rat() == Rat::GSM;
     MonitoredCell cell = isGsm ? monitoredGsmCell(world, sector) : monitoredUmtsCell(world, sector);
     cell.isServing = true;
     cell.mcc = kMcc;
     cell.mnc = kMnc;
-    cell.lac = world.phone.area().lac;
-    cell.cellId = isGsm ? world.network.gsm[sector].cellId : world.network.umts[sector].cellId;
+    cell.lac = world.modem.area().lac;
+    cell.cellId = isGsm ? world.network.gsmCells[sector].cellId : world.network.umtsCells[sector].cellId;
     return cell;
 }
 
 /// The network tells of a site's other sectors, found or not; here of the first that is not.
 std::optional<std::size_t> missedSibling(const World& world) {
-    if (!world.phone.isOn(Rat::UMTS)) return {};
-    const std::size_t first = world.phone.serving() / 3 * 3;
+    if (!world.modem.isOn(Rat::UMTS)) return {};
+    const std::size_t first = world.modem.serving() / 3 * 3;
     for (std::size_t sector = first; sector < first + 3; ++sector) {
-        if (sector != world.phone.serving() && !world.air.isFound(sector)) return sector;
+        if (sector != world.modem.serving() && !world.air.isFound(sector)) return sector;
     }
     return {};
 }
@@ -69,11 +69,11 @@ int countErrors(int blocks, double rate, Random& random) {
 /// All links of the soft handover together.
 double combinedEcNo(const World& world) {
     double sum = 0;
-    for (const std::size_t sector : world.phone.activeSet().members()) sum += toMilliwatts(world.air.ecNo(sector));
+    for (const std::size_t sector : world.modem.activeSet().members()) sum += toMilliwatts(world.air.ecNo(sector));
     return toDecibels(sum);
 }
 
-std::vector<HarqProcess> drawProcesses(int subFrames, double sinr, double errorRate, Random& random) {
+std::vector<HarqProcess> harqProcesses(int subFrames, double sinr, double errorRate, Random& random) {
     const double share = random.between(0.3, 0.9);  // others are served in the rest
     const double blockBits = dataRate(sinr) * seconds(kSubFrame);
     std::vector<HarqProcess> processes;
@@ -92,82 +92,82 @@ double blockErrorRate(double ecNo) { return 1 / (1 + std::exp((ecNo + 16) / 1.2)
 double dataRate(double sinr) { return std::min(linkCapacity(kBandwidth, sinr), kFastestCarrier); }
 
 GsmMeasurement gsmMeasurement(const World& world) {
-    const Phone& phone = world.phone;
-    const std::size_t serving = phone.serving();
+    const Modem& modem = world.modem;
+    const std::size_t serving = modem.serving();
     GsmMeasurement measurement{.level = world.air.gsmLevel(serving),
-                               .c1 = phone.c1(serving),
-                               .c2 = phone.c2(serving),
-                               .isHysteresisApplied = phone.isHysteresisApplied()};
-    for (const std::size_t sector : phone.gsmNeighbors()) {
+                               .c1 = modem.c1(serving),
+                               .c2 = modem.c2(serving),
+                               .isHysteresisApplied = modem.isHysteresisApplied()};
+    for (const std::size_t sector : modem.gsmNeighbors()) {
         measurement.neighbors.push_back(gsmNeighbor(world, sector));
     }
     return measurement;
 }
 
 RrStatus rrStatus(const World& world) {
-    const Phone& phone = world.phone;
-    return {phone.rrState(), static_cast<int>(phone.link()), phone.isCamped() ? 1 : 0, phone.use() == Use::Data};
+    const Modem& modem = world.modem;
+    return {modem.rrState(), static_cast<int>(modem.link()), modem.isCamped() ? 1 : 0, modem.use() == Use::Data};
 }
 
 ServingNetwork servingNetwork(const World& world) {
-    const Phone& phone = world.phone;
-    const bool isGsm = phone.rat() == Rat::GSM;
-    return {phone.area(), phone.registration().mobility().service,
-            isGsm ? world.network.gsm[phone.serving()].gprs.networkOperationMode : 0};
+    const Modem& modem = world.modem;
+    const bool isGsm = modem.rat() == Rat::GSM;
+    return {modem.area(), modem.registration().mobility().service,
+            isGsm ? world.network.gsmCells[modem.serving()].gprs.networkOperationMode : 0};
 }
 
 std::vector<Plmn> equivalentPlmns(const World& world) {
-    const auto& registered = world.phone.registration().registered();
+    const auto& registered = world.modem.registration().registered();
     if (!registered || registered->lac % 2 == 0) return {};  // a partner serves every other district
     return {{kMcc, 2}};
 }
 
 std::vector<SearchedCell> searchedCells(const World& world) {
-    const Phone& phone = world.phone;
+    const Modem& modem = world.modem;
     std::vector<SearchedCell> cells;
     const auto add = [&](std::size_t sector, CellSet set) {
-        cells.push_back({sector, world.network.umts[sector].scramblingCode, set, world.air.ecNo(sector)});
+        cells.push_back({sector, world.network.umtsCells[sector].scramblingCode, set, world.air.ecNo(sector)});
     };
-    const std::size_t serving = phone.serving();
-    if (phone.link() == Link::Open) {
-        for (const std::size_t sector : phone.activeSet().members()) add(sector, CellSet::Active);
+    const std::size_t serving = modem.serving();
+    if (modem.link() == Link::Open) {
+        for (const std::size_t sector : modem.activeSet().members()) add(sector, CellSet::Active);
     } else {
         add(serving, CellSet::Active);
     }
     const int site = world.network.umtsSectors[serving].siteNumber;
-    for (const std::size_t sector : phone.umtsNeighbors(2)) {
+    for (const std::size_t sector : modem.umtsNeighbors(2)) {
         const bool isTold = world.network.umtsSectors[sector].siteNumber <= site + 6;  // far sites are not in its list
         add(sector, isTold ? CellSet::Monitored : CellSet::Detected);
     }
-    if (world.network.umts[serving].hasTwoCarriers) add(serving, CellSet::VirtualActive);
+    if (world.network.umtsCells[serving].hasTwoCarriers) add(serving, CellSet::VirtualActive);
     return cells;
 }
 
 std::vector<RankedUmtsCell> rankedUmtsCells(const World& world) {
     std::vector<RankedUmtsCell> cells;
-    for (const auto& [sector, rank] : world.phone.rankedUmts()) {
+    for (const auto& [sector, rank] : world.modem.rankedUmts()) {
         cells.push_back(
-            {world.network.umts[sector].scramblingCode, world.air.rscp(sector), world.air.ecNo(sector), rank});
+            {world.network.umtsCells[sector].scramblingCode, world.air.rscp(sector), world.air.ecNo(sector), rank});
     }
     return cells;
 }
 
 std::vector<RankedGsmCell> rankedGsmCells(const World& world) {
     std::vector<RankedGsmCell> cells;
-    for (const auto& [sector, rank] : world.phone.rankedGsm()) {
-        const GsmCell& cell = world.network.gsm[sector];
+    for (const auto& [sector, rank] : world.modem.rankedGsm()) {
+        const GsmCell& cell = world.network.gsmCells[sector];
         cells.push_back({cell.arfcn, cell.bsic, world.air.gsmLevel(sector), rank});
     }
     return cells;
 }
 
 std::vector<MonitoredCell> monitoredCells(const World& world) {
-    const bool isGsm = world.phone.rat() == Rat::GSM;
+    const bool isGsm = world.modem.rat() == Rat::GSM;
     std::vector<MonitoredCell> cells{servingCell(world)};
-    auto neighbors = world.phone.gsmNeighbors();
+    auto neighbors = world.modem.gsmNeighbors();
     neighbors.resize(std::min(neighbors.size(), std::size_t{isGsm ? 2U : 1U}));
     for (const std::size_t sector : neighbors) cells.push_back(monitoredGsmCell(world, sector));
-    for (const std::size_t sector : world.phone.umtsNeighbors(isGsm ? 1 : 2)) {
+    for (const std::size_t sector : world.modem.umtsNeighbors(isGsm ? 1 : 2)) {
         cells.push_back(monitoredUmtsCell(world, sector));
     }
     if (const auto missed = missedSibling(world)) cells.push_back(monitoredUmtsCell(world, *missed));
@@ -175,8 +175,8 @@ std::vector<MonitoredCell> monitoredCells(const World& world) {
 }
 
 std::vector<PdpContext> pdpContexts(const World& world, int sessions) {
-    if (!world.phone.registration().registered()) return {};
-    if (world.phone.use() != Use::Data) return {{.apn = "internet", .type = "IPv4", .state = "Inactive"}};
+    if (!world.modem.registration().registered()) return {};
+    if (world.modem.use() != Use::Data) return {{.apn = "internet", .type = "IPv4", .state = "Inactive"}};
     std::vector<PdpContext> contexts{{.apn = "internet",
                                       .type = "IPv4",
                                       .state = "Active",
@@ -188,43 +188,43 @@ std::vector<PdpContext> pdpContexts(const World& world, int sessions) {
     return contexts;
 }
 
-std::vector<std::optional<double>> drawTransmitPower(const World& world, Random& random) {
+std::vector<std::optional<double>> transmitPower(const World& world, Random& random) {
     constexpr double kPilot = 23;         // dBm
     constexpr double kWantedBelow = 118;  // dB: sent at 0 dBm, a call just arrives over this path
     constexpr double kDataMore = 6;       // dB
     constexpr double kGap = 0.5;          // of the records tell of one, while GSM is measured in compressed mode
-    const double mean = kPilot - world.air.rscp(world.phone.serving()) - kWantedBelow +
-                        (world.phone.use() == Use::Data ? kDataMore : 0);
+    const double mean = kPilot - world.air.rscp(world.modem.serving()) - kWantedBelow +
+                        (world.modem.use() == Use::Data ? kDataMore : 0);
     std::vector<std::optional<double>> slots;
     for (int i = 0; i < kSlots; ++i) {
         const double fading = std::max(rayleighFading(random), -10.0);
         slots.emplace_back(std::clamp(mean - fading, -50.0, 24.0));
     }
-    if (world.phone.isMeasuringGsm() && random.chance(kGap)) slots[random.between(0, kSlots - 1)].reset();
+    if (world.modem.isMeasuringGsm() && random.chance(kGap)) slots[random.between(0, kSlots - 1)].reset();
     return slots;
 }
 
-BlockErrors drawBlockErrors(const World& world, Time window, Random& random) {
+BlockErrors blockErrors(const World& world, Time window, Random& random) {
     const int frames = static_cast<int>(window / kRadioFrame);
     const double rate = blockErrorRate(combinedEcNo(world));
     BlockErrors errors{.windowSize = frames};
     const auto add = [&](int id, int blocks) {
         errors.channels.push_back({id, blocks, countErrors(blocks, rate, random)});
     };
-    if (world.phone.use() == Use::Voice) add(kSpeechChannel, frames / 2);  // a speech frame lasts 20 ms
+    if (world.modem.use() == Use::Voice) add(kSpeechChannel, frames / 2);  // a speech frame lasts 20 ms
     add(kSignallingChannel, frames / 4);                                   // a signalling block 40 ms
     return errors;
 }
 
-HsdpaReport drawHsdpaReport(const World& world, Time window, Random& random) {
-    const std::size_t serving = world.phone.serving();
+HsdpaReport hsdpaReport(const World& world, Time window, Random& random) {
+    const std::size_t serving = world.modem.serving();
     const double sinr = world.air.dataSinr(serving);
     const double errorRate = kFirstBlockErrors + (1 - kFirstBlockErrors) * blockErrorRate(world.air.ecNo(serving));
     HsdpaReport report{.subFrames = static_cast<int>(window / kSubFrame),
-                       .hasTwoCarriers = world.network.umts[serving].hasTwoCarriers};
-    report.primary = drawProcesses(report.subFrames, sinr, errorRate, random);
+                       .hasTwoCarriers = world.network.umtsCells[serving].hasTwoCarriers};
+    report.primary = harqProcesses(report.subFrames, sinr, errorRate, random);
     if (report.hasTwoCarriers) {
-        report.secondary = drawProcesses(report.subFrames, sinr + kSecondCarrierLoss, errorRate, random);
+        report.secondary = harqProcesses(report.subFrames, sinr + kSecondCarrierLoss, errorRate, random);
     }
     return report;
 }

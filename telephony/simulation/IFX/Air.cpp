@@ -12,7 +12,7 @@ constexpr double kPilotShare = -10;    // dB of a sector's power
 constexpr double kUmtsLoad = 0.6;      // part of its power that a sector sends
 
 void readGsm(Air& air, const Drive& drive, const Network& network, Random& random) {
-    const auto& cells = network.gsm;
+    const auto& cells = network.gsmCells;
     for (std::size_t i = 0; i < cells.size(); ++i) {
         double rest = toMilliwatts(kGsmNoise);
         for (std::size_t other = 0; other < cells.size(); ++other) {
@@ -20,18 +20,18 @@ void readGsm(Air& air, const Drive& drive, const Network& network, Random& rando
         }
         const double reading = drive.received(i) + kReadingNoise * random.normal();
         air.rssi.push_back(std::clamp(reading, -110.0, -47.0));
-        air.gsmToRest.push_back(reading - toDecibels(rest));
+        air.carrierToInterference.push_back(reading - toDecibels(rest));
     }
 }
 
 void readUmts(Air& air, const Drive& drive, const Network& network, Random& random) {
     double total = toMilliwatts(kUmtsNoise);
-    for (std::size_t i = 0; i < network.umts.size(); ++i) {
-        if (network.umts[i].built) total += kUmtsLoad * toMilliwatts(drive.received(i) + Network::kUmtsGain);
+    for (std::size_t i = 0; i < network.umtsCells.size(); ++i) {
+        if (network.umtsCells[i].built) total += kUmtsLoad * toMilliwatts(drive.received(i) + Network::kUmtsGain);
     }
-    for (std::size_t i = 0; i < network.umts.size(); ++i) {
+    for (std::size_t i = 0; i < network.umtsCells.size(); ++i) {
         const double pilot = drive.received(i) + Network::kUmtsGain + kPilotShare + kReadingNoise * random.normal();
-        const double rscp = network.umts[i].built ? pilot : -120;
+        const double rscp = network.umtsCells[i].built ? pilot : -120;
         air.rscp.push_back(std::clamp(rscp, -120.0, -25.0));
         air.ecN0.push_back(std::clamp(rscp - toDecibels(total), -24.0, 0.0));
     }

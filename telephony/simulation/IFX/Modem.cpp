@@ -55,7 +55,7 @@ double lostAtFirst(double sinr, double needed) { return kAimedErrors + (1 - kAim
 
 }  // namespace
 
-void Modem::measure(const Drive& drive, Time now, PhoneUser::Activity activity, double demand) {
+void Modem::measure(Time now, const Drive& drive, PhoneUser::Activity activity, double demand) {
     _air = listen(drive, _network, _random);
     choose(now);
     registerInArea(now);
@@ -67,16 +67,16 @@ void Modem::measure(const Drive& drive, Time now, PhoneUser::Activity activity, 
 
 LocationArea Modem::area() const {
     if (_status.access == RadioAccess::None) return {};
-    return _status.access == RadioAccess::Gsm ? _network.gsm[_status.serving].area
-                                              : _network.umts[_status.serving].area;
+    return _status.access == RadioAccess::Gsm ? _network.gsmCells[_status.serving].area
+                                              : _network.umtsCells[_status.serving].area;
 }
 
 /// Of the cells on one carrier no more than the strongest can be decoded, and on the serving cell's carrier no other.
 std::vector<std::size_t> Modem::gsmByStrength() const {
     std::set<int> heard;
-    if (_status.access == RadioAccess::Gsm) heard.insert(_network.gsm[_status.serving].arfcn);
+    if (_status.access == RadioAccess::Gsm) heard.insert(_network.gsmCells[_status.serving].arfcn);
     std::vector<std::size_t> order = byStrength(_air.rssi);
-    std::erase_if(order, [&](std::size_t sector) { return !heard.insert(_network.gsm[sector].arfcn).second; });
+    std::erase_if(order, [&](std::size_t sector) { return !heard.insert(_network.gsmCells[sector].arfcn).second; });
     order.resize(std::min(order.size(), kMostNeighbors));
     return order;
 }
@@ -122,7 +122,8 @@ void Modem::chooseFromUmts(Time now) {
 }
 
 double Modem::gsmMargin(std::size_t candidate, Time now) const {
-    const double area = _network.gsm[candidate].area == _network.gsm[_status.serving].area ? 0 : kAreaHysteresis;
+    const double area =
+        _network.gsmCells[candidate].area == _network.gsmCells[_status.serving].area ? 0 : kAreaHysteresis;
     return std::max(area, now - _movedAt < kRecently ? kRecentMargin : 0);
 }
 
@@ -149,7 +150,7 @@ void Modem::registerInArea(Time now) {
 
 void Modem::readServing() {
     _status.rssi = _air.rssi[_status.serving];
-    _status.gsmToRest = _air.gsmToRest[_status.serving];
+    _status.carrierToInterference = _air.carrierToInterference[_status.serving];
     _status.rscp = _air.rscp[_status.serving];
     _status.ecN0 = _air.ecN0[_status.serving];
 }
@@ -190,7 +191,7 @@ void Modem::connect(PhoneUser::Activity activity, double demand) {
 }
 
 void Modem::connectOnGsm(double demand) {
-    const double ratio = _status.gsmToRest;
+    const double ratio = _status.carrierToInterference;
     // The base station wants -85 dBm.
     _status.tx = std::clamp(Network::kPower - _status.rssi - 85, 5.0, 33.0);
     const double rate = linkCapacity(kSlotKHz, ratio);

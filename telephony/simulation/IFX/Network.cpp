@@ -10,12 +10,12 @@ constexpr int kController = 101;
 constexpr double kUmtsRadius = 1100;  // metres
 
 /// The town's quarters; the drive goes clockwise and begins in the north.
-int quarterOf(Point site) { return static_cast<int>((bearing({}, site) + 40) / 90) % 4; }
+int quarterOf(Point site) { return sliceOf(site, 4, 40); }
 
 GsmCell gsmCell(const Sector& sector, int third) {
     const int quarter = quarterOf(sector.site);
-    return {.arfcn = 20 + 2 * (kReuse * third + sector.siteNumber % kReuse),
-            .bsic = 8 * kColourOfNetwork + sector.siteNumber / kReuse % 8,
+    return {.arfcn = Arfcn(20 + 2 * (kReuse * third + sector.siteNumber % kReuse)),
+            .bsic = Bsic(8 * kColourOfNetwork + sector.siteNumber / kReuse % 8),
             .cellId = 10 * (sector.siteNumber + 100) + third + 1,
             .area = {2101 + quarter, 1 + quarter}};
 }
@@ -23,22 +23,20 @@ GsmCell gsmCell(const Sector& sector, int third) {
 UmtsCell umtsCell(const Sector& sector, int third) {
     const int quarter = quarterOf(sector.site);
     return {.built = distance({}, sector.site) < kUmtsRadius,
-            .scramblingCode = 8 * sector.siteNumber + third,
+            .scramblingCode = Psc(8 * sector.siteNumber + third),
             .cellId = kController << 16 | (10 * (sector.siteNumber + 3000) + third + 1),
             .area = {2151 + quarter, 21 + quarter}};
 }
 
 }  // namespace
 
-Network buildNetwork(Random& random) {
-    Network network{buildSectors(kPlan, random), {}, {}};
+Network::Network(Random& random) : sectors(buildSectors(kPlan, random)) {
     int third = 0;
-    for (const Sector& sector : network.radio) {
-        network.gsm.push_back(gsmCell(sector, third));
-        network.umts.push_back(umtsCell(sector, third));
+    for (const Sector& sector : sectors) {
+        gsmCells.push_back(gsmCell(sector, third));
+        umtsCells.push_back(umtsCell(sector, third));
         third = (third + 1) % 3;
     }
-    return network;
 }
 
 }  // namespace kelvo::simulation::ifx

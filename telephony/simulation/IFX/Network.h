@@ -1,15 +1,11 @@
 #pragma once
 
-#include <string_view>
 #include <vector>
 
+#include "telephony/simulation/RadioNumbers.h"
 #include "telephony/simulation/Town.h"
 
 namespace kelvo::simulation::ifx {
-
-/// The network's code: a test network of ITU-T E.212.
-inline constexpr std::string_view kMcc = "001";
-inline constexpr std::string_view kMnc = "01";
 
 /// A location and routing area of one of the two radio networks.
 struct LocationArea {
@@ -20,19 +16,19 @@ struct LocationArea {
 
 /// A GSM 900 cell (3GPP TS 45.005).
 struct GsmCell {
-    int arfcn;  ///< of the BCCH carrier: 935 MHz and 200 kHz a channel
-    int bsic;   ///< base station identity code, 0 to 63
+    Arfcn arfcn;  ///< of the BCCH carrier: 935 MHz and 200 kHz a channel
+    Bsic bsic;
     int cellId;
     LocationArea area;
 };
 
 /// A UMTS cell on the network's only carrier.
 struct UmtsCell {
-    static constexpr int kUarfcn = 10562;
+    static constexpr Uarfcn kUarfcn{10562};
     static constexpr double kMHz = 2112.4;  ///< a fifth of the channel's number
 
     bool built;  ///< the outer sites have none
-    int scramblingCode;
+    Psc scramblingCode;
     int cellId;  ///< the radio network controller's number in the upper 12 of 28 bits
     LocationArea area;
 };
@@ -43,11 +39,11 @@ struct Network {
     static constexpr double kPower = 28;       ///< dBm: the antennas' gain less what houses and the car's roof take
     static constexpr double kUmtsGain = -7.3;  ///< dB that the higher carrier is received weaker
 
-    std::vector<Sector> radio;
-    std::vector<GsmCell> gsm;    ///< by the same index
-    std::vector<UmtsCell> umts;  ///< by the same index
-};
+    explicit Network(Random& random);
 
-Network buildNetwork(Random& random);
+    std::vector<Sector> sectors;
+    std::vector<GsmCell> gsmCells;    ///< by the same index
+    std::vector<UmtsCell> umtsCells;  ///< by the same index
+};
 
 }  // namespace kelvo::simulation::ifx

@@ -1,7 +1,9 @@
 #include "LogGenerator/CDMA/C2KLogGenerator.h"
 
+#include <fmt/printf.h>
 #include <gtest/gtest.h>
 
+#include "LogGenerator/Factory.h"
 #include "platform/telephony/TelephonyConstants.h"
 #include "tests/support/C2KScreen.h"
 #include "tests/support/FakeResources.h"
@@ -47,10 +49,15 @@ Bytes joined(std::initializer_list<Bytes> parts) {
 
 Bytes prefixed(const Record& record) { return joined({{0x81, 0x55}, record.bytes()}); }
 
+TEST_F(C2KGeneratorState, BeginsWithALineAboutItsGenerator) {
+    const auto generator = C2KLogGenerator::generator();
+    EXPECT_EQ(lines(), (Lines{{4, fmt::sprintf("Creating Log object: %p", static_cast<void*>(generator.get()))}}));
+}
+
 TEST_F(C2KGeneratorState, BelongsToTheGeneratorOfItsTechnology) {
-    const auto generator = LogGenerator::generatorFromTechnology(kPLLogChannelTechnology_Oskra_CDMA);
+    const auto generator = generatorFromTechnology(kPLLogChannelTechnology_Oskra_CDMA);
     EXPECT_NE(dynamic_cast<C2KLogGenerator*>(generator.get()), nullptr);
-    EXPECT_EQ(LogGenerator::generatorFromTechnology("kPLLogChannelTechnology_Oskra_CDM"), nullptr);
+    EXPECT_EQ(generatorFromTechnology("kPLLogChannelTechnology_Oskra_CDM"), nullptr);
 }
 
 TEST_F(C2KGeneratorState, IsFedByTheEightCodesOfTheStartCommandInTheirOrder) {

@@ -5,6 +5,7 @@
 #include <algorithm>
 #include <set>
 
+#include "LogGenerator/Factory.h"
 #include "LogGenerator/GSMUMTS/OSK_GSMClassIndex.h"
 #include "platform/system/DirectoryResources.h"
 #include "platform/system/Environment.h"
@@ -94,7 +95,7 @@ protected:
 };
 
 TEST_F(OSK_GSM, IsTheGeneratorOfTheGsmTechnology) {
-    const auto generator = LogGenerator::generatorFromTechnology("kPLLogChannelTechnology_Oskra_GSM");
+    const auto generator = generatorFromTechnology("kPLLogChannelTechnology_Oskra_GSM");
     EXPECT_NE(dynamic_cast<OSK_GSMLogGenerator*>(generator.get()), nullptr);
 }
 

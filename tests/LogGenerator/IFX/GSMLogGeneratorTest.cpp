@@ -1,5 +1,6 @@
 #include "LogGenerator/IFX/GSMLogGenerator.h"
 
+#include <fmt/printf.h>
 #include <gtest/gtest.h>
 
 #include "LogGenerator/AssertionFailure.h"
@@ -44,6 +45,13 @@ TEST(GSMLogGenerator, DropsTheFirstElementOfEveryArray) {
     EXPECT_EQ(simplified(list({"header", list({"inner", "x"}), "y"})), list({list({"x"}), "y"}));
     EXPECT_EQ(simplified(list({"header", dict({{"only", list({"a", "b"})}})})), list({list({"b"})}));
     EXPECT_EQ(simplified(list({7, "x"})), list({"x"}));  // not looked at either
+}
+
+TEST(GSMLogGenerator, SaysThatItWasMade) {
+    test::RecordingLog log;
+    const Environment::Scope environment({.log = &log});
+    const auto generator = GSMLogGenerator::generator();
+    EXPECT_EQ(log.lines(), (Lines{{4, fmt::sprintf("Creating Log object: %p", static_cast<void*>(generator.get()))}}));
 }
 
 TEST(GSMLogGenerator, LeavesTheReceivedTreeAsItIs) {

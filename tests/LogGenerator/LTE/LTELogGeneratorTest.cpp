@@ -5,6 +5,7 @@
 #include <algorithm>
 #include <set>
 
+#include "LogGenerator/Factory.h"
 #include "LogGenerator/LTE/LTEClassIndex.h"
 #include "platform/system/DirectoryResources.h"
 #include "platform/system/Environment.h"
@@ -32,10 +33,10 @@ protected:
 };
 
 TEST_F(LTE, IsTheGeneratorOfTheLteTechnology) {
-    const auto generator = LogGenerator::generatorFromTechnology("kPLLogChannelTechnology_Oskra_LTE");
+    const auto generator = generatorFromTechnology("kPLLogChannelTechnology_Oskra_LTE");
     EXPECT_NE(dynamic_cast<LTELogGenerator*>(generator.get()), nullptr);
-    EXPECT_EQ(LogGenerator::generatorFromTechnology("kPLLogChannelTechnology_Oskra_LTE2"), nullptr);
-    EXPECT_EQ(LogGenerator::generatorFromTechnology(""), nullptr);
+    EXPECT_EQ(generatorFromTechnology("kPLLogChannelTechnology_Oskra_LTE2"), nullptr);
+    EXPECT_EQ(generatorFromTechnology(""), nullptr);
 }
 
 TEST_F(LTE, ShowsARecordOnItsScreen) {

@@ -2,31 +2,18 @@
 
 #include <gtest/gtest.h>
 
+#include "tests/support/CellArray.h"
 #include "tests/support/Fed.h"
 #include "tests/support/Shows.h"
 
 namespace kelvo {
 namespace {
 
+using test::cell;
+using test::cellArray;
 using test::Fed;
 using test::Record;
 using Lines = std::vector<test::RecordingLog::Line>;
-
-/// A cell-information record whose payload is an array of the given dictionaries, in XML.
-Record cellArray(const std::string& cells) {
-    return Record(0xFF0001, 13).text(13, "<plist version=\"1.0\"><array>" + cells + "</array></plist>");
-}
-
-std::string entry(const std::string& key, const std::string& value) { return "<key>" + key + "</key>" + value; }
-
-std::string cell(const std::string& technology, const std::string& type, const std::string& more = "") {
-    return "<dict>" +
-           entry("kPLCellMonitorCellRadioAccessTechnology",
-                 "<string>kPLCellMonitorRadioAccessTechnology" + technology + "</string>") +
-           entry("kPLCellMonitorCellType", "<string>kPLCellMonitorCellType" + type + "</string>") + more + "</dict>";
-}
-
-std::string number(int value) { return "<integer>" + std::to_string(value) + "</integer>"; }
 
 TEST(LTEServingCellInfo, ShowsEveryFieldOfTheServingCell) {
     Fed<LTEServingCellInfo> section(Record(0xB0C2, 38)
@@ -97,14 +84,18 @@ TEST(LTEServingCellInfo, ReportsACodeOfOthers) {
 }
 
 TEST(LTEServingCellInfo, TakesTheFirstServingLteCellOfTheCellArray) {
-    Fed<LTEServingCellInfo> section(
-        cellArray(cell("GSM", "Serving", entry("kPLCellMonitorTAC", number(1))) + "<dict/>" +
-                  cell("LTE", "Neighbor", entry("kPLCellMonitorTAC", number(2))) +
-                  cell("LTE", "Serving",
-                       entry("kPLCellMonitorTAC", number(4566)) + entry("kPLCellMonitorCellId", number(-5)) +
-                           entry("kPLCellMonitorPID", number(301)) + entry("kPLCellMonitorBandInfo", number(17)) +
-                           entry("kPLCellMonitorUARFCN", number(5780))) +
-                  cell("LTE", "Serving", entry("kPLCellMonitorTAC", number(3)))));
+    Fed<LTEServingCellInfo> section(cellArray({
+        cell("GSM", "Serving", {{"kPLCellMonitorTAC", 1}}),
+        Dictionary::make(),
+        cell("LTE", "Neighbor", {{"kPLCellMonitorTAC", 2}}),
+        cell("LTE", "Serving",
+             {{"kPLCellMonitorTAC", 4566},
+              {"kPLCellMonitorCellId", -5},
+              {"kPLCellMonitorPID", 301},
+              {"kPLCellMonitorBandInfo", 17},
+              {"kPLCellMonitorUARFCN", 5780}}),
+        cell("LTE", "Serving", {{"kPLCellMonitorTAC", 3}}),
+    }));
     EXPECT_EQ(section["Tracking Area Code"], "4566");
     EXPECT_EQ(section["Cell Identity"], "-5");
     EXPECT_EQ(section["Physical Cell ID"], "301");
@@ -116,10 +107,10 @@ TEST(LTEServingCellInfo, TakesTheFirstServingLteCellOfTheCellArray) {
 TEST(LTEServingCellInfo, SaysWhichValueACellLacksAndShowsTheOthers) {
     Fed<LTEServingCellInfo> section(Record(0xB0C2, 38).u32(22, 99));
     section.clearLog();
-    section.feed(cellArray(cell("LTE", "Serving",
-                                entry("kPLCellMonitorTAC", "<string>12</string>") +
-                                    entry("kPLCellMonitorBandInfo", "<integer>2147483648</integer>") +
-                                    entry("kPLCellMonitorPID", number(44)))));
+    section.feed(cellArray({cell("LTE", "Serving",
+                                 {{"kPLCellMonitorTAC", "12"},
+                                  {"kPLCellMonitorBandInfo", std::int64_t{2147483648}},
+                                  {"kPLCellMonitorPID", 44}})}));
     EXPECT_EQ(section["Cell Identity"], "99");
     EXPECT_EQ(section["Physical Cell ID"], "44");
     EXPECT_EQ(section.log(), (Lines{{4, "LTE Serving Cell Info"},
@@ -130,14 +121,14 @@ TEST(LTEServingCellInfo, SaysWhichValueACellLacksAndShowsTheOthers) {
 }
 
 TEST(LTEServingCellInfo, TakesItsOwnFrequenciesOverTheCellArraysUarfcn) {
-    Fed<LTEServingCellInfo> section(cellArray(cell("LTE", "Serving", entry("kPLCellMonitorUARFCN", number(5780)))));
+    Fed<LTEServingCellInfo> section(cellArray({cell("LTE", "Serving", {{"kPLCellMonitorUARFCN", 5780}})}));
     ASSERT_EQ(section["UARFCN"], "5780");
     section.feed(Record(0xB0C2, 38));
     EXPECT_EQ(section["UARFCN"], "(absent)");
 }
 
 TEST(LTEServingCellInfo, KeepsTheCellArraysUarfcnWhenARecordIsOneByteShort) {
-    Fed<LTEServingCellInfo> section(cellArray(cell("LTE", "Serving", entry("kPLCellMonitorUARFCN", number(5780)))));
+    Fed<LTEServingCellInfo> section(cellArray({cell("LTE", "Serving", {{"kPLCellMonitorUARFCN", 5780}})}));
     const Value before = section.part().copy();
     section.feed(Record(0xB0C2, 37));
     EXPECT_EQ(section["UARFCN"], "5780");
@@ -146,20 +137,19 @@ TEST(LTEServingCellInfo, KeepsTheCellArraysUarfcnWhenARecordIsOneByteShort) {
 
 TEST(LTEServingCellInfo, KeepsItsValuesWhenACellArrayHasNoServingLteCell) {
     Fed<LTEServingCellInfo> section(Record(0xB0C2, 38).u16(14, 301).u32(22, 99).u16(26, 4566));
-    section.feed(cellArray(cell("LTE", "Serving", entry("kPLCellMonitorUARFCN", number(5780)))));
+    section.feed(cellArray({cell("LTE", "Serving", {{"kPLCellMonitorUARFCN", 5780}})}));
     ASSERT_EQ(section["UARFCN"], "5780");
     const Value before = section.part().copy();
     section.clearLog();
-    const std::string values = entry("kPLCellMonitorTAC", number(1)) + entry("kPLCellMonitorUARFCN", number(2));
-    section.feed(cellArray(cell("LTE", "Neighbor", values)));
-    section.feed(cellArray(cell("UMTS", "Serving", values)));
+    section.feed(cellArray({cell("LTE", "Neighbor", {{"kPLCellMonitorTAC", 1}, {"kPLCellMonitorUARFCN", 2}}),
+                            cell("UMTS", "Serving", {{"kPLCellMonitorTAC", 1}, {"kPLCellMonitorUARFCN", 2}})}));
     EXPECT_EQ(section.part(), before);
-    EXPECT_EQ(section.log(), (Lines(2, {4, "LTE Serving Cell Info"})));
+    EXPECT_EQ(section.log(), (Lines{{4, "LTE Serving Cell Info"}}));
 }
 
 TEST(LTEServingCellInfo, SaysWhatACellLacksEvenWithoutAPlaceOnTheScreen) {
     Fed<LTEServingCellInfo> section{Value()};
-    section.feed(cellArray(cell("LTE", "Serving")));
+    section.feed(cellArray({cell("LTE", "Serving")}));
     EXPECT_EQ(section.log(), (Lines{{4, "LTE Serving Cell Info"},
                                     {3, "Serving Cell Info: Failed to retrieve TAC\n"},
                                     {3, "Serving Cell Info: Failed to retrieve Cell ID\n"},
@@ -169,11 +159,11 @@ TEST(LTEServingCellInfo, SaysWhatACellLacksEvenWithoutAPlaceOnTheScreen) {
 }
 
 TEST(LTEServingCellInfo, IgnoresAnArrayWithoutAServingLteCell) {
-    for (const std::string& cells : {std::string(), cell("LTE", "Neighbor"), cell("UMTS", "Serving"),
-                                     std::string("<string>cell</string><integer>1</integer>")}) {
-        Fed<LTEServingCellInfo> section(cellArray(cells));
-        EXPECT_TRUE(section.part().dictionary()->empty()) << cells;
-        EXPECT_EQ(section.log(), (Lines{{4, "LTE Serving Cell Info"}})) << cells;
+    for (const Record& record : {cellArray({}), cellArray({cell("LTE", "Neighbor")}),
+                                 cellArray({cell("UMTS", "Serving")}), cellArray({"cell", 1})}) {
+        Fed<LTEServingCellInfo> section(record);
+        EXPECT_TRUE(section.part().dictionary()->empty());
+        EXPECT_EQ(section.log(), (Lines{{4, "LTE Serving Cell Info"}}));
     }
 }
 

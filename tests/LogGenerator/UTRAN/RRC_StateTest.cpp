@@ -42,10 +42,17 @@ TEST(RRC_State, SaysThatARecordIsShortAndDecodesItAllTheSame) {
               (Lines{{4, "RRC Info"},
                      {4, "LogCode_0xD0E0 is length is 14 expected size 15"},
                      {4, "Display Dict = {State = Unknown RRC Mode}, rrc mode = 255 Unknown RRC Mode"}}));
-    section.feed(Record(0xD0E0, 14).u8(13, 1));
-    EXPECT_EQ(section["State"], "Disconnected");  // the missing byte reads as 0
     section.feed(Bytes(), 0xD0E0);
     EXPECT_EQ(section["State"], "Unknown RRC Mode");
+}
+
+TEST(RRC_State, MakesNoModeOfAMissingByte) {
+    Fed<RRC_State> section(Record(0xD0E0, 15).u8(13, 1).u8(14, 3));
+    section.clearLog();
+    section.feed(Record(0xD0E0, 14).u8(13, 1));
+    EXPECT_EQ(section["State"], "Unknown RRC Mode");
+    EXPECT_EQ(section.log().back().second,
+              "Display Dict = {State = Unknown RRC Mode}, rrc mode = 255 Unknown RRC Mode");
 }
 
 TEST(RRC_State, DescribesEverythingInItsPartOfTheDisplay) {

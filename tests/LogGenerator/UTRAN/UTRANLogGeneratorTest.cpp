@@ -49,8 +49,9 @@ TEST(UTRANLogGenerator, TakesTheFirstTemplateThatMentionsUtranInAnyCase) {
     EXPECT_EQ(templateAmong({"/r/UTRA.plist", "/r/my.Utran.plist"}), "my.Utran");
 }
 
-TEST(UTRANLogGenerator, LooksAtTheWholePath) {
-    EXPECT_EQ(templateAmong({"/utran/GSM.plist", "/utran/UTRAN.plist"}), "GSM");
+TEST(UTRANLogGenerator, LooksAtTheTemplatesNameAndNotAtItsDirectories) {
+    EXPECT_EQ(templateAmong({"/opt/utran/GSM.plist", "/opt/utran/UTRAN.plist"}), "UTRAN");
+    EXPECT_EQ(templateAmong({"/home/UTRAN tests/LTE.plist", "/home/UTRAN tests/my.utran.plist"}), "my.utran");
 }
 
 TEST(UTRANLogGenerator, SaysWhatItBuilds) {
@@ -132,7 +133,7 @@ TEST_P(HalfBuiltUTRANLogGenerator, LeavesTheDisplayOfAnotherAsItIs) {
 
 INSTANTIATE_TEST_SUITE_P(WithoutATemplate, HalfBuiltUTRANLogGenerator,
                          testing::Values(std::vector<std::string>(),
-                                         std::vector<std::string>{"/r/GSM.plist", "/r/UTRA.plist"}));
+                                         std::vector<std::string>{"/utran/GSM.plist", "/utran/UTRA.plist"}));
 
 class UTRANScreens : public testing::Test {
 protected:

@@ -9,7 +9,7 @@ namespace {
 
 std::string problemOf(const Bytes& bytes) {
     const auto parsed = parsePortDatagram(bytes);
-    return parsed ? "" : parsed.error();
+    return parsed ? "" : parsed.error().reason;
 }
 
 TEST(PortDatagram, IsTakenApart) {

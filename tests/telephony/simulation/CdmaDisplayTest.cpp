@@ -7,11 +7,12 @@
 #include <optional>
 #include <set>
 
-#include "telephony/simulation/CdmaSimulation.h"
+#include "telephony/simulation/CDMA/Simulation.h"
 #include "tests/telephony/simulation/Played.h"
 
 using namespace kelvo;
 using namespace kelvo::simulation;
+using namespace kelvo::simulation::cdma;
 using namespace std::chrono_literals;
 
 namespace {
@@ -76,7 +77,7 @@ protected:
     void is(const char* path, const std::string& text) { EXPECT_EQ(played.text(path), text) << path; }
 
     void checkOneX() {
-        const OneXStatus& truth = modem.oneX().status();
+        const OneXStatus& truth = modem.modem().oneX().status();
         is("1x/State", kOneXStates.at(truth.state));
         is("1x/Rx0 Band Class", "800 MHz cellular band [0]");
         is("1x/Rx0 Channel", "283");
@@ -107,12 +108,12 @@ protected:
         }
     }
     void checkFrame() {
-        errors = errors.value_or(0) * 63 / 64 + (modem.oneX().status().frameErased ? 1 / 64.0 : 0);
+        errors = errors.value_or(0) * 63 / 64 + (modem.modem().oneX().status().frameErased ? 1 / 64.0 : 0);
         near("1x/Traffic FER", *errors * 100, 0, "%");
         near("Rates and Errors/1x Traffic FER", *errors * 100, 0, "%");
     }
     void checkSystem() {
-        const CdmaSystem& truth = modem.oneX().system();
+        const System& truth = modem.modem().oneX().system();
         is("System/Roaming Indicator", kRoamingIndicators.at(truth.roamingIndicator));
         const bool found = truth.type == 2;
         is("System/System ID", found ? std::to_string(truth.sid) : "(unknown system type 0)");
@@ -123,7 +124,7 @@ protected:
         systems.insert({truth.sid, truth.nid});
     }
     void checkEvdo() {
-        const EvdoStatus& truth = modem.evdo().status();
+        const EvdoStatus& truth = modem.modem().evdo().status();
         is("EV-DO/Device State", kEvdoStates.at(truth.state));
         is("EV-DO/Session State", kSessionStates.at(truth.session));
         is("EV-DO/Channel", "475");
@@ -132,8 +133,8 @@ protected:
         char uati[16];
         std::snprintf(uati, sizeof uati, "0x%06x", truth.uati);
         is("EV-DO/UATI24", uati);
-        const std::string pn = std::to_string(truth.servingPn) + " \u00d7 64chips";
-        is("EV-DO/Serving PN Offset", truth.servingPn == 65535 ? "Invalid Value" : pn);
+        is("EV-DO/Serving PN Offset",
+           truth.servingPn ? std::to_string(*truth.servingPn) + " \u00d7 64chips" : "Invalid Value");
         near("EV-DO/Rx0 AGC", truth.rx0, 1, " dBm");
         const bool sends = truth.state == EvdoState::Access || truth.state == EvdoState::Connected;
         if (sends) {
@@ -147,7 +148,7 @@ protected:
         sessionStates.insert(truth.session);
     }
     void checkPilots() {
-        const auto& truth = modem.evdo().status().active;
+        const auto& truth = modem.modem().evdo().status().active;
         if (truth.empty()) return is("EV-DO/Active Set", "(none)");
         const auto rows = rowsOf(played.at("EV-DO/Active Set"));
         ASSERT_EQ(rows.size(), truth.size());
@@ -157,10 +158,10 @@ protected:
         }
     }
     void checkFingers() {
-        const auto& truth = modem.evdo().status().fingers;
+        const auto& truth = modem.modem().evdo().status().fingers;
         std::vector<std::pair<std::string, double>> locked;
         for (std::size_t i = 0; i < truth.size(); ++i) {
-            if (truth[i].pn != 65535) locked.emplace_back(rowKey(i, truth[i].pn), truth[i].carrierToInterference);
+            if (truth[i].pn) locked.emplace_back(rowKey(i, *truth[i].pn), truth[i].carrierToInterference);
         }
         if (locked.empty()) return is("EV-DO/Fingers", "(none)");
         const auto rows = rowsOf(played.at("EV-DO/Fingers"));
@@ -187,7 +188,7 @@ protected:
     }
 
     void check(std::uint32_t code) {
-        const PacketCounters& packets = modem.evdo().counters();
+        const PacketCounters& packets = modem.modem().evdo().counters();
         switch (code) {
             case 0x119C: return checkOneX();
             case 0x119D: return checkFrame();
@@ -201,7 +202,7 @@ protected:
         }
     }
 
-    CdmaSimulation modem{1};
+    cdma::Simulation modem{1};
     test::Played played{modem};
     std::optional<double> errors;
     std::optional<Total> forward;

@@ -1,4 +1,4 @@
-#include "telephony/simulation/CdmaSimulation.h"
+#include "telephony/simulation/CDMA/Simulation.h"
 
 #include <gtest/gtest.h>
 
@@ -12,6 +12,7 @@
 
 using namespace kelvo;
 using namespace kelvo::simulation;
+using namespace kelvo::simulation::cdma;
 using namespace std::chrono_literals;
 
 namespace {
@@ -19,7 +20,7 @@ namespace {
 std::uint32_t codeOf(const Bytes& message) { return message.at(5) | message.at(6) << 8U; }
 
 std::vector<Bytes> minuteOf(std::uint64_t seed) {
-    CdmaSimulation modem(seed);
+    cdma::Simulation modem(seed);
     std::vector<Bytes> messages;
     for (auto message = modem.next(); message.time < 1min; message = modem.next()) messages.push_back(message.bytes);
     return messages;
@@ -37,7 +38,7 @@ TEST(CdmaSimulation, GivesTheSameBytesForTheSameSeed) {
 }
 
 TEST(CdmaSimulation, SendsEveryRecordAskedForAtItsRate) {
-    CdmaSimulation modem(1);
+    cdma::Simulation modem(1);
     std::map<std::uint32_t, int> counts;
     std::set<std::uint32_t> codes;  // of the first four minutes
     std::size_t bytes = 0;
@@ -60,17 +61,17 @@ TEST(CdmaSimulation, SendsEveryRecordAskedForAtItsRate) {
 }
 
 TEST(CdmaSimulation, HandsOffOnlyToPilotsOfTheActiveSetDuringACall) {
-    CdmaSimulation modem(1);
+    cdma::Simulation modem(1);
     std::vector<PilotReading> before;
-    int reference = -1;
+    std::optional<PnOffset> reference;
     int handoffs = 0;
     std::size_t most = 0;
     for (auto message = modem.next(); message.time < 5min; message = modem.next()) {
-        const OneXStatus& status = modem.oneX().status();
+        const OneXStatus& status = modem.modem().oneX().status();
         if (status.state != OneXState::Traffic) {
-            reference = -1;
+            reference.reset();
         } else if (codeOf(message.bytes) == 0x119C) {
-            if (reference >= 0 && status.referencePn != reference) {
+            if (reference && status.referencePn != *reference) {
                 ++handoffs;
                 EXPECT_TRUE(holds(before, status.referencePn)) << status.referencePn;
             }
@@ -85,15 +86,15 @@ TEST(CdmaSimulation, HandsOffOnlyToPilotsOfTheActiveSetDuringACall) {
 }
 
 // The pilot that the modem follows alone, as it does when idle.
-std::optional<PilotReading> followedOneX(const CdmaSimulation& modem) {
-    const OneXStatus& status = modem.oneX().status();
+std::optional<PilotReading> followedOneX(const cdma::Simulation& modem) {
+    const OneXStatus& status = modem.modem().oneX().status();
     if (status.state != OneXState::Paging && status.state != OneXState::Sleep) return std::nullopt;
     EXPECT_EQ(status.active.size(), 1U);
     return status.active.at(0);
 }
 
-std::optional<PilotReading> followedEvdo(const CdmaSimulation& modem) {
-    const EvdoStatus& status = modem.evdo().status();
+std::optional<PilotReading> followedEvdo(const cdma::Simulation& modem) {
+    const EvdoStatus& status = modem.modem().evdo().status();
     if (status.state != EvdoState::Idle) return std::nullopt;
     EXPECT_EQ(status.active.size(), 1U);
     return status.active.at(0);
@@ -101,11 +102,11 @@ std::optional<PilotReading> followedEvdo(const CdmaSimulation& modem) {
 
 // An idle phone's records show the pilot that it follows alone, so the others come from the world. A pilot weaker than
 // `drop` may be left for any that is stronger.
-void expectMovesWhenIdle(std::optional<PilotReading> (*followed)(const CdmaSimulation&), double drop, int fewest) {
-    CdmaSimulation modem(1);
-    const auto& sectors = modem.network().sectors;
+void expectMovesWhenIdle(std::optional<PilotReading> (*followed)(const cdma::Simulation&), double drop, int fewest) {
+    cdma::Simulation modem(1);
+    const auto& sectors = modem.network().cells;
     const auto sectorOf = [&sectors](int pn) {
-        return static_cast<std::size_t>(std::ranges::find(sectors, pn, &CdmaSector::pn) - sectors.begin());
+        return static_cast<std::size_t>(std::ranges::find(sectors, pn, &Cell::pn) - sectors.begin());
     };
     std::deque<std::pair<Time, std::vector<double>>> received;  // of the last 8 s
     std::optional<PilotReading> before;
@@ -139,52 +140,52 @@ TEST(CdmaSimulation, MovesLikewiseInEvdo) {
 }
 
 TEST(CdmaSimulation, RegistersWheneverTheSystemOrNetworkChanges) {
-    CdmaSimulation modem(3);
+    cdma::Simulation modem(3);
     std::pair<int, int> area{0, 0};
     int changes = 0;
     int registrationsThen = 0;
     Time changedAt{0};
     for (auto message = modem.next(); message.time < 10min; message = modem.next()) {
-        const CdmaSystem& system = modem.oneX().system();
+        const System& system = modem.modem().oneX().system();
         if (std::pair(system.sid, system.nid) != area) {
             area = {system.sid, system.nid};
             ++changes;
-            registrationsThen = modem.oneX().registrations();
+            registrationsThen = modem.modem().oneX().registrations();
             changedAt = message.time;
-            EXPECT_EQ(modem.oneX().status().state, OneXState::Paging);  // awake for it
+            EXPECT_EQ(modem.modem().oneX().status().state, OneXState::Paging);  // awake for it
         } else if (message.time > changedAt + 1300ms) {
-            EXPECT_EQ(modem.oneX().registrations(), registrationsThen + 1 - (changes == 0 ? 1 : 0));
+            EXPECT_EQ(modem.modem().oneX().registrations(), registrationsThen + 1 - (changes == 0 ? 1 : 0));
         }
     }
     EXPECT_GE(changes, 3);
 }
 
 TEST(CdmaSimulation, KeepsAnEvdoAddressOfTheSubnetItIsIn) {
-    CdmaSimulation modem(3);
+    cdma::Simulation modem(3);
     std::map<int, std::set<std::uint32_t>> addresses;  // by colour code
     Time settled{0};
     for (auto message = modem.next(); message.time < 10min; message = modem.next()) {
-        const EvdoStatus& status = modem.evdo().status();
+        const EvdoStatus& status = modem.modem().evdo().status();
         if (status.state != EvdoState::Idle || status.session != SessionState::Open) settled = message.time + 400ms;
         if (message.time <= settled) continue;
-        const auto& sectors = modem.network().sectors;
-        const auto serving = std::ranges::find(sectors, status.servingPn, &CdmaSector::pn);
+        const auto& sectors = modem.network().cells;
+        const auto serving = std::ranges::find(sectors, *status.servingPn, &Cell::pn);
         ASSERT_NE(serving, sectors.end());
-        EXPECT_EQ(status.colorCode, kCdmaZones[serving->zone].colorCode);
+        EXPECT_EQ(status.colorCode, kZones[serving->zone].colorCode);
         addresses[status.colorCode].insert(status.uati);
     }
     EXPECT_GE(addresses.size(), 2U);
 }
 
 TEST(CdmaSimulation, LeavesEvdoDuringCallsAndReturnsToIt) {
-    CdmaSimulation modem(1);
+    cdma::Simulation modem(1);
     int calls = 0;
     int connections = 0;
     bool talked = false;
     bool connected = false;
     for (auto message = modem.next(); message.time < 5min; message = modem.next()) {
-        const bool talks = modem.oneX().status().state == OneXState::Traffic;
-        const EvdoStatus& evdo = modem.evdo().status();
+        const bool talks = modem.modem().oneX().status().state == OneXState::Traffic;
+        const EvdoStatus& evdo = modem.modem().evdo().status();
         if (talks) {
             EXPECT_EQ(evdo.state, EvdoState::Inactive);
             EXPECT_TRUE(evdo.active.empty() && evdo.fingers.empty());
@@ -199,14 +200,14 @@ TEST(CdmaSimulation, LeavesEvdoDuringCallsAndReturnsToIt) {
 }
 
 TEST(CdmaSimulation, ReadsASteadyLevelWhileThePhoneStands) {
-    CdmaSimulation modem(1);
+    cdma::Simulation modem(1);
     double driven = -1;
     double least = 0;
     double most = 0;
     Time since{0};
     int stops = 0;
     for (auto message = modem.next(); message.time < 5min; message = modem.next()) {
-        const double level = modem.oneX().status().rx0;
+        const double level = modem.modem().oneX().status().rx0;
         if (modem.drive().driven() != driven) {
             stops += message.time - since > 4s;
             driven = modem.drive().driven();
@@ -221,17 +222,16 @@ TEST(CdmaSimulation, ReadsASteadyLevelWhileThePhoneStands) {
 }
 
 TEST(CdmaSimulation, GivesNoTwoSectorsOnePilotOffset) {
-    CdmaSimulation modem(5);
+    cdma::Simulation modem(5);
     std::set<int> offsets;
-    for (const CdmaSector& sector : modem.network().sectors) {
+    for (const Cell& sector : modem.network().cells) {
         EXPECT_TRUE(offsets.insert(sector.pn).second);
-        EXPECT_TRUE(sector.pn >= 0 && sector.pn < 512);
     }
 }
 
 namespace {
 
-CdmaAir air(std::vector<double> pilots) { return {std::move(pilots), -70}; }
+Air air(std::vector<double> pilots) { return {std::move(pilots), -70}; }
 
 }  // namespace
 

@@ -34,7 +34,7 @@ void GsmComparison::compare(std::uint32_t code) {
 
 void GsmComparison::compareMobility(std::uint32_t code) {
     _group = "Registration and Network/";
-    const Mobility& mobility = _modem.phone().registration().mobility();
+    const Mobility& mobility = _modem.modem().registration().mobility();
     switch (code) {
         case 0x7130:
             shows("Process PS/MM State", label(kGmmStates, mobility.gmm));
@@ -61,7 +61,7 @@ void GsmComparison::compareMobility(std::uint32_t code) {
 }
 
 void GsmComparison::servingNetwork() {
-    const Phone& phone = _modem.phone();
+    const Modem& phone = _modem.modem();
     shows("Serving PLMN/Mobile Country Code", "001");
     shows("Serving PLMN/Mobile Network Code", "01 ");
     shows("Serving PLMN/Location Area Code", phone.area().lac);
@@ -73,7 +73,7 @@ void GsmComparison::servingNetwork() {
 
 /// The partner network 001 02 serves the districts of odd codes.
 void GsmComparison::equivalents() {
-    const auto& registered = _modem.phone().registration().registered();
+    const auto& registered = _modem.modem().registration().registered();
     const bool hasPartner = registered && registered->lac % 2 == 1;
     ASSERT_EQ(_played.rows(_group + "Equivalent PLMN List"), hasPartner ? 1U : 0U);
     if (!hasPartner) return;
@@ -82,7 +82,7 @@ void GsmComparison::equivalents() {
 }
 
 void GsmComparison::sim() {
-    const auto& registered = _modem.phone().registration().registered();
+    const auto& registered = _modem.modem().registration().registered();
     char area[16] = "FFFE";
     char routingArea[16] = "FF";
     if (registered) {
@@ -117,9 +117,9 @@ void GsmComparison::cells() {
     _group = "Registration and Network/Serving PLMN/";
     shows("Mobile Country Code", "1");
     shows("Mobile Network Code", "1");
-    shows("Location Area Code", _modem.phone().area().lac);
+    shows("Location Area Code", _modem.modem().area().lac);
     _group = "";
-    if (_modem.phone().rat() == Rat::GSM) {
+    if (_modem.modem().rat() == Rat::GSM) {
         shows("GSM Cell and Neighbours/GSM Serving Cell/Cell ID", gsmCell().cellId);
         shows("GSM Cell and Neighbours/GSM Serving Cell/ARFCN", gsmCell().arfcn);
     } else {
@@ -133,7 +133,7 @@ void GsmComparison::cells() {
 
 /// The best cells that are found beside those in use and, in UMTS, the first of the serving site that is not found.
 void GsmComparison::umtsNeighborsOfArray() {
-    const Phone& phone = _modem.phone();
+    const Modem& phone = _modem.modem();
     const bool isUmts = phone.rat() == Rat::UMTS;
     std::vector<std::size_t> told = phone.umtsNeighbors(isUmts ? 2 : 1);
     const std::size_t first = phone.serving() - phone.serving() % 3;
@@ -148,7 +148,7 @@ void GsmComparison::umtsNeighborsOfArray() {
         const std::size_t sector = told[row];
         EXPECT_FALSE(isUmts && sector == phone.serving());
         shows("UARFCN", "10562");
-        shows("Scrambling Code", _modem.network().umts[sector].scramblingCode);
+        shows("Scrambling Code", _modem.network().umtsCells[sector].scramblingCode);
         if (_modem.air().isFound(sector)) {
             within("RSCP", _modem.air().rscp(sector), 0.5, " dBm");
             within("Energy Per Chip", _modem.air().ecNo(sector), 0.5, " dB");
@@ -160,19 +160,19 @@ void GsmComparison::umtsNeighborsOfArray() {
 }
 
 void GsmComparison::gsmNeighborsOfArray() {
-    const auto neighbors = _modem.phone().gsmNeighbors();
-    const std::size_t told = std::min<std::size_t>(neighbors.size(), _modem.phone().rat() == Rat::GSM ? 2 : 1);
+    const auto neighbors = _modem.modem().gsmNeighbors();
+    const std::size_t told = std::min<std::size_t>(neighbors.size(), _modem.modem().rat() == Rat::GSM ? 2 : 1);
     ASSERT_EQ(_played.rows("GSM Cell and Neighbours/Neighboring Cells"), told);
     for (std::size_t row = 0; row < told; ++row) {
         _group = "GSM Cell and Neighbours/Neighboring Cells/" + std::to_string(row) + "/";
-        shows("ARFCN", _modem.network().gsm[neighbors[row]].arfcn);
+        shows("ARFCN", _modem.network().gsmCells[neighbors[row]].arfcn);
         within("RSSI", _modem.air().gsmLevel(neighbors[row]), 1, " dBm");  // told in steps of 2 dB
     }
 }
 
 void GsmComparison::contexts() {
     _group = "SIM and Data Contexts/PDP Context Info";
-    const Phone& phone = _modem.phone();
+    const Modem& phone = _modem.modem();
     if (!phone.registration().registered()) {
         EXPECT_EQ(_played.rows(_group), 0U);
         return;

@@ -7,7 +7,7 @@
 #include <string>
 #include <vector>
 
-#include "telephony/simulation/GsmSimulation.h"
+#include "telephony/simulation/GSMUMTS/Simulation.h"
 #include "tests/telephony/simulation/Played.h"
 
 namespace kelvo::test {
@@ -20,7 +20,7 @@ class GsmComparison {
 public:
     using Labels = std::map<int, std::string>;
 
-    explicit GsmComparison(GsmSimulation& modem) : _modem(modem), _played(modem) {}
+    explicit GsmComparison(gsm::Simulation& modem) : _modem(modem), _played(modem) {}
 
     void next() {
         const std::uint32_t code = _played.next();
@@ -84,10 +84,10 @@ private:
         return _played.number(_group + path);
     }
 
-    const GsmCell& gsmCell() const { return _modem.network().gsm[_modem.phone().serving()]; }
-    const UmtsCell& umtsCell() const { return _modem.network().umts[_modem.phone().serving()]; }
+    const GsmCell& gsmCell() const { return _modem.network().gsmCells[_modem.modem().serving()]; }
+    const UmtsCell& umtsCell() const { return _modem.network().umtsCells[_modem.modem().serving()]; }
 
-    GsmSimulation& _modem;
+    gsm::Simulation& _modem;
     Played _played;
     std::string _group;  // the screen that paths begin at
     std::map<int, int> _bsics;

@@ -17,7 +17,7 @@ const GsmComparison::Labels kT3192{{0, "500 ms"}, {1, "1000 ms"}, {2, "1500 ms"}
 
 void GsmComparison::compareGsm(std::uint32_t code) {
     _group = "GSM Cell and Neighbours/";
-    const Phone& phone = _modem.phone();
+    const Modem& phone = _modem.modem();
     switch (code) {
         case 0x5134:
             shows("GSM Serving Cell/Cell ID", gsmCell().cellId);
@@ -32,15 +32,15 @@ void GsmComparison::compareGsm(std::uint32_t code) {
             shows("GSM RR Info/RR Status", phone.isCamped() ? "1" : "0");
             shows("GSM RR Info/RR Mode", phone.use() == Use::Data ? "Data" : "Voice");
             break;
-        case 0x5072: shows("GSM RR Info/DTX Used", _modem.drawn().isDtxUsed ? "ON" : "OFF"); break;
-        case 0x5076: shows("GSM Serving Cell/MA Dedicated ARFCN", _modem.drawn().dedicatedArfcn); break;
+        case 0x5072: shows("GSM RR Info/DTX Used", _modem.lastReports().isDtxUsed ? "ON" : "OFF"); break;
+        case 0x5076: shows("GSM Serving Cell/MA Dedicated ARFCN", _modem.lastReports().dedicatedArfcn); break;
         case 0x51f8: return mobileAllocation();
         default: ADD_FAILURE() << "not a record of this family";
     }
 }
 
 void GsmComparison::gsmMeasurement() {
-    const std::size_t serving = _modem.phone().serving();
+    const std::size_t serving = _modem.modem().serving();
     const double level = _modem.air().gsmLevel(serving);
     const double c1 = level + 104;  // above the -104 dBm that the cells ask for
     levelWithin("GSM Serving Cell/RSSI", level, " dBm");
@@ -49,22 +49,22 @@ void GsmComparison::gsmMeasurement() {
     levelWithin("GSM RR Info/Serving Rx Level", level);
     within("GSM RR Info/Rx Quality Full", c1, 0.5);
     within("GSM RR Info/Rx Quality Sub", c1 + gsmCell().reselectOffset, 0.5);
-    const auto neighbors = _modem.phone().gsmNeighbors();
-    const auto& cells = _modem.network().gsm;
+    const auto neighbors = _modem.modem().gsmNeighbors();
+    const auto& cells = _modem.network().gsmCells;
     const std::size_t candidate = *std::ranges::max_element(neighbors, {}, [&](std::size_t sector) {
         return _modem.air().gsmLevel(sector) + cells[sector].reselectOffset;
     });
-    const bool isApplied = _modem.phone().link() == Link::Open || cells[candidate].area.lac != gsmCell().area.lac;
+    const bool isApplied = _modem.modem().link() == Link::Open || cells[candidate].area.lac != gsmCell().area.lac;
     EXPECT_EQ(_played.text("GPRS/GPRS Information/Cell Reselect Hysteresis"), isApplied ? "Applied" : "Not Applied");
     gsmNeighbors();
 }
 
 void GsmComparison::gsmNeighbors() {
-    const auto neighbors = _modem.phone().gsmNeighbors();
+    const auto neighbors = _modem.modem().gsmNeighbors();
     ASSERT_EQ(_played.rows(_group + "Neighboring Cells"), neighbors.size());
     for (std::size_t row = 0; row < neighbors.size(); ++row) {
         const std::string path = "Neighboring Cells/" + std::to_string(row);
-        const GsmCell& cell = _modem.network().gsm[neighbors[row]];
+        const GsmCell& cell = _modem.network().gsmCells[neighbors[row]];
         const double level = _modem.air().gsmLevel(neighbors[row]);
         shows(path + "/ARFCN", cell.arfcn);
         levelWithin(path + "/RSSI", level);
@@ -76,8 +76,8 @@ void GsmComparison::gsmNeighbors() {
 
 void GsmComparison::rememberBsics() {
     _bsics.clear();
-    for (const std::size_t sector : _modem.phone().gsmNeighbors()) {
-        const GsmCell& cell = _modem.network().gsm[sector];
+    for (const std::size_t sector : _modem.modem().gsmNeighbors()) {
+        const GsmCell& cell = _modem.network().gsmCells[sector];
         _bsics[cell.arfcn] = cell.bsic;
     }
 }

@@ -13,11 +13,11 @@ const GsmComparison::Labels kRrcStates{{0, "Disconnected"}, {1, "Connecting"}, {
 
 void GsmComparison::compareUmts(std::uint32_t code) {
     _group = "UMTS Radio/UMTS RR Info/";
-    const Link link = _modem.phone().link();
+    const Link link = _modem.modem().link();
     switch (code) {
         case 0x417a: return searcher();
         case 0x4005: return ranking();
-        case 0x4125: shows("RRC State", label(kRrcStates, _modem.phone().rrcState())); break;
+        case 0x4125: shows("RRC State", label(kRrcStates, _modem.modem().rrcState())); break;
         case 0x4127:
             shows("Cell ID", umtsCell().cellId);
             shows("Uplink Frequency", "9612");
@@ -37,12 +37,12 @@ void GsmComparison::compareUmts(std::uint32_t code) {
 /// power under the RSCP is rounded down to 1 dB, too.
 void GsmComparison::searcher() {
     _group = "UMTS Cells/";
-    const Phone& phone = _modem.phone();
+    const Modem& phone = _modem.modem();
     const auto members = phone.link() == Link::Open ? phone.activeSet().members() : std::vector{phone.serving()};
     ASSERT_EQ(_played.rows(_group + "Active Set"), members.size());
     for (std::size_t row = 0; row < members.size(); ++row) {
         const std::string path = "Active Set/" + std::to_string(row);
-        shows(path + "/Scrambling Code", _modem.network().umts[members[row]].scramblingCode);
+        shows(path + "/Scrambling Code", _modem.network().umtsCells[members[row]].scramblingCode);
         within(path + "/Energy Per Chip", _modem.air().ecNo(members[row]) - 0.55, 0.7, " dB");
         within(path + "/RSCP", _modem.air().rscp(members[row]) - 1.05, 1.25, " dB");
     }
@@ -65,12 +65,12 @@ void GsmComparison::ranking() {
 }
 
 void GsmComparison::rankedUmts() {
-    const auto& ranked = _modem.phone().rankedUmts();
+    const auto& ranked = _modem.modem().rankedUmts();
     ASSERT_EQ(_played.rows(_group + "UMTS Set"), ranked.size());
     for (std::size_t row = 0; row < ranked.size(); ++row) {
         const std::string path = "UMTS Set/" + std::to_string(row);
         const std::size_t sector = ranked[row].sector;
-        shows(path + "/Scrambling Code", _modem.network().umts[sector].scramblingCode);
+        shows(path + "/Scrambling Code", _modem.network().umtsCells[sector].scramblingCode);
         shows(path + "/Downlink Frequency", "10562");
         within(path + "/RSCP", _modem.air().rscp(sector), 0.5, " dB");
         within(path + "/Rank Cell RSCP", _modem.air().rscp(sector), 0.5, " dB");
@@ -82,13 +82,13 @@ void GsmComparison::rankedUmts() {
 
 void GsmComparison::rankedGsm() {
     _group = "GSM Cell and Neighbours/";
-    const auto& ranked = _modem.phone().rankedGsm();
+    const auto& ranked = _modem.modem().rankedGsm();
     ASSERT_EQ(_played.rows(_group + "GSM Set"), ranked.size());
     for (std::size_t row = 0; row < ranked.size(); ++row) {
         const std::string path = "GSM Set/" + std::to_string(row);
         const std::size_t sector = ranked[row].sector;
-        shows(path + "/ARFCN", _modem.network().gsm[sector].arfcn);
-        shows(path + "/BSIC", _modem.network().gsm[sector].bsic);
+        shows(path + "/ARFCN", _modem.network().gsmCells[sector].arfcn);
+        shows(path + "/BSIC", _modem.network().gsmCells[sector].bsic);
         within(path + "/RSSI", _modem.air().gsmLevel(sector), 0.5, " dBm");
         within(path + "/Ranking Value", ranked[row].rank, 0.5);
     }
@@ -98,7 +98,7 @@ void GsmComparison::rankedGsm() {
 void GsmComparison::transmitPower() {
     double sum = 0;
     int count = 0;
-    for (const auto& slot : _modem.drawn().transmitPower) {
+    for (const auto& slot : _modem.lastReports().transmitPower) {
         if (!slot) continue;
         sum += *slot;
         ++count;
@@ -108,7 +108,7 @@ void GsmComparison::transmitPower() {
 
 void GsmComparison::blockErrors() {
     _group = "Counters/BLER/";
-    const BlockErrors& errors = _modem.drawn().blockErrors;
+    const BlockErrors& errors = _modem.lastReports().blockErrors;
     shows("Window Size", errors.windowSize);
     ASSERT_EQ(_played.rows(_group + "Transport Channels"), errors.channels.size());
     for (std::size_t row = 0; row < errors.channels.size(); ++row) {
@@ -121,7 +121,7 @@ void GsmComparison::blockErrors() {
 
 void GsmComparison::hsdpa() {
     _group = "UMTS Radio/HSDPA Info/";
-    const HsdpaReport& report = _modem.drawn().hsdpa;
+    const HsdpaReport& report = _modem.lastReports().hsdpa;
     shows("Version", "2");
     shows("Sub Frames", report.subFrames);
     shows("Carrier Info", umtsCell().hasTwoCarriers ? "Dual Carrier" : "Single Carrier");

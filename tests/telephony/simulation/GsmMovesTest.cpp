@@ -5,7 +5,7 @@
 #include <map>
 #include <set>
 
-#include "telephony/simulation/GsmSimulation.h"
+#include "telephony/simulation/GSMUMTS/Simulation.h"
 #include "tests/telephony/simulation/Played.h"
 
 using namespace kelvo;
@@ -15,7 +15,7 @@ using namespace std::chrono_literals;
 using kelvo::test::Played;
 
 TEST(GsmMoves, MovesWithinGsmToANeighborThatWasShownAndHadRisen) {
-    GsmSimulation modem(10);  // mostly in GSM
+    gsm::Simulation modem(10);  // mostly in GSM
     Played played(modem);
     std::size_t serving = 0;
     bool wasGsm = false;
@@ -25,11 +25,11 @@ TEST(GsmMoves, MovesWithinGsmToANeighborThatWasShownAndHadRisen) {
     int risen = 0;
     while (played.time() < 12min) {
         const auto code = played.next();
-        const Phone& phone = modem.phone();
+        const Modem& phone = modem.modem();
         const bool isGsm = phone.isOn(Rat::GSM);
         if (isGsm && wasGsm && phone.serving() != serving) {
             ++changes;
-            EXPECT_TRUE(shown.contains(std::to_string(modem.network().gsm[phone.serving()].arfcn)));
+            EXPECT_TRUE(shown.contains(std::to_string(modem.network().gsmCells[phone.serving()].arfcn)));
             const auto& then = history.front().second;
             const auto lead = [&](const auto& level) { return level(phone.serving()) - level(serving); };
             risen += lead([&](std::size_t sector) { return modem.air().gsmLevel(sector); }) >
@@ -43,7 +43,7 @@ TEST(GsmMoves, MovesWithinGsmToANeighborThatWasShownAndHadRisen) {
             shown.insert(played.text("GSM Cell and Neighbours/Neighboring Cells/" + std::to_string(row) + "/ARFCN"));
         }
         std::vector<double> levels;
-        for (std::size_t sector = 0; sector < modem.network().gsm.size(); ++sector) {
+        for (std::size_t sector = 0; sector < modem.network().gsmCells.size(); ++sector) {
             levels.push_back(modem.air().gsmLevel(sector));
         }
         history.emplace_back(played.time(), std::move(levels));
@@ -64,14 +64,14 @@ TEST(GsmMoves, MovesWithinUmtsToACellThatWasShownAndHadRisen) {
     };
     Count counts[2];  // idle, connected
     for (std::uint64_t seed : {3U, 5U, 7U}) {
-        GsmSimulation modem(seed);
+        gsm::Simulation modem(seed);
         Played played(modem);
         std::optional<std::size_t> serving;
         bool wasConnected = false;
         std::deque<Listing> listings;
         while (played.time() < 10min) {
             const auto code = played.next();
-            const Phone& phone = modem.phone();
+            const Modem& phone = modem.modem();
             if (!phone.isOn(Rat::UMTS)) {
                 serving.reset();
                 continue;
@@ -97,10 +97,10 @@ TEST(GsmMoves, MovesWithinUmtsToACellThatWasShownAndHadRisen) {
             for (std::size_t row = 0; row < played.rows(list); ++row) {
                 const std::string cell = list + "/" + std::to_string(row);
                 if (played.text(cell + "/RSCP").empty()) continue;  // told of, but not found
-                const auto at =
-                    std::ranges::find(modem.network().umts, static_cast<int>(played.number(cell + "/Scrambling Code")),
-                                      &UmtsCell::scramblingCode);
-                listing.levels[static_cast<std::size_t>(at - modem.network().umts.begin())] =
+                const auto at = std::ranges::find(modem.network().umtsCells,
+                                                  static_cast<int>(played.number(cell + "/Scrambling Code")),
+                                                  &UmtsCell::scramblingCode);
+                listing.levels[static_cast<std::size_t>(at - modem.network().umtsCells.begin())] =
                     played.number(cell + "/RSCP");
             }
             listing.levels.try_emplace(*serving, modem.air().rscp(*serving));  // the cell array tells no level of it
@@ -117,7 +117,7 @@ TEST(GsmMoves, MovesWithinUmtsToACellThatWasShownAndHadRisen) {
 TEST(GsmMoves, MovesBetweenTheSystemsToACellThatIsListed) {
     std::map<RrState, int> moves;
     for (std::uint64_t seed = 1; seed <= 5; ++seed) {
-        GsmSimulation modem(seed);
+        gsm::Simulation modem(seed);
         Played played(modem);
         std::optional<Rat> last;
         RrState move = RrState::Idle;
@@ -132,15 +132,15 @@ TEST(GsmMoves, MovesBetweenTheSystemsToACellThatIsListed) {
         };
         while (played.time() < 10min) {
             const auto code = played.next();
-            const Phone& phone = modem.phone();
+            const Modem& phone = modem.modem();
             if (!phone.isCamped()) continue;
             if (last && *last != phone.rat()) {
                 ++moves[move];
                 if (phone.rat() == Rat::GSM) {
-                    EXPECT_TRUE(gsm.contains(modem.network().gsm[phone.serving()].arfcn))
+                    EXPECT_TRUE(gsm.contains(modem.network().gsmCells[phone.serving()].arfcn))
                         << seed << " at " << seconds(played.time()) << " by " << static_cast<int>(move);
                 } else {
-                    EXPECT_TRUE(umts.contains(modem.network().umts[phone.serving()].scramblingCode))
+                    EXPECT_TRUE(umts.contains(modem.network().umtsCells[phone.serving()].scramblingCode))
                         << seed << " at " << seconds(played.time()) << " by " << static_cast<int>(move);
                 }
             }

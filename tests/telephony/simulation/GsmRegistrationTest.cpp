@@ -1,9 +1,10 @@
 #include <gtest/gtest.h>
 
+#include "telephony/simulation/GSMUMTS/Records.h"
 #include "telephony/simulation/GSMUMTS/Registration.h"
-#include "telephony/simulation/GSMUMTS/UmtsRecords.h"
 
 using namespace kelvo;
+using namespace kelvo::simulation;
 using namespace kelvo::simulation::gsm;
 using namespace std::chrono_literals;
 
@@ -85,8 +86,8 @@ TEST(Registration, SuspendsPacketDataDuringACallInGsmOnly) {
 }
 
 TEST(SearcherRecord, TellsTheSetOfEachCellAboveThirteenBitsOfItsCode) {
-    const SearchedCell cells[] = {{.scramblingCode = 0x1ab, .set = CellSet::Active, .ecNo = 0},
-                                  {.scramblingCode = 0x0cd, .set = CellSet::VirtualActive, .ecNo = -10}};
+    const SearchedCell cells[] = {{.scramblingCode = Psc(0x1ab), .set = CellSet::Active, .ecNo = 0},
+                                  {.scramblingCode = Psc(0x0cd), .set = CellSet::VirtualActive, .ecNo = -10}};
     const Bytes message = searcherRecord(0s, -70, cells);
     const ByteView record = ByteView(message).subspan(2);
     ASSERT_EQ(record.size(), 16U + 2 * 15 + 2 * 44);

@@ -6,7 +6,7 @@ using namespace std::chrono_literals;
 using kelvo::test::GsmComparison;
 
 TEST(GsmSimulationDisplay, ShowsForTenMinutesWhatTheWorldIs) {
-    GsmSimulation modem(1);
+    gsm::Simulation modem(1);
     GsmComparison comparison(modem);
     comparison.next();
     comparison.played().clearLog();  // the display's own first lines
@@ -17,7 +17,7 @@ TEST(GsmSimulationDisplay, ShowsForTenMinutesWhatTheWorldIs) {
 TEST(GsmSimulationDisplay, ShowsTheWorldOfOtherSeeds) {
     for (std::uint64_t seed = 2; seed < 8; ++seed) {
         SCOPED_TRACE(seed);
-        GsmSimulation modem(seed);
+        gsm::Simulation modem(seed);
         GsmComparison comparison(modem);
         while (comparison.played().time() < 1min && !testing::Test::HasFailure()) comparison.next();
     }

@@ -1,4 +1,4 @@
-#include "telephony/simulation/GsmSimulation.h"
+#include "telephony/simulation/GSMUMTS/Simulation.h"
 
 #include <gtest/gtest.h>
 
@@ -24,7 +24,7 @@ struct Written {
 };
 
 Written write(std::uint64_t seed, Time until) {
-    GsmSimulation modem(seed);
+    gsm::Simulation modem(seed);
     Written written;
     for (auto message = modem.next(); message.time < until; message = modem.next()) {
         const auto& bytes = message.bytes;
@@ -38,7 +38,7 @@ Written write(std::uint64_t seed, Time until) {
 
 /// Goes on, message by message, as long as `until` has not come; calls `look` after each.
 template <class Look>
-void watch(GsmSimulation& modem, Time until, Look look) {
+void watch(gsm::Simulation& modem, Time until, Look look) {
     for (auto message = modem.next(); message.time < until; message = modem.next()) look(message.time);
 }
 
@@ -96,14 +96,14 @@ TEST(GsmSimulation, FitsFourMinutesIntoAShortCapture) {
 }
 
 TEST(GsmSimulation, ChangesCellsSystemsAreasAndUsesInThreeMinutes) {
-    GsmSimulation modem(1);
+    gsm::Simulation modem(1);
     std::set<std::pair<Rat, std::size_t>> cells;
     std::set<int> areas;
     std::set<Use> uses;
     int systemChanges = -1;
     std::optional<Rat> last;
     watch(modem, 3min, [&](Time) {
-        const Phone& phone = modem.phone();
+        const Modem& phone = modem.modem();
         if (!phone.isCamped()) return;
         cells.insert({phone.rat(), phone.serving()});
         areas.insert(phone.area().lac);
@@ -118,12 +118,12 @@ TEST(GsmSimulation, ChangesCellsSystemsAreasAndUsesInThreeMinutes) {
 }
 
 TEST(GsmSimulation, RegistersAgainSoonAfterEveryChangeOfArea) {
-    GsmSimulation modem(2);
+    gsm::Simulation modem(2);
     Time unregisteredSince{0};
     int changes = 0;
     Area before{};
     watch(modem, 10min, [&](Time now) {
-        const Phone& phone = modem.phone();
+        const Modem& phone = modem.modem();
         if (!phone.isCamped()) return;
         if (phone.area() != before) ++changes;
         before = phone.area();
@@ -135,7 +135,7 @@ TEST(GsmSimulation, RegistersAgainSoonAfterEveryChangeOfArea) {
 }
 
 TEST(GsmSimulation, ShowsARegistrationInAllThreeProcesses) {
-    GsmSimulation modem(1);
+    gsm::Simulation modem(1);
     Played played(modem);
     std::set<std::string> states;
     while (played.time() < 3s) {
@@ -150,14 +150,14 @@ TEST(GsmSimulation, ShowsARegistrationInAllThreeProcesses) {
 }
 
 TEST(GsmSimulation, LeavesUmtsWhereItIsWeakAndComesBackWhereItIsGood) {
-    GsmSimulation modem(2);
+    gsm::Simulation modem(2);
     std::optional<Rat> last;
     double worst = 0;  // of the last three seconds
     std::deque<std::pair<Time, double>> recent;
     int left = 0;
     int back = 0;
     watch(modem, 10min, [&](Time now) {
-        const Phone& phone = modem.phone();
+        const Modem& phone = modem.modem();
         if (!phone.isCamped()) return;
         if (last && *last != phone.rat() && now > 2s) {
             if (phone.rat() == Rat::GSM) {
@@ -179,12 +179,12 @@ TEST(GsmSimulation, LeavesUmtsWhereItIsWeakAndComesBackWhereItIsGood) {
 }
 
 TEST(GsmSimulation, KeepsUpToThreeCloseCellsInSoftHandover) {
-    GsmSimulation modem(3);
+    gsm::Simulation modem(3);
     std::set<std::size_t> sizes;
     int strays = 0;
     int looks = 0;
     watch(modem, 10min, [&](Time) {
-        const Phone& phone = modem.phone();
+        const Modem& phone = modem.modem();
         if (!phone.isDedicated(Rat::UMTS)) return;
         const auto& members = phone.activeSet().members();
         sizes.insert(members.size());
@@ -203,10 +203,10 @@ TEST(GsmSimulation, BeginsAConnectionInUmtsWithOneCell) {
     int openings = 0;
     int widenings = 0;
     for (std::uint64_t seed = 1; seed <= 4; ++seed) {
-        GsmSimulation modem(seed);
+        gsm::Simulation modem(seed);
         std::optional<Time> opened;
         watch(modem, 10min, [&](Time now) {
-            const Phone& phone = modem.phone();
+            const Modem& phone = modem.modem();
             if (!phone.isDedicated(Rat::UMTS)) return opened.reset();
             if (!opened) {
                 ++openings;
@@ -234,12 +234,12 @@ TEST(GsmSimulation, WaitsForItsTimesToTriggerAnewAfterEveryChangeOfState) {
     };
     int reselections[2] = {};  // GSM, UMTS
     for (std::uint64_t seed = 1; seed <= 6; ++seed) {
-        GsmSimulation modem(seed);
+        gsm::Simulation modem(seed);
         std::optional<Phase> phase;
         std::size_t serving = 0;
         Time since{0};
         watch(modem, 10min, [&](Time now) {
-            const Phone& phone = modem.phone();
+            const Modem& phone = modem.modem();
             const RrState state = phone.rrState();
             const bool isMoving = state == RrState::CellReselection || state >= RrState::W2gHandover;
             const Phase next{phone.isCamped(), phone.rat(), phone.link(), isMoving};
@@ -266,11 +266,11 @@ TEST(GsmSimulation, CountsBlocksOverTheTimeInWhichItReceivedThem) {
     int returns = 0;
     int windows = 0;
     for (const std::uint64_t seed : {1, 2, 3, 21}) {  // the last comes back from GSM into a call
-        GsmSimulation modem(seed);
+        gsm::Simulation modem(seed);
         bool isHandover = false;
         bool wasInUmtsCall = false;  // and not out of a connection since
         for (auto message = modem.next(); message.time < 10min; message = modem.next()) {
-            const Phone& phone = modem.phone();
+            const Modem& phone = modem.modem();
             if (phone.link() != Link::Open) wasInUmtsCall = false;
             if (phone.isDedicated(Rat::UMTS)) {
                 returns += wasInUmtsCall && isHandover;
@@ -278,13 +278,13 @@ TEST(GsmSimulation, CountsBlocksOverTheTimeInWhichItReceivedThem) {
             }
             isHandover = phone.rrState() == RrState::G2wHandover;
             const unsigned code = message.bytes[5] | message.bytes[6] << 8U;
-            const int size = modem.drawn().blockErrors.windowSize;
+            const int size = modem.lastReports().blockErrors.windowSize;
             if (code == 0x4116) {
                 ++windows;
                 EXPECT_TRUE(size == 30 || size == 200) << size << " frames, seed " << seed;
             }
             if (code != 0x4221) continue;
-            EXPECT_EQ(modem.drawn().hsdpa.subFrames, 5 * size);  // of 2 ms, not 10
+            EXPECT_EQ(modem.lastReports().hsdpa.subFrames, 5 * size);  // of 2 ms, not 10
         }
     }
     EXPECT_GE(windows, 200);
@@ -295,13 +295,13 @@ TEST(GsmSimulation, SendsInAllSlotsButOneAtMost) {
     int whole = 0;
     int broken = 0;
     for (std::uint64_t seed = 1; seed <= 4; ++seed) {
-        GsmSimulation modem(seed);
+        gsm::Simulation modem(seed);
         for (auto message = modem.next(); message.time < 10min; message = modem.next()) {
             if (message.bytes[5] != 0x31 || message.bytes[6] != 0x40) continue;
-            const auto& slots = modem.drawn().transmitPower;
+            const auto& slots = modem.lastReports().transmitPower;
             const auto gaps = std::ranges::count_if(slots, [](const auto& slot) { return !slot; });
             ASSERT_EQ(slots.size(), 3U);
-            ASSERT_LE(gaps, modem.phone().isMeasuringGsm() ? 1 : 0);
+            ASSERT_LE(gaps, modem.modem().isMeasuringGsm() ? 1 : 0);
             ++(gaps == 0 ? whole : broken);
         }
     }
@@ -310,7 +310,7 @@ TEST(GsmSimulation, SendsInAllSlotsButOneAtMost) {
 }
 
 TEST(GsmSimulation, HoldsItsLevelsWhileThePhoneStands) {
-    GsmSimulation modem(1);
+    gsm::Simulation modem(1);
     double driven = -1;
     double low = 0;
     double high = 0;
@@ -345,11 +345,11 @@ TEST(GsmSimulation, LoadsFasterAndCleanerWhereTheSignalIsGood) {
     double goodBits = 0, goodErrors = 0, goodBlocks = 1;
     double poorBits = 0, poorErrors = 0, poorBlocks = 1;
     for (std::uint64_t seed : {1U, 3U}) {
-        GsmSimulation modem(seed);
+        gsm::Simulation modem(seed);
         for (auto message = modem.next(); message.time < 6min; message = modem.next()) {
             if (message.bytes[5] != 0x21 || message.bytes[6] != 0x42) continue;
-            const bool isGood = modem.air().ecNo(modem.phone().serving()) > -11;
-            for (const HarqProcess& process : modem.drawn().hsdpa.primary) {
+            const bool isGood = modem.air().ecNo(modem.modem().serving()) > -11;
+            for (const HarqProcess& process : modem.lastReports().hsdpa.primary) {
                 (isGood ? goodBits : poorBits) += process.bits;
                 (isGood ? goodErrors : poorErrors) += process.blockErrors;
                 (isGood ? goodBlocks : poorBlocks) += process.newTransmissions;

@@ -1,4 +1,4 @@
-#include "telephony/simulation/IfxSimulation.h"
+#include "telephony/simulation/IFX/Simulation.h"
 
 #include <gtest/gtest.h>
 
@@ -16,7 +16,7 @@ using namespace std::chrono_literals;
 namespace {
 
 std::vector<Bytes> minuteOf(std::uint64_t seed) {
-    IfxSimulation modem(seed);
+    ifx::Simulation modem(seed);
     std::vector<Bytes> messages;
     for (auto message = modem.next(); message.time < 1min; message = modem.next()) messages.push_back(message.bytes);
     return messages;
@@ -70,9 +70,9 @@ protected:
         is("Serving/MNC", "01");
         is("Serving/LAC", modem.modem().area().lac);
         if (truth().access == RadioAccess::Gsm) {
-            checkGsm(modem.network().gsm[truth().serving]);
+            checkGsm(modem.network().gsmCells[truth().serving]);
         } else {
-            checkUmts(modem.network().umts[truth().serving]);
+            checkUmts(modem.network().umtsCells[truth().serving]);
         }
     }
     void checkGsm(const GsmCell& cell) {
@@ -100,7 +100,7 @@ protected:
         ASSERT_EQ(played.rows("Neighbours/GSM"), truth().gsm.size());
         for (std::size_t i = 0; i < truth().gsm.size(); ++i) {
             const GsmNeighbor& neighbor = truth().gsm[i];
-            const GsmCell& cell = modem.network().gsm[neighbor.sector];
+            const GsmCell& cell = modem.network().gsmCells[neighbor.sector];
             const std::string row = "Neighbours/GSM/" + std::to_string(i);
             if (!neighbor.measured) {
                 is(row, cell.arfcn);  // nothing else is known
@@ -115,7 +115,7 @@ protected:
         ASSERT_EQ(played.rows("Neighbours/UMTS"), truth().umts.size());
         for (std::size_t i = 0; i < truth().umts.size(); ++i) {
             const std::string row = "Neighbours/UMTS/" + std::to_string(i);
-            is(row + "/SCN", modem.network().umts[truth().umts[i].sector].scramblingCode);
+            is(row + "/SCN", modem.network().umtsCells[truth().umts[i].sector].scramblingCode);
             near(row + "/RSCP", truth().umts[i].rscp, 1, " dBm");
             near(row + "/ECN0", truth().umts[i].ecN0, 0.5, " dB");
         }
@@ -154,7 +154,7 @@ protected:
         checkConnection();
     }
 
-    IfxSimulation modem{1};
+    ifx::Simulation modem{1};
     test::Played played{modem};
     std::set<std::string> channels;
 };
@@ -192,7 +192,7 @@ TEST(IfxSimulation, GivesTheSameBytesForTheSameSeed) {
 }
 
 TEST(IfxSimulation, SendsATreeEveryFewSecondsAndAtEachChange) {
-    IfxSimulation modem(1);
+    ifx::Simulation modem(1);
     int messages = 0;
     std::size_t bytes = 0;
     Time last{0};
@@ -218,7 +218,7 @@ TEST(IfxSimulation, GoesOnlyToCellsThatItHasShownBeforeAndThatCameCloser) {
     };
     std::map<std::string, Moves> moves;
     for (std::uint64_t seed = 1; seed <= 3; ++seed) {
-        IfxSimulation modem(seed);
+        ifx::Simulation modem(seed);
         test::Played played(modem);
         std::map<std::string, std::vector<Sighting>> sightings;
         Cells before(played);
@@ -261,8 +261,8 @@ TEST(IfxSimulation, GoesOnlyToCellsThatItHasShownBeforeAndThatCameCloser) {
 TEST(IfxSimulation, ServesTheStrongestWithinTheMarginsOfItsRules) {
     for (std::uint64_t seed = 1; seed <= 3; ++seed) {
         Random random(seed);
-        const Network network = buildNetwork(random);
-        Drive drive{network.radio, Journey::through(2000, random), random.split()};
+        const Network network(random);
+        Drive drive{network.sectors, Journey::through(2000, random), random.split()};
         PhoneUser user(random.split());
         Modem modem(network, random.split());
         const Status& status = modem.status();
@@ -274,7 +274,7 @@ TEST(IfxSimulation, ServesTheStrongestWithinTheMarginsOfItsRules) {
             drive.moveTo(now);
             const bool wasIdle = status.connection == Connection::Idle;
             const auto activity = user.at(now);
-            modem.measure(drive, now, activity, user.demand());
+            modem.measure(now, drive, activity, user.demand());
             EXPECT_TRUE(std::ranges::is_sorted(status.gsm, std::greater(), &GsmNeighbor::rssi));
             std::map<std::size_t, Time> idle;
             std::map<std::size_t, Time> connected;
@@ -301,7 +301,7 @@ TEST(IfxSimulation, ServesTheStrongestWithinTheMarginsOfItsRules) {
 
 TEST(IfxSimulation, HearsOneCellOfACarrierAtMost) {
     for (std::uint64_t seed = 1; seed <= 5; ++seed) {
-        IfxSimulation modem(seed);
+        ifx::Simulation modem(seed);
         test::Played played(modem);
         std::size_t most = 0;
         while (played.time() < 5min) {
@@ -321,19 +321,19 @@ TEST(IfxSimulation, HearsOneCellOfACarrierAtMost) {
 }
 
 TEST(IfxSimulation, LosesMoreAndCarriesLessWhereTheSignalIsWorse) {
-    std::map<int, std::map<double, double>> gsm;     // by coding scheme, and call as 0: errors by signal to rest
-    std::map<double, int> schemes;                   // by signal to rest
+    std::map<int, std::map<double, double>> gsm;  // by coding scheme, and call as 0: errors by carrier to interference
+    std::map<double, int> schemes;                // by carrier to interference
     std::map<bool, std::map<double, double>> umts;   // by call: errors by Ec/N0
     std::map<bool, std::pair<double, int>> carried;  // on UMTS, by a good Ec/N0: the sum of kbit/s, the messages
     for (std::uint64_t seed = 1; seed <= 3; ++seed) {
-        IfxSimulation modem(seed);
+        ifx::Simulation modem(seed);
         for (auto message = modem.next(); message.time < 10min; message = modem.next()) {
             const Status& status = modem.modem().status();
             if (status.connection == Connection::Idle) continue;
             const bool call = status.connection == Connection::Call;
             if (status.access == RadioAccess::Gsm) {
-                gsm[call ? 0 : status.codingScheme][status.gsmToRest] = status.errors;
-                if (!call) schemes[status.gsmToRest] = status.codingScheme;
+                gsm[call ? 0 : status.codingScheme][status.carrierToInterference] = status.errors;
+                if (!call) schemes[status.carrierToInterference] = status.codingScheme;
             } else {
                 umts[call][status.ecN0] = status.errors;
                 if (call || status.throughput == 0) continue;
@@ -362,7 +362,7 @@ TEST(IfxSimulation, LosesMoreAndCarriesLessWhereTheSignalIsWorse) {
 }
 
 TEST(IfxSimulation, ChangesBetweenItsTwoNetworksWithinThreeMinutes) {
-    IfxSimulation modem(1);
+    ifx::Simulation modem(1);
     std::set<RadioAccess> served;
     std::set<int> cells;
     for (auto message = modem.next(); message.time < 3min; message = modem.next()) {
@@ -375,7 +375,7 @@ TEST(IfxSimulation, ChangesBetweenItsTwoNetworksWithinThreeMinutes) {
 }
 
 TEST(IfxSimulation, UpdatesItsAreaAfterEachChangeButNotDuringACall) {
-    IfxSimulation modem(1);
+    ifx::Simulation modem(1);
     LocationArea area;
     Time elsewhereSince{0};
     std::set<int> registered;
@@ -399,16 +399,17 @@ TEST(IfxSimulation, UpdatesItsAreaAfterEachChangeButNotDuringACall) {
 }
 
 TEST(IfxSimulation, GivesNeighboringCellsDifferentIdentities) {
-    IfxSimulation modem(7);
+    ifx::Simulation modem(7);
     const auto& network = modem.network();
     std::set<std::pair<int, int>> gsm;
     std::set<int> umts;
     std::set<int> cells;
-    for (std::size_t i = 0; i < network.radio.size(); ++i) {
-        EXPECT_TRUE(gsm.insert({network.gsm[i].arfcn, network.gsm[i].bsic}).second);
-        EXPECT_TRUE(umts.insert(network.umts[i].scramblingCode).second);
-        EXPECT_TRUE(cells.insert(network.gsm[i].cellId).second && cells.insert(network.umts[i].cellId).second);
-        EXPECT_TRUE(network.gsm[i].arfcn >= 1 && network.gsm[i].arfcn <= 124);
-        EXPECT_LT(network.umts[i].scramblingCode, 512);
+    for (std::size_t i = 0; i < network.sectors.size(); ++i) {
+        EXPECT_TRUE(gsm.insert({network.gsmCells[i].arfcn, network.gsmCells[i].bsic}).second);
+        EXPECT_TRUE(umts.insert(network.umtsCells[i].scramblingCode).second);
+        EXPECT_TRUE(cells.insert(network.gsmCells[i].cellId).second &&
+                    cells.insert(network.umtsCells[i].cellId).second);
+        EXPECT_TRUE(network.gsmCells[i].arfcn >= 1 && network.gsmCells[i].arfcn <= 124);
+        EXPECT_LT(network.umtsCells[i].scramblingCode, 512);
     }
 }

@@ -7,6 +7,7 @@
 namespace kelvo::test {
 
 using namespace simulation;
+using namespace simulation::lte;
 
 void LteShown::compare(std::uint32_t code) {
     switch (code) {
@@ -34,10 +35,10 @@ void LteShown::reads(const std::string& key, double truth, double step, const st
 }
 
 void LteShown::servingCell() {
-    const LteCell& cell = _modem.serving();
+    const Cell& cell = _modem.serving();
     const bool isWide = cell.carrier.downlink == 1300;
     _section = "Serving Cell Info";
-    equals("Physical Cell ID", cell.physicalId);
+    equals("Physical Cell ID", cell.pci);
     equals("Cell Identity", cell.identity);
     equals("Tracking Area Code", cell.trackingArea);
     equals("Download Frequency", isWide ? "1300" : "300");
@@ -52,18 +53,18 @@ void LteShown::connectedMeasurement() {
     EXPECT_TRUE(_modem.isConnected());
     _section = "Connected mode LTE Intra-frequency Measurement";
     equals("E-ARFCN", _modem.serving().carrier.downlink);
-    equals("Serving Physical Cell ID", _modem.serving().physicalId);
+    equals("Serving Physical Cell ID", _modem.serving().pci);
     equals("Subframe Number", _modem.subframe());
-    reads("Serving Filtered RSRP", _modem.reading().averageRsrp, 0.25, " dBm");
-    reads("Serving Filtered RSRQ", _modem.reading().averageRsrq, 0.125, " dB");
+    reads("Serving Filtered RSRP", _modem.reading().filteredRsrp, 0.25, " dBm");
+    reads("Serving Filtered RSRQ", _modem.reading().filteredRsrq, 0.125, " dB");
 
     ASSERT_EQ(_played.rows("Measured Neighbor Cells"), _modem.neighbors().size());
     for (std::size_t i = 0; i < _modem.neighbors().size(); ++i) {
-        const LteNeighbor& cell = _modem.neighbors()[i];
+        const Neighbor& cell = _modem.neighbors()[i];
         _section = "Measured Neighbor Cells/" + std::to_string(i);
-        equals("Physical Cell ID", cell.physicalId);
-        reads("Filtered RSRP", cell.reading.averageRsrp, 0.25, " dBm");
-        reads("Filtered RSRQ", cell.reading.averageRsrq, 0.125, " dB");
+        equals("Physical Cell ID", cell.pci);
+        reads("Filtered RSRP", cell.reading.filteredRsrp, 0.25, " dBm");
+        reads("Filtered RSRQ", cell.reading.filteredRsrq, 0.125, " dB");
     }
     ASSERT_EQ(_played.rows("Detected Cells"), _modem.detected().size());
     for (std::size_t i = 0; i < _modem.detected().size(); ++i) {
@@ -74,21 +75,21 @@ void LteShown::connectedMeasurement() {
 
 void LteShown::servingMeasurement() {
     EXPECT_FALSE(_modem.isConnected());
-    const LteCell& cell = _modem.serving();
-    const LteReading& reading = _modem.reading();
-    const LteIdleState& idle = _modem.idle();
+    const Cell& cell = _modem.serving();
+    const Reading& reading = _modem.reading();
+    const IdleState& idle = _modem.idle();
     const auto thresholdText = [](const std::optional<int>& dB, const char* unit) {
         return dB ? std::to_string(*dB) + unit : "Not Present";
     };
     _section = "Serving Cell Measurements";
     equals("Version", 1);
     equals("E-ARFCN", cell.carrier.downlink);
-    equals("Physical Cell ID", cell.physicalId);
+    equals("Physical Cell ID", cell.pci);
     equals("Serving Layer Priority", cell.priority);
     reads("Measured RSRP", reading.rsrp, 0.25, " dBm");
-    reads("Average RSRP", reading.averageRsrp, 0.25, " dBm");
+    reads("Average RSRP", reading.filteredRsrp, 0.25, " dBm");
     reads("Measured RSRQ", reading.rsrq, 0.25, " dB");
-    reads("Average RSRQ", reading.averageRsrq, 0.25, " dB");
+    reads("Average RSRQ", reading.filteredRsrq, 0.25, " dB");
     reads("Measured RSSI", reading.rssi, 0.5, " dBm");
     equals("Qrxlevmin", std::to_string(cell.minimumLevel) + " dBm");
     equals("P_Max", thresholdText(cell.maximumPower, " dBm"));
@@ -108,14 +109,14 @@ void LteShown::neighborMeasurement() {
     equals("Qrxlevmin", std::to_string(_modem.neighborsMinimumLevel()) + " dBm");
     ASSERT_EQ(_played.rows("Neighbor Cells List"), _modem.neighbors().size());
     for (std::size_t i = 0; i < _modem.neighbors().size(); ++i) {
-        const LteNeighbor& cell = _modem.neighbors()[i];
+        const Neighbor& cell = _modem.neighbors()[i];
         _section = "Neighbor Cells List/" + std::to_string(i);
-        equals("Physical Cell ID", cell.physicalId);
+        equals("Physical Cell ID", cell.pci);
         reads("Measured RSSI", cell.reading.rssi, 0.5, " dBm");
         reads("Measured RSRP", cell.reading.rsrp, 0.5, " dBm");
-        reads("Average RSRP", cell.reading.averageRsrp, 0.5, " dBm");
+        reads("Average RSRP", cell.reading.filteredRsrp, 0.5, " dBm");
         reads("Measured RSRQ", cell.reading.rsrq, 0.25, " dB");
-        reads("Average RSRQ", cell.reading.averageRsrq, 0.25, " dB");
+        reads("Average RSRQ", cell.reading.filteredRsrq, 0.25, " dB");
         reads("Srxlev", cell.srxlev, 1, " dBm");
         equals("Frequency Offset", cell.frequencyError);
         for (const char* antenna : {"Ant 0", "Ant 1"}) {
@@ -129,31 +130,31 @@ void LteShown::candidates() {
     _section = "Reselection Candidates";
     equals("Version", 1);
     equals("Serving EARFCN", _modem.serving().carrier.downlink);
-    equals("Serving Cell ID", _modem.serving().physicalId);
+    equals("Serving Cell ID", _modem.serving().pci);
     const auto& shown = _modem.candidate();
     ASSERT_EQ(_played.rows("Reselection Candidates List"), shown ? 1U : 0U);
     if (shown) candidate(*shown);
 }
 
-void LteShown::candidate(const LteCandidate& candidate) {
+void LteShown::candidate(const Candidate& candidate) {
     _section = "Reselection Candidates List/0";
     equals("Candidate Priority", candidate.priority);
     switch (candidate.kind) {
-        case LteCandidate::Kind::Lte:
+        case Candidate::Kind::Lte:
             equals("Candidate RAT Type", "LTE");
             equals("E ARFCN", candidate.channel);
             return equals("Cell ID", candidate.code);
-        case LteCandidate::Kind::Utran:
+        case Candidate::Kind::Utran:
             equals("Candidate RAT Type", "UTRAN");
             equals("U ARFCN", candidate.channel);
             return equals("PSC", candidate.code);
-        case LteCandidate::Kind::Geran:
+        case Candidate::Kind::Geran:
             equals("Candidate RAT Type", "GERAN");
             equals("ARFCN", candidate.channel);
             equals("Band", candidate.band);
             return equals("BSIC ID", candidate.code);
-        case LteCandidate::Kind::Cdma1x: equals("Candidate RAT Type", "CDMA1XRTT"); break;
-        case LteCandidate::Kind::Hrpd: equals("Candidate RAT Type", "CDMAHRPD"); break;
+        case Candidate::Kind::Cdma1x: equals("Candidate RAT Type", "CDMA1XRTT"); break;
+        case Candidate::Kind::Hrpd: equals("Candidate RAT Type", "CDMAHRPD"); break;
     }
     equals("Band", candidate.band);
     equals("Channel", candidate.channel);
@@ -183,11 +184,11 @@ void LteShown::simFiles() {
 }
 
 void LteShown::monitoredCell() {
-    const LteCell& cell = _modem.serving();
+    const Cell& cell = _modem.serving();
     _section = "Serving Cell Info";
     equals("Tracking Area Code", cell.trackingArea);
     equals("Cell Identity", cell.identity);
-    equals("Physical Cell ID", cell.physicalId);
+    equals("Physical Cell ID", cell.pci);
     equals("Freq Band Indicator", cell.carrier.downlink == 1300 ? "3" : "1");
     equals("UARFCN", cell.carrier.downlink);
 }

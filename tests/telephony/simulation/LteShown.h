@@ -1,6 +1,6 @@
 #pragma once
 
-#include "telephony/simulation/LTE/LteModem.h"
+#include "telephony/simulation/LTE/Modem.h"
 #include "tests/telephony/simulation/Played.h"
 
 namespace kelvo::test {
@@ -9,7 +9,7 @@ namespace kelvo::test {
 /// failures. Knows the records that change the screens, by their log codes.
 class LteShown {
 public:
-    LteShown(Played& played, const simulation::LteModem& modem) : _played(played), _modem(modem) {}
+    LteShown(Played& played, const simulation::lte::Modem& modem) : _played(played), _modem(modem) {}
 
     void compare(std::uint32_t code);
 
@@ -19,7 +19,7 @@ private:
     void servingMeasurement();
     void neighborMeasurement();
     void candidates();
-    void candidate(const simulation::LteCandidate& candidate);
+    void candidate(const simulation::lte::Candidate& candidate);
     void simFiles();
     void monitoredCell();
     void contexts();
@@ -32,7 +32,7 @@ private:
     void reads(const std::string& key, double truth, double step, const std::string& unit);
 
     Played& _played;
-    const simulation::LteModem& _modem;
+    const simulation::lte::Modem& _modem;
     std::string _section;
 };
 

@@ -1,4 +1,4 @@
-#include "telephony/simulation/LteSimulation.h"
+#include "telephony/simulation/LTE/Simulation.h"
 
 #include <gtest/gtest.h>
 
@@ -12,13 +12,14 @@
 
 using namespace kelvo;
 using namespace kelvo::simulation;
+using namespace kelvo::simulation::lte;
 using namespace kelvo::test;
 using namespace std::chrono_literals;
 
 namespace {
 
 Bytes drive(std::uint64_t seed, Time until) {
-    LteSimulation modem(seed);
+    lte::Simulation modem(seed);
     Bytes all;
     for (auto message = modem.next(); message.time < until; message = modem.next()) {
         all.insert(all.end(), message.bytes.begin(), message.bytes.end());
@@ -45,7 +46,7 @@ TEST(LteSimulation, GivesTheSameBytesForTheSameSeed) {
 }
 
 TEST(LteSimulation, ShowsTheWorldItPlays) {
-    LteSimulation modem(1);
+    lte::Simulation modem(1);
     Played played(modem);
     LteShown shown(played, modem.modem());
     do {
@@ -62,7 +63,7 @@ TEST(LteSimulation, ShowsTheWorldItPlays) {
 }
 
 TEST(LteSimulation, SendsEveryRecordThatTheApplicationAsksFor) {
-    LteSimulation modem(3);
+    lte::Simulation modem(3);
     std::map<std::uint32_t, int> counts;
     Played played(modem);
     std::set<std::uint32_t> codes;  // of the first four minutes
@@ -84,7 +85,7 @@ TEST(LteSimulation, SendsEveryRecordThatTheApplicationAsksFor) {
 }
 
 TEST(LteSimulation, FillsEveryScreenWithinTwoSeconds) {
-    LteSimulation modem(1);
+    lte::Simulation modem(1);
     Played played(modem);
     std::set<std::string> filled;
     while (played.time() < 2s) {
@@ -104,12 +105,12 @@ TEST(LteSimulation, FillsEveryScreenWithinTwoSeconds) {
 }
 
 TEST(LteSimulation, HasALivelyFirstThreeMinutesInLittleSpace) {
-    LteSimulation modem(1);
+    lte::Simulation modem(1);
     Played played(modem);
     std::set<std::string> seen;
     int cells = 0;
     std::size_t bytes = 0;
-    LteSimulation twin(1);
+    lte::Simulation twin(1);
     for (auto message = twin.next(); message.time < 3min; message = twin.next()) bytes += message.bytes.size() + 16;
     while (played.time() < 3min) {
         played.next();
@@ -130,7 +131,7 @@ TEST(LteSimulation, HasALivelyFirstThreeMinutesInLittleSpace) {
 }
 
 TEST(LteSimulation, GoesOnlyToCellsThatItHasShownBeforeAndThatCameCloser) {
-    LteSimulation modem(2);
+    lte::Simulation modem(2);
     Played played(modem);
     struct Sighting {
         Time time;
@@ -140,11 +141,11 @@ TEST(LteSimulation, GoesOnlyToCellsThatItHasShownBeforeAndThatCameCloser) {
     int changes = 0;
     int rising = 0;
     Time changed = 0s;
-    int serving = modem.modem().serving().physicalId;
+    int serving = modem.modem().serving().pci;
     while (played.time() < 10min) {
         const auto code = played.next();
-        if (modem.modem().serving().physicalId != serving) {
-            serving = modem.modem().serving().physicalId;
+        if (modem.modem().serving().pci != serving) {
+            serving = modem.modem().serving().pci;
             const auto& history = sightings[serving];
             ASSERT_FALSE(history.empty()) << serving;
             EXPECT_LE(played.time() - history.back().time, 1s);
@@ -173,14 +174,14 @@ TEST(LteSimulation, GoesOnlyToCellsThatItHasShownBeforeAndThatCameCloser) {
 }
 
 TEST(LteSimulation, RegistersSoonAfterTheAreaChanges) {
-    LteSimulation modem(4);
+    lte::Simulation modem(4);
     Played played(modem);
     Time since = 0s;
     int registrations = 0;
     int last = modem.modem().registeredArea();
     while (played.time() < 10min) {
         played.next();
-        const LteModem& world = modem.modem();
+        const Modem& world = modem.modem();
         if (world.serving().trackingArea == world.registeredArea() || world.hasChangedCell()) since = played.time();
         ASSERT_LE(played.time() - since, 1s);
         if (world.registeredArea() == last) continue;
@@ -192,7 +193,7 @@ TEST(LteSimulation, RegistersSoonAfterTheAreaChanges) {
 }
 
 TEST(LteSimulation, IsIdleAndConnectedByTurns) {
-    LteSimulation modem(2);
+    lte::Simulation modem(2);
     int phases = 0;
     int messages = 0;
     int calls = 0;
@@ -221,8 +222,8 @@ TEST(LteSimulation, EndsASessionEarlyOnlyToGoToAnotherCarrierAndNoCallAtAll) {
     int redirections = 0;
     int arrivals = 0;
     for (std::uint64_t seed = 8; seed <= 12; ++seed) {
-        LteSimulation modem(seed);
-        const LteModem& world = modem.modem();
+        lte::Simulation modem(seed);
+        const Modem& world = modem.modem();
         bool wasConnected = true;
         bool wasOnCall = false;
         bool isForArea = true;  // or for the attach
@@ -256,10 +257,10 @@ TEST(LteSimulation, EndsASessionEarlyOnlyToGoToAnotherCarrierAndNoCallAtAll) {
 }
 
 TEST(LteSimulation, ReadsQualityAsLevelOverEverythingHeard) {
-    LteSimulation modem(7);
+    lte::Simulation modem(7);
     int readings = 0;
     for (auto message = modem.next(); message.time < 2min; message = modem.next()) {
-        const LteReading& reading = modem.modem().reading();
+        const Reading& reading = modem.modem().reading();
         const bool isAtTheEnd = reading.rsrq <= -19.5 || reading.rsrq >= -3 || reading.rsrp >= -44;
         if (!modem.modem().hasMeasured() || isAtTheEnd) continue;
         const double blocks = modem.modem().serving().carrier.downlink == 1300 ? 100 : 50;
@@ -270,22 +271,22 @@ TEST(LteSimulation, ReadsQualityAsLevelOverEverythingHeard) {
 }
 
 TEST(LteSimulation, KeepsTheLevelWhileThePhoneStands) {
-    LteSimulation modem(1);
-    const LteModem& world = modem.modem();
+    lte::Simulation modem(1);
+    const Modem& world = modem.modem();
     Time since = 0s;
     double driven = -1;
     double level = 0;
     int steady = 0;
     for (auto message = modem.next(); message.time < 10min; message = modem.next()) {
-        if (world.drive().driven() != driven || world.hasChangedCell()) {
+        if (modem.air().drive().driven() != driven || world.hasChangedCell()) {
             since = message.time;
-            driven = world.drive().driven();
-            level = world.drive().received(world.servingIndex());
+            driven = modem.air().drive().driven();
+            level = modem.air().drive().received(world.servingIndex());
             continue;
         }
-        EXPECT_EQ(world.drive().received(world.servingIndex()), level);
+        EXPECT_EQ(modem.air().drive().received(world.servingIndex()), level);
         if (message.time - since < 4s) continue;  // the average still remembers the road
-        EXPECT_NEAR(world.reading().averageRsrp, level - 10 * std::log10(12 * world.serving().carrier.resourceBlocks),
+        EXPECT_NEAR(world.reading().filteredRsrp, level - 10 * std::log10(12 * world.serving().carrier.resourceBlocks),
                     3);
         ++steady;
     }
@@ -294,23 +295,21 @@ TEST(LteSimulation, KeepsTheLevelWhileThePhoneStands) {
 
 TEST(LteNetwork, NamesEveryCellByItself) {
     Random random(1);
-    auto sectors = buildSectors({}, random);
-    const auto cells = nameLteCells(sectors, random);
-    std::set<int> physicalIds;
+    const Network network(random);
+    std::set<int> pcis;
     std::set<std::uint32_t> identities;
-    for (const LteCell& cell : cells) {
-        EXPECT_TRUE(between(cell.physicalId, 0, 503));
-        physicalIds.insert(cell.physicalId);
+    for (const Cell& cell : network.cells) {
+        pcis.insert(cell.pci);
         identities.insert(cell.identity);
-        for (const LteCandidate& other : cell.others) {
-            const bool isUtran = other.kind == LteCandidate::Kind::Utran;
-            const bool isGeran = other.kind == LteCandidate::Kind::Geran;
+        for (const Candidate& other : cell.others) {
+            const bool isUtran = other.kind == Candidate::Kind::Utran;
+            const bool isGeran = other.kind == Candidate::Kind::Geran;
             // Scrambling codes and pilot offsets go up to 511, base station colours to 63.
             EXPECT_TRUE(between(other.code, 0, isGeran ? 63 : 511)) << other.code;
             EXPECT_TRUE(!isUtran || between(other.channel, 10'562, 10'838));  // band I
             EXPECT_TRUE(!isGeran || between(other.channel, 512, 885));        // DCS 1800
         }
     }
-    EXPECT_EQ(physicalIds.size(), cells.size());
-    EXPECT_EQ(identities.size(), cells.size());
+    EXPECT_EQ(pcis.size(), network.cells.size());
+    EXPECT_EQ(identities.size(), network.cells.size());
 }

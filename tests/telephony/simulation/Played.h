@@ -9,7 +9,7 @@
 #include <string_view>
 #include <vector>
 
-#include "LogGenerator/LogGenerator.h"
+#include "LogGenerator/Factory.h"
 #include "platform/system/DirectoryResources.h"
 #include "platform/system/Environment.h"
 #include "platform/telephony/Technology.h"
@@ -22,7 +22,7 @@ namespace kelvo::test {
 inline std::set<std::uint32_t> codesAskedFor(Technology technology) {
     const DirectoryResources resources{KELVO_RESOURCE_DIR};
     const Environment::Scope environment{{.resources = &resources}};
-    const auto generator = LogGenerator::generatorFromTechnology(namesOf(technology).identifier);
+    const auto generator = generatorFromTechnology(namesOf(technology).identifier);
     const DictionaryRef command = generator->getStartCommand();
     std::set<std::uint32_t> codes;
     const auto add = [&](std::string_view key, std::uint32_t first) {
@@ -41,7 +41,7 @@ inline std::set<std::uint32_t> codesAskedFor(Technology technology) {
 class Played {
 public:
     explicit Played(simulation::Simulation& modem)
-        : _modem(modem), _generator(LogGenerator::generatorFromTechnology(namesOf(modem.technology()).identifier)) {}
+        : _modem(modem), _generator(generatorFromTechnology(namesOf(modem.technology()).identifier)) {}
 
     /// Feeds the next message. Its log code, 0xff0000 and more for an extended record.
     std::uint32_t next() {

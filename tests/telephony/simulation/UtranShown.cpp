@@ -8,6 +8,7 @@
 namespace kelvo::test {
 
 using namespace simulation;
+using namespace simulation::utran;
 
 namespace {
 
@@ -22,7 +23,7 @@ bool isInStep(double truth, double level, double lowest, double step, int last) 
 
 void UtranShown::compare(std::uint32_t code) {
     switch (code) {
-        case 0xD0E0: return mode();
+        case 0xD0E0: return rrcState();
         case 0xD0E2: return servingCell();
         case 0xD00A: return cells();
         case 0xD00C: return channels();
@@ -38,20 +39,20 @@ void UtranShown::equals(const std::string& key, const std::string& text) {
     EXPECT_EQ(at(key), text) << _section << "/" << key;
 }
 
-void UtranShown::mode() {
+void UtranShown::rrcState() {
     _section = "RRC Info";
-    switch (_modem.mode()) {
-        case UtranMode::Disconnected: return equals("State", "Disconnected");
-        case UtranMode::Connecting: return equals("State", "Connecting");
-        case UtranMode::CellFach: return equals("State", "Cell Fach");
-        case UtranMode::CellDch: return equals("State", "Cell DCH");
-        case UtranMode::CellPch: return equals("State", "Cell PCH");
-        case UtranMode::UraPch: return equals("State", "Cell URA PCH");
+    switch (_modem.rrcState()) {
+        case RrcState::Disconnected: return equals("State", "Disconnected");
+        case RrcState::Connecting: return equals("State", "Connecting");
+        case RrcState::CellFach: return equals("State", "Cell Fach");
+        case RrcState::CellDch: return equals("State", "Cell DCH");
+        case RrcState::CellPch: return equals("State", "Cell PCH");
+        case RrcState::UraPch: return equals("State", "Cell URA PCH");
     }
 }
 
 void UtranShown::servingCell() {
-    const UtranCell& cell = _modem.serving();
+    const Cell& cell = _modem.serving();
     _section = "Serving Cell Info";
     equals("Cell Access Restrictions", cell.barredClasses);
     equals("Cell ID", cell.identity);
@@ -64,8 +65,8 @@ void UtranShown::servingCell() {
 void UtranShown::cells() {
     ASSERT_EQ(_played.rows("Neighbor Cell List"), _modem.measurements().size());
     for (std::size_t i = 0; i < _modem.measurements().size(); ++i) {
-        const UtranMeasurement& measured = _modem.measurements()[i];
-        const UtranCell& cell = _modem.cells()[measured.cell];
+        const Measurement& measured = _modem.measurements()[i];
+        const Cell& cell = _modem.cells()[measured.cell];
         _section = "Neighbor Cell List/" + std::to_string(i);
         equals("UARFCN", cell.uarfcn);
         equals("Cell ID", cell.parameterId);
@@ -73,9 +74,9 @@ void UtranShown::cells() {
         EXPECT_NEAR(level, std::round(level), 0.001);
         EXPECT_TRUE(isInStep(measured.rscp, std::round(level), -115, 1, 91)) << measured.rscp << " as " << level;
         switch (measured.set) {
-            case UtranMeasurement::Set::Active: equals("Status", "ASET"); break;
-            case UtranMeasurement::Set::Monitored: equals("Status", "MSET"); break;
-            case UtranMeasurement::Set::Detected: equals("Status", "DSET"); break;
+            case Measurement::Set::Active: equals("Status", "ASET"); break;
+            case Measurement::Set::Monitored: equals("Status", "MSET"); break;
+            case Measurement::Set::Detected: equals("Status", "DSET"); break;
         }
         equals("inJDCS", measured.isJointlyDetected ? "TRUE" : "FALSE");
     }
@@ -133,7 +134,7 @@ void UtranShown::simFiles() {
 }
 
 void UtranShown::monitoredCell() {
-    const UtranCell& cell = _modem.serving();
+    const Cell& cell = _modem.serving();
     _section = "Serving Cell Info";
     equals("Local Area Code", cell.locationArea);
     equals("Cell ID", cell.identity);

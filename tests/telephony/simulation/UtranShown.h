@@ -1,6 +1,6 @@
 #pragma once
 
-#include "telephony/simulation/UTRAN/UtranModem.h"
+#include "telephony/simulation/UTRAN/Modem.h"
 #include "tests/telephony/simulation/Played.h"
 
 namespace kelvo::test {
@@ -9,12 +9,12 @@ namespace kelvo::test {
 /// failures. Knows the records that change the screens, by their log codes.
 class UtranShown {
 public:
-    UtranShown(Played& played, const simulation::UtranModem& modem) : _played(played), _modem(modem) {}
+    UtranShown(Played& played, const simulation::utran::Modem& modem) : _played(played), _modem(modem) {}
 
     void compare(std::uint32_t code);
 
 private:
-    void mode();
+    void rrcState();
     void servingCell();
     void cells();
     void channels();
@@ -29,7 +29,7 @@ private:
     void equals(const std::string& key, std::int64_t number) { equals(key, std::to_string(number)); }
 
     Played& _played;
-    const simulation::UtranModem& _modem;
+    const simulation::utran::Modem& _modem;
     std::string _section;
 };
 

@@ -1,4 +1,4 @@
-#include "telephony/simulation/UtranSimulation.h"
+#include "telephony/simulation/UTRAN/Simulation.h"
 
 #include <gtest/gtest.h>
 
@@ -9,13 +9,14 @@
 
 using namespace kelvo;
 using namespace kelvo::simulation;
+using namespace kelvo::simulation::utran;
 using namespace kelvo::test;
 using namespace std::chrono_literals;
 
 namespace {
 
 Bytes drive(std::uint64_t seed, Time until) {
-    UtranSimulation modem(seed);
+    utran::Simulation modem(seed);
     Bytes all;
     for (auto message = modem.next(); message.time < until; message = modem.next()) {
         all.insert(all.end(), message.bytes.begin(), message.bytes.end());
@@ -33,7 +34,7 @@ TEST(UtranSimulation, GivesTheSameBytesForTheSameSeed) {
 }
 
 TEST(UtranSimulation, ShowsTheWorldItPlays) {
-    UtranSimulation modem(1);
+    utran::Simulation modem(1);
     Played played(modem);
     UtranShown shown(played, modem.modem());
     do {
@@ -46,7 +47,7 @@ TEST(UtranSimulation, ShowsTheWorldItPlays) {
 }
 
 TEST(UtranSimulation, SendsEveryRecordThatTheApplicationAsksFor) {
-    UtranSimulation modem(3);
+    utran::Simulation modem(3);
     std::map<std::uint32_t, int> counts;
     std::set<std::uint32_t> codes;  // of the first four minutes
     for (auto message = modem.next(); message.time < 10min; message = modem.next()) {
@@ -68,7 +69,7 @@ TEST(UtranSimulation, SendsEveryRecordThatTheApplicationAsksFor) {
 }
 
 TEST(UtranSimulation, FillsEveryScreenWithinTwoSeconds) {
-    UtranSimulation modem(1);
+    utran::Simulation modem(1);
     Played played(modem);
     while (played.time() < 2s) played.next();
     for (const char* list : {"Neighbor Cell List", "TRCH BLER", "CCTRCH SIR", "PDP Context Info"}) {
@@ -81,7 +82,7 @@ TEST(UtranSimulation, FillsEveryScreenWithinTwoSeconds) {
 }
 
 TEST(UtranSimulation, HasALivelyFirstThreeMinutesInLittleSpace) {
-    UtranSimulation modem(1);
+    utran::Simulation modem(1);
     Played played(modem);
     std::set<std::string> seen;
     std::set<std::size_t> sizes;
@@ -108,7 +109,7 @@ TEST(UtranSimulation, HasALivelyFirstThreeMinutesInLittleSpace) {
 }
 
 TEST(UtranSimulation, GoesOnlyToCellsThatItHasShownBeforeAndThatCameCloser) {
-    UtranSimulation modem(2);
+    utran::Simulation modem(2);
     Played played(modem);
     struct Sighting {
         Time time;
@@ -144,8 +145,8 @@ TEST(UtranSimulation, GoesOnlyToCellsThatItHasShownBeforeAndThatCameCloser) {
 }
 
 TEST(UtranSimulation, MayOnlyCallForHelpUntilItIsRegistered) {
-    UtranSimulation modem(4);
-    const UtranModem& world = modem.modem();
+    utran::Simulation modem(4);
+    const Modem& world = modem.modem();
     Time since = 0s;
     int registrations = 0;
     int last = world.registeredArea();
@@ -154,40 +155,40 @@ TEST(UtranSimulation, MayOnlyCallForHelpUntilItIsRegistered) {
         ASSERT_LE(message.time - since, 3s);
         if (world.registeredArea() == last) continue;
         last = world.registeredArea();
-        EXPECT_TRUE(world.mode() == UtranMode::CellFach || world.mode() == UtranMode::CellDch);
+        EXPECT_TRUE(world.rrcState() == RrcState::CellFach || world.rrcState() == RrcState::CellDch);
         ++registrations;
     }
     EXPECT_GE(registrations, 4);
 }
 
 TEST(UtranSimulation, GoesThroughTheStatesOfAConnectionInTheirOrder) {
-    UtranSimulation modem(2);
-    using enum UtranMode;
-    const std::set<std::pair<UtranMode, UtranMode>> allowed = {
+    utran::Simulation modem(2);
+    using enum RrcState;
+    const std::set<std::pair<RrcState, RrcState>> allowed = {
         {Disconnected, Connecting}, {Connecting, CellDch}, {Connecting, CellFach}, {CellDch, CellFach},
         {CellDch, Disconnected},    {CellFach, CellDch},   {CellFach, CellPch},    {CellFach, Disconnected},
         {CellPch, UraPch},          {CellPch, CellFach},   {UraPch, Disconnected}, {UraPch, CellFach}};
-    UtranMode last = Connecting;
+    RrcState last = Connecting;
     int changes = 0;
     for (auto message = modem.next(); message.time < 10min; message = modem.next()) {
-        const UtranMode mode = modem.modem().mode();
-        EXPECT_EQ(modem.modem().transportChannels().empty() || mode == CellDch, true);
-        if (mode == last) continue;
-        EXPECT_TRUE(allowed.contains({last, mode})) << static_cast<int>(last) << " " << static_cast<int>(mode);
-        last = mode;
+        const RrcState state = modem.modem().rrcState();
+        EXPECT_EQ(modem.modem().transportChannels().empty() || state == CellDch, true);
+        if (state == last) continue;
+        EXPECT_TRUE(allowed.contains({last, state})) << static_cast<int>(last) << " " << static_cast<int>(state);
+        last = state;
         ++changes;
     }
     EXPECT_GE(changes, 60);
 }
 
 TEST(UtranSimulation, HasMoreBlockErrorsWhereInterferenceIsStronger) {
-    UtranSimulation modem(1);
+    utran::Simulation modem(1);
     double good = 0;
     double bad = 0;
     int goods = 0;
     int bads = 0;
     for (auto message = modem.next(); message.time < 10min; message = modem.next()) {
-        const UtranModem& world = modem.modem();
+        const Modem& world = modem.modem();
         if (!world.hasMeasured() || world.composites().empty() || world.composites()[0].timeslots != 3) continue;
         const double sir = *world.composites()[0].sir[5];
         (sir >= 9.5 ? good : bad) += world.transportChannels()[0].blockErrors;
@@ -200,20 +201,20 @@ TEST(UtranSimulation, HasMoreBlockErrorsWhereInterferenceIsStronger) {
 }
 
 TEST(UtranSimulation, KeepsTheLevelWhileThePhoneStands) {
-    UtranSimulation modem(1);
-    const UtranModem& world = modem.modem();
+    utran::Simulation modem(1);
+    const Modem& world = modem.modem();
     Time since = 0s;
     double driven = -1;
     double level = 0;
     int steady = 0;
     for (auto message = modem.next(); message.time < 10min; message = modem.next()) {
-        if (world.drive().driven() != driven || world.hasChangedCell()) {
+        if (modem.air().drive().driven() != driven || world.hasChangedCell()) {
             since = message.time;
-            driven = world.drive().driven();
-            level = world.drive().received(world.servingIndex());
+            driven = modem.air().drive().driven();
+            level = modem.air().drive().received(world.servingIndex());
             continue;
         }
-        EXPECT_EQ(world.drive().received(world.servingIndex()), level);
+        EXPECT_EQ(modem.air().drive().received(world.servingIndex()), level);
         if (message.time - since < 6s) continue;  // the filter still remembers the road
         EXPECT_NEAR(world.measurements()[0].rscp, level, 5);
         ++steady;

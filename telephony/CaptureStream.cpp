@@ -25,6 +25,7 @@ Result<std::unique_ptr<CaptureStream>> CaptureStream::open(const std::filesystem
 std::optional<CapturePacket> CaptureStream::next() {
     auto packet = readPacket();
     if (!packet && _loop && _packets > 0 && beginNextPass()) packet = readPacket();
+    _ended = !packet;
     if (packet) packet->time = place(packet->time);
     return packet;
 }
@@ -57,7 +58,8 @@ void CaptureStream::tell(const Failure& failure) {
     logLine(Level::Error, _failure);
 }
 
-std::string CaptureStream::ending() const {
+std::string CaptureStream::state() const {
+    if (!_ended) return _failure;  // of the pass before
     return _failure.empty() ? "the capture has ended" : "the capture has ended: " + _failure;
 }
 

@@ -19,7 +19,7 @@ public:
 
     Technology technology() const override { return _technology; }
     std::string description() const override { return "the capture " + _path.string(); }
-    std::string ending() const override;
+    std::string state() const override;
     std::optional<CapturePacket> next() override;
 
 private:
@@ -42,6 +42,7 @@ private:
     nanoseconds _played{0};  // of this pass
     std::size_t _packets = 0;
     bool _firstPass = true;
+    bool _ended = false;   // the last packet has been given
     std::string _failure;  // why no more could be read of it; empty: nothing went wrong
 };
 

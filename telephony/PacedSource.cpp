@@ -55,8 +55,7 @@ void PacedSource::pump() {
 // False when there is nothing more to come.
 bool PacedSource::readNext() {
     _next = _stream->next();
-    _ended = !_next;
-    if (_ended) return false;
+    if (!_next) return false;
     if (_last && _speed) _due += scaled(_next->time - *_last);
     _last = _next->time;
     return true;

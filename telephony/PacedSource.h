@@ -28,7 +28,7 @@ public:
 
     Technology technology() const override { return _stream->technology(); }
     std::string description() const override { return _stream->description(); }
-    std::string state() const override { return _ended ? _stream->ending() : std::string(); }
+    std::string state() const override { return _stream->state(); }
     void start(RecordSink& sink) override;
     void feed() override;
 
@@ -50,7 +50,6 @@ private:
     std::optional<CapturePacket> _next;  // read and not yet given
     std::optional<CaptureTime> _last;    // the time of the packet read last
     nanoseconds _due{0};                 // of _next, and before that of the packet before
-    bool _ended = false;                 // the stream gives no more
     int _refused = 0;                    // in a row
     bool _waiting = false;               // pump() is on the queue
     const Lifetime _lifetime;            // tasks on the queue outlive the source

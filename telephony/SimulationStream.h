@@ -14,7 +14,6 @@ public:
 
     Technology technology() const override { return _modem->technology(); }
     std::string description() const override;
-    std::string ending() const override { return {}; }  // it does not end
     std::optional<CapturePacket> next() override;
 
 private:

@@ -2,13 +2,13 @@
 
 #include <fmt/format.h>
 
-#include <ctime>
 #include <limits>
 #include <optional>
 #include <utility>
 
 #include "platform/encodings/PropertyList.h"
 #include "platform/host/Capture.h"
+#include "platform/system/DateText.h"
 #include "tools/CommandFailure.h"
 #include "tools/RawRecords.h"
 
@@ -18,15 +18,15 @@ namespace {
 
 constexpr std::chrono::seconds kRefresh{2};
 
-/// The date of an entry, "2011-03-04 09:15:02 +0100"; none when there is none, it reads otherwise or lies outside the
+/// The date of an entry; none when there is none, it reads otherwise or lies outside the
 /// 32 bits that a capture has for its seconds.
 std::optional<CaptureTime> timeOf(const SnapshotFile::Entry& entry) {
-    std::tm broken{};
-    if (!entry.date || strptime(entry.date->c_str(), "%Y-%m-%d %H:%M:%S %z", &broken) == nullptr) return std::nullopt;
-    const long eastOfUtc = broken.tm_gmtoff;
-    const std::time_t seconds = timegm(&broken) - eastOfUtc;
-    if (seconds < 0 || seconds > std::numeric_limits<std::uint32_t>::max()) return std::nullopt;
-    return CaptureTime(std::chrono::seconds(seconds));
+    const auto date = entry.date ? dateFromDescription(*entry.date) : std::nullopt;
+    if (!date) return std::nullopt;
+    const std::chrono::seconds since1970 = date->time_since_epoch();
+    constexpr std::chrono::seconds kLast(std::numeric_limits<std::uint32_t>::max());
+    if (since1970 < since1970.zero() || since1970 > kLast) return std::nullopt;
+    return CaptureTime(since1970);
 }
 
 /// The messages of one entry; what is odd about them goes to `odd`.

@@ -26,7 +26,7 @@ using Lines = std::vector<RecordingLog::Line>;
 /// A modem whose records the test makes up.
 class TestSource final : public RecordSource {
 public:
-    Technology technology() const override { return spoken; }
+    std::optional<Technology> technology() const override { return spoken; }
     std::string description() const override { return "a test"; }
     std::string state() const override { return condition; }
     void start(RecordSink& sink) override {

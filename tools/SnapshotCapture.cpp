@@ -55,26 +55,30 @@ std::vector<Bytes> messagesOf(const SnapshotFile::Entry& entry, bool asTree, con
 
 }  // namespace
 
-std::size_t writeSnapshotCapture(const SnapshotFile& snapshot, Technology technology, OutputFile file,
-                                 std::vector<std::string>& odd) {
-    std::optional<CaptureWriter> writer;
-    std::size_t total = 0;
+std::vector<SnapshotMessage> messagesOf(const SnapshotFile& snapshot, bool asTrees, std::vector<std::string>& odd) {
+    std::vector<SnapshotMessage> all;
     CaptureTime end{};
     for (std::size_t i = 0; i < snapshot.entries.size(); ++i) {
         const SnapshotFile::Entry& entry = snapshot.entries[i];
-        const auto messages = messagesOf(entry, !hasCodes(technology), fmt::format("entry {}", i + 1), odd);
+        auto messages = messagesOf(entry, asTrees, fmt::format("entry {}", i + 1), odd);
         end = std::max(end + kRefresh, timeOf(entry).value_or(CaptureTime()));
         for (std::size_t m = 0; m < messages.size(); ++m) {
-            if (!writer) writer.emplace(orFail(CaptureWriter::create(std::move(file), technology)));
             const std::chrono::nanoseconds before =
                 std::chrono::nanoseconds(kRefresh) * (messages.size() - m) / static_cast<long>(messages.size());
-            orFail(writer->append(end - before, messages[m]));
-            ++total;
+            all.push_back({end - before, std::move(messages[m])});
         }
     }
-    if (total == 0) throw CommandFailure("the snapshot holds no raw records");
-    orFail(writer->appear());
-    return total;
+    return all;
+}
+
+std::size_t writeSnapshotCapture(const SnapshotFile& snapshot, Technology technology, OutputFile file,
+                                 std::vector<std::string>& odd) {
+    const auto messages = messagesOf(snapshot, !hasCodes(technology), odd);
+    if (messages.empty()) throw CommandFailure("the snapshot holds no raw records");
+    CaptureWriter writer = orFail(CaptureWriter::create(std::move(file), technology));
+    for (const SnapshotMessage& message : messages) orFail(writer.append(message.time, message.bytes));
+    orFail(writer.appear());
+    return messages.size();
 }
 
 }  // namespace kelvo

@@ -2,34 +2,30 @@
 
 #include <fmt/format.h>
 
-#include <cerrno>
-#include <cstdio>
-#include <memory>
-#include <system_error>
+#include <span>
 
 #include "LogGenerator/SnapshotFormat.h"
 #include "platform/encodings/PropertyList.h"
+#include "telephony/recordings/RecordingFile.h"
 
 namespace kelvo {
 
 namespace {
 
 Result<Bytes> readFile(const std::string& name) {
-    const auto failure = [&name] {
-        return Failure{name + " cannot be read: " + std::generic_category().message(errno)};
-    };
-    const std::unique_ptr<std::FILE, int (*)(std::FILE*)> file(std::fopen(name.c_str(), "rb"), std::fclose);
-    if (!file) return failure();
+    auto file = RecordingFile::open(name);
+    if (!file) return file.error();
     Bytes bytes;
     constexpr std::size_t kChunk = 1 << 16;
     std::size_t count = kChunk;
     while (count == kChunk) {
         const std::size_t length = bytes.size();
         bytes.resize(length + kChunk);
-        count = std::fread(bytes.data() + length, 1, kChunk, file.get());
+        const auto got = file->read(std::span(bytes).subspan(length));
+        if (!got) return got.error();
+        count = *got;
         bytes.resize(length + count);
     }
-    if (std::ferror(file.get()) != 0) return failure();
     return bytes;
 }
 

@@ -10,13 +10,15 @@
 
 namespace kelvo::simulation::ifx {
 
-/// A GSM and UMTS modem.
+/// The modem: chooses its network and cell, registers, and connects as its user wants.
 class Modem {
 public:
-    Modem(const Network& network, Random random) : _network(network), _random(std::move(random)) {}
+    /// Both must outlive it.
+    Modem(const Network& network, const Air& air, Random random)
+        : _network(network), _air(air), _random(std::move(random)) {}
 
-    /// Reads the air and acts on it.
-    void measure(Time now, const Drive& drive, PhoneUser::Activity activity, double demand);
+    /// Acts on what was measured then.
+    void step(Time now, const PhoneUser& user);
 
     const Status& status() const { return _status; }
     /// Of the serving cell.
@@ -35,13 +37,13 @@ private:
     void readServing();
     void readGsmNeighbors(Time now);
     void readUmtsNeighbors();
-    void connect(PhoneUser::Activity activity, double demand);
+    void connect(const PhoneUser& user);
     void connectOnGsm(double demand);
     void connectOnUmts(double demand);
 
     const Network& _network;
+    const Air& _air;
     Random _random;
-    Air _air;
     Status _status;
     EachHeldFor _gsmReselection{std::chrono::seconds(5)};
     EachHeldFor _gsmHandover{std::chrono::seconds(1)};

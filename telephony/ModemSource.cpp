@@ -27,7 +27,7 @@ ModemSource::ModemSource(std::unique_ptr<ModemLines> lines, wire::Session::Optio
       _session(*this, std::move(now), options),
       _pause(kFirstPause) {}
 
-ModemSource::~ModemSource() { _lifetime.end(); }
+ModemSource::~ModemSource() = default;
 
 void ModemSource::findTechnology() {
     needAWhile();

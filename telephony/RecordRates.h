@@ -7,7 +7,7 @@
 #include <vector>
 
 #include "LogGenerator/Framing.h"
-#include "telephony/SteadyTime.h"
+#include "platform/system/SteadyTime.h"
 
 namespace kelvo {
 

@@ -6,7 +6,7 @@
 #include <optional>
 #include <string>
 
-#include "telephony/SteadyTime.h"
+#include "platform/system/SteadyTime.h"
 #include "telephony/wire/Answers.h"
 
 namespace kelvo::wire {

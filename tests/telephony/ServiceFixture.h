@@ -26,8 +26,9 @@ using Lines = std::vector<RecordingLog::Line>;
 /// A modem whose records the test makes up.
 class TestSource final : public RecordSource {
 public:
-    Technology technology() const override { return spoken; }
+    std::optional<Technology> technology() const override { return spoken; }
     std::string description() const override { return "a test"; }
+    std::string state() const override { return condition; }
     void start(RecordSink& sink) override {
         ++starts;
         _sink = &sink;
@@ -38,6 +39,7 @@ public:
     bool someoneIsHungry() const { return _sink->isHungry(); }
 
     Technology spoken = Technology::LTE;
+    std::string condition;
     int starts = 0;
     int feeds = 0;
 

@@ -37,6 +37,19 @@ TEST(StatusText, ListsCodesAndClients) {
               "  other: not streaming yet, 0 delivered, 0 waiting, 0 dropped\n");
 }
 
+TEST(StatusText, TellsTheSourcesState) {
+    const auto answer = Dictionary::make({{"Source", "the capture x.pcap"},
+                                          {"State", "the capture has ended"},
+                                          {"Technology", "GSM"},
+                                          {"Records", 3},
+                                          {"Codes", Array::make({})},
+                                          {"Clients", Array::make({})}});
+    EXPECT_EQ(statusText(answer)->find("Source      the capture x.pcap\n"
+                                       "State       the capture has ended\n"
+                                       "Technology  GSM\n"),
+              0U);
+}
+
 TEST(StatusText, RefusesWhatIsNoStatus) {
     EXPECT_FALSE(statusText(Value("text")));
     EXPECT_FALSE(statusText(Dictionary::make({{"Error", 1}, {"ErrorDomain", 1}})));

@@ -4,8 +4,8 @@
 #include <optional>
 #include <string>
 
+#include "platform/system/SteadyTime.h"
 #include "platform/values/Bytes.h"
-#include "telephony/SteadyTime.h"
 #include "telephony/wire/RecordConfiguration.h"
 
 namespace kelvo {

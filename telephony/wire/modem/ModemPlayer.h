@@ -6,7 +6,7 @@
 
 #include "platform/system/Lifetime.h"
 #include "platform/system/MainQueue.h"
-#include "telephony/SteadyTime.h"
+#include "platform/system/SteadyTime.h"
 #include "telephony/wire/modem/ModemPort.h"
 #include "telephony/wire/modem/PlayedModem.h"
 

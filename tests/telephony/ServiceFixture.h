@@ -33,13 +33,21 @@ public:
         _sink = &sink;
     }
     void feed() override { ++feeds; }
+    void findTechnology() override { ++searches; }
+    void clientsWant(const ClientsWishes& wanted) override { wishes.push_back(wanted); }
+    std::string trouble() const override { return itsTrouble; }
+    DictionaryRef portStatus() const override { return port; }
 
     bool give(ByteView record) { return _sink->take(record); }
     bool someoneIsHungry() const { return _sink->isHungry(); }
 
-    Technology spoken = Technology::LTE;
+    std::optional<Technology> spoken = Technology::LTE;
     int starts = 0;
     int feeds = 0;
+    int searches = 0;
+    std::vector<ClientsWishes> wishes;
+    std::string itsTrouble;
+    DictionaryRef port;
 
 private:
     RecordSink* _sink = nullptr;

@@ -22,14 +22,6 @@ const void* addressOf(const auto& owner) { return static_cast<const void*>(owner
 
 }  // namespace
 
-/// `work` as a callback that others may keep for as long as they like: it does nothing once the model has gone.
-template <class Work>
-auto KelvoModel::whileAlive(Work work) const {
-    return [alive = std::weak_ptr(_alive), work](auto&&... arguments) {
-        if (!alive.expired()) work(arguments...);
-    };
-}
-
 KelvoModel::KelvoModel(Services services) : _services(std::move(services)) {}
 
 KelvoModel::~KelvoModel() { destroyPorts(); }
@@ -51,12 +43,13 @@ bool KelvoModel::createPorts() {
     if (local.alreadyExisted) return failed(State::PortTaken, "Local messsage port already exists");
     if (!_recvPort) return failed(State::NoPort, "Could not create local message port");
     _recvPort->schedule();
-    _recvPort->setInvalidationCallback(whileAlive([this](LocalPort& port) { didInvalidate(port); }));
+    _recvPort->setInvalidationCallback(_lifetime.whileAlive([this](LocalPort& port) { didInvalidate(port); }));
     return openLogChannel();
 }
 
 bool KelvoModel::openLogChannel() {
-    auto server = _services.telephony.createServerConnection(whileAlive([this](std::string_view) { refresh(); }));
+    auto server =
+        _services.telephony.createServerConnection(_lifetime.whileAlive([this](std::string_view) { refresh(); }));
     if (!server) return failed(State::NoService, "Could not create PLServerConnection");
     const PLLogChannel channel = PLServerConnectionNetworkMonitorCreateLogChannel(*server, _services.portName);
     server.reset();
@@ -139,11 +132,11 @@ void KelvoModel::startMonitor() {
     if (_displayUpdateTimer) return;
     if (!startStreaming()) {
         destroyPorts();
-        _services.queue.postAfter(5s, whileAlive([this] { startMonitor(); }));
+        _services.queue.postAfter(5s, _lifetime.whileAlive([this] { startMonitor(); }));
         return tellConnection();
     }
     logLine(Level::Error, "Starting the display update timer");
-    _displayUpdateTimer = _services.queue.repeat(2s, whileAlive([this] { refresh(); }));
+    _displayUpdateTimer = _services.queue.repeat(2s, _lifetime.whileAlive([this] { refresh(); }));
     _receiving = false;
     _silentSince = _services.queue.now();
     tellConnection();
@@ -177,7 +170,7 @@ void KelvoModel::refresh() {
     _updated = false;
     _nodes.reset();
     _nodesByPath.clear();
-    _services.queue.post(whileAlive([this] { _services.updateViewControllerFromModel(); }));
+    _services.queue.post(_lifetime.whileAlive([this] { _services.updateViewControllerFromModel(); }));
 }
 
 void KelvoModel::refresh(const Value&) { refresh(); }
@@ -202,7 +195,8 @@ void KelvoModel::tellConnection() {
     Told told{.isConnected = now.isConnected(), .text = connectionText(now)};
     if (told == _told) return;
     _told = std::move(told);
-    if (_services.connectionChanged) _services.queue.post(whileAlive([this] { _services.connectionChanged(); }));
+    if (_services.connectionChanged)
+        _services.queue.post(_lifetime.whileAlive([this] { _services.connectionChanged(); }));
 }
 
 NodeRef KelvoModel::topLevelNodes() {

@@ -9,6 +9,7 @@
 #include "model/Connection.h"
 #include "model/KelvoModelNode.h"
 #include "platform/encodings/PropertyList.h"
+#include "platform/system/Lifetime.h"
 #include "platform/system/MainQueue.h"
 #include "platform/system/MessagePorts.h"
 #include "platform/telephony/Telephony.h"
@@ -87,8 +88,6 @@ private:
     void rebuildNodes();
     void didReceive(std::int32_t id, ByteView data);
     void didInvalidate(const LocalPort& port);
-    template <class Work>
-    auto whileAlive(Work work) const;
 
     const Services _services;
     const DictionaryRef _state = Dictionary::make();                 // outlives every restart and every generator
@@ -104,7 +103,7 @@ private:
     bool _receiving = false;                                      // a record has come since the monitor runs
     std::chrono::nanoseconds _silentSince{0};                     // when the last one came, or the monitor began to run
     Told _told;                                                   // what the screens know of the connection
-    const std::shared_ptr<bool> _alive = std::make_shared<bool>();  // its owners: tasks on the queue outlive the model
+    const Lifetime _lifetime;  // tasks on the queue, and what others call back, may come after the model
 };
 
 }  // namespace kelvo

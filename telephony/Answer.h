@@ -10,8 +10,8 @@
 namespace kelvo {
 
 /// A dictionary of the service's own making, as the bytes of a reply.
-inline Bytes encodeAnswer(const DictionaryRef& entries) {
-    auto encoded = writeXmlPropertyList(entries);
+inline Bytes encodeAnswer(const DictionaryRef& answer) {
+    auto encoded = writeXmlPropertyList(answer);
     return encoded ? std::move(encoded).value() : Bytes{};
 }
 inline Bytes encodeAnswer(std::initializer_list<std::pair<std::string_view, Value>> entries) {

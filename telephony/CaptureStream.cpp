@@ -25,6 +25,7 @@ Result<std::unique_ptr<CaptureStream>> CaptureStream::open(const std::filesystem
 std::optional<CapturePacket> CaptureStream::next() {
     auto packet = readPacket();
     if (!packet && _loop && _packets > 0 && beginNextPass()) packet = readPacket();
+    _ended = !packet;
     if (packet) packet->time = place(packet->time);
     return packet;
 }
@@ -32,14 +33,14 @@ std::optional<CapturePacket> CaptureStream::next() {
 std::optional<CapturePacket> CaptureStream::readPacket() {
     auto read = _reader.next();
     if (read) return *read;
-    if (!std::exchange(_toldFailure, true)) logLine(Level::Error, read.error().reason);
+    tell(read.error());
     return std::nullopt;
 }
 
 bool CaptureStream::beginNextPass() {
     auto reader = CaptureReader::open(_path);
     if (!reader) {
-        logLine(Level::Error, reader.error().reason);
+        tell(reader.error());
         return false;
     }
     _reader = std::move(reader).value();
@@ -48,6 +49,18 @@ bool CaptureStream::beginNextPass() {
     _played = 0ns;
     _firstPass = false;
     return true;
+}
+
+// Once, however often the capture is played.
+void CaptureStream::tell(const Failure& failure) {
+    if (failure.reason == _failure) return;
+    _failure = failure.reason;
+    logLine(Level::Error, _failure);
+}
+
+std::string CaptureStream::state() const {
+    if (!_ended) return _failure;  // of the pass before
+    return _failure.empty() ? "the capture has ended" : "the capture has ended: " + _failure;
 }
 
 CaptureTime CaptureStream::place(CaptureTime captured) {

@@ -22,16 +22,16 @@ Result<CodesRef> parseCodes(std::string_view key, const Value& value) {
     return CodesRef(std::move(codes));
 }
 
-std::optional<Failure> readCodes(const Dictionary::Entry& entry, CodesRef& into) {
+Result<void> readCodes(const Dictionary::Entry& entry, CodesRef& into) {
     const auto codes = parseCodes(entry.key, entry.value);
     if (!codes) return codes.error();
     into = *codes;
-    return std::nullopt;
+    return {};
 }
 
 bool isText(const Value& value, std::string_view text) { return value.string() != nullptr && *value.string() == text; }
 
-std::optional<Failure> readEntry(const Dictionary::Entry& entry, ChannelCommand& into) {
+Result<void> readEntry(const Dictionary::Entry& entry, ChannelCommand& into) {
     if (entry.key == kPLSetOskraLogCodes) return readCodes(entry, into.ordinaryCodes);
     if (entry.key == kPLSetPlExtraCodes) return readCodes(entry, into.extendedCodes);
     if (entry.key == kPLGetTechnology) {
@@ -43,7 +43,7 @@ std::optional<Failure> readEntry(const Dictionary::Entry& entry, ChannelCommand&
     } else {
         ++into.unknownKeys;
     }
-    return std::nullopt;
+    return {};
 }
 
 }  // namespace
@@ -54,7 +54,7 @@ Result<ChannelCommand> ChannelCommand::parse(ByteView message) {
     if (!read->dictionary()) return Failure{"it is no dictionary"};
     ChannelCommand command;
     for (const Dictionary::Entry& entry : *read->dictionary())
-        if (auto failure = readEntry(entry, command)) return *failure;
+        if (const auto taken = readEntry(entry, command); !taken) return taken.error();
     if (command.unknownKeys == read->dictionary()->size()) return Failure{"it asks for nothing known"};
     return command;
 }

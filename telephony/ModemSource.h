@@ -27,7 +27,7 @@ public:
     std::optional<Technology> technology() const override { return _session.technology(); }
     void findTechnology() override;
     std::string description() const override { return _lines->description(); }
-    std::string trouble() const override { return _trouble; }
+    std::string state() const override { return _trouble; }
     DictionaryRef portStatus() const override;
     void start(RecordSink& sink) override { _sink = &sink; }
     void clientsWant(const ClientsWishes& wishes) override;

@@ -30,11 +30,10 @@ void PacedSource::feed() {
 
 void PacedSource::pumpAfter(nanoseconds delay) {
     _waiting = true;
-    const auto run = [this, alive = _alive] {
-        if (!*alive) return;
+    const auto run = _lifetime.whileAlive([this] {
         _waiting = false;
         pump();
-    };
+    });
     if (delay > 0ns) {
         _queue.postAfter(delay, run);
     } else {

@@ -4,6 +4,7 @@
 #include <memory>
 #include <optional>
 
+#include "platform/system/Lifetime.h"
 #include "platform/system/MainQueue.h"
 #include "platform/system/SteadyTime.h"
 #include "telephony/RecordSource.h"
@@ -20,10 +21,10 @@ public:
 
     /// `queue` outlives the source.
     PacedSource(std::unique_ptr<RecordStream> stream, Speed speed, MainQueue& queue, SteadyTime now);
-    ~PacedSource() override { *_alive = false; }
 
     std::optional<Technology> technology() const override { return _stream->technology(); }
     std::string description() const override { return _stream->description(); }
+    std::string state() const override { return _stream->state(); }
     void start(RecordSink& sink) override;
     void feed() override;
 
@@ -41,12 +42,12 @@ private:
     MainQueue& _queue;
     const SteadyTime _now;
     RecordSink* _sink = nullptr;
-    std::optional<CapturePacket> _next;                           // read and not yet given
-    std::optional<CaptureTime> _last;                             // the time of the packet read last
-    nanoseconds _due{0};                                          // of _next, and before that of the packet before
-    int _refused = 0;                                             // in a row
-    bool _waiting = false;                                        // pump() is on the queue
-    std::shared_ptr<bool> _alive = std::make_shared<bool>(true);  // tasks on the queue outlive the source
+    std::optional<CapturePacket> _next;  // read and not yet given
+    std::optional<CaptureTime> _last;    // the time of the packet read last
+    nanoseconds _due{0};                 // of _next, and before that of the packet before
+    int _refused = 0;                    // in a row
+    bool _waiting = false;               // pump() is on the queue
+    const Lifetime _lifetime;            // tasks on the queue outlive the source
 };
 
 }  // namespace kelvo

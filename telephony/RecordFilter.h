@@ -10,7 +10,7 @@
 
 namespace kelvo {
 
-/// The log code of a record as the service words it; none when it is too short to hold one.
+/// The log code of a record as the service delivers it; none when it is too short to hold one.
 std::optional<LogCode> codeOf(ByteView record);
 
 /// Which records a client asked for. Nothing passes until it asked.

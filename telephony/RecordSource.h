@@ -16,7 +16,7 @@ class RecordSink {
 public:
     virtual ~RecordSink() = default;
 
-    /// Takes one record, exactly as the modem's log service words it; false when no client wants it. `record` is
+    /// Takes one record, exactly as clients get it; false when no client wants it. `record` is
     /// borrowed for the call. Never blocks.
     virtual bool take(ByteView record) = 0;
     /// True while some client has read all it was given: a source without a clock of its own goes on only then.
@@ -45,8 +45,9 @@ public:
     virtual void findTechnology() {}
     /// What it is, for people: "the capture drive.pcap".
     virtual std::string description() const = 0;
-    /// Why no records come, for people: "the modem has gone: it hung up"; empty while they come or may come.
-    virtual std::string trouble() const { return {}; }
+    /// What there is to say of it at the moment, for people: "the capture has ended", "the modem has gone: it hung up";
+    /// empty while records come or may come.
+    virtual std::string state() const { return {}; }
     /// What a modem's port has said, given and lost; none: this is no port.
     virtual DictionaryRef portStatus() const { return nullptr; }
 

@@ -73,12 +73,12 @@ Result<std::string> statusText(const Value& answer) {
     const ArrayRef& codes = status["Codes"].array();
     const ArrayRef& clients = status["Clients"].array();
     if (!codes || !clients) return Failure{"the answer is no status"};
-    const std::string* trouble = status["Trouble"].string();
+    const std::string state = status["State"] ? fmt::format("State       {}\n", textOf(status, "State")) : "";
     const DictionaryRef& port = status["Port"].dictionary();
     return fmt::format("Source      {}\n{}Technology  {}\nRecords     {}\n\n  {:<46}{:>11}{:>14}\n{}\nClients\n{}{}",
-                       textOf(status, "Source"), trouble != nullptr ? fmt::format("Trouble     {}\n", *trouble) : "",
-                       textOf(status, "Technology"), integerOf(status, "Records"), "Log code", "per second", "in all",
-                       linesOf(codes, codeLine), linesOf(clients, clientLine), port ? portStatusText(*port) : "");
+                       textOf(status, "Source"), state, textOf(status, "Technology"), integerOf(status, "Records"),
+                       "Log code", "per second", "in all", linesOf(codes, codeLine), linesOf(clients, clientLine),
+                       port ? portStatusText(*port) : "");
 }
 
 }  // namespace kelvo

@@ -48,7 +48,10 @@ TelephonyService::TelephonyService(MessagePorts& ports, RecordSource& source, Li
 Result<void> TelephonyService::open() {
     auto made = _ports.createLocal(kPLTelephonyServicePort,
                                    [this](std::int32_t id, ByteView message) { return handle(id, message); });
-    if (made.alreadyExisted) return Failure{"another telephony service is running"};
+    if (made.alreadyExisted) {
+        return Failure{"another telephony service is running" +
+                       (made.owner > 0 ? fmt::format(" (process {})", made.owner) : "")};
+    }
     if (!made.port) return Failure{fmt::format("cannot make the port {}", kPLTelephonyServicePort)};
     _controlPort = std::move(made.port);
     _controlPort->schedule();
@@ -78,7 +81,7 @@ Bytes TelephonyService::status() const {
                                           {"Records", static_cast<std::int64_t>(records)},
                                           {"Codes", codes},
                                           {"Clients", clients}});
-    if (auto trouble = _source.trouble(); !trouble.empty()) answer->set("Trouble", std::move(trouble));
+    if (auto state = _source.state(); !state.empty()) answer->set("State", std::move(state));
     if (auto port = _source.portStatus()) answer->set("Port", std::move(port));
     return encodeAnswer(answer);
 }

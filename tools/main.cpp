@@ -9,6 +9,8 @@
 #include "tools/CommandFailure.h"
 #include "tools/DecodeCommand.h"
 #include "tools/DisplayText.h"
+#include "tools/DoctorCommand.h"
+#include "tools/ImportCommand.h"
 #include "tools/SnapshotCommand.h"
 #include "tools/StartCommandCommand.h"
 #include "tools/WatchCommand.h"
@@ -43,7 +45,9 @@ int main(int argc, char** argv) {
     kelvo::addDecodeCommand(app);
     kelvo::addWatchCommand(app);
     kelvo::addSnapshotCommand(app);
+    kelvo::addImportCommand(app);
     kelvo::addStartCommandCommand(app);
+    kelvo::addDoctorCommand(app);
     try {
         app.parse(argc, argv);
         return 0;

@@ -9,7 +9,7 @@ namespace kelvo {
 
 KelvoApp::KelvoApp(Services services) : _services(std::move(services)) {}
 
-KelvoApp::~KelvoApp() { *_alive = false; }
+KelvoApp::~KelvoApp() = default;
 
 void KelvoApp::applicationDidFinishLaunching() {
     getSaveButtonPref();
@@ -29,9 +29,9 @@ void KelvoApp::applicationDidFinishLaunching() {
     _window->setRootScreen(*this);
     _navController->viewWillAppear();
     _window->makeKeyAndVisible();
-    _services.queue.post([this, alive = _alive] {
-        if (*alive && _model) _model->restartMonitor();
-    });
+    _services.queue.post(_lifetime.whileAlive([this] {
+        if (_model) _model->restartMonitor();
+    }));
 }
 
 void KelvoApp::getSaveButtonPref() {

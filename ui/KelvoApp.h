@@ -9,6 +9,7 @@
 #include <vector>
 
 #include "model/KelvoModel.h"
+#include "platform/system/Lifetime.h"
 #include "platform/system/Preferences.h"
 #include "ui/DateFormatter.h"
 #include "ui/KelvoSaveViewController.h"
@@ -104,8 +105,8 @@ private:
     QString _alertMessage;
     QString _alertButton;
     bool _terminated = false;
-    std::shared_ptr<bool> _alive = std::make_shared<bool>(true);  // tasks on the queue outlive the application
-    std::unique_ptr<Window> _window;                              // last, so that nothing it draws goes before it
+    std::unique_ptr<Window> _window;  // behind the rest, so that nothing it draws goes before it
+    const Lifetime _lifetime;         // tasks on the queue outlive the application
 };
 
 }  // namespace kelvo

@@ -1,6 +1,5 @@
 #include "ui/KelvoPaneController.h"
 
-#include <QPointer>
 #include <algorithm>
 #include <utility>
 
@@ -117,9 +116,9 @@ void KelvoPaneController::updateValues(const std::vector<Row>& rows) {
     }
     ++_reloads;
     if (!anyFresh) return;
-    _host.queue().postAfter(kFreshTime, [pane = QPointer(this), reload = _reloads] {
-        if (pane && pane->_reloads == reload) pane->letFreshRowsAge();
-    });
+    _host.queue().postAfter(kFreshTime, _lifetime.whileAlive([this, reload = _reloads] {
+        if (_reloads == reload) letFreshRowsAge();
+    }));
 }
 
 void KelvoPaneController::letFreshRowsAge() {

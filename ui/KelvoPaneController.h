@@ -9,6 +9,7 @@
 
 #include "model/Connection.h"
 #include "model/KelvoModelNode.h"
+#include "platform/system/Lifetime.h"
 
 namespace kelvo {
 
@@ -124,6 +125,7 @@ private:
     std::vector<Row> _rows;
     int _reloads = 0;
     std::vector<ToolbarItem> _toolbarItems;
+    const Lifetime _lifetime;  // tasks on the queue outlive the pane
 };
 
 }  // namespace kelvo

@@ -36,14 +36,16 @@ void KelvoSaveViewController::writeSnapshot() {
         const Result<Bytes> bytes = snapshot.propertyList();
         *written = bytes && writeFileInPlace(path, *bytes);
     };
-    const auto finish = [written, path, services = _services, alive = std::weak_ptr(_alive)] {
-        if (!*written) logLine(Level::Error, "Unable to write snapshot to %s", path);
-        if (alive.expired()) return;  // the program has ended over it
+    const auto leave = _lifetime.whileAlive([written, services = _services] {
         if (!*written) {
             services.host.showAlert(QStringLiteral("File Error"), QStringLiteral("Unable to write file to disk"),
                                     QStringLiteral("Close"));
         }
         close(services);
+    });
+    const auto finish = [written, path, leave] {
+        if (!*written) logLine(Level::Error, "Unable to write snapshot to %s", path);
+        leave();  // unless the program has ended meanwhile
     };
     _services.worker.run(write, finish);
 }
@@ -74,7 +76,7 @@ QVariant KelvoSaveViewController::data(const QModelIndex& index, int role) const
     if (!checkIndex(index, CheckIndexOption::IndexIsValid | CheckIndexOption::ParentIsInvalid)) return {};
     if (role != DescriptionRole) return {};
     const DictionaryRef& entry = (*_saveHistory)[static_cast<std::size_t>(index.row())].dictionary();
-    const std::string* text = entry ? (*entry)["Description"].string() : nullptr;
+    const std::string* text = entry ? (*entry)[snapshot::kDescription].string() : nullptr;
     return text != nullptr ? QString::fromStdString(*text) : QString();
 }
 

@@ -8,6 +8,7 @@
 #include <string>
 
 #include "platform/system/Clock.h"
+#include "platform/system/Lifetime.h"
 #include "platform/system/MainQueue.h"
 #include "platform/system/Worker.h"
 #include "platform/values/Value.h"
@@ -71,7 +72,7 @@ private:
     std::optional<std::string> _saveDescription = "";
     const Services _services;
     bool _saving = false;
-    const std::shared_ptr<bool> _alive = std::make_shared<bool>();  // the work may outlive the screen
+    const Lifetime _lifetime;  // the work may outlive the screen
 };
 
 }  // namespace kelvo

@@ -1,9 +1,10 @@
 #pragma once
 
-#include <array>
 #include <unordered_map>
 
 #include "LogGenerator/Base.h"
+#include "LogGenerator/GSMUMTS/GSMUMTSCodes.h"
+#include "LogGenerator/PhoneServices/PhoneCodes.h"
 
 namespace kelvo {
 
@@ -11,7 +12,7 @@ namespace kelvo {
 class NeighboringCells final : public Section<NeighboringCells> {
 public:
     static constexpr std::string_view kSectionName = "Neighboring Cells";
-    static constexpr std::array<LogCode, 3> kLogCodes = {0x5137, 0x51ff, 0xff0001};
+    static constexpr LogCode kLogCodes[] = {code::kGSMReselection, code::kGSMNeighborIdentities, code::kCellArray};
 
     using Section::Section;
     void updateWithData(ByteView data, LogCode logCode) override;

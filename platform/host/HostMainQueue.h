@@ -7,7 +7,7 @@
 namespace kelvo {
 
 /// The main queue on the event loop of a QCoreApplication. What is still waiting when the queue is destroyed never
-/// runs. Waits of a second and more may end up to 5 % early or late, so that the device wakes up for several at a time.
+/// runs. No wait ends early: it is rounded up to whole milliseconds, and one of more than 24 days ends after 24.
 class HostMainQueue final : public MainQueue {
 public:
     void post(Task task) override;

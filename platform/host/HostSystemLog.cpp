@@ -31,7 +31,7 @@ int severityFor(spdlog::level::level_enum level) {
     }
 }
 
-using OneThread = spdlog::details::null_mutex;  // the worker alone writes
+using OneThread = spdlog::details::null_mutex;  // the log's own thread alone writes
 
 class SyslogSink final : public spdlog::sinks::base_sink<OneThread> {
 public:

@@ -23,11 +23,8 @@ public:
         };
     }
 
-    /// Ends it before the object goes: for a destructor whose own work must not be answered.
-    void end() { _token.reset(); }
-
 private:
-    std::shared_ptr<const bool> _token = std::make_shared<const bool>(true);
+    const std::shared_ptr<const bool> _token = std::make_shared<const bool>(true);
 };
 
 }  // namespace kelvo

@@ -167,7 +167,7 @@ TEST_F(ModemSourceTest, TriesAgainAfterTenthOfASecondDoublingToOne) {
     lines->isThere = false;
     stream({0xB0C2});
     EXPECT_EQ(lines->tries, 1);
-    EXPECT_EQ(source->trouble(), "it cannot be opened: No such file or directory");
+    EXPECT_EQ(source->state(), "it cannot be opened: No such file or directory");
     for (const auto pause : {100ms, 200ms, 400ms, 800ms, 1000ms, 1000ms}) {
         const int before = lines->tries;
         queue.advance(pause - 1ms);
@@ -182,7 +182,7 @@ TEST_F(ModemSourceTest, TriesAgainAfterTenthOfASecondDoublingToOne) {
     const int before = lines->tries;
     queue.advance(100s);
     EXPECT_EQ(lines->tries, before);  // nobody is left who wants it
-    EXPECT_EQ(source->trouble(), "");
+    EXPECT_EQ(source->state(), "");
 }
 
 TEST_F(ModemSourceTest, TriesAtOnceWhenThePortMayHaveCome) {
@@ -208,13 +208,13 @@ TEST_F(ModemSourceTest, GoesOnByItselfWhenAModemThatHasGoneIsBack) {
     lines->line->listener.lineClosed("it hung up");
     queue.run();
     EXPECT_EQ(lines->alive, 0);
-    EXPECT_EQ(source->trouble(), "the modem has gone: it hung up");
+    EXPECT_EQ(source->state(), "the modem has gone: it hung up");
     queue.advance(100ms);
     EXPECT_TRUE(lines->lastAgain);
     lines->isThere = true;
     queue.advance(1s);
     answer();
-    EXPECT_EQ(source->trouble(), "");
+    EXPECT_EQ(source->state(), "");
     say(test::recordOf(0xB0C2, 8));
     EXPECT_EQ(taken, std::vector<Bytes>{test::packetOf(0xB0C2, 8)});
     EXPECT_EQ(texts().back(), "line: the modem is back");
@@ -238,7 +238,7 @@ TEST_F(ModemSourceTest, SaysOnceThatAPortIsNoDiagnosticOneAndGoesOnTrying) {
         lines->line->listener.lineOpened();
         queue.advance(3500ms);
     }
-    EXPECT_EQ(source->trouble(), "not a diagnostic port, or in use");
+    EXPECT_EQ(source->state(), "not a diagnostic port, or in use");
     EXPECT_EQ(texts(), std::vector<std::string>{"the modem at line: not a diagnostic port, or in use; trying again"});
     EXPECT_GE(lines->tries, 3);
     EXPECT_FALSE(lines->lastAgain);

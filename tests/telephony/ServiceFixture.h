@@ -28,6 +28,7 @@ class TestSource final : public RecordSource {
 public:
     std::optional<Technology> technology() const override { return spoken; }
     std::string description() const override { return "a test"; }
+    std::string state() const override { return condition; }
     void start(RecordSink& sink) override {
         ++starts;
         _sink = &sink;
@@ -35,18 +36,17 @@ public:
     void feed() override { ++feeds; }
     void findTechnology() override { ++searches; }
     void clientsWant(const ClientsWishes& wanted) override { wishes.push_back(wanted); }
-    std::string trouble() const override { return itsTrouble; }
     DictionaryRef portStatus() const override { return port; }
 
     bool give(ByteView record) { return _sink->take(record); }
     bool someoneIsHungry() const { return _sink->isHungry(); }
 
     std::optional<Technology> spoken = Technology::LTE;
+    std::string condition;
     int starts = 0;
     int feeds = 0;
     int searches = 0;
     std::vector<ClientsWishes> wishes;
-    std::string itsTrouble;
     DictionaryRef port;
 
 private:

@@ -37,18 +37,31 @@ TEST(StatusText, ListsCodesAndClients) {
               "  other: not streaming yet, 0 delivered, 0 waiting, 0 dropped\n");
 }
 
+TEST(StatusText, TellsTheSourcesState) {
+    const auto answer = Dictionary::make({{"Source", "the capture x.pcap"},
+                                          {"State", "the capture has ended"},
+                                          {"Technology", "GSM"},
+                                          {"Records", 3},
+                                          {"Codes", Array::make({})},
+                                          {"Clients", Array::make({})}});
+    EXPECT_EQ(statusText(answer)->find("Source      the capture x.pcap\n"
+                                       "State       the capture has ended\n"
+                                       "Technology  GSM\n"),
+              0U);
+}
+
 TEST(StatusText, RefusesWhatIsNoStatus) {
     EXPECT_FALSE(statusText(Value("text")));
     EXPECT_FALSE(statusText(Dictionary::make({{"Error", 1}, {"ErrorDomain", 1}})));
 }
 
-TEST(StatusText, ShowsTroubleAndPort) {
+TEST(StatusText, ShowsStateAndPort) {
     const auto status = Dictionary::make({{"Source", "the modem at /dev/ttyUSB2"},
                                           {"Technology", "LTE"},
                                           {"Records", 5},
                                           {"Codes", Array::make({})},
                                           {"Clients", Array::make({})},
-                                          {"Trouble", "the modem has gone: it hung up"},
+                                          {"State", "the modem has gone: it hung up"},
                                           {"Port", Dictionary::make({{"Name", ""},
                                                                      {"State", "closed"},
                                                                      {"Target", "T"},
@@ -59,7 +72,7 @@ TEST(StatusText, ShowsTroubleAndPort) {
                                                                      {"Waiting", 3}})}});
     EXPECT_EQ(*statusText(status),
               "Source      the modem at /dev/ttyUSB2\n"
-              "Trouble     the modem has gone: it hung up\n"
+              "State       the modem has gone: it hung up\n"
               "Technology  LTE\n"
               "Records     5\n"
               "\n"

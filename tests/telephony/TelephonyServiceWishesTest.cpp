@@ -86,12 +86,12 @@ TEST_F(TelephonyServiceTest, DeliversRecordsOfATechnologyThatIsNotKnownYet) {
     EXPECT_EQ((*status())["Technology"], Value("not known yet"));
 }
 
-TEST_F(TelephonyServiceTest, TellsTroubleAndPortOfItsSource) {
+TEST_F(TelephonyServiceTest, TellsStateAndPortOfItsSource) {
     start();
-    EXPECT_EQ(status()->find("Trouble"), nullptr);
+    EXPECT_EQ(status()->find("State"), nullptr);
     EXPECT_EQ(status()->find("Port"), nullptr);
-    _source.itsTrouble = "the modem has gone";
+    _source.condition = "the modem has gone";
     _source.port = Dictionary::make({{"BadChecksums", 3}});
-    EXPECT_EQ((*status())["Trouble"], Value("the modem has gone"));
+    EXPECT_EQ((*status())["State"], Value("the modem has gone"));
     EXPECT_EQ((*(*status())["Port"].dictionary())["BadChecksums"], Value(3));
 }

@@ -50,7 +50,7 @@ Rectangle {
         text: bar.pane.note
         visible: text !== ""
         color: Theme.secondaryText
-        font.pixelSize: 11
+        font.pixelSize: 12
         Accessible.ignored: !enabled
         Accessible.role: Accessible.StaticText
         Accessible.name: text

@@ -72,10 +72,14 @@ ParsedModemOptions parseModemOptions(int argc, const char* const* argv) {
         ->type_name("N")
         ->check(CLI::NonNegativeNumber)
         ->capture_default_str();
+    app.set_version_flag("--version", "kelvo-modem " KELVO_VERSION);
     try {
         app.parse(argc, argv);
     } catch (const CLI::CallForHelp&) {
         fmt::print("{}", app.help());
+        return {std::nullopt, 0};
+    } catch (const CLI::CallForVersion& version) {
+        fmt::print("{}\n", version.what());
         return {std::nullopt, 0};
     } catch (const CLI::ParseError& error) {
         fmt::print(stderr, "kelvo-modem: {}\n", error.what());

@@ -29,11 +29,11 @@ ModemPlayer::ModemPlayer(std::unique_ptr<PlayedModem> modem, std::unique_ptr<Mod
     _port->onRoom = [this] { pump(); };
 }
 
-std::optional<Failure> ModemPlayer::start() {
+Result<void> ModemPlayer::start() {
     _modem->plugIn(_now());
-    if (const auto failure = followPlug()) return failure;
+    if (const auto followed = followPlug(); !followed) return followed;
     pump();
-    return std::nullopt;
+    return {};
 }
 
 void ModemPlayer::togglePlug() {
@@ -45,24 +45,24 @@ void ModemPlayer::togglePlug() {
     pump();
 }
 
-std::optional<Failure> ModemPlayer::followPlug() {
+Result<void> ModemPlayer::followPlug() {
     const bool pluggedIn = _modem->isPluggedIn(_now());
-    if (pluggedIn == _portIsThere) return std::nullopt;
+    if (pluggedIn == _portIsThere) return {};
     if (!pluggedIn) {
         _port->unplug();
         logLine(Level::Notice, "Unplugged");
-    } else if (const auto failure = _port->plugIn()) {
-        return failure;
+    } else if (const auto made = _port->plugIn(); !made) {
+        return made;
     } else {
         _onPlace(_port->place());
     }
     _portIsThere = pluggedIn;
-    return std::nullopt;
+    return {};
 }
 
 void ModemPlayer::pump() {
-    if (const auto failure = followPlug()) {
-        logLine(Level::Error, failure->reason);
+    if (const auto followed = followPlug(); !followed) {
+        logLine(Level::Error, followed.error().reason);
         return pumpAt(_now() + 1s);
     }
     for (int i = 0; i < kPiecesPerTurn; ++i) {
@@ -78,11 +78,10 @@ void ModemPlayer::pump() {
 void ModemPlayer::pumpAt(nanoseconds time) {
     if (_nextPump && *_nextPump <= time) return;
     _nextPump = time;
-    const auto run = [this, time, alive = _alive] {
-        if (!*alive) return;
+    const auto run = _lifetime.whileAlive([this, time] {
         if (_nextPump == time) _nextPump.reset();
         pump();
-    };
+    });
     const nanoseconds now = _now();
     if (time > now) {
         _queue.postAfter(time - now, run);

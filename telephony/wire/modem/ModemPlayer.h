@@ -4,6 +4,7 @@
 #include <memory>
 #include <optional>
 
+#include "platform/system/Lifetime.h"
 #include "platform/system/MainQueue.h"
 #include "platform/system/SteadyTime.h"
 #include "telephony/wire/modem/ModemPort.h"
@@ -18,12 +19,9 @@ public:
     /// `queue` outlives the player. `onPlace` hears where the port is each time that it appears.
     ModemPlayer(std::unique_ptr<PlayedModem> modem, std::unique_ptr<ModemPort> port, MainQueue& queue, SteadyTime now,
                 std::function<void(const std::string& place)> onPlace);
-    ~ModemPlayer() { *_alive = false; }
-    ModemPlayer(const ModemPlayer&) = delete;
-    ModemPlayer& operator=(const ModemPlayer&) = delete;
 
     /// Plugs the modem in; the reason when its port cannot be made.
-    std::optional<Failure> start();
+    Result<void> start();
     /// Pulls the plug, or puts it back.
     void togglePlug();
 
@@ -32,7 +30,7 @@ public:
 private:
     using nanoseconds = std::chrono::nanoseconds;
 
-    std::optional<Failure> followPlug();
+    Result<void> followPlug();
     void pump();
     void pumpAt(nanoseconds time);
 
@@ -43,7 +41,7 @@ private:
     const std::function<void(const std::string&)> _onPlace;
     bool _portIsThere = false;
     std::optional<nanoseconds> _nextPump;
-    std::shared_ptr<bool> _alive = std::make_shared<bool>(true);  // tasks on the queue outlive the player
+    const Lifetime _lifetime;  // tasks on the queue outlive the player
 };
 
 }  // namespace kelvo::modem

@@ -2,7 +2,6 @@
 
 #include <cstddef>
 #include <functional>
-#include <optional>
 #include <string>
 
 #include "platform/values/Bytes.h"
@@ -20,7 +19,7 @@ public:
     std::function<void()> onRoom;  ///< after send() has not taken everything, or a reader has come
 
     /// Makes the port appear; the reason when it cannot.
-    virtual std::optional<Failure> plugIn() = 0;
+    virtual Result<void> plugIn() = 0;
     /// Makes it go: its reader sees the end.
     virtual void unplug() = 0;
     /// Where it is, as the service's --port takes it.

@@ -51,12 +51,12 @@ bool isStillClaimed(const std::string& path) {
 
 }  // namespace
 
-std::optional<Failure> PseudoTerminal::plugIn() {
+Result<void> PseudoTerminal::plugIn() {
     _master = openTerminal(_path);
     if (!_master) return Failure{"a pseudo-terminal cannot be made: " + lastError()};
-    if (const auto failure = makeLink()) {
+    if (const auto linked = makeLink(); !linked) {
         _master.reset();
-        return failure;
+        return linked;
     }
     _incoming = std::make_unique<FdWatcher>(_master.get(), FdWatcher::For::Reading, [this] { read(); });
     _room = std::make_unique<FdWatcher>(_master.get(), FdWatcher::For::Writing, [this] {
@@ -64,7 +64,7 @@ std::optional<Failure> PseudoTerminal::plugIn() {
         if (onRoom) onRoom();
     });
     waitForReader();
-    return std::nullopt;
+    return {};
 }
 
 void PseudoTerminal::unplug() {
@@ -78,13 +78,13 @@ void PseudoTerminal::unplug() {
     _master.reset();
 }
 
-std::optional<Failure> PseudoTerminal::makeLink() {
-    if (_link.empty()) return std::nullopt;
+Result<void> PseudoTerminal::makeLink() {
+    if (_link.empty()) return {};
     std::error_code error;
     const auto target = std::filesystem::read_symlink(_link, error);
     if (!error && target.string().starts_with(kTerminals)) std::filesystem::remove(_link, error);
     std::filesystem::create_symlink(_path, _link, error);
-    if (!error) return std::nullopt;
+    if (!error) return {};
     return Failure{error == std::errc::file_exists
                        ? fmt::format("{} is there and no link to a modem that is played", _link.string())
                        : fmt::format("the link {} cannot be made: {}", _link.string(), error.message())};
@@ -128,7 +128,7 @@ void PseudoTerminal::lookForReader() {
     if (isHungUp()) {
         if (!isStillClaimed(_path)) return;
         unplug();
-        if (const auto failure = plugIn()) return logLine(Level::Error, failure->reason);
+        if (const auto made = plugIn(); !made) return logLine(Level::Error, made.error().reason);
         return logLine(Level::Notice, "The reader was killed and left its claim: the modem is at %s now", _path);
     }
     _absent.reset();

@@ -18,13 +18,13 @@ public:
     PseudoTerminal(std::filesystem::path link, MainQueue& queue) : _link(std::move(link)), _queue(queue) {}
     ~PseudoTerminal() override { unplug(); }
 
-    std::optional<Failure> plugIn() override;
+    Result<void> plugIn() override;
     void unplug() override;
     std::string place() const override { return _link.empty() ? _path : _link.string(); }
     std::size_t send(ByteView bytes) override;
 
 private:
-    std::optional<Failure> makeLink();
+    Result<void> makeLink();
     bool isHungUp() const;
     void read();
     void waitForReader();

@@ -67,11 +67,11 @@ TcpPort::TcpPort(std::uint16_t port) : _port(port) {
     });
 }
 
-std::optional<Failure> TcpPort::plugIn() {
+Result<void> TcpPort::plugIn() {
     if (!_server.listen(QHostAddress::LocalHost, _port))
         return Failure{fmt::format("TCP port {} cannot be had: {}", _port, _server.errorString().toStdString())};
     _port = _server.serverPort();  // where it comes back
-    return std::nullopt;
+    return {};
 }
 
 std::string TcpPort::place() const { return fmt::format("tcp:127.0.0.1:{}", _port); }
@@ -87,7 +87,7 @@ UnixPort::UnixPort(std::filesystem::path path) : _path(std::move(path)) {
     });
 }
 
-std::optional<Failure> UnixPort::plugIn() {
+Result<void> UnixPort::plugIn() {
     const QString path = QString::fromStdString(_path.string());
     std::error_code error;
     if (std::filesystem::exists(std::filesystem::symlink_status(_path, error))) {  // which listen() would replace
@@ -100,7 +100,7 @@ std::optional<Failure> UnixPort::plugIn() {
     if (!_server.listen(path))
         return Failure{
             fmt::format("{} cannot be listened on: {}", _path.string(), _server.errorString().toStdString())};
-    return std::nullopt;
+    return {};
 }
 
 }  // namespace kelvo::modem

@@ -33,7 +33,7 @@ public:
     /// 0: a port that is free.
     explicit TcpPort(std::uint16_t port);
     ~TcpPort() override { unplug(); }
-    std::optional<Failure> plugIn() override;
+    Result<void> plugIn() override;
     std::string place() const override;
 
 private:
@@ -49,7 +49,7 @@ class UnixPort final : public SocketPort {
 public:
     explicit UnixPort(std::filesystem::path path);
     ~UnixPort() override { unplug(); }
-    std::optional<Failure> plugIn() override;
+    Result<void> plugIn() override;
     std::string place() const override { return "unix:" + _path.string(); }
 
 private:

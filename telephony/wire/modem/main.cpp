@@ -71,7 +71,7 @@ int play(const ModemOptions& options) {
         if (signal == SIGUSR1) return player.togglePlug();
         QCoreApplication::quit();
     });
-    if (const auto failure = player.start()) return fail(*failure);
+    if (const auto started = player.start(); !started) return fail(started.error());
     const int status = HostEventLoop::run(QCoreApplication::exec);
     fmt::print("{}", tallyText(player.tally()));
     return status;

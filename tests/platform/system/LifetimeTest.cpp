@@ -38,15 +38,6 @@ TEST(Lifetime, LetsNoCallThroughOnceTheOwnerHasGone) {
     EXPECT_TRUE(heard.empty());
 }
 
-TEST(Lifetime, MayEndBeforeItsOwner) {
-    std::vector<std::string> heard;
-    Owner owner{&heard};
-    const auto call = owner.callback();
-    owner.lifetime.end();
-    call(1, "a");
-    EXPECT_TRUE(heard.empty());
-}
-
 TEST(Lifetime, HandsOnWhatOnlyMoves) {
     const Lifetime lifetime;
     int got = 0;

@@ -8,8 +8,8 @@
 #include <vector>
 
 #include "LogGenerator/CodeDictionary.h"
-#include "LogGenerator/FieldTable.h"
 #include "LogGenerator/LogCode.h"
+#include "LogGenerator/ShowFields.h"
 #include "platform/values/Bytes.h"
 #include "platform/values/Value.h"
 
@@ -54,8 +54,18 @@ protected:
 
     /// Shows a record by its layout. False, and nothing changed, when the record is too short for it.
     template <std::size_t N>
-    bool show(ByteView data, const Layout<N>& layout) const {
+    bool show(ByteView data, const RecordLayout<N>& layout) const {
         return showLayout(data, layout.size, layout.fields);
+    }
+    /// Shows a record by the layout of its code; a code of none of them is reported.
+    template <std::size_t... N>
+    void showOneOf(ByteView data, LogCode logCode, const RecordLayout<N>&... layouts) const {
+        const bool known = ((logCode == layouts.code && (show(data, layouts), true)) || ...);
+        if (!known) reportUnknown(logCode);
+    }
+    /// Takes a key off the screen.
+    void hide(Key key) const {
+        if (values()) values()->remove(key);
     }
     /// Writes "Received an unknown log message: %d".
     static void reportUnknown(LogCode logCode);

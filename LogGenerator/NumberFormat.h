@@ -1,29 +1,47 @@
 #pragma once
 
 #include <cstddef>
+#include <cstdint>
+#include <string>
 #include <string_view>
 
 namespace kelvo {
 
-/// A printf format with one conversion, taken apart at compile time: "%d", "%+d", "%u", "%06x", "%4.2f" and so on, with
-/// text around it; a percent sign may follow the number directly.
+/// The unit of a shown number.
+struct Unit {
+    std::string_view symbol;   ///< for machines
+    std::string_view written;  ///< directly behind the number on a screen
+};
+
+// clang-format off
+inline constexpr Unit dBm      {"dBm",      " dBm"};
+inline constexpr Unit dB       {"dB",       " dB"};
+inline constexpr Unit kbps     {"kbps",     " kbps"};
+inline constexpr Unit percent  {"%",        "%"};
+inline constexpr Unit inSeconds{"s",        " sec"};
+inline constexpr Unit pnOffset {"64 chips", " × 64chips"};  ///< in steps of 64 chips, 3GPP2 C.S0024
+// clang-format on
+
+/// How a number is written: a printf format with one conversion, taken apart at compile time ("%d", "%+d", "%u",
+/// "%06x",
+/// "%4.2f" and so on, with text around it), and the unit behind the number.
 struct NumberFormat {
     std::string_view before;
     std::string_view after;
+    Unit unit{};
     char conversion = 0;  ///< 'd', 'u', 'x' or 'f'; 0 for a text without a number
     bool plus = false;    ///< the sign is always shown
     bool zeros = false;   ///< filled up to the width with zeros; hexadecimal only
     int width = 0;
     int precision = 6;
 
-    constexpr NumberFormat() = default;
-    constexpr NumberFormat(const char* format) {
+    constexpr NumberFormat(const char* format, Unit behind = {}) : unit(behind) {
         const std::string_view text(format);
-        const std::size_t percent = text.find('%');
-        before = text.substr(0, percent);
-        if (percent == std::string_view::npos) return;
+        const std::size_t percentSign = text.find('%');
+        before = text.substr(0, percentSign);
+        if (percentSign == std::string_view::npos) return;
         const auto isDigit = [&](std::size_t i) { return i < text.size() && text[i] >= '0' && text[i] <= '9'; };
-        std::size_t i = percent + 1;
+        std::size_t i = percentSign + 1;
         if (i < text.size() && text[i] == '+') plus = text[i++] == '+';
         if (i < text.size() && text[i] == '0') zeros = text[i++] == '0';
         for (; isDigit(i); ++i) width = width * 10 + (text[i] - '0');
@@ -38,10 +56,15 @@ struct NumberFormat {
         }
         if (zeros && conversion != 'x') throw "zeros before a sign are not printed here";
         after = text.substr(i + 1);
-        const bool isPercent = after.starts_with("%%");  // stands for one
-        if (isPercent) after.remove_prefix(1);
-        if (after.find('%', isPercent ? 1 : 0) != std::string_view::npos) throw "one conversion a format";
+        if (after.find('%') != std::string_view::npos) throw "one conversion a format";
     }
+
+    /// Makes `text` a whole number; 'u' and 'x' are for numbers that are not negative.
+    void print(std::string& text, std::int64_t number) const;
+    /// Makes `text` a real number; infinities and not-a-number as printf writes them.
+    void print(std::string& text, double number) const;
+    /// Makes `text` a real number that is given in eighths; with two decimals or more.
+    void printEighths(std::string& text, std::int64_t eighths) const;
 };
 
 }  // namespace kelvo

@@ -50,6 +50,8 @@ public:
         word = word >> raw.lowBit << unused;  // the number's bits alone, at the upper end
         return raw.isSigned ? std::int64_t{static_cast<std::int32_t>(word) >> unused} : std::int64_t{word >> unused};
     }
+    /// How many entries the record says that it has.
+    std::size_t count(std::size_t at, Raw raw) const { return static_cast<std::size_t>(read(at, raw)); }
 
 private:
     std::uint32_t wordAt(std::size_t at) const {

@@ -58,7 +58,7 @@ Family cdmaFamily() {
               interleave({frames, frames, frames, frames, frames, vary(kVariants, evdoStatus), vary(kVariants, fingers),
                           vary(kVariants, activeSetPilots), vary(kVariants, status1x), vary(kVariants, forwardRate),
                           vary(kVariants, reverseRate), vary(kVariants, identification)})},
-             {"0x119c with 3 pilots", vary(kVariants, status1x)}}};
+             {"1x status (0x119c, 3 pilots)", vary(kVariants, status1x)}}};
 }
 
 }  // namespace kelvo::bench

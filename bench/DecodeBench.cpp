@@ -97,9 +97,9 @@ int main(int argc, char** argv) {
     if (std::freopen("/dev/null", "w", stderr) == nullptr) return 1;
     const Family lte = bench::lteFamily();
     const Family gsm = bench::gsmFamily();
-    add("LTE and GSM/UMTS / 0xB0C1, 0xB0C2, 0xB179 and 0x7130 to 0x7135",
-        {{lte.technology, traffic(lte, "0xB0C1, 0xB0C2, 0xB179").messages},
-         {gsm.technology, traffic(gsm, "0x7130 to 0x7135").messages}});
+    add("LTE and GSM/UMTS / cells and registration (0xB0C1, 0xB0C2, 0xB179, 0x7130 to 0x7135)",
+        {{lte.technology, traffic(lte, "cells (0xB0C1, 0xB0C2, 0xB179)").messages},
+         {gsm.technology, traffic(gsm, "registration (0x7130 to 0x7135)").messages}});
     for (const Family& family : {lte, gsm, bench::cdmaFamily(), bench::utranFamily(), bench::ifxFamily()}) {
         for (const auto& [name, messages] : family.traffic) {
             add(family.name + " / " + name, {{family.technology, messages}});

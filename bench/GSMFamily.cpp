@@ -134,7 +134,9 @@ Family gsmFamily() {
     kinds.push_back(cells);
     return {"GSM/UMTS",
             kPLLogChannelTechnology_Oskra_GSM,
-            {{"mix", interleave(kinds)}, {"0x7130 to 0x7135", interleave(states)}, {"cell array of 7 cells", cells}}};
+            {{"mix", interleave(kinds)},
+             {"registration (0x7130 to 0x7135)", interleave(states)},
+             {"cell array of 7 cells", cells}}};
 }
 
 std::vector<Bytes> fullestGSMScreen() {

@@ -55,16 +55,17 @@ Bytes candidates(std::uint32_t i) {
 Family lteFamily() {
     const auto twoCells = vary(kVariants, [](std::uint32_t i) { return connectedMode(i, 2); });
     const auto idle = vary(kVariants, idleNeighbors);
-    return {
-        "LTE",
-        kPLLogChannelTechnology_Oskra_LTE,
-        {{"mix", interleave({vary(kVariants, antennas), vary(kVariants, servingCell),
-                             vary(kVariants, servingMeasurement), twoCells, idle, vary(kVariants, candidates)})},
-         {"0xB0C2 (8 values)", vary(kVariants, servingCell)},
-         {"0xB17F (18 values)", vary(kVariants, servingMeasurement)},
-         {"0xB179 with 4 cells", vary(kVariants, [](std::uint32_t i) { return connectedMode(i, 4); })},
-         {"0xB180 with 8 cells", idle},
-         {"0xB0C1, 0xB0C2, 0xB179", interleave({vary(kVariants, antennas), vary(kVariants, servingCell), twoCells})}}};
+    return {"LTE",
+            kPLLogChannelTechnology_Oskra_LTE,
+            {{"mix", interleave({vary(kVariants, antennas), vary(kVariants, servingCell),
+                                 vary(kVariants, servingMeasurement), twoCells, idle, vary(kVariants, candidates)})},
+             {"serving cell, identity (0xB0C2, 8 values)", vary(kVariants, servingCell)},
+             {"serving cell, idle (0xB17F, 18 values)", vary(kVariants, servingMeasurement)},
+             {"intra-frequency, connected (0xB179, 4 cells)",
+              vary(kVariants, [](std::uint32_t i) { return connectedMode(i, 4); })},
+             {"neighbor cells, idle (0xB180, 8 cells)", idle},
+             {"cells (0xB0C1, 0xB0C2, 0xB179)",
+              interleave({vary(kVariants, antennas), vary(kVariants, servingCell), twoCells})}}};
 }
 
 }  // namespace kelvo::bench

@@ -32,7 +32,7 @@ Family utranFamily() {
             kPLLogChannelTechnology_Oskra_UTRAN2,
             {{"mix",
               interleave({vary(kVariants, rrcState), vary(kVariants, servingCell), cells, vary(kVariants, channels)})},
-             {"0xD00A with 8 cells", cells}}};
+             {"neighbor cells (0xD00A, 8 cells)", cells}}};
 }
 
 }  // namespace kelvo::bench

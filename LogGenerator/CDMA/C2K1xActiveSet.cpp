@@ -8,7 +8,7 @@ namespace kelvo {
 
 namespace {
 
-constexpr NumberFormat kReferencePilotLevel = "(ref pilot) %+.2f dB";
+constexpr ShownReal kReferencePilotLevel("(ref pilot) %+.2f", dB);
 
 /// What the levels of one active set are measured against.
 struct Scale {
@@ -32,8 +32,8 @@ DictionaryRef C2K1xActiveSet(RecordView record, std::size_t base) {
     const Scale scale{.normaliser = static_cast<double>(record.read(base + 4, u16)),
                       .factor = static_cast<double>(record.read(base + 6, u8)),
                       .exponent = static_cast<int>(record.read(base + 7, u8))};
-    const auto count = static_cast<std::size_t>(record.read(base + 8, u8));
-    const auto extras = static_cast<std::size_t>(record.read(base + 9, u8));
+    const auto count = record.count(base + 8, u8);
+    const auto extras = record.count(base + 9, u8);
     const std::int64_t reference = record.read(base + 10, u16);
     const RecordEntries entries = RecordEntries(base + 12, strideOf(extras), count).within(record.size());
 

@@ -30,8 +30,8 @@ constexpr ValueTable kState({
     { 11, "Powerup state [11]"                  },
 }, "[Bad Value %d]");
 
-constexpr Shown kReceiveLevel = linear(0.334, -63.248, "%+.2f dBm");
-constexpr Shown kTransmitLevel = linear(0.1, 0.0, "%+.2f dBm");
+constexpr Shown kReceiveLevel = linear(0.334, -63.248, "%+.2f", dBm);
+constexpr Shown kTransmitLevel = linear(0.1, 0.0, "%+.2f", dBm);
 
 // Offsets count from the sub-packet.
 constexpr auto kSystemState = entry(5, {  // sub-packet 1

@@ -36,7 +36,7 @@ constexpr std::array<std::uint16_t, 12> kReverseBits = {  // of a packet, by rat
     128, 256, 512, 768, 1024, 1536, 2048, 3072, 4096, 6144, 8192, 12288,
 };
 
-constexpr NumberFormat kRate = "%.2f kbps";
+constexpr ShownReal kRate("%.2f", kbps);
 
 /// Where one link keeps its values.
 struct Link {

@@ -32,7 +32,7 @@ void decodeActiveSetPilots(ByteView packet, Dictionary&, const DictionaryRef& lo
         return;
     }
     const RecordView record(packet);
-    const RecordEntries entries(kActiveSet.start, kActiveSet.stride, static_cast<std::size_t>(record.read(15, u8)));
+    const RecordEntries entries(kActiveSet.start, kActiveSet.stride, record.count(15, u8));
     if (packet.size() < kActiveSet.start + kActiveSet.stride * entries.count()) {
         logLine(Level::Error, "Log code 0x12b6 is %u bytes long, but has %d substructs.", packet.size(),
                 entries.count());
@@ -53,7 +53,7 @@ void decodeFingerC2I(ByteView packet, Dictionary&, const DictionaryRef& lookup) 
         return;
     }
     const RecordView record(packet);
-    const RecordEntries entries(kFingers.start, kFingers.stride, static_cast<std::size_t>(record.read(22, u8)));
+    const RecordEntries entries(kFingers.start, kFingers.stride, record.count(22, u8));
     if (packet.size() != kFingers.start + kFingers.stride * entries.count()) {
         logLine(Level::Error, "Log code 0x108a has bad length of %u bytes, but has %d substructs (size=%lu).",
                 packet.size(), entries.count(), kFingers.start);

@@ -2,6 +2,7 @@
 
 #include "LogGenerator/CDMA/C2KBandClass.h"
 #include "LogGenerator/CDMA/C2KStoreDisplayValue.h"
+#include "LogGenerator/CDMA/CDMACodes.h"
 #include "platform/system/Environment.h"
 
 namespace kelvo {
@@ -30,21 +31,21 @@ constexpr ValueTable kSessionState({
     { 4, "Open [4]"             },
 }, "[Reserved %d]");
 
-constexpr Shown kLevel = whole(1, 0, "%+d dBm");
+constexpr Shown kLevel = whole(1, 0, dBm, "%+d");
 
-constexpr auto kReceiver = record(kSize, {
+constexpr auto kReceiver = record(code::kEVDOStatus, kSize, {
     // at             raw               lookup key            shown as
     { 13,             u16.bits( 0, 10), "kChannel",           decimal              },
     { kDeviceStateAt, u8,               "k1xEVDODeviceState", label(kDeviceState)  },
     { 14,             u8.bits(3, 7),    "kBandClass",         label(kC2KBandClass) },
     { 15,             i8,               "kRxAGC0",            kLevel               },
 });
-constexpr auto kWithAccess = record(kSize, {
+constexpr auto kWithAccess = record(code::kEVDOStatus, kSize, {
     { 16,             i8,               "kRxAGC1",            kLevel               },
     { 17,             i8,               "kTxAGC",             kLevel               },
 });
-constexpr auto kSession = record(kSize, {
-    { 18,             u16,              "kServingPNOffset",   whole(1, 0, "%d × 64chips").unless(65535, "Invalid Value") },
+constexpr auto kSession = record(code::kEVDOStatus, kSize, {
+    { 18,             u16,              "kServingPNOffset",   whole(1, 0, pnOffset).unless(65535, "Invalid Value") },
     { 37,             u8,               "kSessionState",      label(kSessionState) },
     { 38,             u32.bits( 0, 23), "kUATI24",            hexadecimal("0x%06x") },
     { 41,             u8,               "kColorCode",         decimal              },

@@ -9,6 +9,7 @@
 #include "LogGenerator/CDMA/C2KEVDOStatus.h"
 #include "LogGenerator/CDMA/C2KSystemIdentification.h"
 #include "LogGenerator/CDMA/C2KTrafficFER.h"
+#include "LogGenerator/CDMA/CDMACodes.h"
 #include "LogGenerator/Framing.h"
 #include "platform/system/Environment.h"
 #include "platform/telephony/LogChannelProtocol.h"
@@ -24,14 +25,14 @@ struct Decoder {
 
 // clang-format off
 constexpr std::array<Decoder, 8> kDecoders = {{  // in the order in which the service is asked for them
-    { 0x108a, decodeFingerC2I            },
-    { 0x1183, decodeEVDOStatus           },
-    { 0x1192, decodeForwardDataRate      },
-    { 0x12b6, decodeActiveSetPilots      },
-    { 0x119c, decode1xStatus             },
-    { 0x119d, decodeTrafficFER           },
-    { 0x127e, decodeReverseDataRate      },
-    { 0x134f, decodeSystemIdentification },
+    { code::kEVDOFingers,    decodeFingerC2I            },
+    { code::kEVDOStatus,     decodeEVDOStatus           },
+    { code::kEVDOForwardLink, decodeForwardDataRate      },
+    { code::kEVDOActiveSet,  decodeActiveSetPilots      },
+    { code::k1xStatus,       decode1xStatus             },
+    { code::k1xTrafficFrames, decodeTrafficFER           },
+    { code::kEVDOReverseLink, decodeReverseDataRate      },
+    { code::kCDMASystem,     decodeSystemIdentification },
 }};
 // clang-format on
 

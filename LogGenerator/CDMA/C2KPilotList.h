@@ -3,13 +3,13 @@
 #include <cstddef>
 #include <cstdint>
 
-#include "LogGenerator/NumberFormat.h"
+#include "LogGenerator/Shown.h"
 #include "platform/values/Dictionary.h"
 
 namespace kelvo {
 
 /// A pilot's level with its sign, as every list shows it.
-inline constexpr NumberFormat kC2KPilotLevel = "%+.2f dB";
+inline constexpr ShownReal kC2KPilotLevel("%+.2f", dB);
 
 /// A list of pilots as a screen of its own: a dictionary in key order whose keys are "position;PN", so that rows stand
 /// in the order of their position's digits and show the PN offset as their label.
@@ -18,9 +18,9 @@ public:
     /// An empty list with room for `pilots` rows.
     explicit C2KPilotList(std::size_t pilots);
 
-    /// Adds the pilot at `position` (from 0) of the record; `level` is in dB and may be infinite, `format` static data.
-    void add(std::size_t position, std::int64_t pn, double level, const NumberFormat& format = kC2KPilotLevel);
-    void add(std::size_t position, std::int64_t pn, double level, NumberFormat&& format) = delete;
+    /// Adds the pilot at `position` (from 0) of the record; `level` is in dB and may be infinite, `shown` static data.
+    void add(std::size_t position, std::int64_t pn, double level, const ShownReal& shown = kC2KPilotLevel);
+    void add(std::size_t position, std::int64_t pn, double level, const ShownReal&& shown) = delete;
     const DictionaryRef& rows() const { return _rows; }
     /// The rows, or the text "(none)" when there are none.
     Value rowsOrNone() const;

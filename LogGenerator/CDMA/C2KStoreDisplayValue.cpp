@@ -2,7 +2,11 @@
 
 namespace kelvo {
 
-void C2KStoreDisplayValue(Key lookupKey, const Value& value, const DictionaryRef& lookup) {
+namespace {
+
+/// Hands every place that is bound to `lookupKey` to `store`.
+template <class Store>
+void atEachPlace(Key lookupKey, const DictionaryRef& lookup, Store store) {
     static constexpr Key kDict("dict");
     static constexpr Key kKey("key");
     if (!lookup) return;
@@ -13,15 +17,20 @@ void C2KStoreDisplayValue(Key lookupKey, const Value& value, const DictionaryRef
         const DictionaryRef& display = (*binding.dictionary())[kDict].dictionary();
         const std::string* key = (*binding.dictionary())[kKey].string();
         if (!display || key == nullptr) return;
-        display->slot(*key) = value;
+        store(display->slot(*key));
     }
 }
 
+}  // namespace
+
+void C2KStoreDisplayValue(Key lookupKey, const Value& value, const DictionaryRef& lookup) {
+    atEachPlace(lookupKey, lookup, [&](Value& place) { place = value; });
+}
+
 void C2KStoreFields(RecordView record, std::size_t base, std::span<const Field> fields, const DictionaryRef& lookup) {
-    Value value;
     for (const Field& field : fields) {
-        showValue(value, record.read(base + field.at, field.raw), field.shown);
-        C2KStoreDisplayValue(field.key, value, lookup);
+        const std::int64_t raw = record.read(base + field.at, field.raw);
+        atEachPlace(field.key, lookup, [&](Value& place) { showValue(place, raw, field.shown); });
     }
 }
 

@@ -2,8 +2,8 @@
 
 #include <span>
 
-#include "LogGenerator/FieldTable.h"
 #include "LogGenerator/RecordView.h"
+#include "LogGenerator/ShowFields.h"
 #include "platform/values/Dictionary.h"
 
 /// The road from a decoder to the screens. A lookup maps lookup keys to arrays of bindings; a binding is a dictionary

@@ -1,6 +1,7 @@
 #include "LogGenerator/CDMA/C2KSystemIdentification.h"
 
 #include "LogGenerator/CDMA/C2KStoreDisplayValue.h"
+#include "LogGenerator/CDMA/CDMACodes.h"
 #include "platform/system/Environment.h"
 
 namespace kelvo {
@@ -28,20 +29,20 @@ constexpr ValueTable kRoamingIndicator({
     { 12, "Banner OFF [12]"                    },
 }, "ERI - %d");
 
-constexpr Shown kUnknownSystem{.how = Shown::How::Signed32, .format = "(unknown system type %d)"};
+constexpr Shown kUnknownSystem = Shown::Name{{}, "(unknown system type %d)"};
 
-constexpr auto kRoaming = record(kMinimum, {
+constexpr auto kRoaming = record(code::kCDMASystem, kMinimum, {
     {  42, i32, "k1xRoamingHome",    label(kRoamingIndicator) },
 });
-constexpr auto kIds = record(kMinimum, {
+constexpr auto kIds = record(code::kCDMASystem, kMinimum, {
     {  50, u16, "kSystemId",         decimal                  },
     {  52, u16, "kNetworkId",        decimal                  },
 });
-constexpr auto kNoIds = record(kMinimum, {
-    {  46, u32, "kSystemId",         kUnknownSystem           },
-    {  46, u32, "kNetworkId",        kUnknownSystem           },
+constexpr auto kNoIds = record(code::kCDMASystem, kMinimum, {
+    {  46, i32, "kSystemId",         kUnknownSystem           },
+    {  46, i32, "kNetworkId",        kUnknownSystem           },
 });
-constexpr auto kStation = record(kMinimum + 15, {  // intended: the base station lies past what a record must have
+constexpr auto kStation = record(code::kCDMASystem, kMinimum + 15, {  // intended: the base station lies past what a record must have
     { 131, u8,  "kPacketZoneId",     decimal                  },
     { 184, u16, "kBaseId",           decimal                  },
     { 133, u8,  "kProtocolRevision", decimal                  },

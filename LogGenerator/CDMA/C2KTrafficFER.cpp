@@ -12,8 +12,8 @@ namespace {
 constexpr std::size_t kMinimum = 17;
 constexpr Key kTrafficFER("TrafficFER");
 constexpr Key kShownKey("k1xTrafficFER");
-constexpr NumberFormat kRate = "%.02f%%";
-constexpr NumberFormat kOldRate = "%.02f%% (old)";
+constexpr ShownReal kRate("%.02f", percent);
+constexpr ShownReal kOldRate("%.02f (old)", percent);
 
 /// In single precision, as the filter has always run: one frame in 64 counts.
 float filtered(bool erased, const Number* previous) {
@@ -23,9 +23,9 @@ float filtered(bool erased, const Number* previous) {
 }
 
 /// The percentage is for the eye alone: it is multiplied in double precision, in which it is printed anyway.
-void show(const NumberFormat& format, double rate, const DictionaryRef& lookup) {
+void show(const ShownReal& quantity, double rate, const DictionaryRef& lookup) {
     Value shown;
-    showReal(shown, 100 * rate, format);
+    showReal(shown, 100 * rate, quantity);
     C2KStoreDisplayValue(kShownKey, shown, lookup);
 }
 

@@ -16,7 +16,7 @@ constexpr auto kCell = entry(kCellSize, {
 });
 // clang-format on
 constexpr Raw kSetType = u16.bits(13, 15);  // at 7 as well; 0 is the active set
-constexpr Shown kDecibel = whole(1, 0, "%d dB");
+constexpr Shown kDecibel = whole(1, 0, dB);
 constexpr Key kRSCP("RSCP");
 constexpr Key kEnergyPerChip("Energy Per Chip");
 
@@ -33,9 +33,9 @@ std::int64_t energyOf(RecordView record, std::size_t measurement) {
 
 void ActiveSet::updateWithData(ByteView data, LogCode logCode) {
     logLine(Level::Warning, "ActiveSet");
-    if (logCode != 0x417a) return reportUnknown(logCode);
+    if (logCode != code::kUMTSCellSets) return reportUnknown(logCode);
     if (data.size() < 16) return;
-    showActiveCells(data, static_cast<std::size_t>(RecordView(data).read(15, u8)));
+    showActiveCells(data, RecordView(data).count(15, u8));
 }
 
 void ActiveSet::showActiveCells(ByteView data, std::size_t count) const {

@@ -1,8 +1,7 @@
 #pragma once
 
-#include <array>
-
 #include "LogGenerator/Base.h"
+#include "LogGenerator/GSMUMTS/GSMUMTSCodes.h"
 
 namespace kelvo {
 
@@ -10,7 +9,7 @@ namespace kelvo {
 class ActiveSet final : public Section<ActiveSet> {
 public:
     static constexpr std::string_view kSectionName = "Active Set";
-    static constexpr std::array<LogCode, 1> kLogCodes = {0x417a};
+    static constexpr LogCode kLogCodes[] = {code::kUMTSCellSets};
 
     using Section::Section;
     void updateWithData(ByteView data, LogCode logCode) override;

@@ -8,7 +8,7 @@ namespace kelvo {
 namespace {
 
 // clang-format off
-constexpr auto kWindow = record(16, {
+constexpr auto kWindow = record(code::kUMTSTransportErrors, 16, {
     { 14, u16, "Window Size",           decimal  },
 });
 
@@ -23,9 +23,9 @@ constexpr auto kChannel = entry(9, {
 
 void BLER::updateWithData(ByteView data, LogCode logCode) {
     logLine(Level::Warning, "BLER");
-    if (logCode != 0x4116) return reportUnknown(logCode);
+    if (logCode != code::kUMTSTransportErrors) return reportUnknown(logCode);
     if (!show(data, kWindow) || !values()) return;
-    const auto count = static_cast<std::size_t>(RecordView(data).read(13, u8));
+    const auto count = RecordView(data).count(13, u8);
     showRows(ownArray(values()->slot("Transport Channels")), data, 16, count, kChannel);
 }
 

@@ -21,10 +21,10 @@ void showNetwork(Dictionary::Rewrite& network, RecordView record, std::size_t at
 
 void EquivalentPLMNList::updateWithData(ByteView data, LogCode logCode) {
     logLine(Level::Warning, "Equivalent PLMN List");
-    if (logCode != 0x7150) return reportUnknown(logCode);
+    if (logCode != code::kEquivalentPLMNs) return reportUnknown(logCode);
     if (data.size() < 17) return;
     const RecordView record(data);
-    const auto count = static_cast<std::size_t>(record.read(16, u8));
+    const auto count = record.count(16, u8);
     const RecordEntries entries = RecordEntries(17, 3, count).within(data.size());
     RowWriter rows(list());
     for (std::size_t i = 0; i < entries.count(); ++i) {

@@ -1,8 +1,7 @@
 #pragma once
 
-#include <array>
-
 #include "LogGenerator/Base.h"
+#include "LogGenerator/GSMUMTS/GSMUMTSCodes.h"
 
 namespace kelvo {
 
@@ -10,7 +9,7 @@ namespace kelvo {
 class EquivalentPLMNList final : public Section<EquivalentPLMNList> {
 public:
     static constexpr std::string_view kSectionName = "Equivalent PLMN List";
-    static constexpr std::array<LogCode, 1> kLogCodes = {0x7150};
+    static constexpr LogCode kLogCodes[] = {code::kEquivalentPLMNs};
 
     using Section::Section;
     void updateWithData(ByteView data, LogCode logCode) override;

@@ -1,5 +1,8 @@
 #include "LogGenerator/GSMUMTS/GPRSInformation.h"
 
+#include "LogGenerator/GSMUMTS/GPRSCellOptionsRecord.h"
+#include "LogGenerator/GSMUMTS/GSMReselectionRecord.h"
+#include "LogGenerator/GSMUMTS/ServingPLMNRecord.h"
 #include "platform/system/Environment.h"
 
 namespace kelvo {
@@ -32,46 +35,23 @@ constexpr ValueTable kAccessThresholds({
     { 255, "Not Available" },
 }, "Unknown");
 
-constexpr ValueTable kT3192({
-    { 0, "500 ms"  },
-    { 1, "1000 ms" },
-    { 2, "1500 ms" },
-    { 3, "0 ms"    },
-    { 4, "80 ms"   },
-    { 5, "120 ms"  },
-    { 6, "160 ms"  },
-    { 7, "200 ms"  },
-}, "?? ms");
-
 constexpr ValueTable kSI13Positions({
     {   0, "Located on BCCH"          },
     {   1, "Located on Extended BCCH" },
     { 255, "Not Available"            },
 }, "Unknown");
 
-constexpr ValueTable kOperatingModes({
-    { 0, "Class 1" },
-    { 1, "Class 2" },
-    { 2, "Class 3" },
-}, "Unknown");
-
-constexpr auto kControl = record(18, {  // 0x51f5
+constexpr auto kControl = record(code::kGPRSNetworkControl, 18, {
     { 15, u8, "Network Control Order",     label(kControlOrders)                  },
     { 13, u8, "PFC Supported",             label(kFlowContexts)                   },
     { 14, u8, "Priority Access Threshold", label(kAccessThresholds)               },
 });
 
-constexpr auto kCellOptions = record(24, {  // 0x51f6
-    { 15, u8, "T3192",                     label(kT3192)                          },
-    { 17, u8, "Access Burst Type",         flag("11-bit format", "8-bit format")  },
-    { 16, u8, "DRX Timer Max",             decimal                                },
-});
-
-constexpr auto kBroadcastChannel = record(34, {  // 0x51fb
+constexpr auto kBroadcastChannel = record(code::kGPRSBroadcastChannel, 34, {
     { 13, u8, "PBCCH Present",             decimal                                },
 });
 
-constexpr auto kSystemInformation = record(35, {  // 0x51fd
+constexpr auto kSystemInformation = record(code::kGPRSSystemInformation, 35, {
     { 16, u8, "Ext Measurement Order",     decimal                                },
     { 13, u8, "Packet PSI Status",         decimal                                },
     { 33, u8, "Packet SI Status",          flag("Supported", "Not Supported")     },
@@ -79,16 +59,8 @@ constexpr auto kSystemInformation = record(35, {  // 0x51fd
     { 15, u8, "Count HR",                  decimal                                },
 });
 
-constexpr auto kSI13 = record(15, {  // 0x51f4
+constexpr auto kSI13 = record(code::kGPRSSI13Position, 15, {
     { 14, u8, "SI13 Position",             label(kSI13Positions)                  },
-});
-
-constexpr auto kMeasurement = record(29, {  // 0x5137
-    { 26, u8, "Cell Reselect Hysteresis",  flag("Applied", "Not Applied")         },
-});
-
-constexpr auto kNetwork = record(32, {  // 0x7135
-    { 13, u8, "Network Operating Mode",    label(kOperatingModes)                 },
 });
 // clang-format on
 
@@ -96,16 +68,8 @@ constexpr auto kNetwork = record(32, {  // 0x7135
 
 void GPRSInformation::updateWithData(ByteView data, LogCode logCode) {
     logLine(Level::Warning, "GPRSInformation");
-    switch (logCode) {
-        case 0x51f5: show(data, kControl); break;
-        case 0x51f6: show(data, kCellOptions); break;
-        case 0x51fb: show(data, kBroadcastChannel); break;
-        case 0x51fd: show(data, kSystemInformation); break;
-        case 0x51f4: show(data, kSI13); break;
-        case 0x5137: show(data, kMeasurement); break;
-        case 0x7135: show(data, kNetwork); break;
-        default: reportUnknown(logCode);
-    }
+    showOneOf(data, logCode, kControl, GPRSCellOptionsRecord::kOptions, kBroadcastChannel, kSystemInformation, kSI13,
+              GSMReselectionRecord::kHysteresis, ServingPLMNRecord::kOperatingMode);
 }
 
 }  // namespace kelvo

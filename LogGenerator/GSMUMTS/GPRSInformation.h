@@ -1,8 +1,7 @@
 #pragma once
 
-#include <array>
-
 #include "LogGenerator/Base.h"
+#include "LogGenerator/GSMUMTS/GSMUMTSCodes.h"
 
 namespace kelvo {
 
@@ -10,7 +9,9 @@ namespace kelvo {
 class GPRSInformation final : public Section<GPRSInformation> {
 public:
     static constexpr std::string_view kSectionName = "GPRS Information";
-    static constexpr std::array<LogCode, 7> kLogCodes = {0x51f5, 0x7135, 0x51f6, 0x51fb, 0x51fd, 0x51f4, 0x5137};
+    static constexpr LogCode kLogCodes[] = {
+        code::kGPRSNetworkControl,    code::kServingPLMN,      code::kGPRSCellOptions, code::kGPRSBroadcastChannel,
+        code::kGPRSSystemInformation, code::kGPRSSI13Position, code::kGSMReselection};
 
     using Section::Section;
     void updateWithData(ByteView data, LogCode logCode) override;

@@ -1,5 +1,7 @@
 #include "LogGenerator/GSMUMTS/GSMRRInfo.h"
 
+#include "LogGenerator/GSMUMTS/GPRSCellOptionsRecord.h"
+#include "LogGenerator/GSMUMTS/GSMReselectionRecord.h"
 #include "platform/system/Environment.h"
 
 namespace kelvo {
@@ -32,25 +34,15 @@ constexpr ValueTable kStates({  // the blanks within 13, 19 and 21 are meant to 
     { 21, "RR_W2G_INTERRAT_CC_ORDER_ PROGRESS"   },
 }, "Unknown");
 
-constexpr auto kState = record(17, {  // 0x512c
-    { 13, u8,  "RR State",         label(kStates)          },
-    { 14, u8,  "RR Sub State",     decimal                 },
-    { 15, u8,  "RR Status",        decimal                 },
-    { 16, u8,  "RR Mode",          flag("Data", "Voice")   },
+constexpr auto kState = record(code::kGSMRRState, 17, {
+    { 13, u8,  "RR State",         label(kStates)        },
+    { 14, u8,  "RR Sub State",     decimal               },
+    { 15, u8,  "RR Status",        decimal               },
+    { 16, u8,  "RR Mode",          flag("Data", "Voice") },
 });
 
-constexpr auto kMeasurement = record(29, {  // 0x5137; GSM Serving Cell shows the same bytes in its own way
-    { 15, u8,  "Serving Rx Level", decimal                 },
-    { 16, u32, "Rx Quality Full",  asSigned                },
-    { 20, u32, "Rx Quality Sub",   asSigned                },
-});
-
-constexpr auto kDTX = record(20, {  // 0x5072
-    { 19, u8,  "DTX Used",         flag("ON", "OFF")       },
-});
-
-constexpr auto kDRX = record(24, {  // 0x51f6
-    { 16, u8,  "DRX Used",         whole(1, 0, "%d sec")   },
+constexpr auto kDTX = record(code::kGSMDTX, 20, {
+    { 19, u8,  "DTX Used",         flag("ON", "OFF") },
 });
 // clang-format on
 
@@ -58,13 +50,7 @@ constexpr auto kDRX = record(24, {  // 0x51f6
 
 void GSMRRInfo::updateWithData(ByteView data, LogCode logCode) {
     logLine(Level::Warning, "GSMRRInfo");
-    switch (logCode) {
-        case 0x512c: show(data, kState); break;
-        case 0x5137: show(data, kMeasurement); break;
-        case 0x5072: show(data, kDTX); break;
-        case 0x51f6: show(data, kDRX); break;
-        default: reportUnknown(logCode);
-    }
+    showOneOf(data, logCode, kState, GSMReselectionRecord::kQuality, kDTX, GPRSCellOptionsRecord::kDRX);
 }
 
 }  // namespace kelvo

@@ -1,8 +1,7 @@
 #pragma once
 
-#include <array>
-
 #include "LogGenerator/Base.h"
+#include "LogGenerator/GSMUMTS/GSMUMTSCodes.h"
 
 namespace kelvo {
 
@@ -10,7 +9,8 @@ namespace kelvo {
 class GSMRRInfo final : public Section<GSMRRInfo> {
 public:
     static constexpr std::string_view kSectionName = "GSM RR Info";
-    static constexpr std::array<LogCode, 4> kLogCodes = {0x512c, 0x5137, 0x5072, 0x51f6};
+    static constexpr LogCode kLogCodes[] = {code::kGSMRRState, code::kGSMReselection, code::kGSMDTX,
+                                            code::kGPRSCellOptions};
 
     using Section::Section;
     void updateWithData(ByteView data, LogCode logCode) override;

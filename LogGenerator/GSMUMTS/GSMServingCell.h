@@ -1,8 +1,8 @@
 #pragma once
 
-#include <array>
-
 #include "LogGenerator/Base.h"
+#include "LogGenerator/GSMUMTS/GSMUMTSCodes.h"
+#include "LogGenerator/PhoneServices/PhoneCodes.h"
 
 namespace kelvo {
 
@@ -10,7 +10,8 @@ namespace kelvo {
 class GSMServingCell final : public Section<GSMServingCell> {
 public:
     static constexpr std::string_view kSectionName = "GSM Serving Cell";
-    static constexpr std::array<LogCode, 4> kLogCodes = {0x5134, 0x5137, 0x5076, 0xff0001};
+    static constexpr LogCode kLogCodes[] = {code::kGSMServingCell, code::kGSMReselection, code::kGSMDedicatedChannel,
+                                            code::kCellArray};
 
     using Section::Section;
     void updateWithData(ByteView data, LogCode logCode) override;

@@ -1,8 +1,7 @@
 #pragma once
 
-#include <array>
-
 #include "LogGenerator/Base.h"
+#include "LogGenerator/GSMUMTS/GSMUMTSCodes.h"
 
 namespace kelvo {
 
@@ -10,7 +9,7 @@ namespace kelvo {
 class GSMSet final : public Section<GSMSet> {
 public:
     static constexpr std::string_view kSectionName = "GSM Set";
-    static constexpr std::array<LogCode, 1> kLogCodes = {0x4005};
+    static constexpr LogCode kLogCodes[] = {code::kNeighborRanking};
 
     using Section::Section;
     void updateWithData(ByteView data, LogCode logCode) override;

@@ -14,7 +14,7 @@ constexpr ValueTable kCarriers({
     { 3, "Reserved"       },
 }, "Unknown");
 
-constexpr auto kDownlink = record(18, {
+constexpr auto kDownlink = record(code::kHSDPA, 18, {
     { 13, u8,               "Version",      asUnsigned       },
     { 14, u16.bits( 0,  9), "Sub Frames",   asUnsigned       },
     { 14, u16.bits(10, 11), "Carrier Info", label(kCarriers) },
@@ -32,10 +32,10 @@ constexpr auto kProcess = entry(9, {
 
 void HSDPAInformation::updateWithData(ByteView data, LogCode logCode) {
     logLine(Level::Warning, "HSDPA Info");
-    if (logCode != 0x4221 || !show(data, kDownlink)) return;
+    if (logCode != code::kHSDPA || !show(data, kDownlink)) return;
     const RecordView record(data);
-    const auto primary = static_cast<std::size_t>(record.read(16, u8));
-    const auto secondary = static_cast<std::size_t>(record.read(17, u8));
+    const auto primary = record.count(16, u8);
+    const auto secondary = record.count(17, u8);
     showProcesses("Primary HARQ Process", data, 18, primary);
     showProcesses("Secondary HARQ Process", data, 18 + 162 * primary, secondary);  // intended: a gap lies before them
 }

@@ -8,7 +8,7 @@ namespace kelvo {
 namespace {
 
 // clang-format off
-constexpr auto kSequence = record(15, {
+constexpr auto kSequence = record(code::kMobileAllocation, 15, {
     { 13, u8, "HSN", decimal },
 });
 // clang-format on
@@ -17,10 +17,10 @@ constexpr auto kSequence = record(15, {
 
 void MobileAllocation::updateWithData(ByteView data, LogCode logCode) {
     logLine(Level::Warning, "MobileAllocation");
-    if (logCode != 0x51f8) return reportUnknown(logCode);
+    if (logCode != code::kMobileAllocation) return reportUnknown(logCode);
     if (!show(data, kSequence) || !values()) return;
     const RecordView record(data);
-    const RecordEntries entries(15, 2, static_cast<std::size_t>(record.read(14, u8)));
+    const RecordEntries entries(15, 2, record.count(14, u8));
     showValues(ownArray(values()->slot("ARFCNs")), record, entries.within(data.size()), u16, decimal);
 }
 

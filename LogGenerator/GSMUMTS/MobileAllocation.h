@@ -1,8 +1,7 @@
 #pragma once
 
-#include <array>
-
 #include "LogGenerator/Base.h"
+#include "LogGenerator/GSMUMTS/GSMUMTSCodes.h"
 
 namespace kelvo {
 
@@ -10,7 +9,7 @@ namespace kelvo {
 class MobileAllocation final : public Section<MobileAllocation> {
 public:
     static constexpr std::string_view kSectionName = "Mobile Allocation";
-    static constexpr std::array<LogCode, 1> kLogCodes = {0x51f8};
+    static constexpr LogCode kLogCodes[] = {code::kMobileAllocation};
 
     using Section::Section;
     void updateWithData(ByteView data, LogCode logCode) override;

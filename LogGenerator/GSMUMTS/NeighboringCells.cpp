@@ -1,5 +1,6 @@
 #include "LogGenerator/GSMUMTS/NeighboringCells.h"
 
+#include "LogGenerator/GSMUMTS/GSMReselectionRecord.h"
 #include "LogGenerator/PhoneServices/CellInfo.h"
 #include "LogGenerator/RowWriter.h"
 #include "platform/system/Environment.h"
@@ -10,15 +11,9 @@ namespace kelvo {
 namespace {
 
 // clang-format off
-constexpr auto kCell = entry(14, {  // 0x5137
-    { 0, u16, "ARFCN",    decimal  },
-    { 2, u8,  "RSSI",     decimal  },
-    { 3, u32, "C1 Value", asSigned },
-});
-
 constexpr CellField kNeighbor[] = {  // 32767 is no value
-    { kPLCellMonitorARFCN, "ARFCN", "NeighboringCells: Failed to retrieve ARFCN\n"                                          },
-    { kPLCellMonitorRSSI,  "RSSI",  "NeighboringCells: Failed to retrieve RSSI\n", whole(2, 0, "%d dBm").unless(32767, "") },
+    { kPLCellMonitorARFCN, "ARFCN", "NeighboringCells: Failed to retrieve ARFCN\n"                                    },
+    { kPLCellMonitorRSSI,  "RSSI",  "NeighboringCells: Failed to retrieve RSSI\n", whole(2, 0, dBm).unless(32767, "") },
 };
 // clang-format on
 
@@ -27,9 +22,9 @@ constexpr CellField kNeighbor[] = {  // 32767 is no value
 void NeighboringCells::updateWithData(ByteView data, LogCode logCode) {
     logLine(Level::Warning, "NeighboringCells");
     switch (logCode) {
-        case 0x5137: showMeasurements(data); break;
-        case 0x51ff: keepIdentities(data); break;
-        case 0xff0001: showCellArray(data); break;
+        case code::kGSMReselection: showMeasurements(data); break;
+        case code::kGSMNeighborIdentities: keepIdentities(data); break;
+        case code::kCellArray: showCellArray(data); break;
         default: reportUnknown(logCode);
     }
 }
@@ -38,8 +33,7 @@ void NeighboringCells::keepIdentities(ByteView data) {
     if (data.size() < 15) return;
     arfcnToBsic.clear();
     const RecordView record(data);
-    const auto count = static_cast<std::size_t>(record.read(14, u8));
-    const RecordEntries entries = RecordEntries(15, 4, count).within(data.size());
+    const RecordEntries entries = RecordEntries(15, 4, record.count(14, u8)).within(data.size());
     for (std::size_t i = 0; i < entries.count(); ++i) {
         const std::size_t at = entries.offsetOf(i);
         arfcnToBsic[record.read(at, u16)] = record.read(at + 2, u8);
@@ -47,14 +41,13 @@ void NeighboringCells::keepIdentities(ByteView data) {
 }
 
 void NeighboringCells::showMeasurements(ByteView data) {
-    if (data.size() < 29) return;
+    if (data.size() < GSMReselectionRecord::kMinimum) return;
     const RecordView record(data);
-    const auto count = static_cast<std::size_t>(record.read(28, u8));
-    const RecordEntries entries = RecordEntries(29, kCell.size, count).within(data.size());
+    const RecordEntries entries = GSMReselectionRecord::neighbors(record).within(data.size());
     RowWriter rows(list());
     for (std::size_t i = 0; i < entries.count(); ++i) {
         Dictionary::Rewrite cell = rows.next();
-        showFields(cell, record, entries.offsetOf(i), kCell.fields);
+        showFields(cell, record, entries.offsetOf(i), GSMReselectionRecord::kNeighbor.fields);
         const auto bsic = arfcnToBsic.find(record.read(entries.offsetOf(i), u16));
         if (bsic != arfcnToBsic.end()) showValue(cell.next("BSIC"), bsic->second, decimal);
     }

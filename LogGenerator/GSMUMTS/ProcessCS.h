@@ -1,7 +1,7 @@
 #pragma once
 
-#include <array>
-
+#include "LogGenerator/GSMUMTS/GSMUMTSCodes.h"
+#include "LogGenerator/GSMUMTS/MMStateRecord.h"
 #include "LogGenerator/GSMUMTS/ProcessSection.h"
 
 namespace kelvo {
@@ -11,12 +11,10 @@ class ProcessCS final : public ProcessSection<ProcessCS> {
 public:
     static constexpr std::string_view kSectionName = "Process CS";
     static constexpr std::string_view kTraceWord = "ProcessCS";
-    static constexpr std::array<LogCode, 2> kLogCodes = {0x7131, 0x7132};
+    static constexpr LogCode kLogCodes[] = {code::kMMState, code::kRegistration};
+    static constexpr const auto& kState = MMStateRecord::kWhole;
 
     using ProcessSection::ProcessSection;
-
-private:
-    void showState(ByteView data) const override;
 };
 
 }  // namespace kelvo

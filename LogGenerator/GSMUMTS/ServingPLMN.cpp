@@ -2,6 +2,8 @@
 
 #include <algorithm>
 
+#include "LogGenerator/GSMUMTS/RegistrationRecord.h"
+#include "LogGenerator/GSMUMTS/ServingPLMNRecord.h"
 #include "LogGenerator/PhoneServices/CellInfo.h"
 #include "platform/system/Environment.h"
 #include "platform/telephony/TelephonyConstants.h"
@@ -11,32 +13,6 @@ namespace kelvo {
 namespace {
 
 // clang-format off
-constexpr ValueTable kSelectionModes({
-    { 0, "Automatic"           },
-    { 1, "Manual"              },
-    { 2, "Limited"             },
-    { 3, "LIMITED_ROUTINE_ACQ" },
-    { 4, "LIMITED_MANUAL_ACQ"  },
-}, "Unknown");
-
-constexpr ValueTable kServiceTypes({
-    { 0, "NO_SERVICE"      },
-    { 1, "CS_ONLY"         },
-    { 2, "PS_ONLY"         },
-    { 3, "CS_PS_SERVICE"   },
-    { 4, "LIMITED_SERVICE" },
-}, "Unknown");
-
-constexpr auto kSelection = record(16, {  // 0x7132
-    { 14, u8,              "PLMN Sel Mod",       label(kSelectionModes) },
-});
-
-constexpr auto kServing = record(32, {  // 0x7135, behind the network's digits at 15 to 17
-    { 18, u16.bigEndian(), "Location Area Code", decimal                },
-    { 20, u8,              "Routing Area Code",  decimal                },
-    { 14, u8,              "Service Type",       label(kServiceTypes)   },
-});
-
 constexpr CellField kCell[] = {
     { kPLCellMonitorMCC, "Mobile Country Code", "ServingPLMN: Failed to retrieve MCC\n" },
     { kPLCellMonitorMNC, "Mobile Network Code", "ServingPLMN: Failed to retrieve MNC\n" },
@@ -54,15 +30,15 @@ bool isServing(const Value& cell) {
 void ServingPLMN::updateWithData(ByteView data, LogCode logCode) {
     logLine(Level::Warning, "Serving PLMN");
     switch (logCode) {
-        case 0x7135: showServing(data); break;
-        case 0x7132: show(data, kSelection); break;
-        case 0xff0001: showCellArray(data); break;
+        case code::kServingPLMN: showServing(data); break;
+        case code::kRegistration: show(data, RegistrationRecord::kSelection); break;
+        case code::kCellArray: showCellArray(data); break;
         default: reportUnknown(logCode);
     }
 }
 
 void ServingPLMN::showServing(ByteView data) {
-    if (data.size() < kServing.size || !values()) return;
+    if (data.size() < ServingPLMNRecord::kMinimum || !values()) return;
     const RecordView record(data);
     // Packed BCD, 3GPP TS 24.008: fillers, such as the third digit of a two-digit network code, show as blanks.
     const auto digit = [&](std::size_t at, int lowBit) {
@@ -71,7 +47,7 @@ void ServingPLMN::showServing(ByteView data) {
     };
     values()->slot("Mobile Country Code").text() = {digit(15, 0), digit(15, 4), digit(16, 0)};
     values()->slot("Mobile Network Code").text() = {digit(17, 0), digit(17, 4), digit(16, 4)};
-    showFields(*values(), record, 0, kServing.fields);
+    showFields(*values(), record, 0, ServingPLMNRecord::kAreas.fields);
 }
 
 void ServingPLMN::showCellArray(ByteView data) {

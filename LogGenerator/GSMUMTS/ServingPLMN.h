@@ -1,8 +1,8 @@
 #pragma once
 
-#include <array>
-
 #include "LogGenerator/Base.h"
+#include "LogGenerator/GSMUMTS/GSMUMTSCodes.h"
+#include "LogGenerator/PhoneServices/PhoneCodes.h"
 
 namespace kelvo {
 
@@ -10,7 +10,7 @@ namespace kelvo {
 class ServingPLMN final : public Section<ServingPLMN> {
 public:
     static constexpr std::string_view kSectionName = "Serving PLMN";
-    static constexpr std::array<LogCode, 3> kLogCodes = {0x7135, 0x7132, 0xff0001};
+    static constexpr LogCode kLogCodes[] = {code::kServingPLMN, code::kRegistration, code::kCellArray};
 
     using Section::Section;
     void updateWithData(ByteView data, LogCode logCode) override;

@@ -18,19 +18,18 @@ constexpr ValueTable kRRCStates({
     { 5, "URA_PCH"      },
 }, "Unknown");
 
-constexpr auto kState = record(14, {  // 0x4125
+constexpr auto kState = record(code::kUMTSRRCState, 14, {
     { 13, u8,  "RRC State",          label(kRRCStates)           },
 });
 
-constexpr auto kCell = record(29, {  // 0x4127
+constexpr auto kCell = record(code::kUMTSServingCell, 29, {
     { 21, u32, "Cell ID",            asSigned                    },
     { 17, u32, "Downlink Frequency", asSigned                    },
     { 13, u32, "Uplink Frequency",   asSigned                    },
-    removed(   "UARFCN"                                          ),  // the cell array's key: these frequencies replace it
     { 25, u16, "URA ID",             decimal                     },
 });
 
-constexpr auto kCiphering = record(19, {  // 0x4157
+constexpr auto kCiphering = record(code::kUMTSCiphering, 19, {
     { 13, u8,  "Ciphering",          flag("Enabled", "Disabled") },
 });
 
@@ -41,18 +40,22 @@ constexpr CellField kServingCell[] = {
 };
 // clang-format on
 
-constexpr NumberFormat kTransmitPower = "%4.2lf dBm";
+constexpr ShownReal kTransmitPower("%4.2f", dBm);
 
 }  // namespace
 
 void UMTSRRInfo::updateWithData(ByteView data, LogCode logCode) {
     logLine(Level::Warning, "UMTSRRInfo");
     switch (logCode) {
-        case 0x4125: show(data, kState); break;
-        case 0x4031: showTransmitPower(data); break;
-        case 0x4127: show(data, kCell); break;
-        case 0x4157: show(data, kCiphering); break;
-        case 0xff0001: showServingCell(values(), data, kPLCellMonitorRadioAccessTechnologyUMTS, kServingCell); break;
+        case code::kUMTSRRCState: show(data, kState); break;
+        case code::kUMTSTransmitPower: showTransmitPower(data); break;
+        case code::kUMTSServingCell:
+            if (show(data, kCell)) hide("UARFCN");  // the cell array's key: these frequencies replace it
+            break;
+        case code::kUMTSCiphering: show(data, kCiphering); break;
+        case code::kCellArray:
+            showServingCell(values(), data, kPLCellMonitorRadioAccessTechnologyUMTS, kServingCell);
+            break;
         default: reportUnknown(logCode);
     }
 }
@@ -60,7 +63,7 @@ void UMTSRRInfo::updateWithData(ByteView data, LogCode logCode) {
 void UMTSRRInfo::showTransmitPower(ByteView data) {
     if (data.size() < 16 || !values()) return;
     const RecordView record(data);
-    const RecordEntries entries(16, 14, static_cast<std::size_t>(record.read(14, u8)));
+    const RecordEntries entries(16, 14, record.count(14, u8));
     double sum = 0.0;
     int count = 0;
     for (std::size_t i = 0; i < entries.count(); ++i) {

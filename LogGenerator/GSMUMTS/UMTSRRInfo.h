@@ -1,8 +1,8 @@
 #pragma once
 
-#include <array>
-
 #include "LogGenerator/Base.h"
+#include "LogGenerator/GSMUMTS/GSMUMTSCodes.h"
+#include "LogGenerator/PhoneServices/PhoneCodes.h"
 
 namespace kelvo {
 
@@ -10,7 +10,8 @@ namespace kelvo {
 class UMTSRRInfo final : public Section<UMTSRRInfo> {
 public:
     static constexpr std::string_view kSectionName = "UMTS RR Info";
-    static constexpr std::array<LogCode, 5> kLogCodes = {0x4125, 0x4031, 0x4127, 0x4157, 0xff0001};
+    static constexpr LogCode kLogCodes[] = {code::kUMTSRRCState, code::kUMTSTransmitPower, code::kUMTSServingCell,
+                                            code::kUMTSCiphering, code::kCellArray};
 
     using Section::Section;
     void updateWithData(ByteView data, LogCode logCode) override;

@@ -1,8 +1,8 @@
 #pragma once
 
-#include <array>
-
 #include "LogGenerator/Base.h"
+#include "LogGenerator/GSMUMTS/GSMUMTSCodes.h"
+#include "LogGenerator/PhoneServices/PhoneCodes.h"
 
 namespace kelvo {
 
@@ -10,7 +10,7 @@ namespace kelvo {
 class UMTSSet final : public Section<UMTSSet> {
 public:
     static constexpr std::string_view kSectionName = "UMTS Set";
-    static constexpr std::array<LogCode, 2> kLogCodes = {0x4005, 0xff0001};
+    static constexpr LogCode kLogCodes[] = {code::kNeighborRanking, code::kCellArray};
 
     using Section::Section;
     void updateWithData(ByteView data, LogCode logCode) override;

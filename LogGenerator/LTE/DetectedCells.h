@@ -1,8 +1,7 @@
 #pragma once
 
-#include <array>
-
 #include "LogGenerator/Base.h"
+#include "LogGenerator/LTE/LTECodes.h"
 
 namespace kelvo {
 
@@ -10,7 +9,7 @@ namespace kelvo {
 class DetectedCells final : public Section<DetectedCells> {
 public:
     static constexpr std::string_view kSectionName = "Detected Cells";
-    static constexpr std::array<LogCode, 1> kLogCodes = {0xB179};
+    static constexpr LogCode kLogCodes[] = {code::kLTEIntraFrequency};
 
     using Section::Section;
     void updateWithData(ByteView data, LogCode logCode) override;

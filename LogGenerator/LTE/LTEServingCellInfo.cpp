@@ -18,12 +18,11 @@ constexpr ValueTable kBandwidth({  // resource blocks, 3GPP TS 36.101 table 5.6-
     { 100, "20 MHz"  },
 }, "Unknown");
 
-constexpr auto kServingCell = record(38, {  // 0xB0C2
+constexpr auto kServingCell = record(code::kLTEServingCell, 38, {
     // at  raw  key                    shown as
     {  14, u16, "Physical Cell ID",    decimal           },
     {  16, u16, "Download Frequency",  decimal           },
     {  18, u16, "Upload Frequency",    decimal           },
-    removed(    "UARFCN"                                 ),  // the cell array's key: these frequencies replace it
     {  20, u8,  "Download Bandwidth",  label(kBandwidth) },
     {  21, u8,  "Upload Bandwidth",    label(kBandwidth) },
     {  22, u32, "Cell Identity",       asSigned          },
@@ -31,7 +30,7 @@ constexpr auto kServingCell = record(38, {  // 0xB0C2
     {  28, u32, "Freq Band Indicator", asSigned          },
 });
 
-constexpr auto kAntennas = record(22, {  // 0xB0C1
+constexpr auto kAntennas = record(code::kLTEMasterInformationBlock, 22, {
     {  20, u8,  "Num Tx Antennas",     decimal           },
 });
 
@@ -49,11 +48,13 @@ constexpr CellField kCell[] = {
 void LTEServingCellInfo::updateWithData(ByteView data, LogCode logCode) {
     logLine(Level::Warning, "LTE Serving Cell Info");
     switch (logCode) {
-        case 0xB0C2: show(data, kServingCell); break;
-        case 0xB0C1:
+        case code::kLTEServingCell:
+            if (show(data, kServingCell)) hide("UARFCN");  // the cell array's key: these frequencies replace it
+            break;
+        case code::kLTEMasterInformationBlock:
             if (show(data, kAntennas)) reportUnknown(logCode);  // intended: shown and still reported
             break;
-        case 0xFF0001: showServingCell(values(), data, kPLCellMonitorRadioAccessTechnologyLTE, kCell); break;
+        case code::kCellArray: showServingCell(values(), data, kPLCellMonitorRadioAccessTechnologyLTE, kCell); break;
         default: reportUnknown(logCode);
     }
 }

@@ -1,8 +1,8 @@
 #pragma once
 
-#include <array>
-
 #include "LogGenerator/Base.h"
+#include "LogGenerator/LTE/LTECodes.h"
+#include "LogGenerator/PhoneServices/PhoneCodes.h"
 
 namespace kelvo {
 
@@ -10,7 +10,7 @@ namespace kelvo {
 class LTEServingCellInfo final : public Section<LTEServingCellInfo> {
 public:
     static constexpr std::string_view kSectionName = "Serving Cell Info";
-    static constexpr std::array<LogCode, 3> kLogCodes = {0xB0C2, 0xB0C1, 0xFF0001};
+    static constexpr LogCode kLogCodes[] = {code::kLTEServingCell, code::kLTEMasterInformationBlock, code::kCellArray};
 
     using Section::Section;
     void updateWithData(ByteView data, LogCode logCode) override;

@@ -1,8 +1,7 @@
 #pragma once
 
-#include <array>
-
 #include "LogGenerator/Base.h"
+#include "LogGenerator/LTE/LTECodes.h"
 
 namespace kelvo {
 
@@ -10,7 +9,7 @@ namespace kelvo {
 class NeighborMeasurementMisc final : public Section<NeighborMeasurementMisc> {
 public:
     static constexpr std::string_view kSectionName = "Neighbor Measurements";
-    static constexpr std::array<LogCode, 1> kLogCodes = {0xB180};
+    static constexpr LogCode kLogCodes[] = {code::kLTENeighborCellsIdle};
 
     using Section::Section;
     void updateWithData(ByteView data, LogCode logCode) override;

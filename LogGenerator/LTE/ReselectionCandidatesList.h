@@ -1,8 +1,7 @@
 #pragma once
 
-#include <array>
-
 #include "LogGenerator/Base.h"
+#include "LogGenerator/LTE/LTECodes.h"
 
 namespace kelvo {
 
@@ -10,7 +9,7 @@ namespace kelvo {
 class ReselectionCandidatesList final : public Section<ReselectionCandidatesList> {
 public:
     static constexpr std::string_view kSectionName = "Reselection Candidates List";
-    static constexpr std::array<LogCode, 1> kLogCodes = {0xB186};
+    static constexpr LogCode kLogCodes[] = {code::kLTEReselectionCandidates};
 
     using Section::Section;
     void updateWithData(ByteView data, LogCode logCode) override;

@@ -1,8 +1,7 @@
 #pragma once
 
-#include <array>
-
 #include "LogGenerator/Base.h"
+#include "LogGenerator/LTE/LTECodes.h"
 
 namespace kelvo {
 
@@ -10,7 +9,7 @@ namespace kelvo {
 class ServingCellMeasurement final : public Section<ServingCellMeasurement> {
 public:
     static constexpr std::string_view kSectionName = "Serving Cell Measurements";
-    static constexpr std::array<LogCode, 1> kLogCodes = {0xB17F};
+    static constexpr LogCode kLogCodes[] = {code::kLTEServingCellIdle};
 
     using Section::Section;
     void updateWithData(ByteView data, LogCode logCode) override;

@@ -3,7 +3,7 @@
 #include <span>
 #include <string_view>
 
-#include "LogGenerator/FieldTable.h"
+#include "LogGenerator/ShowFields.h"
 #include "platform/values/Bytes.h"
 #include "platform/values/Value.h"
 

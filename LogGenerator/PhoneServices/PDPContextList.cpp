@@ -7,7 +7,7 @@ namespace kelvo {
 
 void PDPContextList::updateWithData(ByteView data, LogCode logCode) {
     logLine(Level::Warning, "PDPContextList");
-    if (logCode != 0xff0002) return reportUnknown(logCode);
+    if (logCode != code::kPDPContexts) return reportUnknown(logCode);
     const Value contexts = payloadPropertyList(data);
     if (contexts.array()) replaceArray(list(), {contexts.array()->begin(), contexts.array()->end()});
 }

@@ -1,8 +1,7 @@
 #pragma once
 
-#include <array>
-
 #include "LogGenerator/Base.h"
+#include "LogGenerator/PhoneServices/PhoneCodes.h"
 
 namespace kelvo {
 
@@ -10,7 +9,7 @@ namespace kelvo {
 class PDPContextList final : public Section<PDPContextList> {
 public:
     static constexpr std::string_view kSectionName = "PDP Context Info";
-    static constexpr std::array<LogCode, 1> kLogCodes = {0xff0002};
+    static constexpr LogCode kLogCodes[] = {code::kPDPContexts};
 
     using Section::Section;
     void updateWithData(ByteView data, LogCode logCode) override;

@@ -36,7 +36,7 @@ constexpr SimFile kFiles[] = {
 
 void SimInfo::updateWithData(ByteView data, LogCode logCode) {
     logLine(Level::Warning, "SimInfo");
-    if (logCode != 0xff0000) return;
+    if (logCode != code::kSimFiles) return;
     const Value files = payloadPropertyList(data);
     if (!files) {
         logLine(Level::Error, "SIM File dictionary data could not be constructed");

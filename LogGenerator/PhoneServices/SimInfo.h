@@ -1,8 +1,7 @@
 #pragma once
 
-#include <array>
-
 #include "LogGenerator/Base.h"
+#include "LogGenerator/PhoneServices/PhoneCodes.h"
 
 namespace kelvo {
 
@@ -10,7 +9,7 @@ namespace kelvo {
 class SimInfo final : public Section<SimInfo> {
 public:
     static constexpr std::string_view kSectionName = "SIM Info";
-    static constexpr std::array<LogCode, 1> kLogCodes = {0xff0000};
+    static constexpr LogCode kLogCodes[] = {code::kSimFiles};
 
     using Section::Section;
     void updateWithData(ByteView data, LogCode logCode) override;

@@ -1,8 +1,7 @@
 #pragma once
 
-#include <array>
-
 #include "LogGenerator/Base.h"
+#include "LogGenerator/UTRAN/UTRANCodes.h"
 
 namespace kelvo {
 
@@ -10,7 +9,7 @@ namespace kelvo {
 class CCTRCHSIRMeasurement final : public Section<CCTRCHSIRMeasurement> {
 public:
     static constexpr std::string_view kSectionName = "CCTRCH SIR";
-    static constexpr std::array<LogCode, 1> kLogCodes = {0xD00C};
+    static constexpr LogCode kLogCodes[] = {code::kUTRANTransportChannels};
 
     using Section::Section;
     void updateWithData(ByteView data, LogCode logCode) override;

@@ -22,14 +22,14 @@ constexpr auto kNeighbor = entry(8, {
 
 void GSMNeighbhorMeasurements::updateWithData(ByteView data, LogCode logCode) {
     logLine(Level::Warning, "GSM Neighbor Cell List");
-    if (logCode != 0xD00E || data.size() < 17) return;
+    if (logCode != code::kUTRANGSMNeighborCells || data.size() < 17) return;
     clearElementsInArray(list());
     neighbors(data);  // intended: the rows are made and never handed to the list, which stays empty
 }
 
 ArrayRef GSMNeighbhorMeasurements::neighbors(ByteView data) {
     const ArrayRef cells = Array::make();
-    showRows(cells, data, 17, static_cast<std::size_t>(RecordView(data).read(16, u8)), kNeighbor);
+    showRows(cells, data, 17, RecordView(data).count(16, u8), kNeighbor);
     return cells;
 }
 

@@ -1,8 +1,7 @@
 #pragma once
 
-#include <array>
-
 #include "LogGenerator/Base.h"
+#include "LogGenerator/UTRAN/UTRANCodes.h"
 
 namespace kelvo {
 
@@ -10,7 +9,7 @@ namespace kelvo {
 class GSMNeighbhorMeasurements final : public Section<GSMNeighbhorMeasurements> {
 public:
     static constexpr std::string_view kSectionName = "GSM Neighbor Cell List";
-    static constexpr std::array<LogCode, 1> kLogCodes = {0xD00E};
+    static constexpr LogCode kLogCodes[] = {code::kUTRANGSMNeighborCells};
 
     using Section::Section;
     void updateWithData(ByteView data, LogCode logCode) override;

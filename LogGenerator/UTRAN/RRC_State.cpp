@@ -17,6 +17,7 @@ constexpr ValueTable kMode({
     { 4, "Cell PCH"      },
     { 5, "Cell URA PCH"  },
 }, "Unknown RRC Mode");
+constexpr Shown kShownMode = label(kMode);
 // clang-format on
 
 /// "{State = Cell DCH; Other = 1}"; a value that is no text is named by its kind.
@@ -34,7 +35,7 @@ std::string describe(const Dictionary& values) {
 
 void RRC_State::updateWithData(ByteView data, LogCode logCode) {
     logLine(Level::Warning, "RRC Info");
-    if (logCode != 0xD0E0) return;
+    if (logCode != code::kUTRANRRCState) return;
     if (data.size() < 15) {  // intended: said, and decoded all the same
         logLine(Level::Warning, "LogCode_0xD0E0 is length is %ld expected size %ld", data.size(), 15L);
     }
@@ -42,8 +43,8 @@ void RRC_State::updateWithData(ByteView data, LogCode logCode) {
     const bool tellsMode = record.read(13, u8) == 1 && record.size() > 14;
     const std::int64_t mode = tellsMode ? record.read(14, u8) : kUnknownMode;
     std::string name;
-    print(name, mode, label(kMode));
-    if (values()) values()->set("State", name);
+    kShownMode.print(name, mode);
+    if (values()) showValue(values()->slot("State"), mode, kShownMode);
     if (!logWants(Level::Warning)) return;
     const std::string shown = values() ? describe(*values()) : "(none)";
     logLine(Level::Warning, "Display Dict = %s, rrc mode = %d %s", shown, mode, name);

@@ -1,8 +1,7 @@
 #pragma once
 
-#include <array>
-
 #include "LogGenerator/Base.h"
+#include "LogGenerator/UTRAN/UTRANCodes.h"
 
 namespace kelvo {
 
@@ -10,7 +9,7 @@ namespace kelvo {
 class RRC_State final : public Section<RRC_State> {
 public:
     static constexpr std::string_view kSectionName = "RRC Info";
-    static constexpr std::array<LogCode, 1> kLogCodes = {0xD0E0};
+    static constexpr LogCode kLogCodes[] = {code::kUTRANRRCState};
 
     using Section::Section;
     void updateWithData(ByteView data, LogCode logCode) override;

@@ -26,8 +26,8 @@ constexpr auto kNeighbor = entry(16, {
 
 void UTRANNeighbhorMeasurements::updateWithData(ByteView data, LogCode logCode) {
     logLine(Level::Warning, "NeighbhorMeasurements List");
-    if (logCode != 0xD00A || data.size() < 21) return;
-    const auto count = static_cast<std::size_t>(RecordView(data).read(16, u8.bits(1, 7)));
+    if (logCode != code::kUTRANNeighborCells || data.size() < 21) return;
+    const auto count = RecordView(data).count(16, u8.bits(1, 7));
     showRows(list(), data, 168, count, kNeighbor);
 }
 

@@ -9,7 +9,7 @@ namespace kelvo {
 namespace {
 
 // clang-format off
-constexpr auto kServingCell = record(26, {  // 0xD0E2
+constexpr auto kServingCell = record(code::kUTRANServingCell, 26, {
     { 14, u8,        "Cell Access Restrictions", decimal                                    },
     { 21, u32,       "Cell ID",                  asSigned                                   },
     { 19, u16,       "Downlink UARFCN",          decimal                                    },
@@ -18,7 +18,7 @@ constexpr auto kServingCell = record(26, {  // 0xD0E2
     { 25, u8.bit(0), "Allowed Access",           flag("Emergency Calls Only", "All Calls")  },
 });
 
-constexpr CellField kCell[] = {  // 0xFF0001
+constexpr CellField kCell[] = {
     { kPLCellMonitorLAC,      "Local Area Code",      "Serving Cell Info: Failed to retrieve LAC\n"                  },
     { kPLCellMonitorCellId,   "Cell ID",              "Serving Cell Info: Failed to retrieve Cell ID\n"              },
     { kPLCellMonitorBandInfo, "Freq Band Indicator",  "Serving Cell Info: Failed to retrieve Freq Band Indicator\n"  },
@@ -32,8 +32,8 @@ constexpr CellField kCell[] = {  // 0xFF0001
 
 void UTRANServingCellInfo::updateWithData(ByteView data, LogCode logCode) {
     logLine(Level::Warning, "Serving Cell Info");
-    if (logCode == 0xD0E2) show(data, kServingCell);
-    if (logCode == 0xFF0001) showCellArray(data);
+    if (logCode == code::kUTRANServingCell) show(data, kServingCell);
+    if (logCode == code::kCellArray) showCellArray(data);
 }
 
 void UTRANServingCellInfo::showCellArray(ByteView data) {

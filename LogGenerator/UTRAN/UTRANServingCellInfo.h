@@ -1,8 +1,8 @@
 #pragma once
 
-#include <array>
-
 #include "LogGenerator/Base.h"
+#include "LogGenerator/PhoneServices/PhoneCodes.h"
+#include "LogGenerator/UTRAN/UTRANCodes.h"
 
 namespace kelvo {
 
@@ -10,7 +10,7 @@ namespace kelvo {
 class UTRANServingCellInfo final : public Section<UTRANServingCellInfo> {
 public:
     static constexpr std::string_view kSectionName = "Serving Cell Info";
-    static constexpr std::array<LogCode, 2> kLogCodes = {0xD0E2, 0xFF0001};
+    static constexpr LogCode kLogCodes[] = {code::kUTRANServingCell, code::kCellArray};
 
     using Section::Section;
     void updateWithData(ByteView data, LogCode logCode) override;

@@ -46,15 +46,15 @@ const Bytes* Value::data() const {
     return shared != nullptr ? shared->get() : nullptr;
 }
 
-std::string& Value::text() {
-    if (_content.index() == kUnwritten) write();
-    if (auto* text = std::get_if<std::string>(&_content)) return *text;
-    return _content.emplace<std::string>();
+std::optional<Measurement> Value::measurement() const {
+    const Reading* shown = reading();
+    return shown != nullptr ? shown->quantity->measure(shown->raw) : std::nullopt;
 }
 
-void Value::write() const {
-    const UnwrittenText waiting = std::get<UnwrittenText>(_content);
-    waiting.print(_content.emplace<std::string>(), waiting.raw, waiting.how);
+std::string& Value::text() {
+    if (const auto* shown = std::get_if<ShownReading>(&_content)) _content = std::string(shown->printed());
+    if (auto* text = std::get_if<std::string>(&_content)) return *text;
+    return _content.emplace<std::string>();
 }
 
 Value Value::copy() const {

@@ -9,6 +9,7 @@
 #include <variant>
 
 #include "platform/values/Bytes.h"
+#include "platform/values/Reading.h"
 
 namespace kelvo {
 
@@ -38,22 +39,13 @@ private:
 /// A property-list date; milliseconds since 1970-01-01 00:00 UTC.
 using Date = std::chrono::sys_time<std::chrono::milliseconds>;
 
-/// A text that nobody has read yet, so that it need not be written: what `print` makes of `raw`, as `how` says. `how`
-/// is static data; it outlives every value.
-struct UnwrittenText {
-    using Print = void (*)(std::string& text, std::int64_t raw, const void* how);
-
-    std::int64_t raw;
-    const void* how;
-    Print print;
-};
-
 /// One property-list value: none, or one of the seven kinds.
 /// Strings, numbers, booleans, data and dates are values. Arrays and dictionaries are shared objects with identity:
 /// copying the Value shares them, `copy()` makes new ones all the way down.
 ///
-/// A display changes far more often than it is read. A string may therefore wait as an UnwrittenText; the first look at
-/// it writes it, which makes reading a value a matter for the thread that owns it.
+/// A string may be a Reading: the raw number of a record stands beside its text. A display changes far more often than
+/// it is read, so the first look at such a string prints it, which makes reading a value a matter for the thread that
+/// owns it.
 class Value {
 public:
     enum class Kind { None, String, Number, Boolean, Data, Date, Array, Dictionary };
@@ -74,14 +66,14 @@ public:
     template <class T>
     Value(T*) = delete;  // keeps a stray pointer from becoming a boolean
 
-    Kind kind() const { return _content.index() != kUnwritten ? static_cast<Kind>(_content.index()) : Kind::String; }
+    Kind kind() const { return _content.index() != kReading ? static_cast<Kind>(_content.index()) : Kind::String; }
     explicit operator bool() const { return kind() != Kind::None; }
 
     // Access by kind: null (or none) when the value is of another kind.
     // A text stands where it is until the value is written.
     const std::string* string() const {
-        if (_content.index() == kUnwritten) write();
-        return std::get_if<std::string>(&_content);
+        const auto* shown = std::get_if<ShownReading>(&_content);
+        return shown != nullptr ? &shown->printed() : std::get_if<std::string>(&_content);
     }
     const kelvo::Number* number() const { return std::get_if<kelvo::Number>(&_content); }
     const bool* boolean() const { return std::get_if<bool>(&_content); }
@@ -96,16 +88,25 @@ public:
         return dictionary != nullptr ? *dictionary : kNoDictionary;
     }
 
+    /// What a record reported here last; null for a value that no record's number stands behind.
+    const Reading* reading() const {
+        const auto* shown = std::get_if<ShownReading>(&_content);
+        return shown != nullptr ? &shown->reading : nullptr;
+    }
+    /// The reading's number in its unit; none without a reading, and for one that is no number.
+    std::optional<Measurement> measurement() const;
+
     /// Makes the value a string, whatever it was, and hands out its text for writing. A value that is a string already
     /// keeps its storage, so that writing a text of similar length does not allocate.
     std::string& text();
 
-    /// Makes the value a string, whatever it was, whose text is written when somebody asks for it.
-    void set(const UnwrittenText& text) {
-        if (auto* waiting = std::get_if<UnwrittenText>(&_content)) {
-            *waiting = text;
+    /// Makes the value a string, whatever it was: the text of a reading.
+    void set(const Reading& reading) {
+        if (auto* shown = std::get_if<ShownReading>(&_content)) {
+            shown->reading = reading;
+            shown->text.clear();
         } else {
-            _content = text;
+            _content.emplace<ShownReading>(reading);
         }
     }
 
@@ -116,16 +117,26 @@ public:
     friend bool operator==(const Value& a, const Value& b);
 
 private:
-    static constexpr std::size_t kUnwritten = 8;  // index of UnwrittenText, behind those of the kinds
+    /// A reading and its text, which is empty until it is printed.
+    struct ShownReading {
+        explicit ShownReading(const Reading& shown) : reading(shown) {}
+        const std::string& printed() const {
+            if (text.empty()) reading.quantity->print(text, reading.raw);
+            return text;
+        }
+
+        Reading reading;
+        mutable std::string text;
+    };
+
+    static constexpr std::size_t kReading = 8;  // index of ShownReading, behind those of the kinds
 
     static const ArrayRef kNoArray;
     static const DictionaryRef kNoDictionary;
 
-    void write() const;
-
-    mutable std::variant<std::monostate, std::string, kelvo::Number, bool, std::shared_ptr<const Bytes>, kelvo::Date,
-                         ArrayRef, DictionaryRef, UnwrittenText>
-        _content;  // changes under a reader when an unwritten text is written
+    std::variant<std::monostate, std::string, kelvo::Number, bool, std::shared_ptr<const Bytes>, kelvo::Date, ArrayRef,
+                 DictionaryRef, ShownReading>
+        _content;
 };
 
 /// The kind's name for messages: "string", "dictionary", …

@@ -6,7 +6,7 @@
 #include <latch>
 #include <thread>
 
-#include "LogGenerator/FieldTable.h"
+#include "LogGenerator/ShowFields.h"
 #include "LogGenerator/LTE/MeasuredNeighborCells.h"
 #include "LogGenerator/RowWriter.h"
 #include "tests/support/Fed.h"

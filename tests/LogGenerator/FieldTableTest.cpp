@@ -1,5 +1,6 @@
-#include "LogGenerator/FieldTable.h"
+#include "LogGenerator/ShowFields.h"
 
+#include <fmt/format.h>
 #include <gtest/gtest.h>
 
 #include <cmath>
@@ -10,7 +11,7 @@ namespace {
 
 std::string printed(std::int64_t raw, const Shown& shown) {
     std::string text;
-    print(text, raw, shown);
+    shown.print(text, raw);
     return text;
 }
 
@@ -55,10 +56,10 @@ TEST(FieldTable, PrintsWholeNumbersAsPrintfDoes) {
     EXPECT_EQ(printed(-7, decimal), "-7");
     EXPECT_EQ(printed(0xFFFFFFFF, asSigned), "-1");
     EXPECT_EQ(printed(0xFFFFFFFF, asUnsigned), "4294967295");
-    EXPECT_EQ(printed(5, whole(2, -140, "%d dBm")), "-130 dBm");
-    EXPECT_EQ(printed(5, whole(1, 0, "%+d dBm")), "+5 dBm");
-    EXPECT_EQ(printed(-5, whole(1, 0, "%+d dBm")), "-5 dBm");
-    EXPECT_EQ(printed(64, whole(1, -30, "%d dBm").unless(64, "Not Present")), "Not Present");
+    EXPECT_EQ(printed(5, whole(2, -140, dBm)), "-130 dBm");
+    EXPECT_EQ(printed(5, whole(1, 0, dBm, "%+d")), "+5 dBm");
+    EXPECT_EQ(printed(-5, whole(1, 0, dBm, "%+d")), "-5 dBm");
+    EXPECT_EQ(printed(64, whole(1, -30, dBm).unless(64, "Not Present")), "Not Present");
 }
 
 TEST(FieldTable, PrintsHexadecimalNumbersAsPrintfDoes) {
@@ -83,9 +84,9 @@ TEST(FieldTable, NamesValuesAndFallsBack) {
 TEST(FieldTable, PrintsEveryStepOfAnEighthAsPrintfDoes) {
     for (std::int64_t raw = 0; raw <= 65535; ++raw) {
         const double value = static_cast<double>(raw);
-        ASSERT_EQ(printed(raw, linear(0.25, -140.0, "%4.2f dBm")), byPrintf("%4.2f dBm", value * 0.25 - 140.0));
-        ASSERT_EQ(printed(raw, linear(0.125, -20.0, "%4.2f dB")), byPrintf("%4.2f dB", value * 0.125 - 20.0));
-        ASSERT_EQ(printed(raw, linear(0.5, -30.0, "%+.2f dB")), byPrintf("%+.2f dB", value * 0.5 - 30.0));
+        ASSERT_EQ(printed(raw, linear(0.25, -140.0, "%4.2f", dBm)), byPrintf("%4.2f dBm", value * 0.25 - 140.0));
+        ASSERT_EQ(printed(raw, linear(0.125, -20.0, "%4.2f", dB)), byPrintf("%4.2f dB", value * 0.125 - 20.0));
+        ASSERT_EQ(printed(raw, linear(0.5, -30.0, "%+.2f", dB)), byPrintf("%+.2f dB", value * 0.5 - 30.0));
         ASSERT_EQ(printed(raw, linear(0.125, -20.0, "%8.2f")), byPrintf("%8.2f", value * 0.125 - 20.0));
     }
 }
@@ -94,28 +95,60 @@ TEST(FieldTable, PrintsOtherRealNumbersAsPrintfDoes) {
     for (std::int64_t raw = -32768; raw <= 32767; ++raw) {
         const double value = static_cast<double>(raw);
         ASSERT_EQ(printed(raw, linear(1.0 / 256, 0.0, "%f")), byPrintf("%f", value * (1.0 / 256)));
-        ASSERT_EQ(printed(raw, linear(0.334, -63.248, "%+.2f dBm")), byPrintf("%+.2f dBm", value * 0.334 - 63.248));
+        ASSERT_EQ(printed(raw, linear(0.334, -63.248, "%+.2f", dBm)), byPrintf("%+.2f dBm", value * 0.334 - 63.248));
     }
 }
 
 TEST(FieldTable, PrintsRealNumbersOutsideTheNumberLineAsPrintfDoes) {
     for (const double value : {-1.0 / 0.0, 1.0 / 0.0, std::nan(""), -std::nan(""), -0.0, 0.0, -0.001, 1e300}) {
         std::string text;
-        print(text, value, "%+.2f dB");
+        NumberFormat("%+.2f", dB).print(text, value);
         EXPECT_EQ(text, byPrintf("%+.2f dB", value));
     }
     std::string text;
-    print(text, -1.0 / 0.0, "%+.2f dB");
+    NumberFormat("%+.2f", dB).print(text, -1.0 / 0.0);
     EXPECT_EQ(text, "-inf dB");
 }
 
-TEST(FieldTable, TellsTheNumberBehindARealValue) {
-    EXPECT_DOUBLE_EQ(linear(0.25, -140.0, "%4.2f dBm").real(2), -139.5);
-    EXPECT_DOUBLE_EQ(linear(0.334, -63.248, "%.2f dBm").real(1), -62.914);
-    EXPECT_TRUE(linear(0.25, -140.0, "%4.2f dBm").isReal());
-    EXPECT_TRUE(linear(0.334, -63.248, "%.2f dBm").isReal());
-    EXPECT_FALSE(decimal.isReal());
-    EXPECT_FALSE(whole(2, -140, "%d dBm").isReal());
+/// The number and the unit behind a raw value; "none" when it stands for no number.
+std::string measured(std::int64_t raw, const Shown& shown) {
+    const auto measurement = shown.measure(raw);
+    return measurement ? fmt::format("{} {}", measurement->number, measurement->unit) : "none";
+}
+
+TEST(FieldTable, TellsTheNumberAndTheUnitBehindAText) {
+    EXPECT_EQ(measured(179, linear(0.25, -140.0, "%4.2f", dBm)), "-95.25 dBm");
+    EXPECT_EQ(measured(1, linear(0.334, -63.248, "%+.2f", dBm)), "-62.914 dBm");
+    EXPECT_EQ(measured(3, linear(0.5, 0.0, "%f", dB)), "1.5 dB");
+    EXPECT_EQ(measured(10, whole(2, -140, dBm)), "-120 dBm");
+    EXPECT_EQ(measured(4, whole(1, 0, inSeconds)), "4 s");
+    EXPECT_EQ(measured(168, whole(1, 0, pnOffset)), "168 64 chips");
+    EXPECT_EQ(measured(301, decimal), "301 ");
+    EXPECT_EQ(measured(0xFFFFFFFE, asSigned), "-2 ");
+    EXPECT_EQ(measured(0xFFFFFFFE, asUnsigned), "4294967294 ");
+}
+
+TEST(FieldTable, TellsNoNumberForWhatIsNone) {
+    static constexpr ValueTable kState({{0, "A"}}, "[Reserved %d]");
+    EXPECT_EQ(measured(0, label(kState)), "none");
+    EXPECT_EQ(measured(9, label(kState)), "none");
+    EXPECT_EQ(measured(1, flag("ON", "OFF")), "none");
+    EXPECT_EQ(measured(64, whole(1, -30, dBm).unless(64, "Not Present")), "none");
+    EXPECT_EQ(measured(65, whole(1, -30, dBm).unless(64, "Not Present")), "35 dBm");
+}
+
+TEST(FieldTable, KeepsRealNumbersAsTheyAre) {
+    static constexpr ShownReal kRate("%.02f (old)", percent);
+    Value value;
+    showReal(value, 1.5625, kRate);
+    EXPECT_EQ(value, Value("1.56% (old)"));
+    ASSERT_TRUE(value.measurement());
+    EXPECT_DOUBLE_EQ(value.measurement()->number, 1.5625);
+    EXPECT_EQ(value.measurement()->unit, "%");
+    for (const double none : {-1.0 / 0.0, std::nan("")}) {
+        showReal(value, none, kRate);
+        EXPECT_FALSE(value.measurement());
+    }
 }
 
 TEST(FieldTable, LeavesAKeyOutAtOneValueAlone) {

@@ -1,6 +1,6 @@
 #include <gtest/gtest.h>
 
-#include "LogGenerator/FieldTable.h"
+#include "LogGenerator/ShowFields.h"
 #include "LogGenerator/LogGenerator.h"
 #include "platform/system/Environment.h"
 #include "tests/support/ManualClock.h"

@@ -7,7 +7,7 @@
 #include <functional>
 #include <vector>
 
-#include "LogGenerator/FieldTable.h"
+#include "LogGenerator/ShowFields.h"
 
 namespace kelvo {
 namespace {
@@ -50,16 +50,16 @@ TEST(Printing, WritesWholeNumbersAsPrintfDoes) {
         Shown shown;
     } kCases[] = {
         {1, 0, "%ld", decimal},
-        {1, 0, "%ld dBm", whole(1, 0, "%d dBm")},
-        {1, 0, "%ld dB", whole(1, 0, "%d dB")},
-        {1, 0, "%ld sec", whole(1, 0, "%d sec")},
-        {1, 0, "%ld × 64chips", whole(1, 0, "%d × 64chips")},
-        {1, 0, "%+ld dBm", whole(1, 0, "%+d dBm")},
-        {1, -21, "%ld dB", whole(1, -21, "%d dB")},
-        {1, -30, "%ld dBm", whole(1, -30, "%d dBm")},
-        {2, -140, "%ld dBm", whole(2, -140, "%d dBm")},
-        {2, 0, "%ld dBm", whole(2, 0, "%d dBm")},
-        {2, 0, "%ld dB", whole(2, 0, "%d dB")},
+        {1, 0, "%ld dBm", whole(1, 0, dBm)},
+        {1, 0, "%ld dB", whole(1, 0, dB)},
+        {1, 0, "%ld sec", whole(1, 0, inSeconds)},
+        {1, 0, "%ld × 64chips", whole(1, 0, pnOffset)},
+        {1, 0, "%+ld dBm", whole(1, 0, dBm, "%+d")},
+        {1, -21, "%ld dB", whole(1, -21, dB)},
+        {1, -30, "%ld dBm", whole(1, -30, dBm)},
+        {2, -140, "%ld dBm", whole(2, -140, dBm)},
+        {2, 0, "%ld dBm", whole(2, 0, dBm)},
+        {2, 0, "%ld dB", whole(2, 0, dB)},
     };
     for (const auto& number : kCases) {
         SCOPED_TRACE(number.format);
@@ -94,14 +94,14 @@ TEST(Printing, WritesRealNumbersAsPrintfDoes) {
         const char* format;
         Shown shown;
     } kCases[] = {
-        {0.25, -140.0, "%4.2f dBm", linear(0.25, -140.0, "%4.2f dBm")},
-        {0.5, -140.0, "%4.2f dBm", linear(0.5, -140.0, "%4.2f dBm")},
-        {0.125, -20.0, "%4.2f dB", linear(0.125, -20.0, "%4.2f dB")},
-        {0.25, -30.0, "%4.2f dB", linear(0.25, -30.0, "%4.2f dB")},
-        {0.5, 0.0, "%f dB", linear(0.5, 0.0, "%f dB")},
+        {0.25, -140.0, "%4.2f dBm", linear(0.25, -140.0, "%4.2f", dBm)},
+        {0.5, -140.0, "%4.2f dBm", linear(0.5, -140.0, "%4.2f", dBm)},
+        {0.125, -20.0, "%4.2f dB", linear(0.125, -20.0, "%4.2f", dB)},
+        {0.25, -30.0, "%4.2f dB", linear(0.25, -30.0, "%4.2f", dB)},
+        {0.5, 0.0, "%f dB", linear(0.5, 0.0, "%f", dB)},
         {1.0 / 256, 0.0, "%f", linear(1.0 / 256, 0.0, "%f")},
-        {0.334, -63.248, "%+.2f dBm", linear(0.334, -63.248, "%+.2f dBm")},
-        {0.1, 0.0, "%+.2f dBm", linear(0.1, 0.0, "%+.2f dBm")},
+        {0.334, -63.248, "%+.2f dBm", linear(0.334, -63.248, "%+.2f", dBm)},
+        {0.1, 0.0, "%+.2f dBm", linear(0.1, 0.0, "%+.2f", dBm)},
     };
     for (const auto& number : kCases) {
         SCOPED_TRACE(number.format);
@@ -113,11 +113,12 @@ TEST(Printing, WritesRealNumbersAsPrintfDoes) {
     }
 }
 
-TEST(Printing, WritesAFieldInAnotherFormatForTheLog) {
-    static constexpr Shown kLevel = linear(0.25, -30.0, "%4.2f dB");
+TEST(Printing, WritesTheNumberOfAFieldInAnotherFormatForTheLog) {
+    static constexpr Shown kLevel = linear(0.25, -30.0, "%4.2f", dB);
+    static constexpr NumberFormat kLine("Measured RSSI: %lf\n");
     std::string text;
     for (std::int64_t raw = -32768; raw <= 65535; ++raw) {
-        print(text, raw, kLevel, "Measured RSSI: %lf\n");
+        kLine.print(text, kLevel.measure(raw)->number);
         ASSERT_EQ(text, byPrintf("Measured RSSI: %lf\n", static_cast<double>(raw) * 0.25 - 30.0));
     }
 }

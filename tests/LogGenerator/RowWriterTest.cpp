@@ -4,7 +4,7 @@
 
 #include <algorithm>
 
-#include "LogGenerator/FieldTable.h"
+#include "LogGenerator/ShowFields.h"
 #include "LogGenerator/GSMUMTS/NeighboringCells.h"
 #include "tests/support/CellArray.h"
 #include "tests/support/Shows.h"

@@ -142,39 +142,80 @@ TEST(Dictionary, RewritesALargeOneIntoASmallOneAndBack) {
     }
 }
 
-/// Prints the number, and counts how often it did.
-void printAndCount(std::string& text, std::int64_t raw, const void* how) {
-    text = std::to_string(raw);
-    ++**static_cast<int* const*>(how);
-}
+/// Shows a raw number in halves of a decibel, nothing at 99, and counts how often it printed.
+class HalfDecibels final : public Quantity {
+public:
+    void print(std::string& text, std::int64_t raw) const override {
+        text = std::to_string(raw) + "/2 dB";
+        ++prints;
+    }
+    std::optional<Measurement> measure(std::int64_t raw) const override {
+        if (raw == 99) return std::nullopt;
+        return Measurement{static_cast<double>(raw) / 2, "dB"};
+    }
+    mutable int prints = 0;
+};
 
-TEST(Value, WritesATextWhenItIsReadAndOnce) {
-    static int prints;
-    static int* const kCounter = &prints;
-    prints = 0;
+TEST(Value, PrintsAReadingWhenItIsReadAndOnce) {
+    static const HalfDecibels quantity;
     Value value = "before";
-    for (int raw = 0; raw < 10; ++raw) value.set({.raw = raw, .how = &kCounter, .print = printAndCount});
+    for (int raw = 0; raw < 10; ++raw) value.set({.raw = raw, .quantity = &quantity});
     EXPECT_EQ(value.kind(), Value::Kind::String);
     EXPECT_TRUE(value);
-    EXPECT_EQ(prints, 0);
-    EXPECT_EQ(*value.string(), "9");
-    EXPECT_EQ(*value.string(), "9");
-    EXPECT_EQ(prints, 1);
+    EXPECT_EQ(quantity.prints, 0);
+    EXPECT_EQ(*value.string(), "9/2 dB");
+    EXPECT_EQ(*value.string(), "9/2 dB");
+    EXPECT_EQ(quantity.prints, 1);
+    value.set({.raw = 10, .quantity = &quantity});
+    EXPECT_EQ(*value.string(), "10/2 dB");
 }
 
-TEST(Value, IsAStringLikeAnyOtherWhileItsTextIsUnwritten) {
-    static int prints;
-    static int* const kCounter = &prints;
+TEST(Value, KeepsTheNumberOfAReadingBesideItsText) {
+    static const HalfDecibels quantity;
     Value value;
-    value.set({.raw = 7, .how = &kCounter, .print = printAndCount});
+    value.set({.raw = -3, .quantity = &quantity, .record = 0xFFFFFFFFFFFFFFFF});
+    for (const char* when : {"before it is printed", "afterwards"}) {
+        SCOPED_TRACE(when);
+        ASSERT_TRUE(value.measurement());
+        EXPECT_DOUBLE_EQ(value.measurement()->number, -1.5);
+        EXPECT_EQ(value.measurement()->unit, "dB");
+        ASSERT_NE(value.reading(), nullptr);
+        EXPECT_EQ(value.reading()->raw, -3);
+        EXPECT_EQ(value.reading()->quantity, &quantity);
+        EXPECT_EQ(value.reading()->record, 0xFFFFFFFFFFFFFFFF);
+        EXPECT_EQ(value, Value("-3/2 dB"));
+    }
+    EXPECT_EQ(value.copy().measurement()->number, -1.5);
+    value.set({.raw = 99, .quantity = &quantity});
+    EXPECT_FALSE(value.measurement());
+    EXPECT_EQ(value.reading()->raw, 99);
+    EXPECT_EQ(value.reading()->record, 0U);
+}
+
+TEST(Value, HasNoReadingWhenNoRecordStandsBehindIt) {
+    static const HalfDecibels quantity;
+    Value value;
+    value.set({.raw = 4, .quantity = &quantity});
+    value = "2.0 dB";
+    for (const Value& plain : {value, Value("-95.25 dBm"), Value(7), Value(), Value(Array::make())}) {
+        EXPECT_EQ(plain.reading(), nullptr);
+        EXPECT_FALSE(plain.measurement());
+    }
+}
+
+TEST(Value, IsAStringLikeAnyOtherWhileItIsAReading) {
+    static const HalfDecibels quantity;
+    Value value;
+    value.set({.raw = 7, .quantity = &quantity});
     const Value copy = value.copy();
     value = "later";
-    EXPECT_EQ(copy, Value("7"));
+    EXPECT_EQ(copy, Value("7/2 dB"));
     EXPECT_EQ(copy.number(), nullptr);
     Value text = copy;
-    text.set({.raw = 8, .how = &kCounter, .print = printAndCount});
-    text.text() += " dB";
-    EXPECT_EQ(text, Value("8 dB"));
+    text.set({.raw = 8, .quantity = &quantity});
+    text.text() += " or so";
+    EXPECT_EQ(text, Value("8/2 dB or so"));
+    EXPECT_EQ(text.reading(), nullptr);
 }
 
 TEST(Value, BecomesAStringWhateverItWas) {

@@ -1,0 +1,7 @@
+// refused: throw "32 bits need a word on their sign"
+#include "LogGenerator/LTE/LTECodes.h"
+#include "LogGenerator/ShowFields.h"
+
+using namespace kelvo;
+
+constexpr auto kCell = entry(4, {{0, u32, "Cell Identity", decimal}});

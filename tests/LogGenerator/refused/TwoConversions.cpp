@@ -1,0 +1,7 @@
+// refused: throw "one conversion a format"
+#include "LogGenerator/LTE/LTECodes.h"
+#include "LogGenerator/ShowFields.h"
+
+using namespace kelvo;
+
+constexpr ValueTable kStates({{0, "Idle"}}, "state %d of %d");

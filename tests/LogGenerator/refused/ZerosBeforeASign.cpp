@@ -1,0 +1,7 @@
+// refused: throw "zeros before a sign are not printed here"
+#include "LogGenerator/LTE/LTECodes.h"
+#include "LogGenerator/ShowFields.h"
+
+using namespace kelvo;
+
+constexpr auto kCell = entry(2, {{0, i16, "Level", whole(1, 0, dBm, "%04d")}});

@@ -34,7 +34,8 @@ void Air::measure(Time now) {
 Reception Air::listen(const Loading& loading) {
     double total = toMilliwatts(kNoise);
     for (const double received : _drive.received()) total += loading.all * toMilliwatts(received + loading.gain);
-    Reception air{.total = toDecibels(total)};
+    Reception air;
+    air.total = toDecibels(total);
     air.rx0 = air.total + kReadingNoise * _random.normal();
     air.rx1 = air.total + loading.secondAntenna + kReadingNoise * _random.normal();
     air.openLoop = loading.turnaround - air.rx0 + kReadingNoise * 2 * _random.normal();

@@ -63,6 +63,11 @@ void Modem::step(Time now, const PhoneUser& user) {
     connect(user);
 }
 
+void Modem::markReported() {
+    _reported.clear();
+    for (const UmtsNeighbor& neighbor : _status.umts) _reported.insert(neighbor.sector);
+}
+
 LocationArea Modem::area() const {
     if (_status.access == RadioAccess::None) return {};
     return _status.access == RadioAccess::Gsm ? _network.gsmCells[_status.serving].area
@@ -117,8 +122,9 @@ void Modem::chooseFromUmts(Time now) {
     const bool poor = own < kUmtsPoor || _air.rscp()[_status.serving] < kUmtsFar;
     const auto other = _umtsChange(those(umtsByStrength(), better), now);
     const bool leaves = _toGsm(poor, 0, now);
-    if (other) return move(RadioAccess::Umts, *other, now);
-    if (leaves) move(RadioAccess::Gsm, gsmByStrength().front(), now);
+    if (other && _reported.contains(*other)) return move(RadioAccess::Umts, *other, now);
+    const auto known = std::ranges::find_if(_status.gsm, &GsmNeighbor::identified);  // the strongest of them
+    if (leaves && known != _status.gsm.end()) move(RadioAccess::Gsm, known->sector, now);
 }
 
 double Modem::gsmMargin(std::size_t candidate, Time now) const {

@@ -1,6 +1,7 @@
 #pragma once
 
 #include <map>
+#include <set>
 #include <vector>
 
 #include "telephony/simulation/HeldFor.h"
@@ -21,6 +22,8 @@ public:
     void step(Time now, const PhoneUser& user);
 
     const Status& status() const { return _status; }
+    /// The status has been sent: the network may move the phone to the UMTS neighbors in it.
+    void markReported();
     /// Of the serving cell.
     LocationArea area() const;
 
@@ -48,6 +51,7 @@ private:
     EachHeldFor _gsmReselection{std::chrono::seconds(5)};
     EachHeldFor _gsmHandover{std::chrono::seconds(1)};
     EachHeldFor _umtsChange{std::chrono::seconds(1)};
+    std::set<std::size_t> _reported;  // UMTS neighbors in the last message
     HeldFor _toGsm{std::chrono::seconds(2)};
     EachHeldFor _toUmts{std::chrono::seconds(5)};
     Time _movedAt{0};

@@ -20,10 +20,12 @@ void Simulation::step() {
     _air.measure(now());
     _modem.step(now(), _user);
     const Status& status = _modem.status();
-    // A cell that was left is measured when the next has held for one period: what the phone may go to has been told.
+    // Once more when a cell that was left has been measured: the phone may go back there.
     const bool isSettled = _settled(true, 2 * status.serving + (status.access == RadioAccess::Umts), now());
     const Content content{status.access, status.serving, isSettled, status.registration, status.connection};
-    if (_cellMonitor.isDue(now(), content, kPeriod)) emit(cellMonitorRecord(status, _network));
+    if (!_cellMonitor.isDue(now(), content, kPeriod)) return;
+    emit(cellMonitorRecord(status, _network));
+    _modem.markReported();
 }
 
 }  // namespace kelvo::simulation::ifx

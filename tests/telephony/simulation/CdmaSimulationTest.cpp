@@ -233,7 +233,12 @@ TEST(CdmaSimulation, GivesNoTwoSectorsOnePilotOffset) {
 
 namespace {
 
-Reception air(std::vector<double> pilots) { return {.pilots = std::move(pilots), .total = -70}; }
+Reception air(std::vector<double> pilots) {
+    Reception air;
+    air.pilots = std::move(pilots);
+    air.total = -70;
+    return air;
+}
 
 }  // namespace
 

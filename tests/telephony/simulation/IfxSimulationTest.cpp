@@ -247,7 +247,7 @@ TEST(IfxSimulation, GoesOnlyToCellsThatItHasShownBeforeAndThatCameCloser) {
             before = shown;
         }
     }
-    EXPECT_GE(moves["GSM to GSM"].all, 40);
+    EXPECT_GE(moves["GSM to GSM"].all, 25);
     EXPECT_GE(moves["GSM to UMTS"].all, 5);
     EXPECT_GE(moves["UMTS to UMTS"].all, 8);
     EXPECT_GE(moves["UMTS to GSM"].all, 5);
@@ -356,7 +356,7 @@ TEST(IfxSimulation, LosesMoreAndCarriesLessWhereTheSignalIsWorse) {
     EXPECT_TRUE(std::ranges::is_sorted(schemes, {}, second));
     EXPECT_TRUE(falls(umts[false]));
     EXPECT_TRUE(falls(umts[true]));
-    ASSERT_GE(carried[false].second, 20);
+    ASSERT_GE(carried[false].second, 15);
     ASSERT_GE(carried[true].second, 20);
     EXPECT_GT(carried[true].first / carried[true].second, 1.3 * carried[false].first / carried[false].second);
 }

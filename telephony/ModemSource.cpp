@@ -27,8 +27,6 @@ ModemSource::ModemSource(std::unique_ptr<ModemLines> lines, wire::Session::Optio
       _session(*this, std::move(now), options),
       _pause(kFirstPause) {}
 
-ModemSource::~ModemSource() = default;
-
 void ModemSource::findTechnology() {
     needAWhile();
     openLine();

@@ -19,7 +19,6 @@ class ModemSource final : public RecordSource, private wire::Session::Owner, pri
 public:
     /// `queue` outlives the source.
     ModemSource(std::unique_ptr<ModemLines> lines, wire::Session::Options options, MainQueue& queue, SteadyTime now);
-    ~ModemSource() override;
 
     /// Writes what the port gives to `file` as well, as it comes.
     void recordFramesTo(OutputFile file) { _frames = std::move(file); }

@@ -15,7 +15,7 @@
 ///                "Codes": [ { "Code": log code (none: without one), "Records": n, "PerSecond": real }, … ],
 ///                "Clients": [ { "Name": of the local port, "Streaming": boolean, "Delivered": n, "Waiting": n,
 ///                               "Dropped": n }, … ],
-///                "Trouble": text (only while something keeps the records from coming),
+///                "State": text (only while there is something to say),
 ///                "Port": what a modem's port has said and counted, by name (only for a modem at a port) }
 namespace kelvo {
 

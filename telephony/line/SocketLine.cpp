@@ -66,7 +66,7 @@ void SocketLine::mute() {
 }
 
 void SocketLine::read() {
-    for (int i = 0; i < kReadsPerTurn && !_muted; ++i) {
+    for (int i = 0; i < kReadsPerTurn && !_muted && _socket->isOpen(); ++i) {
         const qint64 size = _socket->read(reinterpret_cast<char*>(_buffer.data()), static_cast<qint64>(_buffer.size()));
         if (size <= 0) return;
         _listener.lineGave(std::span(_buffer).first(static_cast<std::size_t>(size)));

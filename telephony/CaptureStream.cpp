@@ -4,6 +4,7 @@
 #include <utility>
 
 #include "platform/system/Environment.h"
+#include "telephony/recordings/RecordingKind.h"
 
 namespace kelvo {
 namespace {
@@ -16,7 +17,7 @@ constexpr std::chrono::nanoseconds kLongestPause = 5s;
 
 Result<std::unique_ptr<CaptureStream>> CaptureStream::open(const std::filesystem::path& path, bool loop) {
     auto reader = CaptureReader::open(path);
-    if (!reader) return reader.error();
+    if (!reader) return Failure{whyNoCapture(path.string(), reader.error().reason)};
     const auto technology = reader->technology();
     if (!technology) return Failure{path.string() + ": its link type is none of a modem's log (147 to 151)"};
     return std::unique_ptr<CaptureStream>(new CaptureStream(path, std::move(reader).value(), *technology, loop));

@@ -20,7 +20,6 @@
 #include "platform/host/HostTelephonyClient.h"
 #include "platform/host/UnixSignals.h"
 #include "platform/system/Environment.h"
-#include "tools/CommandFailure.h"
 #include "tools/DisplayText.h"
 #include "tools/RetryLog.h"
 #include "tools/WatchView.h"
@@ -28,15 +27,6 @@
 namespace kelvo {
 
 namespace {
-
-Terminal* terminalToRestore = nullptr;  // for the terminate handler, which nothing can be handed to
-
-/// What ends the program, a record or a full disk, does so from within the event loop; the terminal must survive it.
-[[noreturn]] void endTidily() {
-    if (terminalToRestore != nullptr) terminalToRestore->leave();
-    fmt::print(stderr, "kelvoctl: the watch ends: {}\n", printable(currentExceptionText()));
-    std::_Exit(1);
-}
 
 /// The model and what the view shows of it.
 class Watch {
@@ -90,12 +80,10 @@ void ensureUtf8Locale() {
 class TerminalControl {
 public:
     TerminalControl() {
-        terminalToRestore = &_terminal;
         if (isatty(STDIN_FILENO) != 0) {
             _input.emplace(STDIN_FILENO, FdWatcher::For::Reading, [this] { readKeys(); });
         }
     }
-    ~TerminalControl() { terminalToRestore = nullptr; }
 
     TerminalWatchView& view() { return _view; }
     void resized() { _view.redraw(); }
@@ -135,7 +123,6 @@ void watch() {
     std::array<char*, 2> arguments{name.data(), nullptr};
     int count = 1;
     const QCoreApplication application(count, arguments.data());
-    std::set_terminate(endTidily);
 
     // The log would write into the picture, unless it is sent elsewhere.
     std::optional<HostSystemLog> log;

@@ -6,7 +6,7 @@
 
 namespace kelvo {
 
-/// A cell set of the UMTS searcher that stays empty, as intended: the searcher's record (0x417a) empties it and none of
+/// A cell set of the UMTS searcher that stays empty, as intended: the searcher's record empties it and none of
 /// its cells is taken in. `Derived` says with `kTraceWord` what each record writes to the log.
 template <class Derived>
 class EmptySet : public Section<Derived> {

@@ -8,7 +8,7 @@
 
 namespace kelvo {
 
-/// GSM neighbors, measured (0x5137) or as the cell-information array lists them.
+/// GSM neighbors, measured for reselection or as the cell-information array lists them.
 class NeighboringCells final : public Section<NeighboringCells> {
 public:
     static constexpr std::string_view kSectionName = "Neighboring Cells";
@@ -22,7 +22,7 @@ private:
     void keepIdentities(ByteView data);
     void showCellArray(ByteView data);
 
-    std::unordered_map<std::int64_t, std::int64_t> arfcnToBsic;  ///< of the last 0x51ff record
+    std::unordered_map<std::int64_t, std::int64_t> arfcnToBsic;  ///< of the last record with identities
 };
 
 }  // namespace kelvo

@@ -18,7 +18,7 @@ constexpr auto kServingCell = record(code::kUTRANServingCell, 26, {
     { 25, u8.bit(0), "Allowed Access",           flag("Emergency Calls Only", "All Calls")  },
 });
 
-constexpr CellField kCell[] = {  // 0xFF0001
+constexpr CellField kCell[] = {
     { kPLCellMonitorLAC,      "Local Area Code",      "Serving Cell Info: Failed to retrieve LAC\n"                  },
     { kPLCellMonitorCellId,   "Cell ID",              "Serving Cell Info: Failed to retrieve Cell ID\n"              },
     { kPLCellMonitorBandInfo, "Freq Band Indicator",  "Serving Cell Info: Failed to retrieve Freq Band Indicator\n"  },

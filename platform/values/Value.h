@@ -91,7 +91,7 @@ public:
     /// What a record reported here last; null for a value that no record's number stands behind.
     const Reading* reading() const {
         const auto* shown = std::get_if<ShownReading>(&_content);
-        return shown != nullptr ? &shown->reading : nullptr;
+        return shown != nullptr ? &shown->reading() : nullptr;
     }
     /// The reading's number in its unit; none without a reading, and for one that is no number.
     std::optional<Measurement> measurement() const;
@@ -103,8 +103,7 @@ public:
     /// Makes the value a string, whatever it was: the text of a reading.
     void set(const Reading& reading) {
         if (auto* shown = std::get_if<ShownReading>(&_content)) {
-            shown->reading = reading;
-            shown->text.clear();
+            shown->set(reading);
         } else {
             _content.emplace<ShownReading>(reading);
         }
@@ -117,16 +116,34 @@ public:
     friend bool operator==(const Value& a, const Value& b);
 
 private:
-    /// A reading and its text, which is empty until it is printed.
-    struct ShownReading {
-        explicit ShownReading(const Reading& shown) : reading(shown) {}
+    /// A reading and its text, which is none or empty until it is printed. The text lies outside, so that a reading
+    /// makes no other value larger; a copy prints its own.
+    class ShownReading {
+    public:
+        explicit ShownReading(const Reading& reading) : _reading(reading) {}
+        ShownReading(const ShownReading& other) : _reading(other._reading) {}
+        ShownReading(ShownReading&&) = default;
+        ShownReading& operator=(const ShownReading& other) {
+            set(other._reading);
+            return *this;
+        }
+        ShownReading& operator=(ShownReading&&) = default;
+        ~ShownReading() = default;
+
+        const Reading& reading() const { return _reading; }
+        void set(const Reading& reading) {
+            _reading = reading;
+            if (_text) _text->clear();
+        }
         const std::string& printed() const {
-            if (text.empty()) reading.quantity->print(text, reading.raw);
-            return text;
+            if (!_text) _text = std::make_unique<std::string>();
+            if (_text->empty()) _reading.quantity->print(*_text, _reading.raw);
+            return *_text;
         }
 
-        Reading reading;
-        mutable std::string text;
+    private:
+        Reading _reading;
+        mutable std::unique_ptr<std::string> _text;
     };
 
     static constexpr std::size_t kReading = 8;  // index of ShownReading, behind those of the kinds

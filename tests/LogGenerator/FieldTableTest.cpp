@@ -118,7 +118,7 @@ std::string measured(std::int64_t raw, const Shown& shown) {
 
 TEST(FieldTable, TellsTheNumberAndTheUnitBehindAText) {
     EXPECT_EQ(measured(179, linear(0.25, -140.0, "%4.2f", dBm)), "-95.25 dBm");
-    EXPECT_EQ(measured(1, linear(0.334, -63.248, "%+.2f", dBm)), "-62.914 dBm");
+    EXPECT_EQ(measured(0, linear(0.334, -63.248, "%+.2f", dBm)), "-63.248 dBm");
     EXPECT_EQ(measured(3, linear(0.5, 0.0, "%f", dB)), "1.5 dB");
     EXPECT_EQ(measured(10, whole(2, -140, dBm)), "-120 dBm");
     EXPECT_EQ(measured(4, whole(1, 0, inSeconds)), "4 s");

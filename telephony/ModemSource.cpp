@@ -93,7 +93,7 @@ void ModemSource::openLine() {
     if (_line || _waiting || _ending) return;
     auto line = _lines->next(*this, std::exchange(_ranBefore, false));
     if (!line) {
-        tell("it cannot be opened: " + line.error().reason);
+        if (_trouble.empty()) tell("it cannot be opened: " + line.error().reason);  // one that has gone is not there
         return retry();
     }
     _line = std::move(line).value();

@@ -1,5 +1,6 @@
 #include "LogGenerator/LogGenerator.h"
 
+#include "LogGenerator/SnapshotFormat.h"
 #include "platform/system/DateText.h"
 #include "platform/system/Environment.h"
 
@@ -23,19 +24,19 @@ void LogGenerator::updateHistoryInState(Dictionary& state) {
     }
 
     // The list of pairs ends at the first value that is absent: without a "DisplayState" the snapshot is empty.
-    const DictionaryRef snapshot = Dictionary::make();
+    const DictionaryRef taken = Dictionary::make();
     bool complete = true;
-    for (const Key key : {Key("DisplayState"), Key("Display"), Key("ExtraInfo")}) {
+    for (const Key key : {Key(snapshot::kDisplayState), Key(snapshot::kDisplay), Key(snapshot::kExtraInfo)}) {
         const Value& value = state[key];
         complete = complete && static_cast<bool>(value);
-        if (complete) snapshot->set(key, value.copy());
+        if (complete) taken->set(key, value.copy());
     }
     if (complete) {
         const std::string date = dateDescription(clock().now());
-        snapshot->set("Date", date);
-        snapshot->set("Description", "Snapshot (" + date + ")");
+        taken->set(snapshot::kDate, date);
+        taken->set(snapshot::kDescription, "Snapshot (" + date + ")");
     }
-    history->append(snapshot);
+    history->append(taken);
 }
 
 }  // namespace kelvo

@@ -4,6 +4,7 @@
 
 #include <utility>
 
+#include "LogGenerator/SnapshotFormat.h"
 #include "platform/system/Environment.h"
 
 namespace kelvo {
@@ -39,9 +40,9 @@ std::optional<Bytes> OSKLogGenerator::generateDlfFromState(const Dictionary& sta
 
     const ArrayRef& history = state["History"].array();
     for (std::size_t i = 0; history && i < history->size(); ++i) {
-        const DictionaryRef& snapshot = (*history)[i].dictionary();
-        if (!snapshot || !(*snapshot)["DisplayState"]) continue;
-        const Bytes* raw = (*snapshot)["DisplayState"].data();
+        const DictionaryRef& taken = (*history)[i].dictionary();
+        if (!taken || !(*taken)[snapshot::kDisplayState]) continue;
+        const Bytes* raw = (*taken)[snapshot::kDisplayState].data();
         if (raw == nullptr) {
             logLine(Level::DlfWriter, "Got wrong class writing history to DLF; aborting writing the DLF file");
             return std::nullopt;
@@ -57,7 +58,7 @@ ArrayRef OSKLogGenerator::getSaveContentsFromState(Dictionary& state) {
     const ArrayRef contents = history ? std::make_shared<Array>(*history) : Array::make();
     if (std::optional<Bytes> dlf = generateDlfFromState(state)) {
         const std::string description = fmt::sprintf("DLF binary (%d bytes)", dlf->size());
-        contents->append(Dictionary::make({{"Description", description}, {"DLF", std::move(*dlf)}}));
+        contents->append(Dictionary::make({{snapshot::kDescription, description}, {snapshot::kDLF, std::move(*dlf)}}));
     }
     return contents;
 }

@@ -2,30 +2,16 @@
 
 #include <fmt/printf.h>
 
-#include <array>
-#include <ctime>
-
 #include "platform/encodings/PropertyList.h"
+#include "platform/system/DateText.h"
 
 namespace kelvo {
-namespace {
-
-std::string utcText(Clock::TimePoint time) {
-    const std::time_t seconds = std::chrono::system_clock::to_time_t(time);
-    std::tm broken{};
-    gmtime_r(&seconds, &broken);
-    std::array<char, 64> text{};
-    const std::size_t length = std::strftime(text.data(), text.size(), "%Y-%m-%d %H:%M:%S +0000", &broken);
-    return {text.data(), length};
-}
-
-}  // namespace
 
 DictionaryRef Snapshot::dictionary() const {
-    DictionaryRef dictionary = Dictionary::make({{"Timestamp", utcText(timestamp)}});
+    DictionaryRef dictionary = Dictionary::make({{snapshot::kTimestamp, utcDateDescription(timestamp)}});
     if (!data) return dictionary;
-    dictionary->set("Data", data);
-    if (description) dictionary->set("Description", *description);
+    dictionary->set(snapshot::kData, data);
+    if (description) dictionary->set(snapshot::kDescription, *description);
     return dictionary;
 }
 

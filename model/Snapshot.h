@@ -4,6 +4,7 @@
 #include <string>
 #include <string_view>
 
+#include "LogGenerator/SnapshotFormat.h"
 #include "platform/system/Clock.h"
 #include "platform/values/Bytes.h"
 #include "platform/values/Result.h"
@@ -12,14 +13,14 @@
 namespace kelvo {
 
 /// One saved snapshot: when it was taken, the contents a generator hands out, and what the user says about it.
-/// The file ends at the first part that is absent: without `data` it holds the time alone, without a description the
+/// LogGenerator/SnapshotFormat.h says what the file holds: without `data` the time alone, without a description the
 /// time and the data.
 struct Snapshot {
     Clock::TimePoint timestamp;
     ArrayRef data;
     std::optional<std::string> description;
 
-    /// The dictionary "Timestamp" (UTC, "2011-03-04 09:15:02 +0000"), "Data", "Description".
+    /// The file's one dictionary.
     DictionaryRef dictionary() const;
     /// The file's bytes, an XML property list.
     Result<Bytes> propertyList() const;

@@ -10,9 +10,12 @@
 namespace kelvo {
 
 /// A dictionary of the service's own making, as the bytes of a reply.
-inline Bytes encodeAnswer(std::initializer_list<std::pair<std::string_view, Value>> entries) {
-    auto encoded = writeXmlPropertyList(Dictionary::make(entries));
+inline Bytes encodeAnswer(const DictionaryRef& answer) {
+    auto encoded = writeXmlPropertyList(answer);
     return encoded ? std::move(encoded).value() : Bytes{};
+}
+inline Bytes encodeAnswer(std::initializer_list<std::pair<std::string_view, Value>> entries) {
+    return encodeAnswer(Dictionary::make(entries));
 }
 
 /// The reply that names an error of the service.

@@ -4,6 +4,7 @@
 #include <utility>
 
 #include "platform/system/Environment.h"
+#include "telephony/recordings/RecordingKind.h"
 
 namespace kelvo {
 namespace {
@@ -16,7 +17,7 @@ constexpr std::chrono::nanoseconds kLongestPause = 5s;
 
 Result<std::unique_ptr<CaptureStream>> CaptureStream::open(const std::filesystem::path& path, bool loop) {
     auto reader = CaptureReader::open(path);
-    if (!reader) return reader.error();
+    if (!reader) return Failure{whyNoCapture(path.string(), reader.error().reason)};
     const auto technology = reader->technology();
     if (!technology) return Failure{path.string() + ": its link type is none of a modem's log (147 to 151)"};
     return std::unique_ptr<CaptureStream>(new CaptureStream(path, std::move(reader).value(), *technology, loop));
@@ -25,6 +26,7 @@ Result<std::unique_ptr<CaptureStream>> CaptureStream::open(const std::filesystem
 std::optional<CapturePacket> CaptureStream::next() {
     auto packet = readPacket();
     if (!packet && _loop && _packets > 0 && beginNextPass()) packet = readPacket();
+    _ended = !packet;
     if (packet) packet->time = place(packet->time);
     return packet;
 }
@@ -32,14 +34,14 @@ std::optional<CapturePacket> CaptureStream::next() {
 std::optional<CapturePacket> CaptureStream::readPacket() {
     auto read = _reader.next();
     if (read) return *read;
-    if (!std::exchange(_toldFailure, true)) logLine(Level::Error, read.error().reason);
+    tell(read.error());
     return std::nullopt;
 }
 
 bool CaptureStream::beginNextPass() {
     auto reader = CaptureReader::open(_path);
     if (!reader) {
-        logLine(Level::Error, reader.error().reason);
+        tell(reader.error());
         return false;
     }
     _reader = std::move(reader).value();
@@ -48,6 +50,18 @@ bool CaptureStream::beginNextPass() {
     _played = 0ns;
     _firstPass = false;
     return true;
+}
+
+// Once, however often the capture is played.
+void CaptureStream::tell(const Failure& failure) {
+    if (failure.reason == _failure) return;
+    _failure = failure.reason;
+    logLine(Level::Error, _failure);
+}
+
+std::string CaptureStream::state() const {
+    if (!_ended) return _failure;  // of the pass before
+    return _failure.empty() ? "the capture has ended" : "the capture has ended: " + _failure;
 }
 
 CaptureTime CaptureStream::place(CaptureTime captured) {

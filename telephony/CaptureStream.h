@@ -19,6 +19,7 @@ public:
 
     Technology technology() const override { return _technology; }
     std::string description() const override { return "the capture " + _path.string(); }
+    std::string state() const override;
     std::optional<CapturePacket> next() override;
 
 private:
@@ -28,6 +29,7 @@ private:
         : _path(std::move(path)), _reader(std::move(reader)), _technology(technology), _loop(loop) {}
     std::optional<CapturePacket> readPacket();
     bool beginNextPass();
+    void tell(const Failure& failure);
     CaptureTime place(CaptureTime captured);
     nanoseconds typicalInterval() const;
 
@@ -40,7 +42,8 @@ private:
     nanoseconds _played{0};  // of this pass
     std::size_t _packets = 0;
     bool _firstPass = true;
-    bool _toldFailure = false;
+    bool _ended = false;   // the last packet has been given
+    std::string _failure;  // why no more could be read of it; empty: nothing went wrong
 };
 
 }  // namespace kelvo

@@ -14,14 +14,14 @@ constexpr int kRecordsPerTurn = 512;
 
 }  // namespace
 
-LogChannel::LogChannel(Technology technology, std::string clientName, std::unique_ptr<RemotePort> client, Owner& owner,
-                       ClientQueue::Limits limits)
+LogChannel::LogChannel(std::optional<Technology> technology, std::string clientName, std::unique_ptr<RemotePort> client,
+                       Owner& owner, ClientQueue::Limits limits)
     : _technology(technology),
       _clientName(std::move(clientName)),
       _client(std::move(client)),
       _owner(owner),
       _queue(limits) {
-    if (!hasCodes(technology)) _filter.passEverything();
+    settleTechnology();
     _client->setInvalidationCallback([this](RemotePort&) { _owner.channelLostClient(*this); });
 }
 
@@ -45,8 +45,22 @@ Bytes LogChannel::handle(std::int32_t id, ByteView message) {
         _streaming = true;
         _owner.channelStreams(*this);
     }
-    if (!command->getTechnology) return {};
-    return encodeAnswer({{kPLGetTechnology, namesOf(_technology).identifier}});
+    if (_streaming) _owner.channelWants(*this);
+    return command->getTechnology ? answerTechnology() : Bytes();
+}
+
+// A client that is told an error asks again, on a channel of its own.
+Bytes LogChannel::answerTechnology() {
+    if (!_technology) {
+        _technology = _owner.technologyForChannel();
+        settleTechnology();
+    }
+    if (!_technology) return errorAnswer(kPLErrorTechnologyUnknown);
+    return encodeAnswer({{kPLGetTechnology, namesOf(*_technology).identifier}});
+}
+
+void LogChannel::settleTechnology() {
+    if (_technology && !hasCodes(*_technology)) _filter.passEverything();
 }
 
 Bytes LogChannel::refuse(const std::string& reason) {

@@ -1,6 +1,7 @@
 #pragma once
 
 #include <memory>
+#include <optional>
 #include <string>
 
 #include "platform/system/MessagePorts.h"
@@ -19,14 +20,17 @@ public:
     class Owner {
     public:
         virtual ~Owner() = default;
+        /// What the client is told, for the life of its channel; none: it is not known yet, and is being found out.
+        virtual std::optional<Technology> technologyForChannel() = 0;
         virtual void channelStreams(LogChannel& channel) = 0;     ///< the client asked for its stream
+        virtual void channelWants(LogChannel& channel) = 0;       ///< it streams, and what it wants may be new
         virtual void channelIsHungry(LogChannel& channel) = 0;    ///< the client has caught up
         virtual void channelLostClient(LogChannel& channel) = 0;  ///< to be destroyed, at once or later
     };
 
     /// A channel for the client whose local port is called `clientName` and reached by `client`.
-    LogChannel(Technology technology, std::string clientName, std::unique_ptr<RemotePort> client, Owner& owner,
-               ClientQueue::Limits limits);
+    LogChannel(std::optional<Technology> technology, std::string clientName, std::unique_ptr<RemotePort> client,
+               Owner& owner, ClientQueue::Limits limits);
     ~LogChannel();
     LogChannel(const LogChannel&) = delete;
     LogChannel& operator=(const LogChannel&) = delete;
@@ -41,6 +45,7 @@ public:
     bool take(ByteView record);
 
     bool isStreaming() const { return _streaming; }
+    const RecordFilter& filter() const { return _filter; }
     std::size_t delivered() const { return _delivered; }        ///< records that are on their way to the client
     std::size_t waiting() const { return _queue.size(); }       ///< records that the client must make room for first
     std::size_t dropped() const { return _queue.lostInAll(); }  ///< records that it was too slow for
@@ -48,11 +53,13 @@ public:
 private:
     Bytes handle(std::int32_t id, ByteView message);
     Bytes refuse(const std::string& reason);
+    Bytes answerTechnology();
+    void settleTechnology();
     void flush();
     bool send(ByteView record);
     void tellLost();
 
-    const Technology _technology;
+    std::optional<Technology> _technology;  // none: the client has not been told yet
     const std::string _clientName;
     const std::unique_ptr<RemotePort> _client;
     Owner& _owner;

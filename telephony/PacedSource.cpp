@@ -62,8 +62,7 @@ bool PacedSource::readNext() {
 }
 
 void PacedSource::give() {
-    if (_sink->take(_next->bytes)) {
-        if (_recording) _recording->append(technology(), *_next);
+    if (hand(*_sink, *_next)) {
         _refused = 0;
     } else if (++_refused == kRefusedBeforeRest) {
         _refused = 0;

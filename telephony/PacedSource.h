@@ -9,7 +9,6 @@
 #include "platform/system/SteadyTime.h"
 #include "telephony/RecordSource.h"
 #include "telephony/RecordStream.h"
-#include "telephony/Recording.h"
 
 namespace kelvo {
 
@@ -23,11 +22,9 @@ public:
     /// `queue` outlives the source.
     PacedSource(std::unique_ptr<RecordStream> stream, Speed speed, MainQueue& queue, SteadyTime now);
 
-    /// Writes every record that a client takes to `recording` as well, with its time in the stream.
-    void recordTo(Recording recording) { _recording = std::move(recording); }
-
-    Technology technology() const override { return _stream->technology(); }
+    std::optional<Technology> technology() const override { return _stream->technology(); }
     std::string description() const override { return _stream->description(); }
+    std::string state() const override { return _stream->state(); }
     void start(RecordSink& sink) override;
     void feed() override;
 
@@ -44,7 +41,6 @@ private:
     const Speed _speed;
     MainQueue& _queue;
     const SteadyTime _now;
-    std::optional<Recording> _recording;
     RecordSink* _sink = nullptr;
     std::optional<CapturePacket> _next;  // read and not yet given
     std::optional<CaptureTime> _last;    // the time of the packet read last

@@ -24,6 +24,9 @@ public:
     void setOrdinaryCodes(std::shared_ptr<const Codes> codes) { _ordinary = std::move(codes); }
     void setExtendedCodes(std::shared_ptr<const Codes> codes) { _extended = std::move(codes); }
 
+    /// None: no code.
+    const std::shared_ptr<const Codes>& ordinaryCodes() const { return _ordinary; }
+
     /// A record too short to hold a code has none, and nobody can have asked for it.
     bool passes(ByteView record) const;
 

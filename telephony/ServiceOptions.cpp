@@ -29,6 +29,20 @@ PacedSource::Speed speedOf(const std::string& text) {
     return text == "max" ? std::nullopt : std::optional(std::stod(text));
 }
 
+// "auto" is none: listen to the modem.
+std::string checkPortTechnology(const std::string& word) {
+    if (word == "auto") return {};
+    if (word == "ifx") return "ifx is not to be had at a port";
+    if (technologyBy(&TechnologyNames::word, std::string_view(word))) return {};
+    return fmt::format("{} is none of gsm, cdma, lte, utran, auto", word);
+}
+
+PortAddress portOf(const std::string& text, bool remote) {
+    auto address = PortAddress::parse(text, remote);
+    if (!address) throw CLI::ValidationError("--port", address.error().reason);
+    return std::move(address).value();
+}
+
 std::uint64_t seedOf(const std::string& text) {
     const auto seed = wholeNumber(text);
     if (!seed) throw CLI::ValidationError("--seed", seed.error().reason);
@@ -41,8 +55,13 @@ ParsedOptions parseServiceOptions(int argc, const char* const* argv) {
     ServiceOptions options;
     std::string word;
     std::string speed = "1";
-    CLI::App app("Telephony service: gives Kelvo the log of a baseband modem, replayed from a capture or simulated.",
-                 "kelvo-telephonyd");
+    std::string port;
+    std::string portTechnology = "auto";
+    bool remote = false;
+    CLI::App app(
+        "Telephony service: gives Kelvo the log of a baseband modem: a real one, simulated, or replayed from a "
+        "capture.",
+        "kelvo-telephonyd");
     app.footer(
         "A capture is a pcap file whose link type names the technology: 147 IFX, 148 GSM/UMTS, 149 CDMA, 150 LTE,\n"
         "151 UTRAN. The replay starts with the first client and keeps the time between packets; pauses of more than\n"
@@ -60,6 +79,11 @@ ParsedOptions parseServiceOptions(int argc, const char* const* argv) {
     auto* status = source->add_flag("--status", options.status,
                                     "Tell what the service that runs is doing, and end: its source, records per\n"
                                     "second by log code, clients and the records they were too slow for");
+    auto* modem = source
+                      ->add_option("--port", port,
+                                   "A modem's diagnostic port: the node of one that is plugged in, a serial node or\n"
+                                   "device, or the socket that a router on the phone offers")
+                      ->type_name("auto|PATH|tcp:HOST:PORT|unix:PATH");
     source->require_option(1);
     auto* loop = app.add_flag("--loop", options.loop, "Start the capture again after its last packet");
     auto* seed = app.add_option_function<std::string>(
@@ -75,14 +99,37 @@ ParsedOptions parseServiceOptions(int argc, const char* const* argv) {
     auto* record =
         app.add_option("--record", options.record, "Write every record that a client takes to this capture as well")
             ->type_name("FILE");
-    auto* force = app.add_flag("--force", options.force, "Let the recording replace a file that is there already");
+    auto* recordFrames =
+        app.add_option("--record-frames", options.recordFrames, "Write what the port gives to this file, as it comes")
+            ->type_name("FILE");
+    auto* technology = app.add_option("--technology", portTechnology,
+                                      "What the clients are shown of the modem; auto listens to what it is camped on")
+                           ->type_name("gsm|cdma|lte|utran|auto")
+                           ->check(checkPortTechnology)
+                           ->capture_default_str();
+    auto* subscription = app.add_option("--subscription", options.session.subscription,
+                                        "Which SIM is shown, from 1; otherwise the first that sends")
+                             ->type_name("N")
+                             ->check(CLI::Range(1, 255));
+    auto* allowRemote =
+        app.add_flag("--allow-remote", remote, "Let tcp: lead to other machines: whoever is in between is trusted");
+    auto* noLines = app.add_flag(
+        "--no-dtr-rts", [&options](std::int64_t) { options.line.controlLines = false; },
+        "Leave a serial port's lines DTR and RTS off");
+    auto* json = app.add_flag("--json", options.json, "The status as one JSON object");
+    app.add_flag("--force", options.force, "Let a recording replace a file that is there already");
     app.set_version_flag("--version", "kelvo-telephonyd " KELVO_VERSION);
     loop->needs(replay);
     seed->needs(simulate);
-    force->needs(record);
+    json->needs(status);
+    for (auto* option : {technology, subscription, allowRemote, noLines, recordFrames}) option->needs(modem);
+    pace->excludes(modem);
     for (auto* option : {pace, record}) option->excludes(status);
     try {
         app.parse(argc, argv);
+        if (options.force && options.record.empty() && options.recordFrames.empty())
+            throw CLI::RequiresError("--force", "--record or --record-frames");
+        if (modem->count() > 0) options.port = portOf(port, remote);
     } catch (const CLI::CallForHelp&) {
         fmt::print("{}", app.help());
         return {std::nullopt, 0};
@@ -93,6 +140,7 @@ ParsedOptions parseServiceOptions(int argc, const char* const* argv) {
         fmt::print(stderr, "kelvo-telephonyd: {}\n", error.what());
         return {std::nullopt, 1};
     }
+    options.session.technology = technologyBy(&TechnologyNames::word, std::string_view(portTechnology));
     if (simulate->count() > 0) options.simulate = *technologyBy(&TechnologyNames::word, std::string_view(word));
     options.speed = speedOf(speed);
     return {options, 0};

@@ -5,19 +5,27 @@
 #include <optional>
 
 #include "telephony/PacedSource.h"
+#include "telephony/line/PortAddress.h"
+#include "telephony/line/SerialLine.h"
+#include "telephony/wire/Session.h"
 
 namespace kelvo {
 
 /// What the command line of the service asks for.
 struct ServiceOptions {
     bool status = false;           ///< ask the service that runs, instead of being one
-    std::filesystem::path replay;  ///< a capture; empty: a simulation
+    bool json = false;             ///< its status is for a program
+    std::filesystem::path replay;  ///< a capture; empty: a simulation or a port
     bool loop = false;
     Technology simulate = Technology::LTE;
     std::uint64_t seed = 1;
     PacedSource::Speed speed = 1.0;
-    std::filesystem::path record;  ///< empty: nothing is recorded
-    bool force = false;            ///< a file that is there gives way to the recording
+    std::optional<PortAddress> port;  ///< none: a capture or a simulation
+    wire::Session::Options session;
+    SerialLine::Options line;
+    std::filesystem::path recordFrames;  ///< empty: the port's bytes are not recorded
+    std::filesystem::path record;        ///< empty: nothing is recorded
+    bool force = false;                  ///< a file that is there gives way to the recording
 };
 
 /// Options to work with, or the status to exit with at once.

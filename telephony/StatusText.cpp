@@ -2,7 +2,10 @@
 
 #include <fmt/format.h>
 
+#include <nlohmann/json.hpp>
+
 #include "LogGenerator/CodeNames.h"
+#include "telephony/PortStatus.h"
 
 namespace kelvo {
 namespace {
@@ -41,7 +44,28 @@ std::string linesOf(const ArrayRef& entries, Line line) {
     return text.empty() ? "  none\n" : text;
 }
 
+nlohmann::ordered_json jsonOf(const Value& value) {
+    if (const std::string* text = value.string()) return *text;
+    if (const bool* boolean = value.boolean()) return *boolean;
+    if (const Number* number = value.number()) {
+        if (number->isReal()) return number->real();
+        return number->integer();
+    }
+    auto json = value.array() ? nlohmann::ordered_json::array() : nlohmann::ordered_json::object();
+    if (value.array()) {
+        for (const Value& element : *value.array()) json.push_back(jsonOf(element));
+    } else if (value.dictionary()) {
+        for (const Dictionary::Entry& entry : *value.dictionary()) json[entry.key] = jsonOf(entry.value);
+    }
+    return json;
+}
+
 }  // namespace
+
+Result<std::string> statusJson(const Value& answer) {
+    if (!answer.dictionary()) return Failure{"the answer is no dictionary"};
+    return jsonOf(answer).dump(2, ' ', true, nlohmann::ordered_json::error_handler_t::replace) + "\n";
+}
 
 Result<std::string> statusText(const Value& answer) {
     if (!answer.dictionary()) return Failure{"the answer is no dictionary"};
@@ -49,9 +73,12 @@ Result<std::string> statusText(const Value& answer) {
     const ArrayRef& codes = status["Codes"].array();
     const ArrayRef& clients = status["Clients"].array();
     if (!codes || !clients) return Failure{"the answer is no status"};
-    return fmt::format("Source      {}\nTechnology  {}\nRecords     {}\n\n  {:<46}{:>11}{:>14}\n{}\nClients\n{}",
-                       textOf(status, "Source"), textOf(status, "Technology"), integerOf(status, "Records"), "Log code",
-                       "per second", "in all", linesOf(codes, codeLine), linesOf(clients, clientLine));
+    const std::string state = status["State"] ? fmt::format("State       {}\n", textOf(status, "State")) : "";
+    const DictionaryRef& port = status["Port"].dictionary();
+    return fmt::format("Source      {}\n{}Technology  {}\nRecords     {}\n\n  {:<46}{:>11}{:>14}\n{}\nClients\n{}{}",
+                       textOf(status, "Source"), state, textOf(status, "Technology"), integerOf(status, "Records"),
+                       "Log code", "per second", "in all", linesOf(codes, codeLine), linesOf(clients, clientLine),
+                       port ? portStatusText(*port) : "");
 }
 
 }  // namespace kelvo

@@ -48,7 +48,10 @@ TelephonyService::TelephonyService(MessagePorts& ports, RecordSource& source, Li
 Result<void> TelephonyService::open() {
     auto made = _ports.createLocal(kPLTelephonyServicePort,
                                    [this](std::int32_t id, ByteView message) { return handle(id, message); });
-    if (made.alreadyExisted) return Failure{"another telephony service is running"};
+    if (made.alreadyExisted) {
+        return Failure{"another telephony service is running" +
+                       (made.owner > 0 ? fmt::format(" (process {})", made.owner) : "")};
+    }
     if (!made.port) return Failure{fmt::format("cannot make the port {}", kPLTelephonyServicePort)};
     _controlPort = std::move(made.port);
     _controlPort->schedule();
@@ -72,15 +75,20 @@ Bytes TelephonyService::status() const {
     }
     const auto clients = Array::make({});
     for (const LogChannel& channel : _channels) clients->append(describe(channel));
-    return encodeAnswer({{"Source", _source.description()},
-                         {"Technology", namesOf(_source.technology()).name},
-                         {"Records", static_cast<std::int64_t>(records)},
-                         {"Codes", codes},
-                         {"Clients", clients}});
+    const auto technology = _source.technology();
+    const auto answer = Dictionary::make({{"Source", _source.description()},
+                                          {"Technology", technology ? namesOf(*technology).name : "not known yet"},
+                                          {"Records", static_cast<std::int64_t>(records)},
+                                          {"Codes", codes},
+                                          {"Clients", clients}});
+    if (auto state = _source.state(); !state.empty()) answer->set("State", std::move(state));
+    if (auto port = _source.portStatus()) answer->set("Port", std::move(port));
+    return encodeAnswer(answer);
 }
 
 Bytes TelephonyService::createLogChannel(const std::string& clientName) {
     _channels.remove_if([](const LogChannel& channel) { return !channel.hasClient(); });  // it may be back already
+    tellWishes();
     if (!hasRoomFor(clientName)) return refuse(kPLErrorTooManyChannels, "there are too many");
     // The service must not deliver to itself.
     auto client = clientName.starts_with(kPLTelephonyServicePort) ? nullptr : _ports.openRemote(clientName);
@@ -103,7 +111,8 @@ bool TelephonyService::hasRoomFor(const std::string& clientName) const {
 }
 
 bool TelephonyService::take(ByteView record) {
-    _rates.count(hasCodes(_source.technology()) ? codeOf(record) : std::nullopt);
+    const auto technology = _source.technology();
+    _rates.count(!technology || hasCodes(*technology) ? codeOf(record) : std::nullopt);
     bool taken = false;
     for (LogChannel& channel : _channels) taken |= channel.take(record);
     return taken;
@@ -114,15 +123,35 @@ bool TelephonyService::isHungry() const {
                        [](const LogChannel& channel) { return channel.isHungry(); });
 }
 
+std::optional<Technology> TelephonyService::technologyForChannel() {
+    if (!_source.technology()) _source.findTechnology();
+    return _source.technology();
+}
+
 void TelephonyService::channelStreams(LogChannel&) {
     if (std::exchange(_started, true)) return _source.feed();
     _source.start(*this);
 }
 
+void TelephonyService::channelWants(LogChannel&) { tellWishes(); }
+
 void TelephonyService::channelIsHungry(LogChannel&) { _source.feed(); }
 
 void TelephonyService::channelLostClient(LogChannel& channel) {
     _channels.remove_if([&](const LogChannel& other) { return &other == &channel; });
+    tellWishes();
+}
+
+void TelephonyService::tellWishes() {
+    ClientsWishes wishes;
+    for (const LogChannel& channel : _channels) {
+        if (!channel.isStreaming() || !channel.hasClient()) continue;
+        wishes.streaming = true;
+        if (const auto& codes = channel.filter().ordinaryCodes()) wishes.ordinary |= *codes;
+    }
+    if (wishes == _wishes) return;
+    _wishes = wishes;
+    _source.clientsWant(_wishes);
 }
 
 }  // namespace kelvo

@@ -35,10 +35,13 @@ private:
     Bytes status() const;
     Bytes createLogChannel(const std::string& clientName);
     bool hasRoomFor(const std::string& clientName) const;
+    void tellWishes();
 
     bool take(ByteView record) override;
     bool isHungry() const override;
+    std::optional<Technology> technologyForChannel() override;
     void channelStreams(LogChannel& channel) override;
+    void channelWants(LogChannel& channel) override;
     void channelIsHungry(LogChannel& channel) override;
     void channelLostClient(LogChannel& channel) override;
 
@@ -49,6 +52,7 @@ private:
     std::unique_ptr<LocalPort> _controlPort;
     std::list<LogChannel> _channels;
     unsigned _channelsMade = 0;
+    ClientsWishes _wishes;  // as the source knows them
     bool _started = false;
 };
 

@@ -4,6 +4,7 @@
 
 #include <QCoreApplication>
 #include <chrono>
+#include <utility>
 
 #include "platform/encodings/PropertyList.h"
 #include "platform/host/HostEventLoop.h"
@@ -14,10 +15,12 @@
 #include "platform/system/Environment.h"
 #include "platform/telephony/TelephonyProtocol.h"
 #include "telephony/CaptureStream.h"
+#include "telephony/ModemSource.h"
 #include "telephony/ServiceOptions.h"
 #include "telephony/SimulationStream.h"
 #include "telephony/StatusText.h"
 #include "telephony/TelephonyService.h"
+#include "telephony/line/HostModemLines.h"
 
 namespace {
 
@@ -37,26 +40,54 @@ Result<std::unique_ptr<RecordStream>> openStream(const ServiceOptions& options) 
     return std::unique_ptr<RecordStream>(std::move(capture).value());
 }
 
+Result<std::unique_ptr<RecordSource>> openPort(const ServiceOptions& options, MainQueue& queue) {
+    auto lines = std::make_unique<HostModemLines>(*options.port, options.line);
+    auto source = std::make_unique<ModemSource>(std::move(lines), options.session, queue, steadyNow);
+    if (!options.recordFrames.empty()) {
+        auto file = OutputFile::create(options.recordFrames, {.replace = options.force});
+        if (!file) return file.error();
+        source->recordFramesTo(std::move(file).value());
+    }
+    return std::unique_ptr<RecordSource>(std::move(source));
+}
+
+Result<std::unique_ptr<RecordSource>> openSource(const ServiceOptions& options, MainQueue& queue) {
+    if (options.port) return openPort(options, queue);
+    auto stream = openStream(options);
+    if (!stream) return stream.error();
+    return std::unique_ptr<RecordSource>(
+        std::make_unique<PacedSource>(std::move(stream).value(), options.speed, queue, steadyNow));
+}
+
+void tellSource(const RecordSource& source) {
+    const auto technology = source.technology();
+    logLine(Level::Notice, "Serving %s%s", source.description(),
+            technology ? fmt::format(", the log of a modem that speaks {}", namesOf(*technology).name) : "");
+}
+
 int serve(const ServiceOptions& options) {
     HostMainQueue queue;
     HostMessagePorts ports;
-    auto stream = openStream(options);
-    if (!stream) return fail(stream.error());
-    PacedSource source(std::move(stream).value(), options.speed, queue, steadyNow);
+    const auto opened = openSource(options, queue);
+    if (!opened) return fail(opened.error());
+    RecordSource& source = **opened;
     if (!options.record.empty()) {
         auto file = OutputFile::create(options.record, {.replace = options.force, .beingRead = {options.replay}});
         if (!file) return fail(file.error());
         source.recordTo(Recording(std::move(file).value()));
     }
-    const UnixSignals handler({SIGINT, SIGTERM, SIGHUP}, [](int) { QCoreApplication::quit(); });
+    bool ending = false;  // the second signal does not wait for the modem
+    const UnixSignals handler({SIGINT, SIGTERM, SIGHUP}, [&](int) {
+        if (std::exchange(ending, true)) return QCoreApplication::quit();
+        source.end([] { QCoreApplication::quit(); });
+    });
     TelephonyService service(ports, source);
-    if (const auto opened = service.open(); !opened) return fail(opened.error());
-    logLine(Level::Notice, "Serving %s, the log of a modem that speaks %s", source.description(),
-            namesOf(source.technology()).name);
+    if (const auto made = service.open(); !made) return fail(made.error());
+    tellSource(source);
     return HostEventLoop::run(QCoreApplication::exec);
 }
 
-int tellStatus() {
+int tellStatus(bool json) {
     HostMessagePorts ports;
     const auto port = ports.openRemote(kPLTelephonyServicePort);
     if (!port) return fail({"no telephony service is running"});
@@ -65,7 +96,7 @@ int tellStatus() {
     if (!answer) return fail({"the telephony service does not answer"});
     const auto read = readPropertyList(*answer);
     if (!read) return fail(read.error());
-    const auto text = statusText(*read);
+    const auto text = json ? statusJson(*read) : statusText(*read);
     if (!text) return fail(text.error());
     fmt::print("{}", *text);
     return 0;
@@ -80,5 +111,5 @@ int main(int argc, char** argv) {
     const bool inTerminal = ::isatty(STDERR_FILENO) != 0;
     HostSystemLog log("kelvo-telephonyd", inTerminal ? HostSystemLog::To::StandardError : HostSystemLog::To::System);
     const Environment::Scope environment(Environment{.log = &log});
-    return parsed.options->status ? tellStatus() : serve(*parsed.options);
+    return parsed.options->status ? tellStatus(parsed.options->json) : serve(*parsed.options);
 }

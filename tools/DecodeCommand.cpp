@@ -12,6 +12,7 @@
 #include "platform/host/Capture.h"
 #include "platform/system/Environment.h"
 #include "platform/system/OutputFile.h"
+#include "telephony/recordings/RecordingKind.h"
 #include "tools/CommandFailure.h"
 #include "tools/DisplayJson.h"
 #include "tools/DisplayText.h"
@@ -141,7 +142,9 @@ void warnOfOtherFamily(const Options& options, const Decoded& decoded, const Cap
 }
 
 void decode(const Options& options) {
-    CaptureReader reader = orFail(CaptureReader::open(options.file));
+    auto opened = CaptureReader::open(options.file);
+    if (!opened) throw CommandFailure(whyNoCapture(options.file, opened.error().reason));
+    CaptureReader& reader = *opened;
     const TechnologyNames& names = namesOf(technologyOf(options, reader));
     std::optional<OutputFile> output;
     if (options.save) output = orFail(OutputFile::create(*options.save, {options.force, {options.file}}));

@@ -1,21 +1,13 @@
 #include "tools/DoctorCommand.h"
 
-#include <fmt/format.h>
-#include <pwd.h>
-#include <unistd.h>
-
 #include <QCoreApplication>
-#include <QDBusConnection>
-#include <QDBusConnectionInterface>
-#include <algorithm>
 #include <memory>
 
-#include "telephony/wire/CandidateFinder.h"
 #include "tools/CommandFailure.h"
 #include "tools/DisplayJson.h"
 #include "tools/StandardOutput.h"
 #include "tools/doctor/Doctor.h"
-#include "tools/doctor/ProbePlace.h"
+#include "tools/doctor/SystemInputs.h"
 
 namespace kelvo {
 
@@ -27,25 +19,6 @@ struct Options {
     bool json = false;
     bool rule = false;
 };
-
-bool modemManagerRuns() {
-    const QDBusConnectionInterface* const bus = QDBusConnection::systemBus().interface();
-    return bus != nullptr && bus->isServiceRegistered("org.freedesktop.ModemManager1");
-}
-
-std::string userName() {
-    const passwd* const entry = ::getpwuid(::getuid());
-    return entry != nullptr ? entry->pw_name : "$USER";
-}
-
-DoctorInputs systemInputs() {
-    return {.candidates = wire::findCandidates,
-            .access = [](const std::string& path) { return accessTo(path); },
-            .holders = [](const std::string& path) { return holdersOf(path, "/proc"); },
-            .modemManagerRuns = modemManagerRuns,
-            .probe = probePlace,
-            .user = userName()};
-}
 
 // Of the first port that may be a diagnostic one, or of the one that was named.
 std::string ruleFor(const Findings& findings) {

@@ -3,6 +3,7 @@
 #include <algorithm>
 
 #include "LogGenerator/Framing.h"
+#include "platform/telephony/LogChannelProtocol.h"
 #include "platform/values/Array.h"
 
 namespace kelvo {
@@ -22,8 +23,8 @@ void append(std::vector<LogCode>& codes, const Value& list, LogCode space) {
 }  // namespace
 
 FamilyCodes::FamilyCodes(const Dictionary& startCommand) {
-    const Value& ordinary = startCommand["SetOskraLogCodes"];
-    const Value& extended = startCommand["SetPlExtraCodes"];
+    const Value& ordinary = startCommand[kPLSetOskraLogCodes];
+    const Value& extended = startCommand[kPLSetPlExtraCodes];
     if (!ordinary && !extended) return;
     _codes.emplace();
     append(*_codes, ordinary, 0);

@@ -2,13 +2,13 @@
 
 #include <fmt/format.h>
 
-#include <ctime>
 #include <limits>
 #include <optional>
 #include <utility>
 
 #include "platform/encodings/PropertyList.h"
 #include "platform/host/Capture.h"
+#include "platform/system/DateText.h"
 #include "tools/CommandFailure.h"
 #include "tools/RawRecords.h"
 
@@ -18,15 +18,15 @@ namespace {
 
 constexpr std::chrono::seconds kRefresh{2};
 
-/// The date of an entry, "2011-03-04 09:15:02 +0100"; none when there is none, it reads otherwise or lies outside the
+/// The date of an entry; none when there is none, it reads otherwise or lies outside the
 /// 32 bits that a capture has for its seconds.
 std::optional<CaptureTime> timeOf(const SnapshotFile::Entry& entry) {
-    std::tm broken{};
-    if (!entry.date || strptime(entry.date->c_str(), "%Y-%m-%d %H:%M:%S %z", &broken) == nullptr) return std::nullopt;
-    const long eastOfUtc = broken.tm_gmtoff;
-    const std::time_t seconds = timegm(&broken) - eastOfUtc;
-    if (seconds < 0 || seconds > std::numeric_limits<std::uint32_t>::max()) return std::nullopt;
-    return CaptureTime(std::chrono::seconds(seconds));
+    const auto date = entry.date ? dateFromDescription(*entry.date) : std::nullopt;
+    if (!date) return std::nullopt;
+    const std::chrono::seconds since1970 = date->time_since_epoch();
+    constexpr std::chrono::seconds kLast(std::numeric_limits<std::uint32_t>::max());
+    if (since1970 < since1970.zero() || since1970 > kLast) return std::nullopt;
+    return CaptureTime(since1970);
 }
 
 /// The messages of one entry; what is odd about them goes to `odd`.
@@ -55,26 +55,30 @@ std::vector<Bytes> messagesOf(const SnapshotFile::Entry& entry, bool asTree, con
 
 }  // namespace
 
-std::size_t writeSnapshotCapture(const SnapshotFile& snapshot, Technology technology, OutputFile file,
-                                 std::vector<std::string>& odd) {
-    std::optional<CaptureWriter> writer;
-    std::size_t total = 0;
+std::vector<SnapshotMessage> messagesOf(const SnapshotFile& snapshot, bool asTrees, std::vector<std::string>& odd) {
+    std::vector<SnapshotMessage> all;
     CaptureTime end{};
     for (std::size_t i = 0; i < snapshot.entries.size(); ++i) {
         const SnapshotFile::Entry& entry = snapshot.entries[i];
-        const auto messages = messagesOf(entry, !hasCodes(technology), fmt::format("entry {}", i + 1), odd);
+        auto messages = messagesOf(entry, asTrees, fmt::format("entry {}", i + 1), odd);
         end = std::max(end + kRefresh, timeOf(entry).value_or(CaptureTime()));
         for (std::size_t m = 0; m < messages.size(); ++m) {
-            if (!writer) writer.emplace(orFail(CaptureWriter::create(std::move(file), technology)));
             const std::chrono::nanoseconds before =
                 std::chrono::nanoseconds(kRefresh) * (messages.size() - m) / static_cast<long>(messages.size());
-            orFail(writer->append(end - before, messages[m]));
-            ++total;
+            all.push_back({end - before, std::move(messages[m])});
         }
     }
-    if (total == 0) throw CommandFailure("the snapshot holds no raw records");
-    orFail(writer->appear());
-    return total;
+    return all;
+}
+
+std::size_t writeSnapshotCapture(const SnapshotFile& snapshot, Technology technology, OutputFile file,
+                                 std::vector<std::string>& odd) {
+    const auto messages = messagesOf(snapshot, !hasCodes(technology), odd);
+    if (messages.empty()) throw CommandFailure("the snapshot holds no raw records");
+    CaptureWriter writer = orFail(CaptureWriter::create(std::move(file), technology));
+    for (const SnapshotMessage& message : messages) orFail(writer.append(message.time, message.bytes));
+    orFail(writer.appear());
+    return messages.size();
 }
 
 }  // namespace kelvo

@@ -2,33 +2,30 @@
 
 #include <fmt/format.h>
 
-#include <cerrno>
-#include <cstdio>
-#include <memory>
-#include <system_error>
+#include <span>
 
+#include "LogGenerator/SnapshotFormat.h"
 #include "platform/encodings/PropertyList.h"
+#include "telephony/recordings/RecordingFile.h"
 
 namespace kelvo {
 
 namespace {
 
 Result<Bytes> readFile(const std::string& name) {
-    const auto failure = [&name] {
-        return Failure{name + " cannot be read: " + std::generic_category().message(errno)};
-    };
-    const std::unique_ptr<std::FILE, int (*)(std::FILE*)> file(std::fopen(name.c_str(), "rb"), std::fclose);
-    if (!file) return failure();
+    auto file = RecordingFile::open(name);
+    if (!file) return file.error();
     Bytes bytes;
     constexpr std::size_t kChunk = 1 << 16;
     std::size_t count = kChunk;
     while (count == kChunk) {
         const std::size_t length = bytes.size();
         bytes.resize(length + kChunk);
-        count = std::fread(bytes.data() + length, 1, kChunk, file.get());
+        const auto got = file->read(std::span(bytes).subspan(length));
+        if (!got) return got.error();
+        count = *got;
         bytes.resize(length + count);
     }
-    if (std::ferror(file.get()) != 0) return failure();
     return bytes;
 }
 
@@ -38,11 +35,11 @@ public:
     Reader(std::string where, const Dictionary& dictionary, std::vector<std::string>& odd)
         : _where(std::move(where)), _dictionary(dictionary), _odd(odd) {}
 
-    std::optional<std::string> string(const char* key) const {
+    std::optional<std::string> string(std::string_view key) const {
         const Value& value = ofKind(key, Value::Kind::String);
         return value ? std::optional(*value.string()) : std::nullopt;
     }
-    const Value& ofKind(const char* key, Value::Kind kind) const {
+    const Value& ofKind(std::string_view key, Value::Kind kind) const {
         static const Value kNone;
         const Value& value = _dictionary[key];
         if (!value || value.kind() == kind) return value;
@@ -65,8 +62,8 @@ SnapshotFile::Entry entryFrom(const Value& value, std::size_t number, std::vecto
     }
     const Dictionary& dictionary = *value.dictionary();
     const Reader reader(where, dictionary, odd);
-    return {reader.string("Description"), reader.string("Date"), dictionary["DisplayState"], dictionary["Display"],
-            reader.ofKind("DLF", Value::Kind::Data)};
+    return {reader.string(snapshot::kDescription), reader.string(snapshot::kDate), dictionary[snapshot::kDisplayState],
+            dictionary[snapshot::kDisplay], reader.ofKind(snapshot::kDLF, Value::Kind::Data)};
 }
 
 }  // namespace
@@ -80,15 +77,16 @@ Result<SnapshotFile> SnapshotFile::read(const std::filesystem::path& path) {
     if (!tree) return Failure{name + " is not a snapshot: " + tree.error().reason};
     const DictionaryRef& dictionary = tree->dictionary();
     if (!dictionary) return Failure{fmt::format("{} is not a snapshot: it holds a {}", name, kindName(tree->kind()))};
-    if (!(*dictionary)["Timestamp"] && !(*dictionary)["Data"]) {
-        return Failure{name + " is not a snapshot: it has neither \"Timestamp\" nor \"Data\""};
+    if (!(*dictionary)[snapshot::kTimestamp] && !(*dictionary)[snapshot::kData]) {
+        return Failure{fmt::format("{} is not a snapshot: it has neither \"{}\" nor \"{}\"", name, snapshot::kTimestamp,
+                                   snapshot::kData)};
     }
 
     SnapshotFile file;
     const Reader reader("the snapshot", *dictionary, file.odd);
-    file.timestamp = reader.string("Timestamp");
-    file.description = reader.string("Description");
-    if (const ArrayRef& data = reader.ofKind("Data", Value::Kind::Array).array()) {
+    file.timestamp = reader.string(snapshot::kTimestamp);
+    file.description = reader.string(snapshot::kDescription);
+    if (const ArrayRef& data = reader.ofKind(snapshot::kData, Value::Kind::Array).array()) {
         for (const Value& entry : *data) file.entries.push_back(entryFrom(entry, file.entries.size() + 1, file.odd));
     }
     return file;

@@ -7,6 +7,8 @@
 #include <algorithm>
 #include <cerrno>
 
+#include "tools/TerminalText.h"
+
 namespace kelvo {
 
 namespace {
@@ -14,16 +16,6 @@ namespace {
 // Alternate screen, no cursor, no wrapping at the edge; and back in the other order.
 constexpr std::string_view kEnter = "\x1b[?1049h\x1b[?25l\x1b[?7l\x1b[2J";
 constexpr std::string_view kLeave = "\x1b[?7h\x1b[?25h\x1b[?1049l";
-
-/// The first `columns` characters of UTF-8 text.
-std::string_view cut(std::string_view text, std::size_t columns) {
-    std::size_t at = 0;
-    for (; at < text.size(); ++at) {
-        const bool begins = (text[at] & 0xc0) != 0x80;
-        if (begins && columns-- == 0) break;
-    }
-    return text.substr(0, at);
-}
 
 }  // namespace
 
@@ -61,14 +53,15 @@ void Terminal::forget() {
     _shown.clear();
 }
 
-void Terminal::draw(const std::vector<std::string>& rows, std::size_t highlighted) {
+void Terminal::draw(const std::vector<std::string>& rows, std::size_t firstHighlighted) {
     const std::size_t columns = size().columns;
     std::string out;
     std::vector<std::string> now;
     for (std::size_t i = 0; i < std::max(rows.size(), _shown.size()); ++i) {
-        std::string row(i < rows.size() ? cut(rows[i], columns) : std::string_view());
-        if (i == highlighted) row = "\x1b[7m" + row + "\x1b[0m";
-        if (i >= _shown.size() || _shown[i] != row) out += fmt::format("\x1b[{};1H{}\x1b[K", i + 1, row);
+        std::string row = i < rows.size() ? clipped(rows[i], 0, columns) : std::string();
+        if (i >= firstHighlighted && i < rows.size()) row = "\x1b[7m" + row + "\x1b[0m";
+        // Erased first: after a full row the cursor stands on its last character.
+        if (i >= _shown.size() || _shown[i] != row) out += fmt::format("\x1b[{};1H\x1b[K{}", i + 1, row);
         if (i < rows.size()) now.push_back(std::move(row));
     }
     _shown = std::move(now);

@@ -32,9 +32,9 @@ public:
     Size size() const;
     /// Forgets what stands on the screen, after a change of its size: the next draw writes every row.
     void forget();
-    /// Shows one row a line from the top, `highlighted` (an index) in reverse video. Rows are cut at the screen's edge;
-    /// only rows that changed are written.
-    void draw(const std::vector<std::string>& rows, std::size_t highlighted);
+    /// Shows one row a line from the top, those from `firstHighlighted` (an index) on in reverse video. Rows are
+    /// clipped at the screen's edge; only rows that changed are written.
+    void draw(const std::vector<std::string>& rows, std::size_t firstHighlighted);
 
 private:
     void write(std::string_view text) const;

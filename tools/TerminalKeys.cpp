@@ -14,6 +14,8 @@ constexpr char kEscape = '\x1b';
 constexpr std::pair<std::string_view, TerminalKey> kKeys[] = {
     {"\x1b[A",  TerminalKey::Up},       {"\x1bOA",  TerminalKey::Up},       {"k", TerminalKey::Up},
     {"\x1b[B",  TerminalKey::Down},     {"\x1bOB",  TerminalKey::Down},     {"j", TerminalKey::Down},
+    {"\x1b[D",  TerminalKey::Left},     {"\x1bOD",  TerminalKey::Left},     {"h", TerminalKey::Left},
+    {"\x1b[C",  TerminalKey::Right},    {"\x1bOC",  TerminalKey::Right},    {"l", TerminalKey::Right},
     {"\x1b[5~", TerminalKey::PageUp},   {"b",       TerminalKey::PageUp},
     {"\x1b[6~", TerminalKey::PageDown}, {" ",       TerminalKey::PageDown},
     {"\x1b[H",  TerminalKey::Home},     {"\x1bOH",  TerminalKey::Home},     {"\x1b[1~", TerminalKey::Home}, {"g", TerminalKey::Home},

@@ -20,28 +20,20 @@
 #include "platform/host/HostTelephonyClient.h"
 #include "platform/host/UnixSignals.h"
 #include "platform/system/Environment.h"
-#include "tools/CommandFailure.h"
 #include "tools/DisplayText.h"
+#include "tools/RetryLog.h"
 #include "tools/WatchView.h"
 
 namespace kelvo {
 
 namespace {
 
-Terminal* terminalToRestore = nullptr;  // for the terminate handler, which nothing can be handed to
-
-/// What ends the program, a record or a full disk, does so from within the event loop; the terminal must survive it.
-[[noreturn]] void endTidily() {
-    if (terminalToRestore != nullptr) terminalToRestore->leave();
-    fmt::print(stderr, "kelvoctl: the watch ends: {}\n", printable(currentExceptionText()));
-    std::_Exit(1);
-}
-
 /// The model and what the view shows of it.
 class Watch {
 public:
-    Watch(MainQueue& queue, MessagePorts& ports, TelephonyClient& telephony, WatchView& view)
+    Watch(MainQueue& queue, MessagePorts& ports, TelephonyClient& telephony, WatchView& view, RetryLog* log)
         : _view(view),
+          _log(log),
           _model({.queue = queue,
                   .ports = ports,
                   .telephony = telephony,
@@ -49,7 +41,7 @@ public:
                   .portName = fmt::format("{}.watch.{}", KelvoModel::kLogChannelPortName, getpid()),
                   .connectionChanged = [this] { updateStatus(); }}) {
         queue.post([this] { _model.restartMonitor(); });
-        _view.showStatus(_shownStatus);
+        updateStatus();
     }
 
 private:
@@ -59,20 +51,22 @@ private:
         const std::tm now = clock().local(clock().now());
         std::array<char, 64> text{};
         std::strftime(text.data(), text.size(), "Updated %Y-%m-%d at %H:%M:%S", &now);
-        _shownStatus = _updateMessage = text.data();
-        _view.showDisplay(root ? displayLines(*root) : std::vector<std::string>(), _shownStatus);
+        _updateMessage = text.data();
+        _view.showDisplay(root ? displayLines(*root) : std::vector<std::string>(), status());
     }
 
     void updateStatus() {
-        const std::string status = statusText(_model.isConnected(), _updateMessage);
-        if (status == _shownStatus) return;
-        _shownStatus = status;
-        _view.showStatus(status);
+        if (_log != nullptr) _log->setConnected(_model.isConnected());
+        _view.showStatus(status());
+    }
+
+    WatchStatus status() const {
+        return {statusText(_model.isConnected(), _updateMessage), connectionText(_model.connection())};
     }
 
     WatchView& _view;
+    RetryLog* const _log;                                // none: there is no log
     std::string _updateMessage = statusText(false, {});  // until the first update
-    std::string _shownStatus = _updateMessage;
     KelvoModel _model;
 };
 
@@ -86,12 +80,10 @@ void ensureUtf8Locale() {
 class TerminalControl {
 public:
     TerminalControl() {
-        terminalToRestore = &_terminal;
         if (isatty(STDIN_FILENO) != 0) {
             _input.emplace(STDIN_FILENO, FdWatcher::For::Reading, [this] { readKeys(); });
         }
     }
-    ~TerminalControl() { terminalToRestore = nullptr; }
 
     TerminalWatchView& view() { return _view; }
     void resized() { _view.redraw(); }
@@ -119,23 +111,30 @@ private:
     std::optional<FdWatcher> _input;
 };
 
+/// A terminal that is none, or says that it obeys nothing, gets plain text.
+bool canBeDrawnOn(int output) {
+    const char* type = std::getenv("TERM");
+    return isatty(output) != 0 && type != nullptr && type[0] != '\0' && std::string_view(type) != "dumb";
+}
+
 void watch() {
     ensureUtf8Locale();
     std::string name = "kelvoctl";
     std::array<char*, 2> arguments{name.data(), nullptr};
     int count = 1;
     const QCoreApplication application(count, arguments.data());
-    std::set_terminate(endTidily);
 
     // The log would write into the picture, unless it is sent elsewhere.
     std::optional<HostSystemLog> log;
     if (isatty(STDERR_FILENO) == 0) log.emplace("kelvoctl", HostSystemLog::To::StandardError);
+    std::optional<RetryLog> retryLog;
+    if (log) retryLog.emplace(*log);
     Environment environment = Environment::current();
-    environment.log = log ? &*log : nullptr;
+    environment.log = retryLog ? &*retryLog : nullptr;
     const Environment::Scope scope(environment);
 
     std::optional<TerminalControl> terminal;
-    if (isatty(STDOUT_FILENO) != 0) terminal.emplace();
+    if (canBeDrawnOn(STDOUT_FILENO)) terminal.emplace();
     PrintedWatchView printed;
     WatchView& view = terminal ? static_cast<WatchView&>(terminal->view()) : printed;
 
@@ -151,7 +150,7 @@ void watch() {
     HostMainQueue queue;
     HostMessagePorts ports;
     HostTelephonyClient telephony(ports);
-    const Watch watch(queue, ports, telephony, view);
+    const Watch watch(queue, ports, telephony, view, retryLog ? &*retryLog : nullptr);
     HostEventLoop::run(QCoreApplication::exec);
 }
 
@@ -160,9 +159,12 @@ void watch() {
 void addWatchCommand(CLI::App& app) {
     CLI::App& command = *app.add_subcommand("watch", "Shows the live screens, refreshed every two seconds");
     command.footer(
-        "On a terminal: arrows, PageUp, PageDown, Home and End scroll, q quits.\n"
-        "Elsewhere every refresh is printed under its status line; the log goes to standard error when that is no\n"
-        "terminal.\n\n"
+        "On a terminal: arrows, PageUp, PageDown, Home and End scroll, q quits. What does not fit ends with \"…\"; "
+        "Left\n"
+        "and Right lead to it.\n"
+        "Elsewhere, and with TERM=dumb, every refresh is printed under its status line; the log goes to standard "
+        "error\n"
+        "when that is no terminal.\n\n"
         "Examples:\n"
         "  kelvoctl watch\n"
         "  kelvoctl watch 2>watch.log\n"

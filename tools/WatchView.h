@@ -9,30 +9,39 @@
 
 namespace kelvo {
 
+/// What stands under the live screens.
+struct WatchStatus {
+    std::string text;    ///< when the values are from
+    std::string remark;  ///< why there are none, or for how long no records have come; empty: nothing to remark
+};
+
 /// Where the live screens are shown. Main thread only.
 class WatchView {
 public:
     virtual ~WatchView() = default;
     /// Shows a new display, line by line, and the status that came with it.
-    virtual void showDisplay(std::vector<std::string> lines, const std::string& status) = 0;
+    virtual void showDisplay(std::vector<std::string> lines, const WatchStatus& status) = 0;
     /// Shows a new status; the display stays.
-    virtual void showStatus(const std::string& status) = 0;
+    virtual void showStatus(const WatchStatus& status) = 0;
 };
 
-/// Prints every display under its status line, for pipes and files.
+/// Prints every display under its status line, for pipes and files, and terminals that can do no more.
 class PrintedWatchView final : public WatchView {
 public:
-    void showDisplay(std::vector<std::string> lines, const std::string& status) override;
-    void showStatus(const std::string& status) override;
+    void showDisplay(std::vector<std::string> lines, const WatchStatus& status) override;
+    void showStatus(const WatchStatus& status) override;
+
+private:
+    std::string _news;  // what the status printed last says, but for its number
 };
 
-/// A window on the display's lines, and the status in the last row.
+/// A window on the display's lines; the status in the last row but one, place and keys in the last.
 class TerminalWatchView final : public WatchView {
 public:
     explicit TerminalWatchView(Terminal& terminal) : _terminal(terminal) {}
 
-    void showDisplay(std::vector<std::string> lines, const std::string& status) override;
-    void showStatus(const std::string& status) override;
+    void showDisplay(std::vector<std::string> lines, const WatchStatus& status) override;
+    void showStatus(const WatchStatus& status) override;
     /// Scrolls; Quit is for the caller.
     void press(TerminalKey key);
     /// Draws again with the terminal's size as it is now.
@@ -40,11 +49,13 @@ public:
 
 private:
     void draw();
+    std::size_t pageRows() const;
 
     Terminal& _terminal;
     std::vector<std::string> _lines;
-    std::string _status;
-    std::size_t _top = 0;  // the first line shown
+    WatchStatus _status;
+    std::size_t _top = 0;   // the first line shown
+    std::size_t _left = 0;  // the first column shown
 };
 
 }  // namespace kelvo

@@ -76,7 +76,7 @@ QVariant KelvoSaveViewController::data(const QModelIndex& index, int role) const
     if (!checkIndex(index, CheckIndexOption::IndexIsValid | CheckIndexOption::ParentIsInvalid)) return {};
     if (role != DescriptionRole) return {};
     const DictionaryRef& entry = (*_saveHistory)[static_cast<std::size_t>(index.row())].dictionary();
-    const std::string* text = entry ? (*entry)["Description"].string() : nullptr;
+    const std::string* text = entry ? (*entry)[snapshot::kDescription].string() : nullptr;
     return text != nullptr ? QString::fromStdString(*text) : QString();
 }
 

@@ -15,6 +15,8 @@ namespace kelvo {
 
 namespace {
 
+constexpr std::size_t kBuffer = std::size_t{1} << 20;
+
 std::string errorText(int error) { return std::generic_category().message(error); }
 
 /// Why a freshly opened file is no classic pcap file, as far as its first byte tells; none when it may be one.
@@ -34,6 +36,10 @@ Result<CaptureReader> CaptureReader::open(const std::filesystem::path& path) {
     std::string name = path.string();
     std::FILE* file = std::fopen(name.c_str(), "rb");
     if (file == nullptr) return Failure{fmt::format("{} cannot be opened: {}", name, errorText(errno))};
+    return open(std::move(name), file);
+}
+
+Result<CaptureReader> CaptureReader::open(std::string name, std::FILE* file) {
     if (const auto reason = refusal(file)) {
         std::fclose(file);
         return Failure{name + " " + *reason};
@@ -75,16 +81,17 @@ Result<std::optional<CapturePacket>> CaptureReader::next() {
 
 void CaptureWriter::DumperCloser::operator()(pcap_dumper* dumper) const { pcap_dump_close(dumper); }
 
-Result<CaptureWriter> CaptureWriter::create(OutputFile file, Technology technology) {
+Result<CaptureWriter> CaptureWriter::create(OutputFile file, Technology technology, Flush flush) {
     const auto stream = file.stream();
     if (!stream) return stream.error();
-    std::setvbuf(*stream, nullptr, _IONBF, 0);  // a full disk shows at the packet that no longer fits, not at the end
+    const bool each = flush == Flush::EachPacket;
+    std::setvbuf(*stream, nullptr, each ? _IONBF : _IOFBF, each ? 0 : kBuffer);
     detail::PcapHandle handle(pcap_open_dead(namesOf(technology).linkType, static_cast<int>(kMaxMessageSize)));
     std::unique_ptr<pcap_dumper, DumperCloser> dumper(pcap_dump_fopen(handle.get(), *stream));
     if (!dumper) {  // the header did not fit; libpcap has closed the stream
         return Failure{fmt::format("{} cannot be written: {}", file.path(), pcap_geterr(handle.get()))};
     }
-    CaptureWriter writer(std::move(file), std::move(handle), std::move(dumper));
+    CaptureWriter writer(std::move(file), flush, std::move(handle), std::move(dumper));
     if (const auto flushed = writer.flush(); !flushed) return flushed.error();
     return writer;
 }
@@ -100,7 +107,13 @@ Result<void> CaptureWriter::append(CaptureTime time, ByteView bytes) {
     header.ts.tv_usec = std::chrono::duration_cast<std::chrono::microseconds>(time - seconds).count();
     header.caplen = header.len = static_cast<bpf_u_int32>(bytes.size());
     pcap_dump(reinterpret_cast<unsigned char*>(_dumper.get()), &header, bytes.data());
-    return flush();
+    return _flush == Flush::EachPacket ? flush() : Result<void>();
+}
+
+Result<void> CaptureWriter::appear() {
+    pcap_dump_flush(_dumper.get());
+    if (const auto flushed = flush(); !flushed) return flushed;
+    return _file.appear();
 }
 
 Result<void> CaptureWriter::flush() {

@@ -38,6 +38,8 @@ class CaptureReader {
 public:
     /// Opens the file and reads its header. A pipe will do.
     static Result<CaptureReader> open(const std::filesystem::path& path);
+    /// The same of a stream, which the reader owns from now on; failures call it `name`.
+    static Result<CaptureReader> open(std::string name, std::FILE* file);
 
     /// The technology that the link type names; none for another link type.
     std::optional<Technology> technology() const;
@@ -59,26 +61,34 @@ private:
 /// Moves, never copies. Any thread, one at a time. A failure's reason names the file.
 class CaptureWriter {
 public:
+    /// When packets reach the file.
+    enum class Flush {
+        EachPacket,  ///< at once: a full disk shows at the packet that no longer fits, and what was written is whole
+        WhenWhole,   ///< at the latest when the file appears, in large pieces
+    };
+
     /// Begins the capture in `file` with its header.
-    static Result<CaptureWriter> create(OutputFile file, Technology technology);
+    static Result<CaptureWriter> create(OutputFile file, Technology technology, Flush flush = Flush::EachPacket);
     CaptureWriter(CaptureWriter&&) noexcept = default;
     CaptureWriter& operator=(CaptureWriter&&) noexcept = default;
 
-    /// Appends one packet; it has reached the file when this succeeds. On a failure (a full disk, a message longer than
-    /// any the service delivers) the file keeps the packets before it, whole.
+    /// Appends one packet; when each is flushed it has reached the file when this succeeds. On a failure (a full disk,
+    /// a message longer than any the service delivers) the file keeps the packets before it, whole.
     Result<void> append(CaptureTime time, ByteView bytes);
     /// Gives the file its name, when it is whole or as early as others may read along.
-    Result<void> appear() { return _file.appear(); }
+    Result<void> appear();
 
 private:
     struct DumperCloser {
         void operator()(pcap_dumper* dumper) const;
     };
-    CaptureWriter(OutputFile file, detail::PcapHandle handle, std::unique_ptr<pcap_dumper, DumperCloser> dumper)
-        : _file(std::move(file)), _handle(std::move(handle)), _dumper(std::move(dumper)) {}
+    CaptureWriter(OutputFile file, Flush flush, detail::PcapHandle handle,
+                  std::unique_ptr<pcap_dumper, DumperCloser> dumper)
+        : _file(std::move(file)), _flush(flush), _handle(std::move(handle)), _dumper(std::move(dumper)) {}
     Result<void> flush();
 
     OutputFile _file;
+    Flush _flush;
     detail::PcapHandle _handle;
     std::unique_ptr<pcap_dumper, DumperCloser> _dumper;
     long _length = 0;  // of the file, up to the end of its last whole packet

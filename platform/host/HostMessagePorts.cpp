@@ -23,6 +23,12 @@ UniqueFd openDirectory(const std::filesystem::path& path) {
     return {};
 }
 
+std::int64_t ownerOf(const std::filesystem::path& directory, std::string_view name) {
+    const UniqueFd opened = openDirectory(directory);
+    const UniqueFd connection = opened ? connectToPort(opened.get(), std::string(name)) : UniqueFd();
+    return connection ? processOfPeer(connection.get()) : 0;
+}
+
 }  // namespace
 
 HostMessagePorts::HostMessagePorts(std::filesystem::path directory) : _directory(std::move(directory)) {}
@@ -36,7 +42,7 @@ MessagePorts::Local HostMessagePorts::createLocal(std::string_view name, Message
     if (!claim) {
         const PortRefusal& refusal = claim.error();
         if (!refusal.isTaken) logLine(Level::Error, "Cannot make port %s: %s", name, refusal.reason);
-        return {nullptr, refusal.isTaken};
+        return {nullptr, refusal.isTaken, refusal.isTaken ? ownerOf(_directory, name) : 0};
     }
     auto server = std::make_shared<PortServer>(std::move(claim).value(), std::string(name), std::move(callback));
     return {std::make_unique<HostLocalPort>(std::move(server)), false};

@@ -10,6 +10,7 @@
 #include <algorithm>
 #include <cerrno>
 #include <cstring>
+#include <optional>
 
 namespace kelvo {
 namespace {
@@ -30,6 +31,12 @@ UniqueFd makeSocket() {
     UniqueFd made(::socket(AF_UNIX, SOCK_SEQPACKET | SOCK_NONBLOCK | SOCK_CLOEXEC, 0));
     if (made) ::setsockopt(made.get(), SOL_SOCKET, SO_SNDBUF, &kSendBuffer, sizeof kSendBuffer);
     return made;
+}
+
+std::optional<ucred> peerOf(int fd) {
+    ucred peer{};
+    socklen_t size = sizeof peer;
+    return ::getsockopt(fd, SOL_SOCKET, SO_PEERCRED, &peer, &size) == 0 ? std::optional(peer) : std::nullopt;
 }
 
 bool isSameFile(int fd, int directory, const std::string& name) {
@@ -60,9 +67,13 @@ UniqueFd connectToPort(int directory, const std::string& name) {
 }
 
 bool isPeerOfThisUser(int fd) {
-    ucred peer{};
-    socklen_t size = sizeof peer;
-    return ::getsockopt(fd, SOL_SOCKET, SO_PEERCRED, &peer, &size) == 0 && peer.uid == ::geteuid();
+    const auto peer = peerOf(fd);
+    return peer && peer->uid == ::geteuid();
+}
+
+pid_t processOfPeer(int fd) {
+    const auto peer = peerOf(fd);
+    return peer ? peer->pid : 0;
 }
 
 Result<PortClaim, PortRefusal> PortClaim::take(UniqueFd directory, std::string name) {

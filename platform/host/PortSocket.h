@@ -1,5 +1,7 @@
 #pragma once
 
+#include <sys/types.h>
+
 #include <string>
 #include <string_view>
 
@@ -18,6 +20,9 @@ UniqueFd connectToPort(int directory, const std::string& name);
 
 /// True when the process at the other end runs under this process's user.
 bool isPeerOfThisUser(int fd);
+
+/// The process at the other end; 0 when it cannot be told.
+pid_t processOfPeer(int fd);
 
 /// Why a port's name is not to be had.
 struct PortRefusal {

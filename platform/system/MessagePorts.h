@@ -73,6 +73,7 @@ public:
     struct Local {
         std::unique_ptr<LocalPort> port;  ///< none when it could not be created
         bool alreadyExisted = false;      ///< none because a live port of that name exists
+        std::int64_t owner = 0;           ///< the process that has it; 0 when that cannot be told
     };
     /// Makes the port `name`. Messages wait until it is scheduled.
     virtual Local createLocal(std::string_view name, MessageCallback callback) = 0;

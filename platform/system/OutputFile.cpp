@@ -81,7 +81,7 @@ Result<void> OutputFile::write(ByteView bytes) {
 Result<void> OutputFile::appear() {
     if (auto opened = open(); !opened) return opened;
     if (!_temporary) return {};
-    if (::fsync(::fileno(_file.get())) != 0) return failed(errno);
+    if (::fsync(::fileno(_file.get())) != 0 && errno != EINVAL) return failed(errno);  // not every file system can
     if (auto allowed = check(); !allowed) return allowed;
     const bool named = _terms.replace ? ::rename(_temporary->c_str(), placeOf(_path).c_str()) == 0
                                       : nameUnlessTaken(*_temporary, _path);

@@ -31,6 +31,7 @@ public:
     explicit Journey(std::vector<Corner> corners);
     /// A round trip within `radius` metres of the town's centre, with stops.
     static Journey through(double radius, Random& random);
+    static Journey throughTown(Random& random) { return through(2000, random); }
 
     Point at(Time time) const;
     /// Metres driven up to then; standing adds none.

@@ -2,32 +2,30 @@
 
 namespace kelvo::simulation {
 
-PhoneUser::Activity PhoneUser::at(Time now) {
+void PhoneUser::moveTo(Time now) {
     if (now >= _until) change(now);
-    if (_activity != Activity::Browsing) {
-        _demand = 0;
-    } else if (now >= _askedUntil) {
-        ask(now);
-    }
-    return _activity;
+    if (!isResting() && now >= _turnUntil) takeTurn(now);
 }
 
 void PhoneUser::change(Time now) {
-    if (_activity != Activity::Resting) {
+    _isPausing = true;
+    _demand = 0;
+    if (!isResting()) {
         _activity = Activity::Resting;
-        _until = now + fromSeconds(_random.between(5.0, 12.0));
+        _until = now + fromSeconds(_random.between(5.0, 16.0));
         return;
     }
     const bool talks = _activities++ % 3 == 1;  // pages, a call, pages, and again
     _activity = talks ? Activity::Talking : Activity::Browsing;
     _until = now + fromSeconds(talks ? _random.between(15.0, 35.0) : _random.between(12.0, 25.0));
-    _askedUntil = now;
+    _sessions += isBrowsing();
+    _turnUntil = now;
 }
 
-void PhoneUser::ask(Time now) {
-    const bool reads = _demand > 0 && _random.chance(0.4);
-    _demand = reads ? 0 : _random.between(0.2, 0.9);
-    _askedUntil = now + fromSeconds(_random.between(0.5, 3.0));
+void PhoneUser::takeTurn(Time now) {
+    _isPausing = !_isPausing && _random.chance(0.4);
+    _demand = isBrowsing() && !_isPausing ? _random.between(0.2, 0.9) : 0;
+    _turnUntil = now + fromSeconds(_random.between(0.5, 3.0));
 }
 
 }  // namespace kelvo::simulation

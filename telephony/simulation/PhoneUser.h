@@ -10,22 +10,34 @@ class PhoneUser {
 public:
     enum class Activity { Resting, Browsing, Talking };
 
-    explicit PhoneUser(Random random) : _random(std::move(random)) {}
+    /// One who rests until `first`, and then browses.
+    PhoneUser(Random random, Time first) : _random(std::move(random)), _until(first) {}
 
-    /// What they do at that time; never earlier than the time before.
-    Activity at(Time now);
-    /// The part of the link that what they do asks for, 0 to 1: reading needs none, a page much.
+    /// Moves on to then; never back.
+    void moveTo(Time now);
+
+    Activity activity() const { return _activity; }
+    bool isResting() const { return _activity == Activity::Resting; }
+    bool isBrowsing() const { return _activity == Activity::Browsing; }
+    bool isTalking() const { return _activity == Activity::Talking; }
+    /// In a call: the other one speaks.
+    bool isListening() const { return isTalking() && _isPausing; }
+    /// The part of the link that what they do asks for, 0 to 1: a page much, reading it and a call none.
     double demand() const { return _demand; }
+    /// How often they have begun to browse.
+    int sessions() const { return _sessions; }
 
 private:
     void change(Time now);
-    void ask(Time now);
+    void takeTurn(Time now);
 
     Random _random;
     Activity _activity = Activity::Resting;
-    Time _until = std::chrono::seconds(4);
-    Time _askedUntil{0};
+    Time _until;
+    Time _turnUntil{0};
     int _activities = 0;
+    int _sessions = 0;
+    bool _isPausing = true;  // reads, or listens
     double _demand = 0;
 };
 

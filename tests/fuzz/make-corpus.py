@@ -40,12 +40,49 @@ def snapshot(messages):
     return {"Timestamp": "2011-03-04 09:15:02 +0000", "Data": [entry, dlf], "Description": "by the river"}
 
 
+def frame(body):
+    """A frame of a modem's diagnostic port."""
+    crc = 0xFFFF
+    for byte in body:
+        crc ^= byte
+        for _ in range(8):
+            crc = crc >> 1 ^ 0x8408 if crc & 1 else crc >> 1
+    raw = body + struct.pack("<H", crc ^ 0xFFFF)
+    return raw.replace(b"\x7d", b"\x7d\x5d").replace(b"\x7e", b"\x7d\x5e") + b"\x7e"
+
+
+def record_frame(message):
+    """A message (its prefix taken off) as a modem sends it."""
+    record = message[3:] if message[0] == 0x81 else message[1:]
+    return frame(struct.pack("<BBH", 0x10, 0, len(record)) + record)
+
+
+def conversation():
+    """What a modem answers from the first question on; the session's target frames the bodies itself."""
+    head = b"\x73\0\0\0"
+    ranges = [0, 0xA02, 0, 0, 0x910, 0x420, 0, 0x4FF, 0, 0, 0x38A, 0x201, 0, 0x1FF, 0, 0]
+    yield b"\0" + b"Jan 01 202012:00:00Jan 02 202012:00:00TARGET99"
+    yield b"\x7c" + bytes(11) + b"BUILD-1\0"
+    yield head + struct.pack("<II16I", 1, 0, *ranges)
+    for id, items in enumerate(ranges):
+        yield head + struct.pack("<IIII", 3, 0, id, items) + bytes((items + 7) // 8)
+
+
+dialogue = list(conversation())
+mask = dialogue[3 + 0xB]
+record = struct.pack("<BBHHHQ", 0x10, 2, 14, 14, 0xB0C2, 72659535985485082) + b"\1\2"
+for name, last in {"records": [record, b"\x98\1\0\0\1\0\0\0" + record], "encrypted": [b"\x9e\1\2"],
+                   "refused": [b"\x14" + mask[:8] + mask[12:]], "texts": [b"\x79\0\0\4"]}.items():
+    write("session", name, b"".join(struct.pack("<H", len(body)) + body for body in dialogue + last))
+
 for path in sorted(CAPTURES.glob("*.pcap")):
     raw = path.read_bytes()
     link, messages = packets(raw)
     write(FAMILIES[link], path.stem, b"".join(struct.pack("<H", len(message)) + message for message in messages))
     write("capture", path.name, raw)
     write("framing", path.stem, b"".join(messages))
+    if link != 147:
+        write("framereader", path.stem, b"".join(record_frame(message) for message in messages[:20] if len(message) > 15))
     for i, message in enumerate(messages[:4]):
         # as one datagram of a port: magic, kind, flags, reserved, id, sequence, length
         header = struct.pack("<IBBHiII", 0x314B4C56, 1, i % 2, 0, 0, i, len(message))

@@ -120,7 +120,7 @@ void FaultyService::deliver() {
 }
 
 void FaultyService::deliverAll(Client& client) {
-    for (const Bytes& message : _messages) client.records->request(0, message, {}, std::nullopt);
+    for (const Bytes& message : _messages) std::ignore = client.records->request(0, message, {}, std::nullopt);
 }
 
 void FaultyService::flood(Client& client) {

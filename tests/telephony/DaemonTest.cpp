@@ -102,6 +102,8 @@ TEST_F(DaemonTest, ServesAClientFromFirstToLastWord) {
     ASSERT_TRUE(runUntil([&] { return client.records.size() == 3; }));
     EXPECT_EQ(client.records, (std::vector<std::string>{"tree 0", "tree 1", "tree 2"}));
     EXPECT_TRUE(client.remote->isValid());  // the channel stays after the last packet
+    run({"--status"});
+    EXPECT_NE(_output.find("State       the capture has ended\n"), std::string::npos) << _output;
 
     stopDaemon();
     EXPECT_FALSE(client.remote->isValid());
@@ -173,7 +175,8 @@ TEST_F(DaemonTest, RefusesToRunTwice) {
     startDaemon();
     const auto [status, error] = run({"--replay", QString::fromStdString(_capture)});
     EXPECT_EQ(status, 1);
-    EXPECT_EQ(error, "kelvo-telephonyd: another telephony service is running\n");
+    EXPECT_EQ(error, "kelvo-telephonyd: another telephony service is running (process " +
+                         std::to_string(_daemon.processId()) + ")\n");
     stopDaemon();
 }
 
@@ -186,7 +189,7 @@ TEST_F(DaemonTest, TellsItsStatusToWhoeverAsks) {
               "Technology  LTE\n"
               "Records     0\n"
               "\n"
-              "  Log code   per second        in all\n"
+              "  Log code                                       per second        in all\n"
               "  none\n"
               "\n"
               "Clients\n"

@@ -203,6 +203,30 @@ TEST_F(PacedSourceTest, LetsOtherWorkRunAmongManyPackets) {
     EXPECT_LE(before, 256U);
 }
 
+TEST_F(PacedSourceTest, SaysWhenTheCaptureHasEnded) {
+    capture({0, 100});
+    play();
+    EXPECT_EQ(_source->state(), "");
+    _queue.advance(100ms);
+    EXPECT_EQ(_source->state(), "the capture has ended");
+}
+
+TEST_F(PacedSourceTest, SaysWhereADamagedCaptureHasEnded) {
+    capture({0, 100});
+    std::filesystem::resize_file(_path, std::filesystem::file_size(_path) - 1);
+    play();
+    EXPECT_EQ(_sink.notes, Notes{"0a"});
+    const std::string expected = "the capture has ended: " + _path.string() + " cannot be read at packet 2: ";
+    EXPECT_EQ(_source->state().substr(0, expected.size()), expected);
+}
+
+TEST_F(PacedSourceTest, ACaptureInALoopDoesNotEnd) {
+    capture({0, 100});
+    play({.loop = true});
+    _queue.advance(10s);
+    EXPECT_EQ(_source->state(), "");
+}
+
 TEST_F(PacedSourceTest, TellsOfADamagedCaptureOnceAndPlaysWhatIsWhole) {
     capture({0, 100, 200});
     std::filesystem::resize_file(_path, std::filesystem::file_size(_path) - 1);
@@ -211,7 +235,8 @@ TEST_F(PacedSourceTest, TellsOfADamagedCaptureOnceAndPlaysWhatIsWhole) {
     EXPECT_EQ(_sink.notes,
               (Notes{"0a", "100b", "200a", "300b", "400a", "500b", "600a", "700b", "800a", "900b", "1000a"}));
     ASSERT_EQ(_log.lines().size(), 1U);
-    EXPECT_NE(_log.lines()[0].second.find("test.pcap"), std::string::npos);
+    EXPECT_EQ(_log.lines()[0].second.find(_path.string() + " cannot be read at packet 3: "), 0U);
+    EXPECT_EQ(_source->state(), _log.lines()[0].second);
 }
 
 TEST_F(PacedSourceTest, EndsWhenTheCaptureIsGoneBeforeTheNextPass) {

@@ -26,20 +26,28 @@ using Lines = std::vector<RecordingLog::Line>;
 /// A modem whose records the test makes up.
 class TestSource final : public RecordSource {
 public:
-    Technology technology() const override { return spoken; }
+    std::optional<Technology> technology() const override { return spoken; }
     std::string description() const override { return "a test"; }
+    std::string state() const override { return condition; }
     void start(RecordSink& sink) override {
         ++starts;
         _sink = &sink;
     }
     void feed() override { ++feeds; }
+    void findTechnology() override { ++searches; }
+    void clientsWant(const ClientsWishes& wanted) override { wishes.push_back(wanted); }
+    DictionaryRef portStatus() const override { return port; }
 
     bool give(ByteView record) { return _sink->take(record); }
     bool someoneIsHungry() const { return _sink->isHungry(); }
 
-    Technology spoken = Technology::LTE;
+    std::optional<Technology> spoken = Technology::LTE;
+    std::string condition;
     int starts = 0;
     int feeds = 0;
+    int searches = 0;
+    std::vector<ClientsWishes> wishes;
+    DictionaryRef port;
 
 private:
     RecordSink* _sink = nullptr;

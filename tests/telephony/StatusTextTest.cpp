@@ -37,7 +37,78 @@ TEST(StatusText, ListsCodesAndClients) {
               "  other: not streaming yet, 0 delivered, 0 waiting, 0 dropped\n");
 }
 
+TEST(StatusText, TellsTheSourcesState) {
+    const auto answer = Dictionary::make({{"Source", "the capture x.pcap"},
+                                          {"State", "the capture has ended"},
+                                          {"Technology", "GSM"},
+                                          {"Records", 3},
+                                          {"Codes", Array::make({})},
+                                          {"Clients", Array::make({})}});
+    EXPECT_EQ(statusText(answer)->find("Source      the capture x.pcap\n"
+                                       "State       the capture has ended\n"
+                                       "Technology  GSM\n"),
+              0U);
+}
+
 TEST(StatusText, RefusesWhatIsNoStatus) {
     EXPECT_FALSE(statusText(Value("text")));
     EXPECT_FALSE(statusText(Dictionary::make({{"Error", 1}, {"ErrorDomain", 1}})));
+}
+
+TEST(StatusText, ShowsStateAndPort) {
+    const auto status = Dictionary::make({{"Source", "the modem at /dev/ttyUSB2"},
+                                          {"Technology", "LTE"},
+                                          {"Records", 5},
+                                          {"Codes", Array::make({})},
+                                          {"Clients", Array::make({})},
+                                          {"State", "the modem has gone: it hung up"},
+                                          {"Port", Dictionary::make({{"Name", ""},
+                                                                     {"State", "closed"},
+                                                                     {"Target", "T"},
+                                                                     {"Subscription", 2},
+                                                                     {"EncryptsRecords", true},
+                                                                     {"Losing", true},
+                                                                     {"Bytes", 100},
+                                                                     {"Waiting", 3}})}});
+    EXPECT_EQ(*statusText(status),
+              "Source      the modem at /dev/ttyUSB2\n"
+              "State       the modem has gone: it hung up\n"
+              "Technology  LTE\n"
+              "Records     5\n"
+              "\n"
+              "  Log code                                       per second        in all\n"
+              "  none\n"
+              "\n"
+              "Clients\n"
+              "  none\n"
+              "\n"
+              "Port\n"
+              "  State                     closed\n"
+              "  Target                    T\n"
+              "  SIM                       2\n"
+              "  this modem encrypts its records\n"
+              "  loses records now\n"
+              "  Bytes                     100\n"
+              "  Waiting in the modem      3\n");
+}
+
+TEST(StatusJson, HoldsTheAnswerAsItIs) {
+    const auto status = Dictionary::make({{"Source", "a \"test\"\x1b"},
+                                          {"Records", 5},
+                                          {"PerSecond", 0.5},
+                                          {"Losing", true},
+                                          {"Codes", Array::make({Dictionary::make({{"Code", 45250}})})}});
+    EXPECT_EQ(*statusJson(status),
+              "{\n"
+              "  \"Source\": \"a \\\"test\\\"\\u001b\",\n"
+              "  \"Records\": 5,\n"
+              "  \"PerSecond\": 0.5,\n"
+              "  \"Losing\": true,\n"
+              "  \"Codes\": [\n"
+              "    {\n"
+              "      \"Code\": 45250\n"
+              "    }\n"
+              "  ]\n"
+              "}\n");
+    EXPECT_FALSE(statusJson("text"));
 }

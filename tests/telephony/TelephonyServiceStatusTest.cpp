@@ -12,6 +12,12 @@ TEST_F(TelephonyServiceTest, TellsItsStatusWithoutAnyClient) {
                                             {"Clients", Array::make({})}}));
 }
 
+TEST_F(TelephonyServiceTest, TellsTheStateOfItsSourceWhenThereIsSomethingToSay) {
+    start();
+    _source.condition = "the capture has ended";
+    EXPECT_EQ((*status())["State"], Value("the capture has ended"));
+}
+
 TEST_F(TelephonyServiceTest, TellsRatesByCodeAndWhatEveryClientGot) {
     start();
     auto client = makeClient("client");

@@ -179,7 +179,8 @@ TEST_F(TelephonyServiceTest, IsOneOfAKind) {
     TelephonyService second(_ports, _source);
     const Result<void> opened = second.open();
     ASSERT_FALSE(opened);
-    EXPECT_EQ(opened.error().reason, "another telephony service is running");
+    EXPECT_EQ(opened.error().reason,
+              "another telephony service is running (process " + std::to_string(::getpid()) + ")");
 }
 
 TEST_F(TelephonyServiceTest, LeavesNoPortsBehind) {

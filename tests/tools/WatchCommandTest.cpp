@@ -12,13 +12,14 @@ namespace {
 
 /// The program in a terminal of its own, where no service runs.
 struct WatchCommand : testing::Test {
-    void start() {
+    void start(const char* type = "xterm") {
         const winsize size{24, 80, 0, 0};
         child = forkpty(&screen, nullptr, nullptr, &size);
         ASSERT_GE(child, 0);
         if (child != 0) return;
         setenv("XDG_RUNTIME_DIR", directory.path().c_str(), 1);
         setenv("LC_ALL", "C", 1);
+        setenv("TERM", type, 1);
         execl(KELVOCTL, KELVOCTL, "watch", nullptr);
         _exit(127);
     }
@@ -83,6 +84,24 @@ TEST_F(WatchCommand, TheInterruptKeyGivesTheScreenBack) {
     ASSERT_EQ(::write(screen, "\x03", 1), 1);
     EXPECT_EQ(status(), 0);
     EXPECT_NE(seen.find(kGivenBack), std::string::npos);
+}
+
+TEST_F(WatchCommand, SaysWhyThereIsNoConnection) {
+    start();
+    ASSERT_TRUE(see("No telephony service is running"));
+}
+
+TEST_F(WatchCommand, WritesNoEscapeCodesToADumbTerminal) {
+    for (const char* type : {"dumb", ""}) {
+        start(type);
+        ASSERT_TRUE(see("Connecting...  No telephony service is running\r\n"));
+        kill(child, SIGTERM);
+        EXPECT_EQ(status(), 0);
+        EXPECT_EQ(seen.find('\x1b'), std::string::npos) << seen;
+        close(screen);
+        screen = -1;
+        seen.clear();
+    }
 }
 
 }  // namespace

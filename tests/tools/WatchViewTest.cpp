@@ -5,9 +5,13 @@
 #include <sys/ioctl.h>
 #include <unistd.h>
 
+#include <clocale>
 #include <optional>
 
 #include "platform/host/UniqueFd.h"
+#include "tests/support/RecordingLog.h"
+#include "tools/RetryLog.h"
+#include "tools/TerminalText.h"
 
 namespace kelvo {
 namespace {
@@ -18,6 +22,7 @@ TEST(TerminalKeys, KnowsBothFormsOfTheArrows) {
     EXPECT_EQ(TerminalKeys().feed("\x1b[A\x1bOB"), (Keys{TerminalKey::Up, TerminalKey::Down}));
     EXPECT_EQ(TerminalKeys().feed("\x1b[5~\x1b[6~\x1b[H\x1bOF"),
               (Keys{TerminalKey::PageUp, TerminalKey::PageDown, TerminalKey::Home, TerminalKey::End}));
+    EXPECT_EQ(TerminalKeys().feed("\x1b[D\x1bOC"), (Keys{TerminalKey::Left, TerminalKey::Right}));
 }
 
 TEST(TerminalKeys, PutsASequenceTogetherFromPieces) {
@@ -34,7 +39,7 @@ TEST(TerminalKeys, DropsWhatIsNoKey) {
     EXPECT_EQ(endless.feed("q"), (Keys{TerminalKey::Quit}));
 }
 
-/// A terminal of 5 rows and 20 columns and what was written to it.
+/// A terminal of 5 rows and 20 columns, for a page of 3 rows, and what was written to it.
 struct View : testing::Test {
     View() {
         int user = -1;
@@ -73,59 +78,162 @@ TEST_F(View, GivesTheScreenBack) {
 
 TEST_F(View, WritesOnlyTheRowsThatChanged) {
     TerminalWatchView view(*terminal);
-    view.showDisplay({"one", "two"}, "status");
+    view.showDisplay({"one", "two"}, {"status", ""});
     written();
-    view.showDisplay({"one", "2"}, "status");
-    EXPECT_EQ(written(), "\x1b[2;1H2\x1b[K");
-    view.showDisplay({"one", "2"}, "status");
+    view.showDisplay({"one", "2"}, {"status", ""});
+    EXPECT_EQ(written(), "\x1b[2;1H\x1b[K2");
+    view.showDisplay({"one", "2"}, {"status", ""});
     EXPECT_EQ(written(), "");
-    view.showStatus("new");
-    EXPECT_EQ(written(), "\x1b[5;1H\x1b[7m new        q quits \x1b[0m\x1b[K");
+    view.showStatus({"new", ""});
+    EXPECT_EQ(written(), "\x1b[4;1H\x1b[K\x1b[7m new                \x1b[0m");
 }
 
-TEST_F(View, CutsRowsAtTheEdgeByCharacters) {
+TEST_F(View, AnnouncesWhatItCutsOff) {
+    written();
     terminal->draw({"ääääääääääääääääääääXY"}, 1);
-    EXPECT_EQ(written().find('X'), std::string::npos);
+    EXPECT_EQ(written(), "\x1b[1;1H\x1b[Käääääääääääääääääää…");
     terminal->draw({"äääääääääääääääääääZ"}, 1);
-    EXPECT_NE(written().find('Z'), std::string::npos);
+    EXPECT_EQ(written(), "\x1b[1;1H\x1b[KäääääääääääääääääääZ");
 }
 
 TEST_F(View, ScrollsWithinTheDisplay) {
     TerminalWatchView view(*terminal);
-    view.showDisplay({"a", "b", "c", "d", "e", "f"}, "s");
-    EXPECT_NE(written().find("1-4 of 6"), std::string::npos);
+    view.showDisplay({"a", "b", "c", "d", "e"}, {"s", ""});
+    EXPECT_NE(written().find("1-3 of 5"), std::string::npos);
     view.press(TerminalKey::Down);
-    EXPECT_EQ(written().substr(0, 14), "\x1b[1;1Hb\x1b[K\x1b[2;");
+    EXPECT_EQ(written().substr(0, 14), "\x1b[1;1H\x1b[Kb\x1b[2;");
     view.press(TerminalKey::PageDown);
-    EXPECT_NE(written().find("3-6 of 6"), std::string::npos);
+    EXPECT_NE(written().find("3-5 of 5"), std::string::npos);
     view.press(TerminalKey::Down);
     EXPECT_EQ(written(), "");
     view.press(TerminalKey::Home);
-    EXPECT_NE(written().find("1-4 of 6"), std::string::npos);
+    EXPECT_NE(written().find("1-3 of 5"), std::string::npos);
     view.press(TerminalKey::End);
-    EXPECT_NE(written().find("3-6 of 6"), std::string::npos);
-    view.showDisplay({"a"}, "s");
-    EXPECT_NE(written().find("\x1b[1;1Ha\x1b[K"), std::string::npos);
+    EXPECT_NE(written().find("3-5 of 5"), std::string::npos);
+    view.showDisplay({"a"}, {"s", ""});
+    EXPECT_NE(written().find("\x1b[1;1H\x1b[Ka"), std::string::npos);
 }
 
-TEST_F(View, DropsHintsBeforeTheStatus) {
+TEST_F(View, ScrollsAsideToWhatDoesNotFit) {
     TerminalWatchView view(*terminal);
-    view.showDisplay({"a", "b", "c", "d", "e", "f"}, "Updating");
-    EXPECT_NE(written().find(" Updating  1-4 of 6 "), std::string::npos);
-    view.showStatus("Connecting...");
-    EXPECT_NE(written().find("\x1b[7m Connecting...      \x1b[0m"), std::string::npos);
+    view.showDisplay({"Address  2001:db8:0:1:2:3:4:5", "  Cell  00000102"}, {"s", ""});
+    EXPECT_NE(written().find("\x1b[1;1H\x1b[KAddress  2001:db8:0…\x1b[2;1H\x1b[K  Cell  00000102"), std::string::npos);
+    view.press(TerminalKey::Left);
+    EXPECT_EQ(written(), "");
+    view.press(TerminalKey::Right);  // as far as there is something: 29 columns, 20 of them in sight
+    EXPECT_EQ(written(), "\x1b[1;1H\x1b[K…001:db8:0:1:2:3:4:5\x1b[2;1H\x1b[K…000102");
+    view.press(TerminalKey::Right);
+    EXPECT_EQ(written(), "");
+    view.press(TerminalKey::Left);
+    EXPECT_EQ(written(), "\x1b[1;1H\x1b[KAddress  2001:db8:0…\x1b[2;1H\x1b[K  Cell  00000102");
+}
+
+TEST_F(View, KeepsPlaceAndKeysInSightFrom34ColumnsOn) {
+    const winsize size{5, 34, 0, 0};
+    ioctl(_program.get(), TIOCSWINSZ, &size);
+    TerminalWatchView view(*terminal);
+    view.showDisplay(std::vector<std::string>(1450, "a"), {"Updated 2026-11-22 at 06:00:00", ""});
+    EXPECT_NE(written().find("\x1b[4;1H\x1b[K\x1b[7m Updated 2026-11-22 at 06:00:00   \x1b[0m"
+                             "\x1b[5;1H\x1b[K\x1b[7m 1-3 of 1450       arrows, q quits\x1b[0m"),
+              std::string::npos);
+    view.press(TerminalKey::End);
+    EXPECT_NE(written().find("\x1b[7m 1448-1450 of 1450 arrows, q quits\x1b[0m"), std::string::npos);
+}
+
+TEST_F(View, DropsTheKeysBeforeThePlaceInFewerColumns) {
+    TerminalWatchView view(*terminal);
+    view.showDisplay({"a"}, {"Updated 2026-11-22 at 06:00:00", ""});
+    EXPECT_NE(written().find("\x1b[4;1H\x1b[K\x1b[7m Updated 2026-11-22…\x1b[0m"
+                             "\x1b[5;1H\x1b[K\x1b[7m 1-1 of 1           \x1b[0m"),
+              std::string::npos);
+}
+
+TEST_F(View, ARemarkStandsBesideTheStatusOrInItsPlace) {
+    TerminalWatchView view(*terminal);
+    view.showStatus({"Now", "No records"});
+    EXPECT_NE(written().find("\x1b[7m Now  No records    \x1b[0m"), std::string::npos);
+    view.showStatus({"Updated", "No records for 24 s"});
+    EXPECT_NE(written().find("\x1b[7m No records for 24 s\x1b[0m"), std::string::npos);
 }
 
 TEST_F(View, DrawsEverythingAgainAfterAChangeOfSize) {
     TerminalWatchView view(*terminal);
-    view.showDisplay({"a", "b", "c"}, "s");
-    const winsize size{3, 30, 0, 0};
+    view.showDisplay({"a", "b", "c"}, {"s", ""});
+    const winsize size{4, 30, 0, 0};
     ioctl(_program.get(), TIOCSWINSZ, &size);
     written();
     view.redraw();
     const std::string drawn = written();
-    EXPECT_EQ(drawn.find("\x1b[2J\x1b[1;1Ha\x1b[K\x1b[2;1Hb\x1b[K\x1b[3;1H\x1b[7m s"), 0U);
+    EXPECT_EQ(drawn.find("\x1b[2J\x1b[1;1H\x1b[Ka\x1b[2;1H\x1b[Kb\x1b[3;1H\x1b[K\x1b[7m s"), 0U);
     EXPECT_NE(drawn.find("1-2 of 3"), std::string::npos);
+}
+
+/// What the printed view writes in `work`.
+template <class Work>
+std::string printed(Work work) {
+    testing::internal::CaptureStdout();
+    work();
+    return testing::internal::GetCapturedStdout();
+}
+
+TEST(PrintedView, PrintsEveryDisplayUnderItsStatus) {
+    PrintedWatchView view;
+    EXPECT_EQ(printed([&] {
+                  view.showStatus({"Connecting...", "No telephony service is running"});
+                  view.showDisplay({"a  1", "b  2"}, {"Updated", ""});
+                  view.showDisplay({"a  1"}, {"Updated", ""});
+              }),
+              "Connecting...  No telephony service is running\nUpdated\na  1\nb  2\nUpdated\na  1\n");
+}
+
+TEST(PrintedView, TellsOnceThatNoRecordsCome) {
+    PrintedWatchView view;
+    EXPECT_EQ(printed([&] {
+                  view.showStatus({"Updated", "No records for 10 s"});
+                  view.showStatus({"Updated", "No records for 12 s"});
+                  view.showStatus({"Connecting...", "No telephony service is running"});
+                  view.showStatus({"Connecting...", "No telephony service is running"});
+              }),
+              "Updated  No records for 10 s\nConnecting...  No telephony service is running\n");
+}
+
+TEST(ClippedText, ShowsWhatFitsAndMarksTheEdgesItGoesBeyond) {
+    EXPECT_EQ(clipped("0123456789", 0, 10), "0123456789");
+    EXPECT_EQ(clipped("0123456789", 0, 9), "01234567…");
+    EXPECT_EQ(clipped("0123456789", 3, 5), "…456…");
+    EXPECT_EQ(clipped("0123456789", 5, 5), "…6789");
+    EXPECT_EQ(clipped("0123456789", 12, 5), "…");
+    EXPECT_EQ(clipped("    value", 4, 5), "value");  // nothing but blanks lies before
+    EXPECT_EQ(clipped("", 0, 5), "");
+    EXPECT_EQ(clipped("0123456789", 3, 1), "…");
+    EXPECT_EQ(clipped("0123456789", 3, 0), "");
+}
+
+TEST(ClippedText, CountsColumnsNotBytes) {
+    const std::string before = std::setlocale(LC_CTYPE, nullptr);
+    ASSERT_NE(std::setlocale(LC_CTYPE, "C.UTF-8"), nullptr);
+    EXPECT_EQ(columnsOf("äöü"), 3U);
+    EXPECT_EQ(columnsOf("中国移动"), 8U);
+    EXPECT_EQ(clipped("中国移动", 0, 8), "中国移动");
+    EXPECT_EQ(clipped("中国移动", 0, 6), "中国 …");
+    std::setlocale(LC_CTYPE, before.c_str());
+}
+
+TEST(RetryLog, TellsOfAFailedStartOnceUntilTheConnectionHasBeenThere) {
+    test::RecordingLog log;
+    RetryLog retry(log);
+    const auto tryToStart = [&] { retry.write(Level::Error, "Could not create PLServerConnection"); };
+    tryToStart();
+    tryToStart();
+    EXPECT_EQ(log.lines().size(), 1U);
+    retry.setConnected(true);
+    retry.write(Level::Warning, "LTE Serving Cell Info");
+    retry.write(Level::Warning, "LTE Serving Cell Info");
+    EXPECT_EQ(log.lines().size(), 3U);
+    retry.setConnected(false);
+    tryToStart();
+    tryToStart();
+    EXPECT_EQ(log.lines().size(), 4U);
 }
 
 }  // namespace

@@ -3,6 +3,7 @@
 #include <QImage>
 #include <QQuickItem>
 #include <QTest>
+#include <optional>
 
 #include "tests/ui/ScreenFixture.h"
 
@@ -41,9 +42,13 @@ TEST_F(TransitionTest, ShowsTheFirstPaneWithoutOne) {
 
 TEST_F(TransitionTest, SlidesAPaneInFromTheRightThatIsPushed) {
     start();
+    std::optional<double> comesFrom;
+    QObject::connect(scene->app().navigation(), &NavigationStack::pushed, &scene->view(), [&] {
+        EXPECT_TRUE(slides());
+        comesFrom = pageOf("Serving Cell");
+    });
     scene->tapText(text("Serving Cell"));
-    EXPECT_TRUE(slides());
-    EXPECT_EQ(pageOf("-95 dBm"), 360);  // beside the window
+    EXPECT_EQ(comesFrom, 360);  // beside the window
     scene->settle();
     EXPECT_FALSE(slides());
     EXPECT_EQ(pageOf("-95 dBm"), 0);
@@ -53,10 +58,15 @@ TEST_F(TransitionTest, SlidesAPaneOutToTheRightThatIsPopped) {
     start();
     scene->tapText(text("Serving Cell"));
     scene->settle();
+    bool popped = false;
+    QObject::connect(scene->app().navigation(), &NavigationStack::popped, &scene->view(), [&] {
+        popped = true;
+        EXPECT_TRUE(slides());
+        EXPECT_EQ(pageOf("-95 dBm"), 0);  // still there
+        EXPECT_LT(pageOf("Registration"), 0);
+    });
     scene->press(Qt::Key_Escape);
-    EXPECT_TRUE(slides());
-    EXPECT_EQ(pageOf("-95 dBm"), 0);  // still there
-    EXPECT_LT(pageOf("Registration"), 0);
+    EXPECT_TRUE(popped);
     scene->settle();
     EXPECT_EQ(pageOf("Registration"), 0);
     EXPECT_FALSE(scene->shows(text("-95 dBm")));
@@ -161,8 +171,11 @@ TEST_F(TransitionTest, MarksRowsThatOpenAmongRecycledOnes) {
 TEST_F(TransitionTest, MarksEveryEntryOfASnapshot) {
     start(true);
     scene->show(sampleTree(2));
+    bool moves = false;
+    QObject::connect(&scene->app(), &KelvoApp::saveViewPresented, &scene->view(),
+                     [&] { moves = scene->itemOfType("SaveSheet")->property("moving").toBool(); });
     scene->tapText(text("Save"));
-    EXPECT_TRUE(scene->itemOfType("SaveSheet")->property("moving").toBool());  // presented animated
+    EXPECT_TRUE(moves);  // presented animated
     scene->settle();
     for (const char* entry : {"Snapshot (2011-03-04 09:15:04 +0000)", "Snapshot (2011-03-04 09:15:06 +0000)"}) {
         const QQuickItem* row = scene->itemWithText(text(entry))->parentItem();

@@ -10,6 +10,8 @@
 namespace kelvo {
 namespace {
 
+using Has = std::function<bool(LogCode)>;
+
 // CDMA has no sections: what each of its records shows.
 struct CdmaRecord {
     LogCode code;
@@ -28,14 +30,14 @@ constexpr CdmaRecord kCdmaRecords[] = {
 };
 // clang-format on
 
-void sortIn(std::string screen, std::span<const LogCode> codes, const wire::Ranges& ranges, FillableScreens& screens) {
+void sortIn(std::string screen, std::span<const LogCode> codes, const Has& has, FillableScreens& screens) {
     if (codes.empty()) return;  // a screen that no record fills
     std::size_t modems = 0;
     std::size_t had = 0;
     for (const LogCode code : codes) {
         if (code >= kExtendedLogCodes) continue;
         ++modems;
-        if ((code & 0xFFF) < ranges[code >> 12]) ++had;
+        if (has(code)) ++had;
     }
     auto& list = modems == 0     ? screens.phone
                  : had == 0      ? screens.empty
@@ -44,24 +46,28 @@ void sortIn(std::string screen, std::span<const LogCode> codes, const wire::Rang
     list.push_back(std::move(screen));
 }
 
-FillableScreens of(Technology technology, const ClassIndex& index, const wire::Ranges& ranges) {
+FillableScreens of(Technology technology, const ClassIndex& index, const Has& has) {
     FillableScreens screens{technology, {}, {}, {}, {}};
     for (const std::string_view name : index.getAllNames())
-        sortIn(std::string(name), index.getClass(name)->getLogCodeArray(), ranges, screens);
+        sortIn(std::string(name), index.getClass(name)->getLogCodeArray(), has, screens);
     return screens;
 }
 
-FillableScreens ofCdma(const wire::Ranges& ranges) {
+FillableScreens ofCdma(const Has& has) {
     FillableScreens screens{Technology::CDMA, {}, {}, {}, {}};
-    for (const CdmaRecord& record : kCdmaRecords) sortIn(record.shows, {&record.code, 1}, ranges, screens);
+    for (const CdmaRecord& record : kCdmaRecords) sortIn(record.shows, {&record.code, 1}, has, screens);
     return screens;
 }
 
 }  // namespace
 
+std::vector<FillableScreens> fillableScreens(const Has& has) {
+    return {of(Technology::GSM, OSK_GSMClassIndex(), has), ofCdma(has), of(Technology::LTE, LTEClassIndex(), has),
+            of(Technology::UTRAN, UTRANClassIndex(), has)};
+}
+
 std::vector<FillableScreens> fillableScreens(const wire::Ranges& ranges) {
-    return {of(Technology::GSM, OSK_GSMClassIndex(), ranges), ofCdma(ranges),
-            of(Technology::LTE, LTEClassIndex(), ranges), of(Technology::UTRAN, UTRANClassIndex(), ranges)};
+    return fillableScreens([&](LogCode code) { return (code & 0xFFF) < ranges[code >> 12]; });
 }
 
 }  // namespace kelvo

@@ -23,12 +23,12 @@ public:
 
 /// What a modem says of itself.
 struct ModemProbe {
-    std::string failure;  ///< why there is nothing more; empty: it answers as a diagnostic port does
-    std::string target;   ///< what it calls itself; may be empty
-    std::string buildId;  ///< may be empty
-    std::optional<wire::Ranges> ranges;
-    std::string rangesFailure;  ///< why there are no ranges
-    bool isStreaming = false;   ///< records come: a reader has asked for them, or has left them running
+    std::string failure{};  ///< why there is nothing more; empty: it answers as a diagnostic port does
+    std::string target{};   ///< what it calls itself; may be empty
+    std::string buildId{};  ///< may be empty
+    std::optional<wire::Ranges> ranges{};
+    std::string rangesFailure{};  ///< why there are no ranges
+    bool isStreaming = false;     ///< records come: a reader has asked for them, or has left them running
 };
 
 /// Asks for version, build and ranges, and for nothing that changes what the modem does. Takes two seconds at most

@@ -9,7 +9,7 @@ namespace kelvo {
 struct PortAccess {
     bool exists = false;
     bool mayOpen = false;  ///< to read and to write
-    std::string group;     ///< that may, when the user is in it; empty: no group may
+    std::string group{};   ///< that may, when the user is in it; empty: no group may
 };
 
 PortAccess accessTo(const std::filesystem::path& port);

@@ -12,8 +12,8 @@ struct PortHolders {
         int process = 0;
         std::string name;  ///< of its program; may be empty
     };
-    std::vector<Holder> known;  ///< in the order of their numbers
-    bool someHidden = false;    ///< processes of others may be among them: this user may not look into those
+    std::vector<Holder> known{};  ///< in the order of their numbers
+    bool someHidden = false;      ///< processes of others may be among them: this user may not look into those
 };
 
 /// Looks through the open files of every process below `proc` ("/proc") for the node `port`. This process is left out.

@@ -8,15 +8,9 @@ namespace {
 
 using namespace std::chrono_literals;
 
-// Pilot bursts go out with all of a sector's power. The carrier lies higher than the one that the drive was built for.
-const Loading kLoading{
-    .gain = pathLoss(1000, kOneXCarrier.downlinkMHz) - pathLoss(1000, kEvdoCarrier.downlinkMHz), .pilot = 1, .all = 1};
-constexpr double kTurnaround = -76;      // dB: mean output power is this less the input
-constexpr double kMostPower = 23;        // dBm
-constexpr double kLeastPower = -50;      // dBm
-constexpr double kSecondAntenna = -2.5;  // dB
-constexpr double kReadingNoise = 0.4;    // dB
-constexpr double kBestPilot = 0.97;      // of all that is received: echoes of the own sector disturb too
+constexpr double kMostPower = 23;    // dBm
+constexpr double kLeastPower = -50;  // dBm
+constexpr double kBestPilot = 0.97;  // of all that is received: echoes of the own sector disturb too
 constexpr std::size_t kFingers = 6;
 constexpr double kStrongestPath = 20;                        // dB: what a finger can tell
 constexpr double kFingerLock = -12;                          // dB; a weaker path has no finger
@@ -29,15 +23,13 @@ double carrierToInterference(double strength) {
 
 }  // namespace
 
-EvdoModem::EvdoModem(const Network& network, Random random)
-    : _network(network), _random(std::move(random)), _link(_random.split()) {}
+EvdoModem::EvdoModem(const Network& network, const Reception& air, Random random)
+    : _network(network), _air(air), _random(std::move(random)), _link(_random.split()) {}
 
-void EvdoModem::measure(const Drive& drive, Time duration, double demand) {
-    _air = listen(drive, kLoading, _random);
-    _status.rx0 = _air.total + kReadingNoise * _random.normal();
-    _status.rx1 = _air.total + kSecondAntenna + kReadingNoise * _random.normal();
-    const double closedLoop = kReadingNoise * 2 * _random.normal();
-    _status.tx = std::clamp(kTurnaround - _status.rx0 + closedLoop, kLeastPower, kMostPower);
+void EvdoModem::measure(Time duration, double demand) {
+    _status.rx0 = _air.rx0;
+    _status.rx1 = _air.rx1;
+    _status.tx = std::clamp(_air.openLoop, kLeastPower, kMostPower);
     readPilots();
     placeFingers();
     if (_status.state != EvdoState::Connected || _status.session != SessionState::Open) return;
@@ -47,12 +39,12 @@ void EvdoModem::measure(const Drive& drive, Time duration, double demand) {
 
 void EvdoModem::step(Time now, bool available, bool browse) {
     if (!available) {
-        begin(EvdoState::Inactive, now, 0ms);
+        begin(now, EvdoState::Inactive, 0ms);
         _pilots.clear();
     } else if (now >= _until) {
         advance(now, browse);
     }
-    if (_status.state == EvdoState::Connected) _pilots.update(_air, now);
+    if (_status.state == EvdoState::Connected) _pilots.update(now, _air);
     const std::vector<std::size_t> before = std::exchange(_followed, _pilots.sectors());
     readPilots();
     if (_followed != before) placeFingers();
@@ -60,31 +52,31 @@ void EvdoModem::step(Time now, bool available, bool browse) {
 
 void EvdoModem::advance(Time now, bool browse) {
     switch (_status.state) {
-        case EvdoState::Inactive: return begin(EvdoState::Acquisition, now, 400ms);
-        case EvdoState::Acquisition: _pilots.follow(_air.strongest()); return begin(EvdoState::Sync, now, 200ms);
-        case EvdoState::Sync: return begin(EvdoState::Idle, now, 100ms);
+        case EvdoState::Inactive: return begin(now, EvdoState::Acquisition, 400ms);
+        case EvdoState::Acquisition: _pilots.follow(_air.strongest()); return begin(now, EvdoState::Sync, 200ms);
+        case EvdoState::Sync: return begin(now, EvdoState::Idle, 100ms);
         case EvdoState::Idle: return idle(now, browse);
         case EvdoState::Access:
             if (_status.session != SessionState::Open) setUpAddress();
-            return begin(EvdoState::Connected, now, 800ms);
+            return begin(now, EvdoState::Connected, 800ms);
         case EvdoState::Connected:
             _status.session = SessionState::Open;
             if (browse) return;
             _pilots.follow(_pilots.reference());
-            return begin(EvdoState::Idle, now, 0ms);
+            return begin(now, EvdoState::Idle, 0ms);
     }
 }
 
-void EvdoModem::begin(EvdoState state, Time now, Time duration) {
+void EvdoModem::begin(Time now, EvdoState state, Time duration) {
     _status.state = state;
     _until = now + duration;
 }
 
 void EvdoModem::idle(Time now, bool browse) {
-    _pilots.reselect(_air, now);
+    _pilots.reselect(now, _air);
     const bool moved = static_cast<int>(_network.cells[_pilots.reference()].zone) != _sessionZone;
     if (moved || _status.session != SessionState::Open) _status.session = SessionState::AddressSetup;
-    if (browse || _status.session != SessionState::Open) begin(EvdoState::Access, now, 400ms);
+    if (browse || _status.session != SessionState::Open) begin(now, EvdoState::Access, 400ms);
 }
 
 /// The subnet gives a new address; a session that is new to all is negotiated by the phone, one that moved in by the

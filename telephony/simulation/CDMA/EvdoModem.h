@@ -8,11 +8,12 @@ namespace kelvo::simulation::cdma {
 /// The EV-DO half of the modem: works while 1x leaves it the receiver.
 class EvdoModem {
 public:
-    EvdoModem(const Network& network, Random random);
+    /// `air` is what it hears; both must outlive it.
+    EvdoModem(const Network& network, const Reception& air, Random random);
 
-    /// Reads the air, and receives and sends the packets of `duration` when connected; `demand` is the part of the
-    /// link that the user asks for, 0 to 1.
-    void measure(const Drive& drive, Time duration, double demand);
+    /// Acts on what was measured, and receives and sends the packets of `duration` when connected; `demand` is the part
+    /// of the link that the user asks for, 0 to 1.
+    void measure(Time duration, double demand);
     /// Moves on; `available` while 1x is idle, `browse` while the user wants data.
     void step(Time now, bool available, bool browse);
 
@@ -21,15 +22,15 @@ public:
 
 private:
     void advance(Time now, bool browse);
-    void begin(EvdoState state, Time now, Time duration);
+    void begin(Time now, EvdoState state, Time duration);
     void idle(Time now, bool browse);
     void setUpAddress();
     void readPilots();
     void placeFingers();
 
     const Network& _network;
+    const Reception& _air;
     Random _random;
-    Air _air;
     PilotSet _pilots{kEvdoRules};
     std::vector<std::size_t> _followed;  // the pilots that the fingers were placed for
     PacketLink _link;

@@ -9,18 +9,21 @@ namespace kelvo::simulation::cdma {
 /// A hybrid CDMA2000 modem: 1x, on whose calls EV-DO leaves it the receiver, and EV-DO.
 class Modem {
 public:
-    /// `network` must outlive it.
-    Modem(const Network& network, Random random) : _oneX(network, random.split()), _evdo(network, random.split()) {}
+    static constexpr Time kMeasurement = std::chrono::milliseconds(100);
 
-    /// Reads the air; `demand` is the part of the link that the user asks for until `duration` from now, 0 to 1.
-    void measure(const Drive& drive, Time duration, double demand) {
-        _oneX.measure(drive);
-        _evdo.measure(drive, duration, demand);
-    }
-    /// Moves on to then, one step after the last time.
-    void step(Time now, PhoneUser::Activity activity) {
-        _oneX.step(now, activity == PhoneUser::Activity::Talking);
-        _evdo.step(now, _oneX.isIdle(), activity == PhoneUser::Activity::Browsing);
+    /// Both must outlive it.
+    Modem(const Network& network, const Air& air, Random random)
+        : _oneX(network, air.oneX(), random.split()), _evdo(network, air.evdo(), random.split()) {}
+
+    /// Moves on to then, one step after the last time; `hasMeasured`, as after each kMeasurement: the air was read
+    /// anew.
+    void step(Time now, const PhoneUser& user, bool hasMeasured) {
+        if (hasMeasured) {
+            _oneX.measure();
+            _evdo.measure(kMeasurement, user.demand());
+        }
+        _oneX.step(now, user.isTalking());
+        _evdo.step(now, _oneX.isIdle(), user.isBrowsing());
     }
     /// The next 1x traffic frame of 20 ms comes.
     void receiveFrame() { _oneX.receiveFrame(); }

@@ -8,44 +8,39 @@ namespace {
 
 using namespace std::chrono_literals;
 
-constexpr Loading kLoading{.gain = 0, .pilot = 0.2, .all = 0.65};
 constexpr Time kSlotCycle = 2560ms;  // SLOT_CYCLE_INDEX 1
 constexpr Time kAwake = 480ms;       // of each cycle, for the paging slot and a look at the neighbors
 constexpr Time kOverhead = 300ms;
 constexpr Time kRegistration = 1200ms;
 constexpr Time kAccess = 600ms;
-constexpr double kTurnaround = -73;  // dB: mean output power is this less the input (3GPP2 C.S0011)
-constexpr double kMostPower = 24;    // dBm
+constexpr double kMostPower = 24;  // dBm
 constexpr double kLeastPower = -50;
-constexpr double kSecondAntenna = -1.5;  // dB
-constexpr double kReadingNoise = 0.4;    // dB
 
 /// Frames lost by what all active pilots together are received with, in dB: power control holds 1 % until it cannot.
 double frameErrors(double strength) { return 0.01 + 0.6 / (1 + std::exp(strength + 13)); }
 
 }  // namespace
 
-OneXModem::OneXModem(const Network& network, Random random) : _network(network), _random(std::move(random)) {}
+OneXModem::OneXModem(const Network& network, const Reception& air, Random random)
+    : _network(network), _air(air), _random(std::move(random)) {}
 
 bool OneXModem::isIdle() const {
     return _status.state == OneXState::Sleep || (_status.state == OneXState::Paging && _task != Task::Access);
 }
 
-void OneXModem::measure(const Drive& drive) {
-    _air = listen(drive, kLoading, _random);
-    _status.rx0 = _air.total + kReadingNoise * _random.normal();
-    _status.rx1 = _air.total + kSecondAntenna + kReadingNoise * _random.normal();
-    const double closedLoop = kReadingNoise * 2 * _random.normal();
-    _status.tx = std::clamp(kTurnaround - _status.rx0 + closedLoop, kLeastPower, kMostPower);
+void OneXModem::measure() {
+    _status.rx0 = _air.rx0;
+    _status.rx1 = _air.rx1;
+    _status.tx = std::clamp(_air.openLoop, kLeastPower, kMostPower);
     readPilots();
 }
 
 void OneXModem::step(Time now, bool talk) {
     if (_status.state == OneXState::Traffic) {
         if (talk) {
-            _pilots.update(_air, now);
+            _pilots.update(now, _air);
         } else {
-            begin(OneXState::Initial, now, 100ms);
+            begin(now, OneXState::Initial, 100ms);
             _pilots.clear();
         }
     } else if (now >= _until) {
@@ -65,23 +60,23 @@ void OneXModem::receiveFrame() {
     _status.frameErased = _random.chance(frameErrors(toDecibels(together)));
 }
 
-void OneXModem::begin(OneXState state, Time now, Time duration) {
+void OneXModem::begin(Time now, OneXState state, Time duration) {
     _status.state = state;
     _until = now + duration;
 }
 
-void OneXModem::begin(Task task, Time now, Time duration) {
+void OneXModem::begin(Time now, Task task, Time duration) {
     _task = task;
-    begin(OneXState::Paging, now, duration);
+    begin(now, OneXState::Paging, duration);
 }
 
 void OneXModem::powerUp(Time now) {
     switch (_status.state) {
-        case OneXState::Powerup: return begin(OneXState::Initial, now, 100ms);
-        case OneXState::Initial: return begin(OneXState::Acquisition, now, 200ms);
-        case OneXState::Acquisition: _pilots.follow(_air.strongest()); return begin(OneXState::Sync, now, 100ms);
-        case OneXState::Sync: return begin(OneXState::Slew, now, 60ms);
-        default: return begin(Task::Overhead, now, kOverhead);
+        case OneXState::Powerup: return begin(now, OneXState::Initial, 100ms);
+        case OneXState::Initial: return begin(now, OneXState::Acquisition, 200ms);
+        case OneXState::Acquisition: _pilots.follow(_air.strongest()); return begin(now, OneXState::Sync, 100ms);
+        case OneXState::Sync: return begin(now, OneXState::Slew, 60ms);
+        default: return begin(now, Task::Overhead, kOverhead);
     }
 }
 
@@ -101,11 +96,11 @@ void OneXModem::finishTask() {
 void OneXModem::idle(Time now, bool talk) {
     if (_status.state == OneXState::Traffic) return;
     const Cell& cell = _network.cells[_pilots.reference()];
-    if (static_cast<int>(cell.zone) != _registeredZone) return begin(Task::Registration, now, kRegistration);
-    if (talk) return begin(Task::Access, now, kAccess);
+    if (static_cast<int>(cell.zone) != _registeredZone) return begin(now, Task::Registration, kRegistration);
+    if (talk) return begin(now, Task::Access, kAccess);
     const bool awake = now % kSlotCycle < kAwake;
     _status.state = awake ? OneXState::Paging : OneXState::Sleep;
-    if (awake && _pilots.reselect(_air, now)) begin(Task::Overhead, now, kOverhead);
+    if (awake && _pilots.reselect(now, _air)) begin(now, Task::Overhead, kOverhead);
 }
 
 void OneXModem::readPilots() {

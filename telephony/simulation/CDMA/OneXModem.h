@@ -7,10 +7,11 @@ namespace kelvo::simulation::cdma {
 /// The 1x half of the modem: finds the system, sleeps between its paging slots, hands off, registers, talks.
 class OneXModem {
 public:
-    OneXModem(const Network& network, Random random);
+    /// `air` is what it hears; both must outlive it.
+    OneXModem(const Network& network, const Reception& air, Random random);
 
-    /// Reads the air; all of the status but its state is as read last.
-    void measure(const Drive& drive);
+    /// Acts on what was measured; all of the status but its state is as read last.
+    void measure();
     /// Moves on; `talk` while the user wants a call.
     void step(Time now, bool talk);
     /// The next traffic frame of 20 ms comes.
@@ -27,16 +28,16 @@ private:
     /// What keeps an idle phone from sleeping.
     enum class Task { None, Overhead, Registration, Access };
 
-    void begin(OneXState state, Time now, Time duration);
-    void begin(Task task, Time now, Time duration);
+    void begin(Time now, OneXState state, Time duration);
+    void begin(Time now, Task task, Time duration);
     void powerUp(Time now);
     void finishTask();
     void idle(Time now, bool talk);
     void readPilots();
 
     const Network& _network;
+    const Reception& _air;
     Random _random;
-    Air _air;
     PilotSet _pilots{kOneXRules};
     OneXStatus _status;
     System _system;

@@ -10,7 +10,7 @@ void PilotSet::follow(std::size_t sector) {
     _better.restart();
 }
 
-bool PilotSet::reselect(const Air& air, Time now) {
+bool PilotSet::reselect(Time now, const Reception& air) {
     const std::size_t best = air.strongest();
     const double margin = air.pilots[best] - air.pilots[_reference];
     const bool lost = margin > 0 && air.pilots[_reference] < _rules.drop;
@@ -19,8 +19,8 @@ bool PilotSet::reselect(const Air& air, Time now) {
     return true;
 }
 
-void PilotSet::update(const Air& air, Time now) {
-    dropWeak(air, now);
+void PilotSet::update(Time now, const Reception& air) {
+    dropWeak(now, air);
     const auto strength = [&air](const Member& member) { return air.pilots[member.sector]; };
     const Member& best = *std::ranges::max_element(_members, {}, strength);
     if (!contains(_reference) || strength(best) > air.pilots[_reference] + kReferenceMargin) _reference = best.sector;
@@ -29,7 +29,7 @@ void PilotSet::update(const Air& air, Time now) {
     }
 }
 
-std::vector<PilotReading> PilotSet::readings(const Air& air, const Network& network) const {
+std::vector<PilotReading> PilotSet::readings(const Reception& air, const Network& network) const {
     std::vector<PilotReading> readings;
     readings.reserve(_members.size());
     for (const Member& member : _members) {
@@ -48,7 +48,7 @@ bool PilotSet::contains(std::size_t sector) const {
     return std::ranges::find(_members, sector, &Member::sector) != _members.end();
 }
 
-void PilotSet::dropWeak(const Air& air, Time now) {
+void PilotSet::dropWeak(Time now, const Reception& air) {
     const auto lost = [this, &air, now](Member& member) {
         return member.weak(air.pilots[member.sector] < _rules.drop, member.sector, now);
     };
@@ -57,7 +57,7 @@ void PilotSet::dropWeak(const Air& air, Time now) {
     if (_members.empty()) _members.push_back(last);  // the last one is held on to: the call drops or recovers
 }
 
-void PilotSet::offer(std::size_t sector, const Air& air) {
+void PilotSet::offer(std::size_t sector, const Reception& air) {
     if (_members.size() < kMost) {
         _members.push_back(member(sector));
         return;

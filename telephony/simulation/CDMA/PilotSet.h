@@ -39,12 +39,12 @@ public:
     /// Leaves all but this one.
     void follow(std::size_t sector);
     /// Idle: moves to another pilot when it should, at once when its own is too weak. True when it did.
-    bool reselect(const Air& air, Time now);
+    bool reselect(Time now, const Reception& air);
     /// Connected: drops, adds and replaces.
-    void update(const Air& air, Time now);
+    void update(Time now, const Reception& air);
 
     /// The members as read last, in the order in which they joined.
-    std::vector<PilotReading> readings(const Air& air, const Network& network) const;
+    std::vector<PilotReading> readings(const Reception& air, const Network& network) const;
     std::vector<std::size_t> sectors() const;
 
 private:
@@ -54,8 +54,8 @@ private:
     };
     Member member(std::size_t sector) const { return {sector, HeldFor(_rules.dropTime)}; }
     bool contains(std::size_t sector) const;
-    void dropWeak(const Air& air, Time now);
-    void offer(std::size_t sector, const Air& air);
+    void dropWeak(Time now, const Reception& air);
+    void offer(std::size_t sector, const Reception& air);
 
     PilotRules _rules;
     std::vector<Member> _members;

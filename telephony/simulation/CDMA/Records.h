@@ -4,7 +4,7 @@
 #include "telephony/simulation/CDMA/Reports.h"
 #include "telephony/simulation/Time.h"
 
-/// The log records of a CDMA2000 modem: one function a record, from what the modem knows to bytes. Values are rounded
+/// The log records of a CDMA2000 modem: one function a record, from what it reports to bytes. Values are rounded
 /// to the record's resolution and cut to its range.
 namespace kelvo::simulation::cdma {
 

@@ -7,7 +7,7 @@
 
 namespace kelvo::simulation::gsm {
 
-/// What the phone measures of both layers. Readings are filtered over about a second, as the modem filters them, so
+/// What the phone's receiver has of both layers' cells. Readings are filtered over about a second, as the modem filters them, so
 /// that the fading is mostly gone; each stands until the next measurement.
 class Air {
 public:

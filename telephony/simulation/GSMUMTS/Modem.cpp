@@ -9,12 +9,10 @@ namespace {
 using namespace std::chrono_literals;
 
 constexpr Time kCellSelection = 200ms;
-constexpr Time kFirstUse = 1400ms;
 constexpr Time kOpening = 200ms;
 constexpr Time kClosing = 200ms;
 constexpr Time kFachTail = 4s;
 constexpr Time kPchTail = 8s;
-constexpr Time kReselection = 200ms;
 constexpr Time kInterRatChange = 300ms;
 
 constexpr double kRxLevAccessMin = -104;  // dBm
@@ -35,20 +33,17 @@ constexpr std::size_t kNeighbors = 6;
 
 }  // namespace
 
-Modem::Modem(const Network& network, const Air& air, Random random)
-    : _network(network), _air(air), _random(std::move(random)), _useEnds(kFirstUse) {}
-
-void Modem::step(Time now, bool hasMeasured) {
+void Modem::step(Time now, const PhoneUser& user, bool hasMeasured) {
     if (!_isCamped) {
         if (now < kCellSelection) return;
         _isCamped = true;
         _serving = _air.gsmByLevel().front();
         rank();
     }
-    followUse(now);
-    if (_change && now >= _change->until) follow(*_change, now);
+    follow(user.activity());
+    if (_change && now >= _change->until) complete(now, *_change);
     if (!_change) followLink(now);
-    _registration.step({area(), _rat, _link == Link::Open, _use}, now);
+    _registration.step(now, {area(), _rat, _link == Link::Open, _activity});
     if (!hasMeasured) return;
     rank();
     if (_change) return;
@@ -90,22 +85,14 @@ RrcState Modem::rrcState() const {
     }
 }
 
-void Modem::followUse(Time now) {
-    if (_use == Use::Voice && _random.chance(0.02)) _isSilent = !_isSilent;  // about each second
-    if (now < _useEnds) return;
-    if (_use != Use::Nothing) {
-        _lastUse = _use;
-        _use = Use::Nothing;
-        _useEnds = now + fromSeconds(_random.between(12.0, 28.0));
-    } else {
-        _use = _lastUse == Use::Voice || _random.chance(0.4) ? Use::Data : Use::Voice;
-        _useEnds = now + fromSeconds(_random.between(15.0, 40.0));
-    }
-    _isSilent = false;
+void Modem::follow(Activity activity) {
+    if (activity == _activity) return;
+    if (_activity != Activity::Resting) _lastActivity = _activity;
+    _activity = activity;
     restartTriggers();
 }
 
-void Modem::setLink(Link link, Time now) {
+void Modem::setLink(Time now, Link link) {
     if (link == Link::Open && _rat == Rat::UMTS) _activeSet.start(_serving);
     _link = link;
     _linkSince = now;
@@ -122,39 +109,40 @@ void Modem::restartTriggers() {
 }
 
 void Modem::followLink(Time now) {
-    const bool isWanted = _use != Use::Nothing || _registration.wantsLink();
+    const bool isWanted = _activity != Activity::Resting || _registration.wantsLink();
     const Time age = now - _linkSince;
     switch (_link) {
         case Link::None:
-            if (isWanted) setLink(Link::Opening, now);
+            if (isWanted) setLink(now, Link::Opening);
             break;
         case Link::Opening:
-            if (age >= kOpening) setLink(Link::Open, now);
+            if (age >= kOpening) setLink(now, Link::Open);
             break;
         case Link::Open:
-            if (!isWanted) setLink(_rat == Rat::UMTS && _lastUse == Use::Data ? Link::Fach : Link::Closing, now);
+            if (!isWanted)
+                setLink(now, _rat == Rat::UMTS && _lastActivity == Activity::Browsing ? Link::Fach : Link::Closing);
             break;
         case Link::Closing:
-            if (age >= kClosing) setLink(Link::None, now);
+            if (age >= kClosing) setLink(now, Link::None);
             break;
         case Link::Fach:
         case Link::UraPch:
             if (isWanted) {
-                setLink(Link::Open, now);
+                setLink(now, Link::Open);
             } else if (age >= (_link == Link::Fach ? kFachTail : kPchTail)) {
-                setLink(_link == Link::Fach ? Link::UraPch : Link::None, now);
+                setLink(now, _link == Link::Fach ? Link::UraPch : Link::None);
             }
             break;
     }
 }
 
-void Modem::follow(const Change& change, Time now) {
+void Modem::complete(Time now, const Change& change) {
     const bool isHandover = change.state == RrState::W2gHandover || change.state == RrState::G2wHandover ||
                             change.state == RrState::W2gCellChangeOrder;
     const bool isNewRat = change.rat != _rat;
     _rat = change.rat;
     _serving = change.sector;
-    if (isNewRat) setLink(isHandover ? Link::Open : Link::None, now);
+    if (isNewRat) setLink(now, isHandover ? Link::Open : Link::None);
     restartTriggers();
     _change.reset();
     rank();
@@ -216,7 +204,7 @@ void Modem::rank() {
 }
 
 void Modem::moveWithinGsm(Time now) {
-    if (_use == Use::Voice) {
+    if (_activity == Activity::Talking) {
         const std::size_t best = gsmNeighbors().front();  // the network's decision, on its power budget
         const bool isBetter = _air.gsmLevel(best) > _air.gsmLevel(_serving) + kHandoverMargin;
         if (_link == Link::Open && _gsmHandover(isBetter, best, now)) _serving = best;
@@ -225,14 +213,14 @@ void Modem::moveWithinGsm(Time now) {
     const std::size_t best = gsmByC2();
     const double margin = isHysteresisApplied() ? kCellReselectHysteresis : 0;
     if (_gsmReselection(c2(best) > c2(_serving) + margin, best, now)) {
-        _change = {Rat::GSM, best, RrState::CellReselection, now + kReselection};
+        _change = {Rat::GSM, best, RrState::CellReselection, now + fromSeconds(_random.between(0.2, 0.4))};
     }
 }
 
 void Modem::leaveGsm(Time now) {
     const std::size_t best = _air.umtsByEcNo().front();
     const bool isFirstSearch = !_hasSearchedUmts && _registration.registered();
-    const bool isHandover = _use == Use::Voice;
+    const bool isHandover = _activity == Activity::Talking;
     const bool isGood = _air.ecNo(best) > (isHandover ? kHandoverToUmts : kFddQmin);
     const bool isTime = _toUmts(isGood, 0, now) || (isFirstSearch && _air.ecNo(best) > kQqualMin);
     if (isFirstSearch) _hasSearchedUmts = true;
@@ -263,7 +251,7 @@ void Modem::leaveUmts(Time now) {
     const std::size_t best = neighbors.front();
     if (_link == Link::Open) {
         const bool isNeeded = umtsQuality() < kHandoverToGsm && _air.gsmLevel(best) > kGsmGoodEnough;
-        const RrState state = _use == Use::Voice ? RrState::W2gHandover : RrState::W2gCellChangeOrder;
+        const RrState state = _activity == Activity::Talking ? RrState::W2gHandover : RrState::W2gCellChangeOrder;
         if (_toGsmHandover(isNeeded, 0, now)) _change = {Rat::GSM, best, state, now + kInterRatChange};
         return;
     }

@@ -35,20 +35,22 @@ struct Ranked {
     double rank = 0;  ///< dB
 };
 
-/// The phone: which cell it is on, what it does there, and when it moves to another.
+/// The modem: which cell it is on, what it does there, and when it moves to another.
 class Modem {
 public:
-    Modem(const Network& network, const Air& air, Random random);
+    /// Both must outlive it.
+    Modem(const Network& network, const Air& air, Random random)
+        : _network(network), _air(air), _random(std::move(random)) {}
 
     /// Moves on to then; `hasMeasured` tells that the air has new readings.
-    void step(Time now, bool hasMeasured);
+    void step(Time now, const PhoneUser& user, bool hasMeasured);
 
     bool isCamped() const { return _isCamped; }
     Rat rat() const { return _rat; }
     /// The serving cell's index in the layer of rat(); in soft handover that of a member.
     std::size_t serving() const { return _serving; }
     const Area& area() const;  ///< broadcast by the serving cell
-    Use use() const { return _use; }
+    Activity activity() const { return _activity; }
     Link link() const { return _link; }
     bool isOn(Rat rat) const { return _isCamped && _rat == rat; }
     bool isDedicated(Rat rat) const { return isOn(rat) && _link == Link::Open; }
@@ -56,8 +58,6 @@ public:
     bool isMoving() const { return _change.has_value(); }
     RrState rrState() const;
     RrcState rrcState() const;
-    /// In a call: nobody is speaking into the phone.
-    bool isSilent() const { return _isSilent; }
 
     const ActiveSet& activeSet() const { return _activeSet; }
     const Registration& registration() const { return _registration; }
@@ -83,11 +83,11 @@ private:
         RrState state;
         Time until;
     };
-    void followUse(Time now);
+    void follow(Activity activity);
     void followLink(Time now);
-    void setLink(Link link, Time now);
+    void setLink(Time now, Link link);
     void restartTriggers();
-    void follow(const Change& change, Time now);
+    void complete(Time now, const Change& change);
     std::size_t gsmByC2() const;  ///< the neighbor of the highest C2; on GSM only
     double umtsQuality() const;   ///< Ec/No of the best cell in use, dB
     void rank();
@@ -104,10 +104,8 @@ private:
     Rat _rat = Rat::GSM;
     std::size_t _serving = 0;
     std::optional<Change> _change;
-    Use _use = Use::Nothing;
-    Use _lastUse = Use::Voice;
-    Time _useEnds;
-    bool _isSilent = false;
+    Activity _activity = Activity::Resting;
+    Activity _lastActivity = Activity::Talking;
     Link _link = Link::None;
     Time _linkSince{0};
     ActiveSet _activeSet;

@@ -57,8 +57,8 @@ struct UmtsCell {
 inline constexpr Uarfcn kDownlinkUarfcn{10562};  // 2112.4 MHz, band I
 inline constexpr Uarfcn kUplinkUarfcn{9612};
 
-/// Two layers of one operator: GSM over the whole town, UMTS from small cells in its centre. Cells have the indices of
-/// their layer's sectors. All of one district are in one location area, a GSM and a UMTS one.
+/// The network of a GSM and UMTS operator: GSM over the whole town, UMTS from small cells in its centre. Cells have the
+/// indices of their layer's sectors. All of one district are in one location area, a GSM and a UMTS one.
 struct Network {
     explicit Network(Random& random);
 

@@ -3,7 +3,7 @@
 #include "platform/values/Bytes.h"
 #include "telephony/simulation/GSMUMTS/Reports.h"
 
-/// The log records of a GSM and UMTS modem: one function a record, from what the modem reports to bytes.
+/// The log records of a GSM and UMTS modem: one function a record, from what it reports to bytes.
 namespace kelvo::simulation::gsm {
 
 Bytes packetStateRecord(Time time, const Mobility& mobility);          // 0x7130

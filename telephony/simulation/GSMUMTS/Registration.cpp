@@ -7,18 +7,18 @@ constexpr Time kProcedure = std::chrono::milliseconds(500);
 
 }  // namespace
 
-void Registration::step(const Surroundings& here, Time now) {
+void Registration::step(Time now, const Surroundings& here) {
     if (!here.area) return;
-    advance(here, now);
+    advance(now, here);
     describeCircuits(here);
     describePackets(here);
     _mobility.registration = _phase == Phase::Settled ? RegistrationState::Idle : RegistrationState::Registering;
     _mobility.service = service(here);
 }
 
-void Registration::advance(const Surroundings& here, Time now) {
+void Registration::advance(Time now, const Surroundings& here) {
     const bool isElsewhere = _registered != here.area;
-    if (_phase == Phase::Settled && isElsewhere && here.use != Use::Voice) _phase = Phase::Requested;
+    if (_phase == Phase::Settled && isElsewhere && here.activity != Activity::Talking) _phase = Phase::Requested;
     if (_phase == Phase::Requested && !isElsewhere) _phase = Phase::Settled;
     if (_phase == Phase::Requested && here.isLinkOpen) {
         _phase = Phase::Updating;
@@ -33,7 +33,7 @@ void Registration::advance(const Surroundings& here, Time now) {
 void Registration::describeCircuits(const Surroundings& here) {
     _mobility.isLocationUpdated = _registered && _registered->lac == here.area->lac;
     _mobility.mmSub = _mobility.isLocationUpdated ? MmSubState::NormalService : MmSubState::LocationUpdateNeeded;
-    if (here.use == Use::Voice) {
+    if (here.activity == Activity::Talking) {
         _mobility.mm = here.isLinkOpen ? MmState::ConnectionActive : MmState::WaitForRrConnectionMm;
     } else if (_mobility.isLocationUpdated || _phase == Phase::Settled) {
         _mobility.mm = MmState::Idle;
@@ -43,12 +43,12 @@ void Registration::describeCircuits(const Surroundings& here) {
 }
 
 void Registration::describePackets(const Surroundings& here) {
-    const bool isSuspended = here.use == Use::Voice && here.rat == Rat::GSM;  // a phone of class B
+    const bool isSuspended = here.activity == Activity::Talking && here.rat == Rat::GSM;  // a phone of class B
     _mobility.isRoutingUpdated = _registered == here.area;
     _mobility.gmm = GmmState::Registered;
     if (_phase != Phase::Settled) {
         _mobility.gmm = _registered ? GmmState::RoutingAreaUpdateInitiated : GmmState::RegisteredInitiated;
-    } else if (here.use == Use::Data && !here.isLinkOpen && here.rat == Rat::UMTS) {
+    } else if (here.activity == Activity::Browsing && !here.isLinkOpen && here.rat == Rat::UMTS) {
         _mobility.gmm = GmmState::ServiceRequestInitiated;
     }
     _mobility.gmmSub = isSuspended                  ? GmmSubState::Suspended

@@ -3,11 +3,12 @@
 #include <optional>
 
 #include "telephony/simulation/GSMUMTS/Network.h"
+#include "telephony/simulation/PhoneUser.h"
 #include "telephony/simulation/Time.h"
 
 namespace kelvo::simulation::gsm {
 
-enum class Use { Nothing, Data, Voice };
+using Activity = PhoneUser::Activity;
 
 // The states of mobility management (3GPP TS 24.008, section 4), numbered as the modem numbers them.
 enum class MmState {
@@ -51,10 +52,10 @@ public:
         std::optional<Area> area = {};  ///< broadcast by the serving cell; none before the first
         Rat rat = Rat::GSM;
         bool isLinkOpen = false;
-        Use use = Use::Nothing;
+        Activity activity = Activity::Resting;
     };
 
-    void step(const Surroundings& here, Time now);
+    void step(Time now, const Surroundings& here);
 
     /// The procedure needs a connection, or is using it.
     bool wantsLink() const { return _phase != Phase::Settled; }
@@ -63,7 +64,7 @@ public:
 
 private:
     enum class Phase { Settled, Requested, Updating };
-    void advance(const Surroundings& here, Time now);
+    void advance(Time now, const Surroundings& here);
     void describeCircuits(const Surroundings& here);
     void describePackets(const Surroundings& here);
     ServiceType service(const Surroundings& here) const;

@@ -106,7 +106,8 @@ GsmMeasurement gsmMeasurement(const World& world) {
 
 RrStatus rrStatus(const World& world) {
     const Modem& modem = world.modem;
-    return {modem.rrState(), static_cast<int>(modem.link()), modem.isCamped() ? 1 : 0, modem.use() == Use::Data};
+    return {modem.rrState(), static_cast<int>(modem.link()), modem.isCamped() ? 1 : 0,
+            modem.activity() == Activity::Browsing};
 }
 
 ServingNetwork servingNetwork(const World& world) {
@@ -176,7 +177,7 @@ std::vector<MonitoredCell> monitoredCells(const World& world) {
 
 std::vector<PdpContext> pdpContexts(const World& world, int sessions) {
     if (!world.modem.registration().registered()) return {};
-    if (world.modem.use() != Use::Data) return {{.apn = "internet", .type = "IPv4", .state = "Inactive"}};
+    if (world.modem.activity() != Activity::Browsing) return {{.apn = "internet", .type = "IPv4", .state = "Inactive"}};
     std::vector<PdpContext> contexts{{.apn = "internet",
                                       .type = "IPv4",
                                       .state = "Active",
@@ -194,7 +195,7 @@ std::vector<std::optional<double>> transmitPower(const World& world, Random& ran
     constexpr double kDataMore = 6;       // dB
     constexpr double kGap = 0.5;          // of the records tell of one, while GSM is measured in compressed mode
     const double mean = kPilot - world.air.rscp(world.modem.serving()) - kWantedBelow +
-                        (world.modem.use() == Use::Data ? kDataMore : 0);
+                        (world.modem.activity() == Activity::Browsing ? kDataMore : 0);
     std::vector<std::optional<double>> slots;
     for (int i = 0; i < kSlots; ++i) {
         const double fading = std::max(rayleighFading(random), -10.0);
@@ -211,8 +212,8 @@ BlockErrors blockErrors(const World& world, Time window, Random& random) {
     const auto add = [&](int id, int blocks) {
         errors.channels.push_back({id, blocks, countErrors(blocks, rate, random)});
     };
-    if (world.modem.use() == Use::Voice) add(kSpeechChannel, frames / 2);  // a speech frame lasts 20 ms
-    add(kSignallingChannel, frames / 4);                                   // a signalling block 40 ms
+    if (world.modem.activity() == Activity::Talking) add(kSpeechChannel, frames / 2);  // a speech frame lasts 20 ms
+    add(kSignallingChannel, frames / 4);                                               // a signalling block 40 ms
     return errors;
 }
 

@@ -3,10 +3,9 @@
 #include "telephony/simulation/GSMUMTS/Records.h"
 
 namespace kelvo::simulation::gsm {
+namespace {
 
 using namespace std::chrono_literals;
-
-namespace {
 
 constexpr Time kMeasurement = 160ms;
 constexpr Time kSlowMeasurement = 960ms;  // 480 ms in a connection, as a SACCH multiframe lasts
@@ -23,17 +22,13 @@ Journey journeyFromCentre(Random& random) {
 
 }  // namespace
 
-Simulation::Simulation(std::uint64_t seed)
-    : _random(seed),
-      _network(_random),
-      _air{_network, journeyFromCentre(_random), _random.split()},  // braces: the draws have an order
-      _modem(_network, _air, _random.split()) {}
+Simulation::Simulation(std::uint64_t seed) : FamilySimulation(seed, 1400ms, journeyFromCentre) {}
 
 void Simulation::step() {
     const bool isMeasurement = every(kMeasurement);
+    _user.moveTo(now());
     if (isMeasurement) _air.measure(now());
-    _modem.step(now(), isMeasurement);
-    countSessions();
+    _modem.step(now(), _user, isMeasurement);
     reportSim();
     reportMobility();
     if (!_modem.isDedicated(Rat::UMTS)) _blocks.reset();
@@ -47,20 +42,14 @@ void Simulation::step() {
     }
 }
 
-void Simulation::countSessions() {
-    const bool isData = _modem.use() == Use::Data;
-    if (isData && !_wasData) ++_dataSessions;
-    _wasData = isData;
-}
-
 void Simulation::reportSim() {
     const auto& registered = _modem.registration().registered();
     if (_sim.isDue(now(), registered, 60s)) {
         const SimFiles files = registered ? testNetworkSim(registered->lac, registered->rac) : testNetworkSim();
         emit(simFilesRecord(now(), files));
     }
-    if (_contexts.isDue(now(), {_modem.use(), registered.has_value()}, 60s)) {
-        emit(pdpContextsRecord(now(), pdpContexts(world(), _dataSessions)));
+    if (_contexts.isDue(now(), {_modem.activity(), registered.has_value()}, 60s)) {
+        emit(pdpContextsRecord(now(), pdpContexts(world(), _user.sessions())));
     }
 }
 
@@ -121,7 +110,7 @@ void Simulation::reportGprs(const GprsOptions& options) {
 void Simulation::reportGsmChannel(const GsmCell& cell) {
     const int hop = _random.between(0, static_cast<int>(cell.mobileAllocation.size()) - 1);
     _lastReports.dedicatedArfcn = cell.mobileAllocation[static_cast<std::size_t>(hop)];
-    _lastReports.isDtxUsed = _modem.isSilent();
+    _lastReports.isDtxUsed = _user.isListening();
     emit(dedicatedCarrierRecord(now(), _lastReports.dedicatedArfcn));
     emit(channelModeRecord(now(), _lastReports.isDtxUsed));
 }
@@ -153,7 +142,7 @@ void Simulation::reportBlocks(Time window) {
     _blocks = Window{now(), now() + kBlocks};
     _lastReports.blockErrors = blockErrors(world(), window, _random);
     emit(blockErrorsRecord(now(), _lastReports.blockErrors));
-    if (_modem.use() != Use::Data) return;
+    if (_modem.activity() != Activity::Browsing) return;
     _lastReports.hsdpa = hsdpaReport(world(), window, _random);
     emit(hsdpaRecord(now(), _lastReports.hsdpa));
 }

@@ -12,7 +12,6 @@ namespace {
 using namespace std::chrono_literals;
 
 constexpr Time kSearch = 800ms;
-constexpr Time kUpdate = 2500ms;
 constexpr std::size_t kMostNeighbors = 6;
 constexpr Time kMeasureNeighbor = 480ms;
 constexpr Time kDecodeNeighbor = 1440ms;
@@ -55,14 +54,18 @@ double lostAtFirst(double sinr, double needed) { return kAimedErrors + (1 - kAim
 
 }  // namespace
 
-void Modem::measure(Time now, const Drive& drive, PhoneUser::Activity activity, double demand) {
-    _air = listen(drive, _network, _random);
+void Modem::step(Time now, const PhoneUser& user) {
     choose(now);
     registerInArea(now);
     readServing();
     readGsmNeighbors(now);
     readUmtsNeighbors();
-    connect(activity, demand);
+    connect(user);
+}
+
+void Modem::markReported() {
+    _reported.clear();
+    for (const UmtsNeighbor& neighbor : _status.umts) _reported.insert(neighbor.sector);
 }
 
 LocationArea Modem::area() const {
@@ -75,14 +78,14 @@ LocationArea Modem::area() const {
 std::vector<std::size_t> Modem::gsmByStrength() const {
     std::set<int> heard;
     if (_status.access == RadioAccess::Gsm) heard.insert(_network.gsmCells[_status.serving].arfcn);
-    std::vector<std::size_t> order = byStrength(_air.rssi);
+    std::vector<std::size_t> order = byStrength(_air.rssi());
     std::erase_if(order, [&](std::size_t sector) { return !heard.insert(_network.gsmCells[sector].arfcn).second; });
     order.resize(std::min(order.size(), kMostNeighbors));
     return order;
 }
 
 std::vector<std::size_t> Modem::umtsByStrength() const {
-    std::vector<std::size_t> order = byStrength(_air.ecN0);
+    std::vector<std::size_t> order = byStrength(_air.ecN0());
     if (_status.access == RadioAccess::Umts) std::erase(order, _status.serving);
     order.resize(std::min(order.size(), kMostNeighbors));
     return order;
@@ -100,8 +103,10 @@ void Modem::choose(Time now) {
 
 void Modem::chooseFromGsm(Time now) {
     const bool idle = _status.connection == Connection::Idle;
-    const auto good = [this](std::size_t cell) { return _air.ecN0[cell] > kUmtsGood && _air.rscp[cell] > kUmtsClose; };
-    const auto better = [this](std::size_t cell) { return _air.rssi[cell] - _air.rssi[_status.serving]; };
+    const auto good = [this](std::size_t cell) {
+        return _air.ecN0()[cell] > kUmtsGood && _air.rscp()[cell] > kUmtsClose;
+    };
+    const auto better = [this](std::size_t cell) { return _air.rssi()[cell] - _air.rssi()[_status.serving]; };
     const auto reselected = [&](std::size_t cell) { return better(cell) > gsmMargin(cell, now); };
     const auto handedOver = [&](std::size_t cell) { return better(cell) > kHandoverMargin; };
     const auto umts = _toUmts(idle ? those(umtsByStrength(), good) : kNone, now);
@@ -112,13 +117,14 @@ void Modem::chooseFromGsm(Time now) {
 }
 
 void Modem::chooseFromUmts(Time now) {
-    const double own = _air.ecN0[_status.serving];
-    const auto better = [&](std::size_t cell) { return _air.ecN0[cell] > own + kUmtsHysteresis; };
-    const bool poor = own < kUmtsPoor || _air.rscp[_status.serving] < kUmtsFar;
+    const double own = _air.ecN0()[_status.serving];
+    const auto better = [&](std::size_t cell) { return _air.ecN0()[cell] > own + kUmtsHysteresis; };
+    const bool poor = own < kUmtsPoor || _air.rscp()[_status.serving] < kUmtsFar;
     const auto other = _umtsChange(those(umtsByStrength(), better), now);
     const bool leaves = _toGsm(poor, 0, now);
-    if (other) return move(RadioAccess::Umts, *other, now);
-    if (leaves) move(RadioAccess::Gsm, gsmByStrength().front(), now);
+    if (other && _reported.contains(*other)) return move(RadioAccess::Umts, *other, now);
+    const auto known = std::ranges::find_if(_status.gsm, &GsmNeighbor::identified);  // the strongest of them
+    if (leaves && known != _status.gsm.end()) move(RadioAccess::Gsm, known->sector, now);
 }
 
 double Modem::gsmMargin(std::size_t candidate, Time now) const {
@@ -145,14 +151,14 @@ void Modem::registerInArea(Time now) {
     const bool elsewhere = _status.registered != area();
     if (!elsewhere || _status.connection == Connection::Call || _status.registration == Registration::Updating) return;
     _status.registration = Registration::Updating;
-    _updatedAt = now + kUpdate;
+    _updatedAt = now + fromSeconds(_random.between(2.0, 3.0));
 }
 
 void Modem::readServing() {
-    _status.rssi = _air.rssi[_status.serving];
-    _status.carrierToInterference = _air.carrierToInterference[_status.serving];
-    _status.rscp = _air.rscp[_status.serving];
-    _status.ecN0 = _air.ecN0[_status.serving];
+    _status.rssi = _air.rssi()[_status.serving];
+    _status.carrierToInterference = _air.carrierToInterference()[_status.serving];
+    _status.rscp = _air.rscp()[_status.serving];
+    _status.ecN0 = _air.ecN0()[_status.serving];
 }
 
 void Modem::readGsmNeighbors(Time now) {
@@ -164,7 +170,7 @@ void Modem::readGsmNeighbors(Time now) {
         const Time since = before != _listed.end() ? before->second : now;
         listed[sector] = since;
         _status.gsm.push_back(
-            {sector, _air.rssi[sector], now - since >= kMeasureNeighbor, now - since >= kDecodeNeighbor});
+            {sector, _air.rssi()[sector], now - since >= kMeasureNeighbor, now - since >= kDecodeNeighbor});
     }
     _listed = std::move(listed);
 }
@@ -173,20 +179,20 @@ void Modem::readUmtsNeighbors() {
     _status.umts.clear();
     if (_status.access == RadioAccess::None) return;
     for (const std::size_t sector : umtsByStrength()) {
-        if (_air.ecN0[sector] < kDetected) break;
-        _status.umts.push_back({sector, _air.rscp[sector], _air.ecN0[sector]});
+        if (_air.ecN0()[sector] < kDetected) break;
+        _status.umts.push_back({sector, _air.rscp()[sector], _air.ecN0()[sector]});
     }
 }
 
-void Modem::connect(PhoneUser::Activity activity, double demand) {
+void Modem::connect(const PhoneUser& user) {
     const bool served = _status.registration == Registration::Registered || _status.connection == Connection::Call;
     _status.connection = Connection::Idle;
-    if (!served || activity == PhoneUser::Activity::Resting) return;
-    _status.connection = activity == PhoneUser::Activity::Talking ? Connection::Call : Connection::Packet;
+    if (!served || user.isResting()) return;
+    _status.connection = user.isTalking() ? Connection::Call : Connection::Packet;
     if (_status.access == RadioAccess::Gsm) {
-        connectOnGsm(demand);
+        connectOnGsm(user.demand());
     } else {
-        connectOnUmts(demand);
+        connectOnUmts(user.demand());
     }
 }
 
@@ -204,12 +210,12 @@ void Modem::connectOnGsm(double demand) {
 }
 
 void Modem::connectOnUmts(double demand) {
-    const double loss = Network::kPower - 10 - _status.rscp;  // of the common pilot, a tenth of the power
-    _status.tx = std::clamp(loss - 108, -50.0, 24.0);
-    const double ratio = _status.ecN0 + 10 + kHsShare;
+    const double pathLoss = Network::kPower - 10 - _status.rscp;  // of the common pilot, a tenth of the power
+    _status.tx = std::clamp(pathLoss - 108, -50.0, 24.0);
+    const double sinr = _status.ecN0 + 10 + kHsShare;
     const bool call = _status.connection == Connection::Call;
     _status.errors = call ? lost(_status.ecN0, kUmtsNeeded) : lostAtFirst(_status.ecN0, kUmtsNeeded);
-    const double offered = std::min(linkCapacity(3840, ratio), kMostHsRate);
+    const double offered = std::min(linkCapacity(3840, sinr), kMostHsRate);
     _status.throughput = call ? 0 : offered * demand * (1 - _status.errors);
 }
 

@@ -1,6 +1,7 @@
 #pragma once
 
 #include <map>
+#include <set>
 #include <vector>
 
 #include "telephony/simulation/HeldFor.h"
@@ -10,15 +11,19 @@
 
 namespace kelvo::simulation::ifx {
 
-/// A GSM and UMTS modem.
+/// The modem: chooses its network and cell, registers, and connects as its user wants.
 class Modem {
 public:
-    Modem(const Network& network, Random random) : _network(network), _random(std::move(random)) {}
+    /// Both must outlive it.
+    Modem(const Network& network, const Air& air, Random random)
+        : _network(network), _air(air), _random(std::move(random)) {}
 
-    /// Reads the air and acts on it.
-    void measure(Time now, const Drive& drive, PhoneUser::Activity activity, double demand);
+    /// Acts on what was measured then.
+    void step(Time now, const PhoneUser& user);
 
     const Status& status() const { return _status; }
+    /// The status has been sent: the network may move the phone to the UMTS neighbors in it.
+    void markReported();
     /// Of the serving cell.
     LocationArea area() const;
 
@@ -35,17 +40,18 @@ private:
     void readServing();
     void readGsmNeighbors(Time now);
     void readUmtsNeighbors();
-    void connect(PhoneUser::Activity activity, double demand);
+    void connect(const PhoneUser& user);
     void connectOnGsm(double demand);
     void connectOnUmts(double demand);
 
     const Network& _network;
+    const Air& _air;
     Random _random;
-    Air _air;
     Status _status;
     EachHeldFor _gsmReselection{std::chrono::seconds(5)};
     EachHeldFor _gsmHandover{std::chrono::seconds(1)};
     EachHeldFor _umtsChange{std::chrono::seconds(1)};
+    std::set<std::size_t> _reported;  // UMTS neighbors in the last message
     HeldFor _toGsm{std::chrono::seconds(2)};
     EachHeldFor _toUmts{std::chrono::seconds(5)};
     Time _movedAt{0};

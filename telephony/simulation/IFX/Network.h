@@ -33,7 +33,7 @@ struct UmtsCell {
     LocationArea area;
 };
 
-/// GSM on every site of the town, UMTS in its middle.
+/// The network of a GSM and UMTS operator: GSM on every site of the town, UMTS in its middle.
 struct Network {
     static constexpr double kGsmMHz = 947;     ///< about: what the propagation is reckoned with
     static constexpr double kPower = 28;       ///< dBm: the antennas' gain less what houses and the car's roof take

@@ -1,7 +1,5 @@
 #include "telephony/simulation/IFX/Simulation.h"
 
-#include <utility>
-
 #include "telephony/simulation/IFX/Records.h"
 
 namespace kelvo::simulation::ifx {
@@ -9,32 +7,25 @@ namespace {
 
 using namespace std::chrono_literals;
 
-constexpr double kDriveRadius = 2000;       // metres
-constexpr Time kMeasurement = 480ms;        // a SACCH period of 3GPP TS 45.008
-constexpr Time kReport = 7 * kMeasurement;  // changes are told at once
-constexpr Time kFirstReport = 3 * kMeasurement;
+constexpr Time kMeasurement = 480ms;  // a SACCH period of 3GPP TS 45.008
+constexpr Time kPeriod = 7 * kMeasurement;
 
 }  // namespace
 
-Simulation::Simulation(Random random)
-    : _network(random),
-      _drive{_network.sectors, Journey::through(kDriveRadius, random), random.split()},  // braces: in this order
-      _user(random.split()),
-      _modem(_network, random.split()) {}
+Simulation::Simulation(std::uint64_t seed) : FamilySimulation(seed, 4s) {}
 
 void Simulation::step() {
     if (!every(kMeasurement)) return;
-    const PhoneUser::Activity activity = _user.at(now());
-    _drive.moveTo(now());
-    _modem.measure(now(), _drive, activity, _user.demand());
-    if (!isNews() && !every(kReport, kFirstReport)) return;
-    emit(cellMonitorRecord(_modem.status(), _network));
-}
-
-bool Simulation::isNews() {
+    _user.moveTo(now());
+    _air.measure(now());
+    _modem.step(now(), _user);
     const Status& status = _modem.status();
-    const News news{status.access, status.serving, status.registration, status.connection};
-    return std::exchange(_told, news) != news;
+    // Once more when a cell that was left has been measured: the phone may go back there.
+    const bool isSettled = _settled(true, 2 * status.serving + (status.access == RadioAccess::Umts), now());
+    const Content content{status.access, status.serving, isSettled, status.registration, status.connection};
+    if (!_cellMonitor.isDue(now(), content, kPeriod)) return;
+    emit(cellMonitorRecord(status, _network));
+    _modem.markReported();
 }
 
 }  // namespace kelvo::simulation::ifx

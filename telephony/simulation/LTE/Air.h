@@ -22,11 +22,11 @@ struct Reading {
 class Air {
 public:
     /// `network` must outlive it.
-    Air(const Network& network, const Journey& journey, Random& random)
+    Air(const Network& network, const Journey& journey, Random random)
         : _cells(network.cells),
           _drive(network.sectors, journey, random.split()),
           _tracked(_cells.size()),
-          _random(random.split()) {}
+          _random(std::move(random)) {}
 
     /// Drives on to then.
     void moveTo(Time now) { _drive.moveTo(now); }

@@ -28,8 +28,8 @@ constexpr double kRedirection = 6;  // dB better than the serving cell
 constexpr Time kRedirectionTime = 640ms;
 constexpr Time kAfterRedirection = 5s;
 
-constexpr Time kAttach = 1200ms;    // the phone is switched on with the drive
-constexpr double kCallShare = 0.4;  // of the sessions
+constexpr Time kAttach = 1200ms;            // the phone is switched on with the drive
+constexpr Time kAfterRegistration = 200ms;  // the network lets the connection go
 
 constexpr double kLeastSrxlev = -30;  // dB: what reports show
 constexpr double kMostSrxlev = 97;
@@ -41,19 +41,18 @@ Modem::Modem(const Network& network, Air& air, Random random)
       _air(air),
       _random(std::move(random)),
       _better(kReselection),
-      _elsewhere(kRedirectionTime) {
+      _elsewhere(kRedirectionTime),
+      _heldUntil(kAttach) {
     for (std::size_t i = 0; i < _cells.size(); ++i) {
         if (meanLevel(i) > meanLevel(_serving)) _serving = i;
     }
     _registeredArea = serving().trackingArea;
 }
 
-void Modem::step(Time now) {
-    _hasMeasured = _hasRegistered = _hasChangedContexts = false;
-    _hasChangedCell = now == Time(0);
+void Modem::step(Time now, const PhoneUser& user) {
+    _hasMeasured = false;
     _now = now;
-    if (now == Time(0)) connect(kAttach);
-    followActivity();
+    followUser(user);
     const Time period = _isConnected ? kConnectedPeriod : kDrxCycle;
     if (now % period != Time(0)) return;
     _hasMeasured = true;
@@ -64,34 +63,27 @@ void Modem::step(Time now) {
     }
 }
 
-void Modem::followActivity() {
+// Connected while the user does something, while it registers, and for a while after.
+void Modem::followUser(const PhoneUser& user) {
     if (_registersAt && _now >= *_registersAt) {
         _registersAt.reset();
         _registeredArea = serving().trackingArea;
-        _hasRegistered = true;
     }
-    if (!_isConnected && _now >= _nextSession && !_registersAt) {
-        connect(_now + fromSeconds(_random.between(6.0, 18.0)));
-        _isOnCall = _random.chance(kCallShare);
-        _hasChangedContexts = _isOnCall;
-    }
-    if (_isConnected && _now >= _connectedUntil && !_registersAt) {
-        release(_now + fromSeconds(_random.between(7.0, 18.0)));
-    }
+    const bool isWanted = _now < _heldUntil || _registersAt || (!user.isResting() && _now >= _barredUntil);
+    if (isWanted && !_isConnected) connect();
+    if (!isWanted && _isConnected) release();
+    _isOnCall = _isConnected && user.isTalking();
 }
 
-void Modem::connect(Time until) {
-    if (!_isConnected) _better = HeldFor(kTimeToTrigger);
+void Modem::connect() {
+    _better = HeldFor(kTimeToTrigger);
     _isConnected = true;
-    _connectedUntil = std::max(_connectedUntil, until);
 }
 
-void Modem::release(Time next) {
+void Modem::release() {
     _better = HeldFor(kReselection);
     _elsewhere.restart();
-    _hasChangedContexts = _isOnCall;
     _isConnected = _isOnCall = false;
-    _nextSession = next;
     _idle.failedCycles = 0;
 }
 
@@ -99,13 +91,13 @@ void Modem::release(Time next) {
 void Modem::registerInArea() {
     if (serving().trackingArea == _registeredArea) return _registersAt.reset();
     _registersAt = _now + fromSeconds(_random.between(0.3, 0.9));
-    connect(*_registersAt + 200ms);
+    _heldUntil = std::max(_heldUntil, *_registersAt + kAfterRegistration);
+    if (!_isConnected) connect();
 }
 
 void Modem::camp(std::size_t cell) {
     _serving = cell;
     _camped = _now;
-    _hasChangedCell = true;
     _better.restart();
     registerInArea();
 }
@@ -144,7 +136,8 @@ void Modem::redirect() {
     const auto best = bestMeasured([this](const Cell& cell) { return !isOnServingCarrier(cell.carrier); });
     const bool isElsewhere = best && _air.reading(*best).filteredRsrp > reading().filteredRsrp + kRedirection;
     if (!_elsewhere(isElsewhere && !_isOnCall && !_registersAt, _serving, _now)) return;
-    release(_now + kAfterRedirection);
+    _barredUntil = _now + kAfterRedirection;
+    release();
     _hasMeasured = false;  // what was measured is no idle phone's
 }
 

@@ -5,6 +5,7 @@
 #include "telephony/simulation/HeldFor.h"
 #include "telephony/simulation/LTE/Air.h"
 #include "telephony/simulation/LTE/Reports.h"
+#include "telephony/simulation/PhoneUser.h"
 
 namespace kelvo::simulation::lte {
 
@@ -15,13 +16,10 @@ public:
     Modem(const Network& network, Air& air, Random random);
 
     /// Moves on to then, one step after the last time.
-    void step(Time now);
+    void step(Time now, const PhoneUser& user);
 
-    // What the last step has brought.
+    /// In the last step, and as the phone still is.
     bool hasMeasured() const { return _hasMeasured; }
-    bool hasChangedCell() const { return _hasChangedCell; }
-    bool hasRegistered() const { return _hasRegistered; }
-    bool hasChangedContexts() const { return _hasChangedContexts; }
 
     std::size_t servingIndex() const { return _serving; }
     const Cell& serving() const { return _cells[_serving]; }
@@ -45,9 +43,9 @@ public:
     const std::optional<Candidate>& candidate() const { return _candidate; }
 
 private:
-    void followActivity();
-    void connect(Time until);
-    void release(Time next);
+    void followUser(const PhoneUser& user);
+    void connect();
+    void release();
     void registerInArea();
     void camp(std::size_t cell);
     void measureConnected();
@@ -77,8 +75,8 @@ private:
     HeldFor _elsewhere;  // a much better cell on another carrier
     bool _isConnected = false;
     bool _isOnCall = false;
-    Time _connectedUntil{0};
-    Time _nextSession{0};
+    Time _heldUntil;  // the connection, at the least
+    Time _barredUntil{0};
     int _registeredArea = 0;
     std::optional<Time> _registersAt;
     std::size_t _cycle = 0;  // of the idle phone
@@ -90,9 +88,6 @@ private:
     IdleState _idle;
     std::optional<Candidate> _candidate;
     bool _hasMeasured = false;
-    bool _hasChangedCell = false;
-    bool _hasRegistered = false;
-    bool _hasChangedContexts = false;
 };
 
 }  // namespace kelvo::simulation::lte

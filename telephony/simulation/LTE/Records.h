@@ -3,9 +3,8 @@
 #include "platform/values/Bytes.h"
 #include "telephony/simulation/LTE/Modem.h"
 
+/// The log records of an LTE modem: one function a record, from what it reports to bytes.
 namespace kelvo::simulation::lte {
-
-// The log records of an LTE modem, as its log service words them.
 
 /// 0xb0c2: the serving cell's identity, carrier and area.
 Bytes servingCellRecord(Time time, const Cell& cell);

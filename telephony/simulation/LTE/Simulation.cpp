@@ -1,7 +1,5 @@
 #include "telephony/simulation/LTE/Simulation.h"
 
-#include <utility>
-
 #include "telephony/simulation/LTE/Records.h"
 
 namespace kelvo::simulation::lte {
@@ -9,31 +7,25 @@ namespace {
 
 using namespace std::chrono_literals;
 
-constexpr Time kServingCellPeriod = 5s;
-constexpr Time kCellsPeriod = 20s;
-constexpr Time kContextsPeriod = 30s;
-constexpr Time kSimPeriod = 60s;
-constexpr double kDriveRadius = 2000;  // metres
 constexpr int kRoutingArea = 1;
 
 }  // namespace
 
-Simulation::Simulation(Random random)
-    : _network(random),
-      _air{_network, Journey::through(kDriveRadius, random), random},  // braces: the draws have an order
-      _modem(_network, _air, std::move(random)) {}
+Simulation::Simulation(std::uint64_t seed) : FamilySimulation(seed, 4s) {}
 
 void Simulation::step() {
+    _user.moveTo(now());
     _air.moveTo(now());
-    _modem.step(now());
+    _modem.step(now(), _user);
     reportServingCell();
     reportMeasurements();
     reportExtended();
 }
 
 void Simulation::reportServingCell() {
-    if (_modem.hasChangedCell()) emit(antennasRecord(now(), _modem.serving()));
-    if (_modem.hasChangedCell() || every(kServingCellPeriod)) emit(servingCellRecord(now(), _modem.serving()));
+    const std::size_t cell = _modem.servingIndex();
+    if (_antennas.isDue(now(), cell)) emit(antennasRecord(now(), _modem.serving()));
+    if (_servingCell.isDue(now(), cell, 5s)) emit(servingCellRecord(now(), _modem.serving()));
 }
 
 void Simulation::reportMeasurements() {
@@ -45,11 +37,11 @@ void Simulation::reportMeasurements() {
 }
 
 void Simulation::reportExtended() {
-    if (_modem.hasChangedCell() || every(kCellsPeriod, 1s)) emit(cellInformationRecord(now(), monitoredCells(_modem)));
-    if (_modem.hasChangedContexts() || every(kContextsPeriod)) emit(pdpContextsRecord(now(), pdpContexts(_modem)));
-    if (_modem.hasRegistered() || every(kSimPeriod)) {
-        emit(simFilesRecord(now(), testNetworkSim(_modem.registeredArea(), kRoutingArea)));
-    }
+    const std::size_t cell = _modem.servingIndex();
+    if (_cells.isDue(now(), cell, 20s)) emit(cellInformationRecord(now(), monitoredCells(_modem)));
+    if (_contexts.isDue(now(), _modem.isOnCall(), 30s)) emit(pdpContextsRecord(now(), pdpContexts(_modem)));
+    const int area = _modem.registeredArea();
+    if (_sim.isDue(now(), area, 60s)) emit(simFilesRecord(now(), testNetworkSim(area, kRoutingArea)));
 }
 
 }  // namespace kelvo::simulation::lte

@@ -1,31 +1,28 @@
 #pragma once
 
+#include "telephony/simulation/FamilySimulation.h"
 #include "telephony/simulation/LTE/Modem.h"
-#include "telephony/simulation/Simulation.h"
 
 namespace kelvo::simulation::lte {
 
-/// An LTE modem on its drive. Its world is read between two calls of next().
-class Simulation final : public simulation::Simulation {
+/// An LTE modem on its drive.
+class Simulation final : public FamilySimulation<Network, Air, Modem> {
 public:
-    explicit Simulation(std::uint64_t seed) : Simulation(Random(seed)) {}
+    explicit Simulation(std::uint64_t seed);
 
     Technology technology() const override { return Technology::LTE; }
 
-    const Network& network() const { return _network; }
-    const Air& air() const { return _air; }
-    const Modem& modem() const { return _modem; }
-
 private:
-    explicit Simulation(Random random);
     void step() override;
     void reportMeasurements();
     void reportServingCell();
     void reportExtended();
 
-    Network _network;
-    Air _air;
-    Modem _modem;
+    Reported<std::size_t> _antennas;
+    Reported<std::size_t> _servingCell;
+    Reported<std::size_t> _cells;
+    Reported<bool> _contexts;
+    Reported<int> _sim;
 };
 
 }  // namespace kelvo::simulation::lte

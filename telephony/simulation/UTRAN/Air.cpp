@@ -21,14 +21,17 @@ constexpr double kCancelled = -12;          // dB left of a cell that is detecte
 }  // namespace
 
 Air::Air(const Network& network, const Journey& journey, Random random)
-    : _cells(network.cells), _drive(network.sectors, journey, std::move(random)), _filtered(_cells.size()) {
+    : _cells(network.cells),
+      _drive(network.sectors, journey, random.split()),
+      _random(std::move(random)),
+      _filtered(_cells.size()) {
     const std::size_t strongest = _drive.byStrength().front();
     _filtered[strongest] = _drive.received(strongest);
 }
 
-void Air::measure(std::size_t serving, Random& random) {
+void Air::measure(std::size_t serving) {
     for (std::size_t i = 0; i < _cells.size(); ++i) {
-        const double reading = _drive.received(i) + kReadingDeviation * random.normal();
+        const double reading = _drive.received(i) + kReadingDeviation * _random.normal();
         const double ratio = _drive.received(i) - interference(i);
         if (ratio < kLost && i != serving) _filtered[i].reset();
         if (_filtered[i]) {

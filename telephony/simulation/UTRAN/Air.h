@@ -21,7 +21,7 @@ public:
     const Drive& drive() const { return _drive; }
 
     /// Looks once at every cell. The serving cell is always found.
-    void measure(std::size_t serving, Random& random);
+    void measure(std::size_t serving);
 
     bool isFound(std::size_t cell) const { return _filtered[cell].has_value(); }
     /// RSCP in dBm, filtered as in 3GPP TS 25.331, section 8.6.7.2; only of a cell that is found.
@@ -36,6 +36,7 @@ private:
 
     const std::vector<Cell>& _cells;
     Drive _drive;
+    Random _random;
     std::vector<std::optional<double>> _filtered;  // none of a cell that is not found
 };
 

@@ -20,8 +20,14 @@ constexpr double kRankHysteresis = 4;  // Qhyst1, dB
 constexpr Time kReselection = 960ms;   // Treselection
 constexpr double kHysteresis = 3;      // dB
 constexpr Time kTimeToTrigger = 960ms;
-constexpr Time kLeastOnCell = 2s;
+constexpr Time kLeastDwell = 2s;
 constexpr Time kAfterRegistration = 300ms;  // the network lets the connection go
+
+// How long a state lasts when nothing is sent.
+constexpr Time kInactivity = 1s;
+constexpr Time kFach = 2s;
+constexpr Time kCellPch = 3s;
+constexpr Time kUraPch = 3s;
 
 // A dedicated channel: power control holds the ratio at its target as long as the base station can (TS 25.224).
 constexpr double kSpeechTarget = 7;  // dB
@@ -45,82 +51,85 @@ Modem::Modem(const Network& network, Air& air, Random random)
       _better(kReselection),
       _registeredArea(serving().locationArea) {}
 
-void Modem::step(Time now) {
-    _hasMeasured = _hasChangedState = _hasRegistered = _hasChangedContexts = false;
-    _hasChangedCell = now == Time(0);
+void Modem::step(Time now, const PhoneUser& user) {
+    _hasMeasured = false;
     _now = now;
     finishRegistration();
-    followConnection();
+    followUser(user);
     if (now % kPeriod == Time(0)) measure();
 }
 
-void Modem::followConnection() {
+// A call, and data that are to be sent, want a dedicated channel.
+void Modem::followUser(const PhoneUser& user) {
+    if (!user.isTalking() && user.demand() == 0) return rest();
+    switch (_rrcState) {
+        case RrcState::Disconnected: enter(RrcState::Connecting, fromSeconds(_random.between(0.3, 0.7))); break;
+        case RrcState::Connecting:
+            if (_now >= _until) enter(RrcState::CellDch, kInactivity);
+            break;
+        case RrcState::CellDch: _until = _now + kInactivity; break;
+        case RrcState::CellFach: enter(RrcState::CellDch, kInactivity); break;
+        case RrcState::CellPch:
+        case RrcState::UraPch: enter(RrcState::CellFach, kFach); break;
+    }
+    serve(user.isTalking() ? Session::Speech : Session::Data);
+}
+
+// Nothing to send: after a while downwards, state by state.
+void Modem::rest() {
     if (_now < _until || (_registersAt && canSignal())) return;
     switch (_rrcState) {
-        case RrcState::Disconnected: return begin(_random.chance(0.3) && _now > 2s ? Session::Speech : Session::Data);
-        case RrcState::Connecting:
-            if (_session == Session::Registration) return enter(RrcState::CellFach, 0.3);
-            return enter(RrcState::CellDch, _random.between(5.0, 14.0));
-        case RrcState::CellDch:
-            if (_session == Session::Speech) return disconnect();
-            return enter(RrcState::CellFach, 3);  // nothing sent for a while, and so on downwards
-        case RrcState::CellFach:
-            if (_session == Session::Registration) return disconnect();
-            if (_random.chance(0.3)) return enter(RrcState::CellDch, _random.between(3.0, 8.0));
-            return enter(RrcState::CellPch, 3);
-        case RrcState::CellPch: return enter(RrcState::UraPch, _random.between(2.0, 6.0));
+        case RrcState::Disconnected: return;
+        case RrcState::Connecting: return enter(RrcState::CellFach, kAfterRegistration);
+        case RrcState::CellDch: return _session == Session::Speech ? disconnect() : enter(RrcState::CellFach, kFach);
+        case RrcState::CellFach: return _session == Session::Data ? enter(RrcState::CellPch, kCellPch) : disconnect();
+        case RrcState::CellPch: return enter(RrcState::UraPch, kUraPch);
         case RrcState::UraPch: return disconnect();
     }
 }
 
-void Modem::enter(RrcState state, double seconds) {
+void Modem::enter(RrcState state, Time duration) {
     if ((state == RrcState::CellDch) != isDedicated()) {
         _better = HeldFor(isDedicated() ? kReselection : kTimeToTrigger);
     }
-    _hasChangedState = true;
     _rrcState = state;
-    _until = _now + fromSeconds(seconds);
-    if (!isDedicated()) {
-        _transportChannels.clear();
-        _composites.clear();
-    }
+    _until = _now + duration;
+    if (isDedicated()) return;
+    _transportChannels.clear();
+    _composites.clear();
 }
 
-void Modem::begin(Session session) {
+void Modem::serve(Session session) {
+    if (session == Session::Data && _session != Session::Data) {
+        _contexts = {"internet"};
+        if (_random.chance(0.3)) _contexts.push_back("mms");
+    }
     _session = session;
-    enter(RrcState::Connecting, _random.between(0.3, 0.7));
-    if (session != Session::Data) return;
-    const std::vector<const char*> before = _contexts;
-    _contexts = {"internet"};
-    if (_random.chance(0.3)) _contexts.push_back("mms");
-    _hasChangedContexts = _contexts != before;
 }
 
 void Modem::disconnect() {
-    enter(RrcState::Disconnected, _random.between(6.0, 14.0));
-    if (_session != Session::Data || !_random.chance(0.4)) return;
-    _contexts.clear();
-    _hasChangedContexts = true;
+    enter(RrcState::Disconnected, Time(0));
+    if (_session == Session::Data && _random.chance(0.4)) _contexts.clear();
+    _session = Session::Registration;
 }
 
 // A location update (TS 24.008, section 4.4.1) needs a connection that can carry it.
 void Modem::registerInArea() {
     if (isRegistered()) return _registersAt.reset();
     _registersAt = _now + fromSeconds(_random.between(0.9, 1.6));
-    if (_rrcState == RrcState::Disconnected) begin(Session::Registration);
-    if (_rrcState == RrcState::CellPch || _rrcState == RrcState::UraPch) enter(RrcState::CellFach, 1);
+    if (_rrcState == RrcState::Disconnected) enter(RrcState::Connecting, fromSeconds(_random.between(0.3, 0.7)));
+    if (_rrcState == RrcState::CellPch || _rrcState == RrcState::UraPch) enter(RrcState::CellFach, kFach);
 }
 
 void Modem::finishRegistration() {
     if (!_registersAt || _now < *_registersAt || !canSignal()) return;
     _registersAt.reset();
     _registeredArea = serving().locationArea;
-    _hasRegistered = true;
     _until = std::max(_until, _now + kAfterRegistration);
 }
 
 void Modem::measure() {
-    _air.measure(_serving, _random);
+    _air.measure(_serving);
     changeCell();
     listCells();
     listGsmCells();
@@ -134,14 +143,13 @@ void Modem::changeCell() {
         if (_air.isFound(known.cell) && _air.level(known.cell) > _air.level(best)) best = known.cell;
     }
     const double hysteresis = isDedicated() ? kHysteresis : kRankHysteresis;
-    const bool isBetter = _air.level(best) > _air.level(_serving) + hysteresis && _now - _camped > kLeastOnCell;
+    const bool isBetter = _air.level(best) > _air.level(_serving) + hysteresis && _now - _camped > kLeastDwell;
     if (_better(isBetter, best, _now)) camp(best);
 }
 
 void Modem::camp(std::size_t cell) {
     _serving = cell;
     _camped = _now;
-    _hasChangedCell = true;
     _better.restart();
     registerInArea();
 }

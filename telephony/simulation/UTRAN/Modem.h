@@ -5,6 +5,7 @@
 #include <vector>
 
 #include "telephony/simulation/HeldFor.h"
+#include "telephony/simulation/PhoneUser.h"
 #include "telephony/simulation/UTRAN/Air.h"
 #include "telephony/simulation/UTRAN/Reports.h"
 
@@ -17,14 +18,10 @@ public:
     Modem(const Network& network, Air& air, Random random);
 
     /// Moves on to then, one step after the last time.
-    void step(Time now);
+    void step(Time now, const PhoneUser& user);
 
-    // What the last step has brought.
+    /// In the last step.
     bool hasMeasured() const { return _hasMeasured; }
-    bool hasChangedCell() const { return _hasChangedCell; }
-    bool hasChangedState() const { return _hasChangedState; }
-    bool hasRegistered() const { return _hasRegistered; }
-    bool hasChangedContexts() const { return _hasChangedContexts; }
 
     const std::vector<Cell>& cells() const { return _network.cells; }
     std::size_t servingIndex() const { return _serving; }
@@ -41,14 +38,15 @@ public:
     const std::vector<TransportChannel>& transportChannels() const { return _transportChannels; }
     const std::vector<CompositeChannel>& composites() const { return _composites; }
     /// The access points of the packet contexts that are active.
-    const std::vector<const char*>& contexts() const { return _contexts; }
+    const std::vector<std::string>& contexts() const { return _contexts; }
 
 private:
     enum class Session { Registration, Speech, Data };
 
-    void followConnection();
-    void enter(RrcState state, double seconds);
-    void begin(Session session);
+    void followUser(const PhoneUser& user);
+    void rest();
+    void enter(RrcState state, Time duration);
+    void serve(Session session);
     void disconnect();
     void registerInArea();
     void finishRegistration();
@@ -72,7 +70,7 @@ private:
     Time _camped{0};
     RrcState _rrcState = RrcState::Disconnected;
     Time _until{0};  // the state lasts
-    Session _session = Session::Data;
+    Session _session = Session::Registration;
     int _registeredArea = 0;
     std::optional<Time> _registersAt;
 
@@ -80,12 +78,8 @@ private:
     std::vector<GsmMeasurement> _gsmMeasurements;
     std::vector<TransportChannel> _transportChannels;
     std::vector<CompositeChannel> _composites;
-    std::vector<const char*> _contexts{"internet"};
+    std::vector<std::string> _contexts{"internet"};
     bool _hasMeasured = false;
-    bool _hasChangedCell = false;
-    bool _hasChangedState = false;
-    bool _hasRegistered = false;
-    bool _hasChangedContexts = false;
 };
 
 }  // namespace kelvo::simulation::utran

@@ -22,10 +22,10 @@ int blerLevel(double share) {
 
 int sirLevel(double dB) { return floorStep(dB, -11, 0.5, 63); }
 
-Bytes rrcStateRecord(Time time, RrcState mode) {
+Bytes rrcStateRecord(Time time, RrcState state) {
     return RecordWriter(time, 0xD0E0, 15)
-        .u8(13, 1)  // the mode is known
-        .u8(14, static_cast<std::uint64_t>(mode))
+        .u8(13, 1)  // the state is known
+        .u8(14, static_cast<std::uint64_t>(state))
         .finish();
 }
 

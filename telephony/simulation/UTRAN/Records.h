@@ -3,13 +3,12 @@
 #include "platform/values/Bytes.h"
 #include "telephony/simulation/UTRAN/Modem.h"
 
+/// The log records of a TD-SCDMA modem: one function a record, from what it reports to bytes. Levels and ratios travel
+/// in the steps in which phones report them (3GPP TS 25.123, section 9.1).
 namespace kelvo::simulation::utran {
 
-// The log records of a TD-SCDMA modem, as its log service words them. Levels and ratios travel in the steps in which
-// phones report them (3GPP TS 25.123, section 9.1).
-
 /// 0xd0e0: the state of the connection.
-Bytes rrcStateRecord(Time time, RrcState mode);
+Bytes rrcStateRecord(Time time, RrcState state);
 /// 0xd0e2: the serving cell, and whether the phone may use it for all calls.
 Bytes servingCellRecord(Time time, const Modem& modem);
 /// 0xd00a: the serving cell and the others around it.

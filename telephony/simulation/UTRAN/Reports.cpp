@@ -35,7 +35,7 @@ std::vector<MonitoredCell> monitoredCells(const Modem& modem) {
 
 std::vector<PdpContext> pdpContexts(const Modem& modem) {
     std::vector<PdpContext> contexts;
-    for (const char* apn : modem.contexts()) {
+    for (const std::string& apn : modem.contexts()) {
         const bool isFirst = contexts.empty();
         contexts.push_back({.id = isFirst ? 5 : 6,
                             .apn = apn,

@@ -1,7 +1,5 @@
 #include "telephony/simulation/UTRAN/Simulation.h"
 
-#include <utility>
-
 #include "telephony/simulation/UTRAN/Records.h"
 
 namespace kelvo::simulation::utran {
@@ -9,33 +7,25 @@ namespace {
 
 using namespace std::chrono_literals;
 
-constexpr Time kStatePeriod = 200ms;
-constexpr Time kServingCellPeriod = 1s;
-constexpr Time kCellsPeriod = 20s;
-constexpr Time kContextsPeriod = 30s;
-constexpr Time kSimPeriod = 60s;
-constexpr double kDriveRadius = 2000;  // metres
 constexpr int kRoutingArea = 1;
 
 }  // namespace
 
-Simulation::Simulation(Random random)
-    : _network(random),
-      _air{_network, Journey::through(kDriveRadius, random), random.split()},  // braces: the draws have an order
-      _modem(_network, _air, std::move(random)) {}
+Simulation::Simulation(std::uint64_t seed) : FamilySimulation(seed, 400ms) {}
 
 void Simulation::step() {
+    _user.moveTo(now());
     _air.moveTo(now());
-    _modem.step(now());
-    if (_modem.hasChangedState() || every(kStatePeriod)) emit(rrcStateRecord(now(), _modem.rrcState()));
+    _modem.step(now(), _user);
     reportServingCell();
     reportMeasurements();
     reportExtended();
 }
 
 void Simulation::reportServingCell() {
-    const bool hasChanged = _modem.hasChangedCell() || _modem.hasRegistered();
-    if (hasChanged || every(kServingCellPeriod)) emit(servingCellRecord(now(), _modem));
+    if (_rrcState.isDue(now(), _modem.rrcState(), 200ms)) emit(rrcStateRecord(now(), _modem.rrcState()));
+    const std::pair cell{_modem.servingIndex(), _modem.isRegistered()};
+    if (_servingCell.isDue(now(), cell, 1s)) emit(servingCellRecord(now(), _modem));
 }
 
 // Without a dedicated connection there are no channels to tell of, which is told once.
@@ -45,16 +35,15 @@ void Simulation::reportMeasurements() {
         emit(gsmCellsRecord(now(), _modem));
     }
     const bool hasChannels = !_modem.transportChannels().empty();
-    if (hasChannels ? _modem.hasMeasured() : _hasShownChannels) emit(channelsRecord(now(), _modem));
-    _hasShownChannels = hasChannels;
+    const bool hasLost = _hadChannels.isDue(now(), hasChannels) && !hasChannels;
+    if (hasLost || (hasChannels && _modem.hasMeasured())) emit(channelsRecord(now(), _modem));
 }
 
 void Simulation::reportExtended() {
-    if (_modem.hasChangedCell() || every(kCellsPeriod)) emit(cellInformationRecord(now(), monitoredCells(_modem)));
-    if (_modem.hasChangedContexts() || every(kContextsPeriod)) emit(pdpContextsRecord(now(), pdpContexts(_modem)));
-    if (_modem.hasRegistered() || every(kSimPeriod)) {
-        emit(simFilesRecord(now(), testNetworkSim(_modem.registeredArea(), kRoutingArea)));
-    }
+    if (_cells.isDue(now(), _modem.servingIndex(), 20s)) emit(cellInformationRecord(now(), monitoredCells(_modem)));
+    if (_contexts.isDue(now(), _modem.contexts(), 30s)) emit(pdpContextsRecord(now(), pdpContexts(_modem)));
+    const int area = _modem.registeredArea();
+    if (_sim.isDue(now(), area, 60s)) emit(simFilesRecord(now(), testNetworkSim(area, kRoutingArea)));
 }
 
 }  // namespace kelvo::simulation::utran

@@ -10,8 +10,8 @@ namespace {
 
 using namespace std::chrono_literals;
 
-constexpr auto kBlocked = 50ms;  // while the reader takes nothing, what it should have had is counted all the same
-constexpr int kPiecesPerTurn = 64;
+constexpr auto kBlocked = 50ms;    // while the reader takes nothing, what it should have had is counted all the same
+constexpr int kPiecesPerTurn = 8;  // the reader is heard in between, whatever a flood costs
 
 }  // namespace
 

@@ -70,24 +70,21 @@ void PlayedModem::plugIn(Time now) {
     if (_answers.masks().wantAny() && !_began) _began = now;
 }
 
+// One step a call, so that whoever looks late sees it gone all the same.
 bool PlayedModem::isPluggedIn(Time now) {
-    advance(now);
+    if (_returns && now >= *_returns) {
+        plugIn(now);
+    } else if (_leaving && !_leaves && _sent == _output.size()) {
+        _leaves = now + kQuiet;
+    } else if (_pluggedIn && _leaves && now >= *_leaves) {
+        unplug();
+        _returns = now + milliseconds(_random.between(300, 1500));
+    }
     return _pluggedIn;
 }
 
-void PlayedModem::advance(Time now) {
-    if (_leaving && _pluggedIn) {
-        if (!_leaves && _sent == _output.size()) _leaves = now + kQuiet;
-        if (_leaves && now >= *_leaves) {
-            unplug();
-            _returns = *_leaves + milliseconds(_random.between(300, 1500));
-        }
-    }
-    if (_returns && now >= *_returns) plugIn(*_returns);
-}
-
 void PlayedModem::receive(ByteView bytes, Time now) {
-    if (!isPluggedIn(now) || _faults.has(Fault::Silent)) return;
+    if (!_pluggedIn || _faults.has(Fault::Silent)) return;
     if (_faults.has(Fault::AtPort)) {
         const ByteView error = bytesOf("\r\nERROR\r\n");
         _output.insert(_output.end(), bytes.begin(), bytes.end());
@@ -172,7 +169,6 @@ void PlayedModem::chat(Time now) {
 }
 
 ByteView PlayedModem::output(Time now) {
-    advance(now);
     gather(now);
     if (!_pluggedIn) return {};
     if (_sent == _output.size()) {

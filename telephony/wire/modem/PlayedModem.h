@@ -40,7 +40,7 @@ public:
     /// can change anything.
     std::optional<Time> nextDue() const;
 
-    /// Whether its port can be seen.
+    /// Whether its port can be seen. To be asked whenever something is due: this is where it hangs up and comes back.
     bool isPluggedIn(Time now);
     /// Pulled out by hand, and put back: then it has forgotten what its reader asked for.
     void unplug();
@@ -62,7 +62,6 @@ private:
         Bytes frames;
     };
 
-    void advance(Time now);
     void handle(ByteView request, Time now);
     Time delayOf(ByteView request);
     void begin(Time now);

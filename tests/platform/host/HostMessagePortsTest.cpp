@@ -59,6 +59,7 @@ TEST_F(HostMessagePortsNames, SayThatALiveOwnerHasTheName) {
     EXPECT_TRUE(first.port);
     EXPECT_FALSE(second.port);
     EXPECT_TRUE(second.alreadyExisted);
+    EXPECT_EQ(second.owner, ::getpid());
 }
 
 TEST_F(HostMessagePortsNames, AreFreeAgainAfterInvalidationAndLeaveNoFiles) {

@@ -102,7 +102,8 @@ std::optional<PilotReading> followedEvdo(const cdma::Simulation& modem) {
 
 // An idle phone's records show the pilot that it follows alone, so the others come from the world. A pilot weaker than
 // `drop` may be left for any that is stronger.
-void expectMovesWhenIdle(std::optional<PilotReading> (*followed)(const cdma::Simulation&), double drop, int fewest) {
+void expectMovesWhenIdle(std::optional<PilotReading> (*followed)(const cdma::Simulation&),
+                         const Reception& (Air::*carrier)() const, double drop, int fewest) {
     cdma::Simulation modem(1);
     const auto& sectors = modem.network().cells;
     const auto sectorOf = [&sectors](int pn) {
@@ -113,14 +114,15 @@ void expectMovesWhenIdle(std::optional<PilotReading> (*followed)(const cdma::Sim
     int moves = 0;
     int rising = 0;
     for (auto message = modem.next(); message.time < 10min; message = modem.next()) {
-        received.emplace_back(message.time, modem.drive().received());
+        received.emplace_back(message.time, modem.air().drive().received());
         while (received.front().first < message.time - 8s) received.pop_front();
         const std::optional<PilotReading> now = followed(modem);
         if (before && now && now->pn != before->pn) {
             const auto above = [&, to = sectorOf(now->pn), from = sectorOf(before->pn)](const auto& levels) {
                 return levels[to] - levels[from];
             };
-            const double least = before->strength < drop + 1 ? -1 : 2;  // 0 or 3 dB as read, noise included
+            const double own = (modem.air().*carrier)().pilots[sectorOf(before->pn)];
+            const double least = own < drop + 1 ? -1 : 2;  // 0 or 3 dB as read, noise included
             EXPECT_GT(above(received.back().second), least) << seconds(message.time);
             rising += above(received.back().second) > above(received.front().second);
             ++moves;
@@ -132,11 +134,11 @@ void expectMovesWhenIdle(std::optional<PilotReading> (*followed)(const cdma::Sim
 }
 
 TEST(CdmaSimulation, MovesToClearlyStrongerPilotsThatCameCloserWhenIdle) {
-    expectMovesWhenIdle(followedOneX, -16, 12);  // T_DROP
+    expectMovesWhenIdle(followedOneX, &Air::oneX, -16, 12);  // T_DROP
 }
 
 TEST(CdmaSimulation, MovesLikewiseInEvdo) {
-    expectMovesWhenIdle(followedEvdo, -9, 6);  // PilotDrop
+    expectMovesWhenIdle(followedEvdo, &Air::evdo, -9, 6);  // PilotDrop
 }
 
 TEST(CdmaSimulation, RegistersWheneverTheSystemOrNetworkChanges) {
@@ -208,9 +210,9 @@ TEST(CdmaSimulation, ReadsASteadyLevelWhileThePhoneStands) {
     int stops = 0;
     for (auto message = modem.next(); message.time < 5min; message = modem.next()) {
         const double level = modem.modem().oneX().status().rx0;
-        if (modem.drive().driven() != driven) {
+        if (modem.air().drive().driven() != driven) {
             stops += message.time - since > 4s;
-            driven = modem.drive().driven();
+            driven = modem.air().drive().driven();
             since = message.time;
             least = most = level;
         }
@@ -231,54 +233,59 @@ TEST(CdmaSimulation, GivesNoTwoSectorsOnePilotOffset) {
 
 namespace {
 
-Air air(std::vector<double> pilots) { return {std::move(pilots), -70}; }
+Reception air(std::vector<double> pilots) {
+    Reception air;
+    air.pilots = std::move(pilots);
+    air.total = -70;
+    return air;
+}
 
 }  // namespace
 
 TEST(PilotSet, AddsAPilotAboveTheAddThresholdAndDropsItAfterItsTimer) {
     PilotSet pilots({.add = -14, .drop = -16, .dropTime = 4s, .compare = 2.5});
     pilots.follow(0);
-    pilots.update(air({-6, -14.5}), 0s);
+    pilots.update(0s, air({-6, -14.5}));
     EXPECT_EQ(pilots.sectors(), (std::vector<std::size_t>{0}));
-    pilots.update(air({-6, -13.5}), 1s);
+    pilots.update(1s, air({-6, -13.5}));
     EXPECT_EQ(pilots.sectors(), (std::vector<std::size_t>{0, 1}));
-    pilots.update(air({-6, -17}), 2s);
-    pilots.update(air({-6, -15}), 5s);  // above the drop threshold: the timer ends
-    pilots.update(air({-6, -17}), 6s);
-    pilots.update(air({-6, -17}), 9s);
+    pilots.update(2s, air({-6, -17}));
+    pilots.update(5s, air({-6, -15}));  // above the drop threshold: the timer ends
+    pilots.update(6s, air({-6, -17}));
+    pilots.update(9s, air({-6, -17}));
     EXPECT_EQ(pilots.sectors().size(), 2U);
-    pilots.update(air({-6, -17}), 10s);
+    pilots.update(10s, air({-6, -17}));
     EXPECT_EQ(pilots.sectors(), (std::vector<std::size_t>{0}));
 }
 
 TEST(PilotSet, FollowsAMemberThatIsClearlyStronger) {
     PilotSet pilots(kOneXRules);
     pilots.follow(0);
-    pilots.update(air({-8, -7}), 0s);
-    pilots.update(air({-8, -7}), 1s);
+    pilots.update(0s, air({-8, -7}));
+    pilots.update(1s, air({-8, -7}));
     EXPECT_EQ(pilots.reference(), 0U);
-    pilots.update(air({-11, -7}), 2s);
+    pilots.update(2s, air({-11, -7}));
     EXPECT_EQ(pilots.reference(), 1U);
 }
 
 TEST(PilotSet, ReplacesTheWeakestOfSixByOneThatBeatsIt) {
     PilotSet pilots(kOneXRules);
     pilots.follow(0);
-    pilots.update(air({-9, -10, -10, -10, -10, -12, -20}), 0s);
-    pilots.update(air({-9, -10, -10, -10, -10, -12, -10}), 1s);
+    pilots.update(0s, air({-9, -10, -10, -10, -10, -12, -20}));
+    pilots.update(1s, air({-9, -10, -10, -10, -10, -12, -10}));
     EXPECT_EQ(pilots.sectors(), (std::vector<std::size_t>{0, 1, 2, 3, 4, 5}));
-    pilots.update(air({-9, -10, -10, -10, -10, -12, -9}), 2s);
+    pilots.update(2s, air({-9, -10, -10, -10, -10, -12, -9}));
     EXPECT_EQ(pilots.sectors(), (std::vector<std::size_t>{0, 1, 2, 3, 4, 6}));
 }
 
 TEST(PilotSet, LeavesItsPilotWhenIdleForOneThatStaysStrongerOrAtOnceWhenItIsLost) {
     PilotSet pilots(kOneXRules);
     pilots.follow(0);
-    EXPECT_FALSE(pilots.reselect(air({-10, -6}), 0s));
-    EXPECT_TRUE(pilots.reselect(air({-10, -6}), 2s));
+    EXPECT_FALSE(pilots.reselect(0s, air({-10, -6})));
+    EXPECT_TRUE(pilots.reselect(2s, air({-10, -6})));
     EXPECT_EQ(pilots.reference(), 1U);
-    EXPECT_FALSE(pilots.reselect(air({-10, -12}), 4s));
-    EXPECT_TRUE(pilots.reselect(air({-15, -17}), 6s));
+    EXPECT_FALSE(pilots.reselect(4s, air({-10, -12})));
+    EXPECT_TRUE(pilots.reselect(6s, air({-15, -17})));
     EXPECT_EQ(pilots.reference(), 0U);
 }
 

@@ -1,6 +1,6 @@
 #include "tests/telephony/simulation/GsmComparison.h"
 
-#include <cstdio>
+#include "tests/telephony/simulation/TestSim.h"
 
 namespace kelvo::test {
 namespace {
@@ -82,35 +82,9 @@ void GsmComparison::equivalents() {
 }
 
 void GsmComparison::sim() {
-    const auto& registered = _modem.modem().registration().registered();
-    char area[16] = "FFFE";
-    char routingArea[16] = "FF";
-    if (registered) {
-        std::snprintf(area, sizeof area, "%04X", static_cast<unsigned>(registered->lac));
-        std::snprintf(routingArea, sizeof routingArea, "%02X", static_cast<unsigned>(registered->rac));
-    }
-    const std::string status = registered ? "00" : "01";  // updated, not updated
-    const std::map<std::string, std::string> expected{
-        {"EF-ICCID", "8900101000000123456"},
-        {"EF-MSISDN", "+0015550123"},
-        {"EF-3GPP MAIL BOX DIALING NUMBER", "+0015550100"},
-        {"EF-HPPLMN SEARCH PERIOD", "05"},
-        {"EF-LOCI", std::string("3A9C41D700F110") + area + "FF" + status},
-        {"EF-GPRS/PS-LOCI", std::string("C41B7E02A95D1300F110") + area + routingArea + status},
-        {"EF-ACCESS CONTROL CLASS", "0008"},
-        {"EF-ADMINISTRATIVE DATA", "00000102"},
-        {"EF-FPLMN", "00F120FFFFFFFFFFFFFFFFFF"},
-        {"EF-ACTING HPLMN", "00F110"},
-        {"EF-RAT MODE", "00"},
-        {"EF-PLMN NETWORK NAME", "Test Network"},
-        {"EF-OPERATOR PLMN LIST", "00F1100000FFFE01"},
-        {"EF-OPLMNAcT", "00F110C080"},
-    };
-    const Value* files = _played.at("SIM and Data Contexts/SIM Info");
-    ASSERT_TRUE(files != nullptr && files->dictionary());
-    std::map<std::string, std::string> shown;
-    for (const auto& [name, text] : *files->dictionary()) shown[name] = text.string() ? *text.string() : "(no text)";
-    EXPECT_EQ(shown, expected);
+    std::optional<RegisteredArea> area;
+    if (const auto& registered = _modem.modem().registration().registered()) area = {registered->lac, registered->rac};
+    expectTestSim(_played, "SIM and Data Contexts/SIM Info", area);
 }
 
 void GsmComparison::cells() {
@@ -177,8 +151,8 @@ void GsmComparison::contexts() {
         EXPECT_EQ(_played.rows(_group), 0U);
         return;
     }
-    const bool isData = phone.use() == Use::Data;
-    const int session = _modem.dataSessions();
+    const bool isData = phone.activity() == Activity::Browsing;
+    const int session = _modem.user().sessions();
     const bool hasMessages = isData && session % 2 == 0;
     const std::string host = std::to_string(session % 250 + 2);
     ASSERT_EQ(_played.rows(_group), hasMessages ? 2U : 1U);

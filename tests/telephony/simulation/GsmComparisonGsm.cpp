@@ -30,7 +30,7 @@ void GsmComparison::compareGsm(std::uint32_t code) {
             shows("GSM RR Info/RR State", label(kRrStates, phone.rrState()));
             shows("GSM RR Info/RR Sub State", static_cast<int>(phone.link()));
             shows("GSM RR Info/RR Status", phone.isCamped() ? "1" : "0");
-            shows("GSM RR Info/RR Mode", phone.use() == Use::Data ? "Data" : "Voice");
+            shows("GSM RR Info/RR Mode", phone.activity() == Activity::Browsing ? "Data" : "Voice");
             break;
         case 0x5072: shows("GSM RR Info/DTX Used", _modem.lastReports().isDtxUsed ? "ON" : "OFF"); break;
         case 0x5076: shows("GSM Serving Cell/MA Dedicated ARFCN", _modem.lastReports().dedicatedArfcn); break;

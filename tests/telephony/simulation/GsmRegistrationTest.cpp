@@ -17,8 +17,8 @@ constexpr Area kSameLocation{0x1101, 2};
 /// Registered in kHome, one second after the beginning.
 Registration settled() {
     Registration registration;
-    registration.step({.area = kHome, .isLinkOpen = true}, 0ms);
-    registration.step({.area = kHome, .isLinkOpen = true}, 1s);
+    registration.step(0ms, {.area = kHome, .isLinkOpen = true});
+    registration.step(1s, {.area = kHome, .isLinkOpen = true});
     return registration;
 }
 
@@ -26,7 +26,7 @@ Registration settled() {
 
 TEST(Registration, SearchesUntilThereIsACell) {
     Registration registration;
-    registration.step({}, 1s);
+    registration.step(1s, {});
     EXPECT_EQ(registration.mobility().registration, RegistrationState::AutomaticSearch);
     EXPECT_EQ(registration.mobility().service, ServiceType::None);
     EXPECT_FALSE(registration.wantsLink());
@@ -34,14 +34,14 @@ TEST(Registration, SearchesUntilThereIsACell) {
 
 TEST(Registration, AsksForAConnectionAndTakesItsTimeOverIt) {
     Registration registration;
-    registration.step({.area = kHome}, 0ms);
+    registration.step(0ms, {.area = kHome});
     EXPECT_TRUE(registration.wantsLink());
     EXPECT_EQ(registration.mobility().mm, MmState::WaitForRrConnectionLu);
     EXPECT_EQ(registration.mobility().gmm, GmmState::RegisteredInitiated);
-    registration.step({.area = kHome, .isLinkOpen = true}, 200ms);
+    registration.step(200ms, {.area = kHome, .isLinkOpen = true});
     EXPECT_EQ(registration.mobility().mm, MmState::LocationUpdateInitiated);
     EXPECT_EQ(registration.mobility().service, ServiceType::Limited);
-    registration.step({.area = kHome, .isLinkOpen = true}, 700ms);
+    registration.step(700ms, {.area = kHome, .isLinkOpen = true});
     EXPECT_EQ(registration.registered(), kHome);
     EXPECT_EQ(registration.mobility().mm, MmState::Idle);
     EXPECT_EQ(registration.mobility().service, ServiceType::CsAndPs);
@@ -50,7 +50,7 @@ TEST(Registration, AsksForAConnectionAndTakesItsTimeOverIt) {
 
 TEST(Registration, LeavesTheCircuitDomainAloneWhenOnlyTheRoutingAreaChanges) {
     Registration registration = settled();
-    registration.step({.area = kSameLocation}, 2s);
+    registration.step(2s, {.area = kSameLocation});
     EXPECT_EQ(registration.mobility().gmm, GmmState::RoutingAreaUpdateInitiated);
     EXPECT_EQ(registration.mobility().gmmSub, GmmSubState::UpdateNeeded);
     EXPECT_EQ(registration.mobility().mm, MmState::Idle);
@@ -59,28 +59,28 @@ TEST(Registration, LeavesTheCircuitDomainAloneWhenOnlyTheRoutingAreaChanges) {
 
 TEST(Registration, WaitsForTheEndOfACall) {
     Registration registration = settled();
-    registration.step({.area = kNext, .isLinkOpen = true, .use = Use::Voice}, 2s);
+    registration.step(2s, {.area = kNext, .isLinkOpen = true, .activity = Activity::Talking});
     EXPECT_FALSE(registration.wantsLink());
     EXPECT_EQ(registration.mobility().mm, MmState::ConnectionActive);
     EXPECT_EQ(registration.mobility().mmSub, MmSubState::LocationUpdateNeeded);
-    registration.step({.area = kNext, .isLinkOpen = true}, 3s);
+    registration.step(3s, {.area = kNext, .isLinkOpen = true});
     EXPECT_EQ(registration.mobility().mm, MmState::LocationUpdateInitiated);
 }
 
 TEST(Registration, GivesUpWhenThePhoneIsBackBeforeItBegan) {
     Registration registration = settled();
-    registration.step({.area = kNext}, 2s);
-    registration.step({.area = kHome}, 3s);
+    registration.step(2s, {.area = kNext});
+    registration.step(3s, {.area = kHome});
     EXPECT_FALSE(registration.wantsLink());
     EXPECT_EQ(registration.mobility().mm, MmState::Idle);
 }
 
 TEST(Registration, SuspendsPacketDataDuringACallInGsmOnly) {
     Registration registration = settled();
-    registration.step({.area = kHome, .isLinkOpen = true, .use = Use::Voice}, 2s);
+    registration.step(2s, {.area = kHome, .isLinkOpen = true, .activity = Activity::Talking});
     EXPECT_EQ(registration.mobility().gmmSub, GmmSubState::Suspended);
     EXPECT_EQ(registration.mobility().service, ServiceType::CsOnly);
-    registration.step({.area = kHome, .rat = Rat::UMTS, .isLinkOpen = true, .use = Use::Voice}, 3s);
+    registration.step(3s, {.area = kHome, .rat = Rat::UMTS, .isLinkOpen = true, .activity = Activity::Talking});
     EXPECT_EQ(registration.mobility().gmmSub, GmmSubState::NormalService);
     EXPECT_EQ(registration.mobility().service, ServiceType::CsAndPs);
 }

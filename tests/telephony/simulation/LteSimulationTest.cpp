@@ -69,6 +69,7 @@ TEST(LteSimulation, SendsEveryRecordThatTheApplicationAsksFor) {
     std::set<std::uint32_t> codes;  // of the first four minutes
     while (played.time() < 10min) {
         const std::uint32_t code = played.next();
+        if (played.time() >= 10min) break;
         if (played.time() < 4min) codes.insert(code);
         ++counts[code];
     }
@@ -108,13 +109,14 @@ TEST(LteSimulation, HasALivelyFirstThreeMinutesInLittleSpace) {
     lte::Simulation modem(1);
     Played played(modem);
     std::set<std::string> seen;
-    int cells = 0;
+    Reported<std::size_t> serving;
+    int cells = -1;  // the first is no change
     std::size_t bytes = 0;
     lte::Simulation twin(1);
     for (auto message = twin.next(); message.time < 3min; message = twin.next()) bytes += message.bytes.size() + 16;
     while (played.time() < 3min) {
         played.next();
-        if (modem.modem().hasChangedCell() && played.time() > 0s) ++cells;
+        cells += serving.isDue(played.time(), modem.modem().servingIndex());
         for (const char* value :
              {"Serving Cell Info/Download Bandwidth", "Serving Cell Measurements/S Intra Search",
               "Serving Cell Measurements/P_Max", "Reselection Candidates List/0/Candidate RAT Type",
@@ -179,10 +181,12 @@ TEST(LteSimulation, RegistersSoonAfterTheAreaChanges) {
     Time since = 0s;
     int registrations = 0;
     int last = modem.modem().registeredArea();
+    Reported<std::size_t> serving;
     while (played.time() < 10min) {
         played.next();
         const Modem& world = modem.modem();
-        if (world.serving().trackingArea == world.registeredArea() || world.hasChangedCell()) since = played.time();
+        const bool hasMoved = serving.isDue(played.time(), world.servingIndex());
+        if (world.serving().trackingArea == world.registeredArea() || hasMoved) since = played.time();
         ASSERT_LE(played.time() - since, 1s);
         if (world.registeredArea() == last) continue;
         last = world.registeredArea();
@@ -215,8 +219,8 @@ TEST(LteSimulation, IsIdleAndConnectedByTurns) {
     EXPECT_TRUE(between(messages / 600.0, 8, 40)) << messages;
 }
 
-// Sessions are meant to last 6 to 18 s. The network ends one earlier only to send the phone to another carrier, and
-// never a call. (Connections for an update of the area are shorter.)
+// A phone whose user does something stays connected, unless the network sends it to another carrier; a call it never
+// ends.
 TEST(LteSimulation, EndsASessionEarlyOnlyToGoToAnotherCarrierAndNoCallAtAll) {
     int calls = 0;
     int redirections = 0;
@@ -226,29 +230,23 @@ TEST(LteSimulation, EndsASessionEarlyOnlyToGoToAnotherCarrierAndNoCallAtAll) {
         const Modem& world = modem.modem();
         bool wasConnected = true;
         bool wasOnCall = false;
-        bool isForArea = true;  // or for the attach
-        Time since = 0s;
-        std::optional<int> left;  // the carrier, until the phone has gone from it
+        std::optional<Earfcn> left;  // the carrier, until the phone has gone from it
         for (auto message = modem.next(); message.time < 10min; message = modem.next()) {
             if (left && world.serving().carrier.downlink != *left) {
                 ++arrivals;
                 left.reset();
             }
-            isForArea |= world.isConnected() && world.registeredArea() != world.serving().trackingArea;
-            if (world.isConnected() == wasConnected) continue;
-            left.reset();
-            const Time lasted = message.time - since;
-            if (wasOnCall) {
-                EXPECT_GE(lasted, 6s) << seed << ": " << seconds(message.time);
+            if (wasOnCall && !world.isOnCall()) {
+                EXPECT_FALSE(modem.user().isTalking()) << seed << ": " << seconds(message.time);
                 ++calls;
-            } else if (wasConnected && !isForArea && lasted < 6s) {
-                left = world.serving().carrier.downlink;
-                ++redirections;
             }
-            wasConnected = world.isConnected();
             wasOnCall = world.isOnCall();
-            isForArea = false;
-            since = message.time;
+            if (world.isConnected() == wasConnected) continue;
+            wasConnected = world.isConnected();
+            left.reset();
+            if (wasConnected || modem.user().isResting()) continue;
+            left = world.serving().carrier.downlink;
+            ++redirections;
         }
     }
     EXPECT_GE(calls, 25);
@@ -277,8 +275,10 @@ TEST(LteSimulation, KeepsTheLevelWhileThePhoneStands) {
     double driven = -1;
     double level = 0;
     int steady = 0;
+    Reported<std::size_t> serving;
     for (auto message = modem.next(); message.time < 10min; message = modem.next()) {
-        if (modem.air().drive().driven() != driven || world.hasChangedCell()) {
+        const bool hasMoved = serving.isDue(message.time, world.servingIndex());
+        if (modem.air().drive().driven() != driven || hasMoved) {
             since = message.time;
             driven = modem.air().drive().driven();
             level = modem.air().drive().received(world.servingIndex());

@@ -3,7 +3,8 @@
 #include <gtest/gtest.h>
 
 #include <cmath>
-#include <cstdio>
+
+#include "tests/telephony/simulation/TestSim.h"
 
 namespace kelvo::test {
 
@@ -28,7 +29,7 @@ void UtranShown::compare(std::uint32_t code) {
         case 0xD00A: return cells();
         case 0xD00C: return channels();
         case 0xD00E: EXPECT_EQ(_played.rows("GSM Neighbor Cell List"), 0U); return;  // intended by the screen
-        case 0xFF0000: return simFiles();
+        case 0xFF0000: return expectTestSim(_played, "SIM Info", RegisteredArea{_modem.registeredArea()});
         case 0xFF0001: return monitoredCell();
         case 0xFF0002: return contexts();
         default: FAIL() << "a record that no screen asks for: " << code;
@@ -109,28 +110,6 @@ void UtranShown::channels() {
             EXPECT_TRUE(sir ? isInStep(*sir, level, -11, 0.5, 63) : level == 0) << level;
         }
     }
-}
-
-void UtranShown::simFiles() {
-    char area[5];
-    std::snprintf(area, sizeof area, "%04X", static_cast<unsigned>(_modem.registeredArea()));
-    _section = "SIM Info";
-    equals("EF-LOCI", std::string("3A9C41D700F110") + area + "FF00");
-    const Value* files = _played.at("SIM Info");  // this key has the path's own sign in it
-    ASSERT_TRUE(files != nullptr && files->dictionary());
-    EXPECT_EQ((*files->dictionary())["EF-GPRS/PS-LOCI"], Value(std::string("C41B7E02A95D1300F110") + area + "0100"));
-    equals("EF-ICCID", "8900101000000123456");
-    equals("EF-MSISDN", "+0015550123");
-    equals("EF-3GPP MAIL BOX DIALING NUMBER", "+0015550100");
-    equals("EF-HPPLMN SEARCH PERIOD", "05");
-    equals("EF-ACCESS CONTROL CLASS", "0008");
-    equals("EF-ADMINISTRATIVE DATA", "00000102");
-    equals("EF-FPLMN", "00F120FFFFFFFFFFFFFFFFFF");
-    equals("EF-ACTING HPLMN", "00F110");
-    equals("EF-RAT MODE", "00");
-    equals("EF-PLMN NETWORK NAME", "Test Network");
-    equals("EF-OPERATOR PLMN LIST", "00F1100000FFFE01");
-    equals("EF-OPLMNAcT", "00F110C080");
 }
 
 void UtranShown::monitoredCell() {

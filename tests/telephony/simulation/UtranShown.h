@@ -18,7 +18,6 @@ private:
     void servingCell();
     void cells();
     void channels();
-    void simFiles();
     void monitoredCell();
     void contexts();
 

@@ -261,3 +261,12 @@ TEST_F(SessionTest, KeepsItsHeadUnderGarbage) {
     say(recordOf(0xB0C2, 1));
     EXPECT_EQ(taken, std::vector<Bytes>{packetOf(0xB0C2, 1)});
 }
+
+TEST_F(SessionTest, ShowsAModemsNameWithoutWhatATerminalObeys) {
+    open();
+    beQuiet();
+    Bytes answer = kVersionAnswer;
+    std::ranges::copy(bytesOf("A\x1b[2J\x9b~ "), answer.begin() + 39);
+    say(answer);
+    EXPECT_EQ(session->target(), "A?[2J?~");
+}

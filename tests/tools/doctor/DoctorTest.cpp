@@ -135,7 +135,7 @@ TEST_F(DoctorTest, EndsWithTheOneThingThatIsInTheWay) {
     add("/dev/ttyUSB0");
     EXPECT_EQ(next(), "run \"kelvoctl doctor --port /dev/ttyUSB0 --probe\", which asks it what it can show");
     managerRuns = true;
-    EXPECT_EQ(next().substr(0, 62), "run \"kelvoctl doctor --port /dev/ttyUSB0 --udev-rule | sudo tee");
+    EXPECT_EQ(next().substr(0, 63), "run \"kelvoctl doctor --port /dev/ttyUSB0 --udev-rule | sudo tee");
     candidates[0].ignoredByModemManager = true;
     EXPECT_EQ(next(), "run \"kelvoctl doctor --port /dev/ttyUSB0 --probe\", which asks it what it can show");
     holders["/dev/ttyUSB0"].known = {{77, "minicom"}};
@@ -145,7 +145,7 @@ TEST_F(DoctorTest, EndsWithTheOneThingThatIsInTheWay) {
     access["/dev/ttyUSB0"].mayOpen = false;
     EXPECT_EQ(next(), "add yourself to the group dialout: run \"sudo usermod -aG dialout ada\", and log in again");
     access["/dev/ttyUSB0"].group = "";
-    EXPECT_EQ(next().substr(0, 62), "run \"kelvoctl doctor --port /dev/ttyUSB0 --udev-rule | sudo tee");
+    EXPECT_EQ(next().substr(0, 63), "run \"kelvoctl doctor --port /dev/ttyUSB0 --udev-rule | sudo tee");
     access["/dev/ttyUSB0"].exists = false;
     EXPECT_EQ(next(), "plug the modem in: /dev/ttyUSB0 is not there");
 }

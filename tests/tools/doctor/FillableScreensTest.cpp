@@ -19,7 +19,7 @@ bool has(const Names& names, const std::string& name) { return std::ranges::find
 
 TEST(FillableScreens, AreToldOfFourFamilies) {
     std::vector<Technology> told;
-    for (const FillableScreens& screens : fillableScreens({})) told.push_back(screens.technology);
+    for (const FillableScreens& screens : fillableScreens(wire::Ranges{})) told.push_back(screens.technology);
     EXPECT_EQ(told, (std::vector{Technology::GSM, Technology::CDMA, Technology::LTE, Technology::UTRAN}));
 }
 
@@ -34,7 +34,7 @@ TEST(FillableScreens, AreAllOfThemWhereTheModemHasEverything) {
 }
 
 TEST(FillableScreens, AreNoneWhereTheModemHasNothing) {
-    for (const FillableScreens& screens : fillableScreens({})) {
+    for (const FillableScreens& screens : fillableScreens(wire::Ranges{})) {
         EXPECT_EQ(screens.filled, Names());
         EXPECT_EQ(screens.partly, Names());
         EXPECT_FALSE(screens.empty.empty());

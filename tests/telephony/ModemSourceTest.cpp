@@ -1,0 +1,367 @@
+#include "telephony/ModemSource.h"
+
+#include <gtest/gtest.h>
+
+#include "tests/support/ManualClock.h"
+#include "tests/support/ManualQueue.h"
+#include "tests/support/RecordingLog.h"
+#include "tests/support/TemporaryDirectory.h"
+#include "tests/telephony/wire/SessionFixture.h"
+
+namespace kelvo {
+namespace {
+
+using namespace std::chrono_literals;
+using test::joined;
+using test::plainBody;
+using test::plainFrame;
+
+/// What a test has of the line that is open.
+struct FakeLine final : ModemLine {
+    FakeLine(Listener& itsListener, int& alive) : listener(itsListener), count(alive) { ++count; }
+    ~FakeLine() override { --count; }
+    std::string name() const override { return "line"; }
+    void open() override { opened = true; }
+    void send(ByteView frame) override { sent.emplace_back(frame.begin(), frame.end()); }
+    void mute() override { muted = true; }
+
+    Listener& listener;
+    int& count;
+    std::vector<Bytes> sent;
+    bool opened = false;
+    bool muted = false;
+};
+
+/// Lines that the test answers for.
+struct FakeLines final : ModemLines {
+    std::string description() const override { return "the modem at line"; }
+    Result<std::unique_ptr<ModemLine>> next(ModemLine::Listener& listener, bool again) override {
+        ++tries;
+        lastAgain = again;
+        if (!isThere) return Failure{"No such file or directory"};
+        auto made = std::make_unique<FakeLine>(listener, alive);
+        line = made.get();
+        return std::unique_ptr<ModemLine>(std::move(made));
+    }
+    void watch(std::function<void()> changed) override { watching = std::move(changed); }
+
+    bool isThere = true;
+    bool lastAgain = false;
+    int tries = 0;
+    int alive = 0;
+    FakeLine* line = nullptr;
+    std::function<void()> watching;
+};
+
+class ModemSourceTest : public testing::Test, public RecordSink {
+protected:
+    ModemSourceTest() { make({.technology = Technology::LTE, .subscription = {}}); }
+    void make(wire::Session::Options options) {
+        auto owned = std::make_unique<FakeLines>();
+        lines = owned.get();
+        source =
+            std::make_unique<ModemSource>(std::move(owned), options, queue, [this] { return queue.now() + 1000s; });
+        source->start(*this);
+    }
+    bool take(ByteView record) override {
+        taken.emplace_back(record.begin(), record.end());
+        return true;
+    }
+    bool isHungry() const override { return true; }
+
+    void stream(std::initializer_list<std::size_t> codes) {
+        ClientsWishes wishes{.streaming = true, .ordinary = {}};
+        for (const std::size_t code : codes) wishes.ordinary.set(code);
+        source->clientsWant(wishes);
+    }
+    void leave() { source->clientsWant({}); }
+    void say(const Bytes& body) {
+        Bytes frame = plainFrame(body);
+        lines->line->listener.lineGave(frame);
+    }
+    // Answers everything that a modem is asked until it is asked for nothing more.
+    void answer() {
+        lines->line->listener.lineOpened();
+        queue.advance(200ms);
+        answerRequests();
+    }
+    void answerRequests() {
+        FakeLine& line = *lines->line;
+        while (!line.sent.empty()) {
+            const Bytes asked = plainBody(line.sent.back());
+            line.sent.clear();
+            if (asked[0] == 0x00) say(test::kVersionAnswer);
+            if (asked[0] == 0x7C) say(test::kBuildIdAnswer);
+            if (asked[0] == 0x73 && asked[4] == 1) say(test::rangesAnswer());
+            if (asked[0] == 0x73 && asked[4] == 3) say(maskAnswer(asked));
+        }
+    }
+    static Bytes maskAnswer(const Bytes& asked) {
+        return joined({Bytes(asked.begin(), asked.begin() + 8), Bytes(4), Bytes(asked.begin() + 8, asked.end())});
+    }
+    std::vector<std::string> texts() const {
+        std::vector<std::string> all;
+        for (const auto& line : log.lines()) all.push_back(line.second);
+        return all;
+    }
+
+    test::ManualQueue queue;
+    test::RecordingLog log;
+    test::ManualClock clock{1'700'000'000};
+    Environment::Scope scope{Environment{.log = &log, .clock = &clock}};
+    FakeLines* lines = nullptr;
+    std::unique_ptr<ModemSource> source;
+    std::vector<Bytes> taken;
+};
+
+}  // namespace
+
+TEST_F(ModemSourceTest, OpensThePortForTheFirstClientOnly) {
+    queue.advance(100s);
+    EXPECT_EQ(lines->tries, 0);
+    EXPECT_EQ(source->description(), "the modem at line");
+    stream({0xB0C2});
+    EXPECT_EQ(lines->tries, 1);
+    EXPECT_TRUE(lines->line->opened);
+    EXPECT_TRUE(lines->line->sent.empty());
+    answer();
+    stream({0xB0C2, 0xB0C1});
+    EXPECT_EQ(lines->tries, 1);
+    say(test::recordOf(0xB0C2, 7));
+    EXPECT_EQ(taken, std::vector<Bytes>{test::packetOf(0xB0C2, 7)});
+}
+
+TEST_F(ModemSourceTest, ReleasesThePortSixSecondsAfterTheLastClientHasLeft) {
+    stream({0xB0C2});
+    answer();
+    leave();
+    answerRequests();  // to the mask without any code
+    queue.advance(5999ms);
+    EXPECT_TRUE(lines->line->sent.empty());
+    queue.advance(1ms);
+    ASSERT_EQ(lines->line->sent.size(), 3U);
+    EXPECT_EQ(lines->line->sent[1], (Bytes{0x73, 0, 0, 0, 0, 0, 0, 0, 0xDA, 0x81, 0x7E}));
+    EXPECT_EQ(lines->alive, 1);
+    queue.advance(200ms);
+    EXPECT_EQ(lines->alive, 0);
+    queue.advance(100s);
+    EXPECT_EQ(lines->tries, 1);
+    stream({0xB0C2});
+    EXPECT_EQ(lines->tries, 2);
+}
+
+TEST_F(ModemSourceTest, KeepsThePortForAClientThatComesBackInTime) {
+    stream({0xB0C2});
+    answer();
+    leave();
+    answerRequests();
+    queue.advance(5s);
+    stream({0xB0C2});
+    answerRequests();
+    queue.advance(100s);
+    EXPECT_EQ(lines->alive, 1);
+    EXPECT_EQ(lines->tries, 1);
+}
+
+TEST_F(ModemSourceTest, TriesAgainAfterTenthOfASecondDoublingToOne) {
+    lines->isThere = false;
+    stream({0xB0C2});
+    EXPECT_EQ(lines->tries, 1);
+    EXPECT_EQ(source->state(), "it cannot be opened: No such file or directory");
+    for (const auto pause : {100ms, 200ms, 400ms, 800ms, 1000ms, 1000ms}) {
+        const int before = lines->tries;
+        queue.advance(pause - 1ms);
+        EXPECT_EQ(lines->tries, before);
+        queue.advance(1ms);
+        EXPECT_EQ(lines->tries, before + 1);
+    }
+    EXPECT_EQ(texts(), std::vector<std::string>{
+                           "the modem at line: it cannot be opened: No such file or directory; trying again"});
+    leave();
+    queue.advance(10s);
+    const int before = lines->tries;
+    queue.advance(100s);
+    EXPECT_EQ(lines->tries, before);  // nobody is left who wants it
+    EXPECT_EQ(source->state(), "");
+}
+
+TEST_F(ModemSourceTest, TriesAtOnceWhenThePortMayHaveCome) {
+    lines->isThere = false;
+    stream({0xB0C2});
+    queue.advance(5s);
+    lines->isThere = true;
+    ASSERT_TRUE(lines->watching);
+    const auto changed = lines->watching;
+    changed();
+    ASSERT_NE(lines->line, nullptr);
+    EXPECT_FALSE(lines->watching);
+    const int tries = lines->tries;
+    changed();
+    queue.advance(5s);
+    EXPECT_EQ(lines->tries, tries);
+}
+
+TEST_F(ModemSourceTest, GoesOnByItselfWhenAModemThatHasGoneIsBack) {
+    stream({0xB0C2});
+    answer();
+    lines->isThere = false;
+    lines->line->listener.lineClosed("it hung up");
+    queue.run();
+    EXPECT_EQ(lines->alive, 0);
+    EXPECT_EQ(source->state(), "the modem has gone: it hung up");
+    queue.advance(100ms);
+    EXPECT_TRUE(lines->lastAgain);
+    lines->isThere = true;
+    queue.advance(1s);
+    answer();
+    EXPECT_EQ(source->state(), "");
+    say(test::recordOf(0xB0C2, 8));
+    EXPECT_EQ(taken, std::vector<Bytes>{test::packetOf(0xB0C2, 8)});
+    EXPECT_EQ(texts().back(), "line: the modem is back");
+}
+
+TEST_F(ModemSourceTest, LeaksNothingWhenItIsUnpluggedAHundredTimes) {
+    stream({0xB0C2});
+    for (int i = 0; i < 100; ++i) {
+        answer();
+        say(test::recordOf(0xB0C2, 1));
+        lines->line->listener.lineClosed("it hung up");
+        queue.advance(100ms);
+        ASSERT_EQ(lines->alive, 1);
+    }
+    EXPECT_EQ(taken.size(), 100U);
+}
+
+TEST_F(ModemSourceTest, SaysOnceThatAPortIsNoDiagnosticOneAndGoesOnTrying) {
+    stream({0xB0C2});
+    for (int i = 0; i < 3; ++i) {
+        lines->line->listener.lineOpened();
+        queue.advance(3500ms);
+    }
+    EXPECT_EQ(source->state(), "not a diagnostic port, or in use");
+    EXPECT_EQ(texts(), std::vector<std::string>{"the modem at line: not a diagnostic port, or in use; trying again"});
+    EXPECT_GE(lines->tries, 3);
+    EXPECT_FALSE(lines->lastAgain);
+}
+
+TEST_F(ModemSourceTest, SilencesTheModemWhenTheServiceEnds) {
+    stream({0xB0C2});
+    answer();
+    lines->line->sent.clear();
+    bool done = false;
+    source->end([&] { done = true; });
+    EXPECT_EQ(lines->line->sent.size(), 3U);
+    EXPECT_FALSE(done);
+    queue.advance(199ms);
+    EXPECT_FALSE(done);
+    queue.advance(1ms);
+    EXPECT_TRUE(done);
+    queue.advance(100s);
+    EXPECT_EQ(lines->tries, 1);
+}
+
+TEST_F(ModemSourceTest, EndsAtOnceWhenNoPortIsOpen) {
+    bool done = false;
+    source->end([&] { done = true; });
+    EXPECT_TRUE(done);
+}
+
+TEST_F(ModemSourceTest, EndsWhenTheModemGoesWhileItIsSilenced) {
+    stream({0xB0C2});
+    answer();
+    bool done = false;
+    source->end([&] { done = true; });
+    lines->line->listener.lineClosed("it hung up");
+    EXPECT_TRUE(done);
+    EXPECT_TRUE(log.lines().empty());
+}
+
+TEST_F(ModemSourceTest, FindsTheTechnologyOutBeforeAnybodyStreams) {
+    make({.technology = {}, .subscription = {}});
+    EXPECT_FALSE(source->technology());
+    source->findTechnology();
+    answer();
+    say(test::recordOf(0x5134));
+    queue.advance(500ms);
+    EXPECT_EQ(source->technology(), Technology::GSM);
+    EXPECT_TRUE(taken.empty() || taken.size() == 1);
+    queue.advance(10s);  // nobody came
+    EXPECT_EQ(lines->alive, 0);
+    EXPECT_FALSE(source->technology());
+}
+
+TEST_F(ModemSourceTest, KeepsTheTechnologyWhileTheModemIsGone) {
+    make({.technology = {}, .subscription = {}});
+    stream({0x5134});
+    answer();
+    say(test::recordOf(0x5134));
+    queue.advance(500ms);
+    lines->line->listener.lineClosed("it hung up");
+    EXPECT_EQ(source->technology(), Technology::GSM);
+}
+
+TEST_F(ModemSourceTest, RecordsRecordsWithTheModemsTimeOrElseTheMachines) {
+    const test::TemporaryDirectory directory;
+    const auto path = directory.path() / "recorded.pcap";
+    auto file = OutputFile::create(path);
+    ASSERT_TRUE(file);
+    source->recordTo(Recording(std::move(file).value()));
+    stream({0xB0C2});
+    answer();
+    Bytes set = test::recordOf(0xB0C2, 1);
+    const std::uint64_t timestamp = 72659535985485082U;  // 2023-12-06 04:04:26.2273
+    for (int i = 0; i < 8; ++i) set[8 + i] = static_cast<std::uint8_t>(timestamp >> 8 * i);
+    say(set);
+    Bytes unset = test::recordOf(0xB0C2, 2);
+    for (int i = 0; i < 8; ++i) unset[8 + i] = i == 0;
+    say(unset);
+    auto capture = CaptureReader::open(path);
+    ASSERT_TRUE(capture);
+    EXPECT_EQ(capture->technology(), Technology::LTE);
+    const auto first = *capture->next();
+    ASSERT_TRUE(first);
+    EXPECT_EQ(std::chrono::floor<std::chrono::microseconds>(first->time).time_since_epoch(), 1'701'835'466'227'324us);
+    EXPECT_EQ(Bytes(first->bytes.begin(), first->bytes.end()), taken[0]);
+    const auto second = *capture->next();
+    ASSERT_TRUE(second);
+    EXPECT_EQ(second->time.time_since_epoch(), 1'700'000'000s);
+    EXPECT_EQ(second->bytes[5], 1);  // the record's own timestamp stays
+}
+
+TEST_F(ModemSourceTest, RecordsFramesAsTheyCome) {
+    const test::TemporaryDirectory directory;
+    const auto path = directory.path() / "recorded.frames";
+    auto file = OutputFile::create(path);
+    ASSERT_TRUE(file);
+    source->recordFramesTo(std::move(file).value());
+    stream({0xB0C2});
+    lines->line->listener.lineOpened();
+    Bytes noise{0x33, 0x7D, 0x5E, 0x7E};
+    lines->line->listener.lineGave(noise);
+    Bytes more{0x44};
+    lines->line->listener.lineGave(more);
+    std::ifstream stream(path, std::ios::binary);
+    EXPECT_EQ(std::string(std::istreambuf_iterator<char>(stream), {}), "\x33\x7D\x5E\x7E\x44");
+}
+
+TEST_F(ModemSourceTest, TellsItsPortsStatus) {
+    stream({0xB0C2});
+    answer();
+    say(test::recordOf(0xB0C2, 1, 9));
+    Bytes damaged{0x01, 0x02, 0x03, 0x04, 0x7E};
+    lines->line->listener.lineGave(damaged);
+    const DictionaryRef port = source->portStatus();
+    EXPECT_EQ((*port)["Name"], Value("line"));
+    EXPECT_EQ((*port)["State"], Value("running"));
+    EXPECT_EQ((*port)["Target"], Value("TARGET9"));
+    EXPECT_EQ((*port)["BuildId"], Value("B-7"));
+    EXPECT_EQ((*port)["CampedOn"], Value("LTE"));
+    EXPECT_EQ((*port)["Losing"], Value(true));
+    EXPECT_EQ((*port)["Records"], Value(1));
+    EXPECT_EQ((*port)["Delivered"], Value(1));
+    EXPECT_EQ((*port)["BadChecksums"], Value(1));
+    EXPECT_EQ((*port)["Waiting"], Value(9));
+    EXPECT_EQ((*port)["Openings"], Value(1));
+}
+
+}  // namespace kelvo

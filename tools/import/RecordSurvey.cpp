@@ -1,0 +1,81 @@
+#include "tools/import/RecordSurvey.h"
+
+#include <algorithm>
+
+#include "LogGenerator/Factory.h"
+#include "LogGenerator/Framing.h"
+#include "platform/system/Environment.h"
+
+namespace kelvo {
+
+using adaptation::Adapted;
+
+RecordSurvey::RecordSurvey() {
+    Environment silent = Environment::current();
+    silent.log = nullptr;  // generators tell of themselves
+    const Environment::Scope scope(silent);
+    for (const TechnologyNames& names : kTechnologies) {
+        if (!hasCodes(names.technology)) continue;
+        const auto generator = generatorFromTechnology(names.identifier);
+        if (generator) _families[static_cast<std::size_t>(names.technology)].emplace(*generator->getStartCommand());
+    }
+}
+
+void RecordSurvey::add(const RecordedMessage& message, bool isTree) {
+    ++_records;
+    if (message.time && (!_first || *message.time < *_first)) _first = message.time;
+    if (message.subscription && !_subscription) _subscription = message.subscription;
+    if (isTree) {
+        ++_recordsOf[static_cast<std::size_t>(Technology::IFX)];
+        return;
+    }
+    const Adapted adapted = _adapter.adapt(stripPrefix(message.message));
+    _meter.count(adapted);
+    const Key key{adapted.kind, adapted.outcome,
+                  adapted.outcome == Adapted::Outcome::Refused ? adapted.refusal : adaptation::Refusal{}};
+    if (_latest == nullptr || _latest->first != key) {
+        const auto [row, isNew] = _rows.try_emplace(key);
+        _latest = &*row;
+        if (isNew) {
+            row->second = {.kind = adapted.kind, .outcome = adapted.outcome, .refusal = std::get<2>(key)};
+            if (adapted.outcome != Adapted::Outcome::Refused) {
+                row->second.technology = technologyOf(adapted.packet);
+                const LogCode code = logCode(adapted.packet.data());
+                const auto place = std::ranges::lower_bound(_shown, code);
+                if (place == _shown.end() || *place != code) _shown.insert(place, code);
+            }
+        }
+    }
+    Row& row = _latest->second;
+    ++row.records;
+    if (message.time && (!row.first || *message.time < *row.first)) row.first = message.time;
+    if (message.time && (!row.last || *message.time > *row.last)) row.last = message.time;
+    if (row.technology) ++_recordsOf[static_cast<std::size_t>(*row.technology)];
+}
+
+std::optional<Technology> RecordSurvey::technologyOf(ByteView packet) const {
+    std::optional<Technology> found;
+    for (const TechnologyNames& names : kTechnologies) {
+        const auto& codes = _families[static_cast<std::size_t>(names.technology)];
+        if (!codes || !codes->include(packet)) continue;
+        if (found) return std::nullopt;
+        found = names.technology;
+    }
+    return found;
+}
+
+std::vector<RecordSurvey::Row> RecordSurvey::rows() const {
+    std::vector<Row> rows;
+    for (const auto& [key, row] : _rows) rows.push_back(row);
+    return rows;
+}
+
+bool RecordSurvey::shows(LogCode code) const { return std::ranges::binary_search(_shown, code); }
+
+std::optional<Technology> RecordSurvey::technology() const {
+    const auto most = std::ranges::max_element(_recordsOf);
+    if (*most == 0) return std::nullopt;
+    return kTechnologies[static_cast<std::size_t>(most - _recordsOf.begin())].technology;
+}
+
+}  // namespace kelvo

@@ -19,11 +19,11 @@ public:
     struct Row {
         adaptation::RecordKind kind;
         adaptation::Adapted::Outcome outcome{};
-        adaptation::Refusal refusal{};         ///< of refused ones
-        std::optional<Technology> technology;  ///< whose screens show it; none when several do, or none
+        adaptation::Refusal refusal{};           ///< of refused ones
+        std::optional<Technology> technology{};  ///< whose screens show it; none when several do, or none
         std::uint64_t records = 0;
-        std::optional<wire::SystemTime> first;
-        std::optional<wire::SystemTime> last;
+        std::optional<wire::SystemTime> first{};
+        std::optional<wire::SystemTime> last{};
     };
 
     RecordSurvey();

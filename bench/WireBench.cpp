@@ -83,9 +83,9 @@ BENCHMARK(BM_FramesAndChecksums)->Unit(benchmark::kMillisecond);
 /// Takes every record.
 struct Taker final : wire::Session::Owner {
     void sendToModem(ByteView) override {}
-    bool takeRecord(ByteView packet, std::uint64_t) override {
+    wire::Session::Taken takeRecord(ByteView packet, std::uint64_t) override {
         benchmark::DoNotOptimize(packet.data());
-        return true;
+        return wire::Session::Taken::Delivered;
     }
 };
 

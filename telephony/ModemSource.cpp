@@ -5,6 +5,7 @@
 
 #include "platform/system/Environment.h"
 #include "telephony/PortStatus.h"
+#include "telephony/adaptation/StandIns.h"
 #include "telephony/wire/Timestamp.h"
 
 namespace kelvo {
@@ -16,6 +17,16 @@ using std::chrono::nanoseconds;
 constexpr nanoseconds kGrace = 6s;  // longer than a client waits before it tries again
 constexpr nanoseconds kFirstPause = 100ms;
 constexpr nanoseconds kLongestPause = 1s;
+
+/// What newer modems send in place of `codes`.
+RecordFilter::Codes insteadOf(const RecordFilter::Codes& codes) {
+    RecordFilter::Codes instead;
+    for (const LogCode code : adaptation::codesWithStandIns()) {
+        if (!codes.test(code)) continue;
+        for (const LogCode standIn : adaptation::standInsFor(code)) instead.set(standIn);
+    }
+    return instead;
+}
 
 }  // namespace
 
@@ -34,7 +45,7 @@ void ModemSource::findTechnology() {
 
 void ModemSource::clientsWant(const ClientsWishes& wishes) {
     const bool streamed = std::exchange(_streaming, wishes.streaming);
-    _session.want(wishes.ordinary);
+    _session.want(wishes.ordinary, insteadOf(wishes.ordinary));
     if (_streaming) {
         openLine();
     } else if (streamed) {
@@ -51,14 +62,22 @@ void ModemSource::end(std::function<void()> done) {
     settle();
 }
 
-DictionaryRef ModemSource::portStatus() const { return kelvo::portStatus(_session, _line ? _line->name() : ""); }
+DictionaryRef ModemSource::portStatus() const {
+    return kelvo::portStatus(_session, _meter, _line ? _line->name() : "");
+}
 
 void ModemSource::sendToModem(ByteView bytes) { _line->send(bytes); }
 
-bool ModemSource::takeRecord(ByteView packet, std::uint64_t timestamp) {
-    if (_sink == nullptr) return false;
+ModemSource::Taken ModemSource::takeRecord(ByteView packet, std::uint64_t timestamp) {
+    if (_sink == nullptr) return Taken::ForNobody;
+    const adaptation::Adapted adapted = _adapter.adapt(packet);
+    const bool refused = adapted.outcome == adaptation::Adapted::Outcome::Refused;
+    if (refused && adapted.refusal == adaptation::Refusal::NotOurs) return Taken::ForNobody;
     const auto time = wire::timeOf(timestamp);
-    return hand(*_sink, {time ? *time : CaptureTime(clock().now().time_since_epoch()), packet});
+    const CapturePacket taken{time ? *time : CaptureTime(clock().now().time_since_epoch()), adapted.packet};
+    if (!refused && !hand(*_sink, taken)) return Taken::ForNobody;
+    if (const auto first = _meter.count(adapted)) logLine(Level::Warning, "%s: %s", description(), *first);
+    return refused ? Taken::Refused : Taken::Delivered;
 }
 
 void ModemSource::lineOpened() {

@@ -7,6 +7,8 @@
 #include "platform/system/OutputFile.h"
 #include "platform/system/SteadyTime.h"
 #include "telephony/RecordSource.h"
+#include "telephony/adaptation/AdaptationMeter.h"
+#include "telephony/adaptation/RecordAdapter.h"
 #include "telephony/line/ModemLines.h"
 #include "telephony/wire/Session.h"
 
@@ -14,7 +16,8 @@ namespace kelvo {
 
 /// A modem behind its diagnostic port. The port is open while some client streams, or waits to learn the technology,
 /// and a few seconds longer: a modem that nobody watches does no work. One that goes is waited for, and asked anew when
-/// it is back; clients notice nothing but the pause.
+/// it is back; clients notice nothing but the pause. Records of newer layouts are turned into the fixed ones before
+/// anybody gets them, and those that cannot be turned are refused and counted.
 class ModemSource final : public RecordSource, private wire::Session::Owner, private ModemLine::Listener {
 public:
     /// `queue` outlives the source.
@@ -35,9 +38,10 @@ public:
 private:
     using nanoseconds = std::chrono::nanoseconds;
     using State = wire::Session::State;
+    using Taken = wire::Session::Taken;
 
     void sendToModem(ByteView bytes) override;
-    bool takeRecord(ByteView packet, std::uint64_t timestamp) override;
+    Taken takeRecord(ByteView packet, std::uint64_t timestamp) override;
     void lineOpened() override;
     void lineGave(std::span<std::uint8_t> bytes) override;
     void lineClosed(const std::string& reason) override;
@@ -59,6 +63,8 @@ private:
     MainQueue& _queue;
     const SteadyTime _now;
     wire::Session _session;
+    adaptation::RecordAdapter _adapter;
+    adaptation::AdaptationMeter _meter;
     RecordSink* _sink = nullptr;
     std::unique_ptr<ModemLine> _line;  // none: released, or waiting for the port
     bool _talking = false;             // the line is open, and a session is held on it

@@ -22,7 +22,8 @@ std::string_view wordFor(wire::Session::State state) {
 
 }  // namespace
 
-DictionaryRef portStatus(const wire::Session& session, const std::string& line) {
+DictionaryRef portStatus(const wire::Session& session, const adaptation::AdaptationMeter& meter,
+                         const std::string& line) {
     auto port = Dictionary::make({{"Name", line},
                                   {"State", wordFor(session.state())},
                                   {"Target", session.target()},
@@ -33,6 +34,11 @@ DictionaryRef portStatus(const wire::Session& session, const std::string& line) 
     if (const auto subscription = session.subscription()) port->set("Subscription", std::int64_t{*subscription});
     for (const PortCounter& counter : kPortCounters)
         port->set(counter.key, static_cast<std::int64_t>(counter.of(session.counts())));
+    port->set("Passed", static_cast<std::int64_t>(meter.passed()));
+    port->set("Adapted", static_cast<std::int64_t>(meter.turned()));
+    const ArrayRef layouts = Array::make();
+    for (const std::string& text : meter.lines()) layouts->append(text);
+    port->set("Layouts", layouts);
     return port;
 }
 
@@ -52,6 +58,12 @@ std::string portStatusText(const Dictionary& port) {
     for (const PortCounter& counter : kPortCounters) {
         const Number* count = port[counter.key].number();
         if (count != nullptr) text += fmt::format("  {:<26}{}\n", counter.label, count->integer());
+    }
+    const ArrayRef& layouts = port["Layouts"].array();
+    if (!layouts || layouts->empty()) return text;
+    text += "\nLayouts\n";
+    for (const Value& line : *layouts) {
+        if (line.string() != nullptr) text += "  " + *line.string() + "\n";
     }
     return text;
 }

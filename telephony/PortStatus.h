@@ -5,6 +5,7 @@
 #include <string_view>
 
 #include "platform/values/Dictionary.h"
+#include "telephony/adaptation/AdaptationMeter.h"
 #include "telephony/wire/Session.h"
 
 namespace kelvo {
@@ -22,6 +23,7 @@ inline constexpr std::array kPortCounters = {
     PortCounter{"Frames",             "Frames",                   [](const wire::PortCounts& c) { return c.frames.frames; }},
     PortCounter{"Records",            "Records",                  [](const wire::PortCounts& c) { return c.records; }},
     PortCounter{"Delivered",          "  delivered",              [](const wire::PortCounts& c) { return c.delivered; }},
+    PortCounter{"Refused",            "  refused",              [](const wire::PortCounts& c) { return c.refused; }},
     PortCounter{"ForNobody",          "  for nobody",             [](const wire::PortCounts& c) { return c.forNobody; }},
     PortCounter{"ListenedTo",         "  for the service",        [](const wire::PortCounts& c) { return c.listenedTo; }},
     PortCounter{"OtherSubscriptions", "  of another SIM",         [](const wire::PortCounts& c) { return c.otherSubscriptions; }},
@@ -41,8 +43,10 @@ inline constexpr std::array kPortCounters = {
 };
 // clang-format on
 
-/// What is said and counted on a modem's port; `line` is where it is open, empty while it is not.
-DictionaryRef portStatus(const wire::Session& session, const std::string& line);
+/// What is said and counted on a modem's port, and what became of its records; `line` is where it is open, empty while
+/// it is not.
+DictionaryRef portStatus(const wire::Session& session, const adaptation::AdaptationMeter& meter,
+                         const std::string& line);
 
 /// The same for people, with a newline at the end of each line.
 std::string portStatusText(const Dictionary& port);

@@ -35,6 +35,15 @@ constexpr std::array<StandIns, 13> kStandIns = {{
 
 }  // namespace
 
+std::span<const LogCode> codesWithStandIns() {
+    static constexpr auto kCodes = [] {
+        std::array<LogCode, kStandIns.size()> codes{};
+        std::ranges::transform(kStandIns, codes.begin(), &StandIns::code);
+        return codes;
+    }();
+    return kCodes;
+}
+
 std::span<const LogCode> standInsFor(LogCode code) {
     const auto found = std::ranges::find(kStandIns, code, &StandIns::code);
     if (found == kStandIns.end()) return {};

@@ -6,6 +6,9 @@
 
 namespace kelvo::adaptation {
 
+/// The codes of fixed layouts that newer modems send others for.
+std::span<const LogCode> codesWithStandIns();
+
 /// The codes that newer modems send instead of `code`, a code of a fixed layout: who asks for it asks for these too.
 std::span<const LogCode> standInsFor(LogCode code);
 

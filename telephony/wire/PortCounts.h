@@ -12,6 +12,7 @@ struct PortCounts {
     std::uint64_t records = 0;             ///< well-formed ones, of whatever subscription
     std::uint64_t delivered = 0;           ///< records that a client took
     std::uint64_t forNobody = 0;           ///< records that no client had asked for
+    std::uint64_t refused = 0;             ///< records in a layout that nobody knows
     std::uint64_t listenedTo = 0;          ///< records asked for to learn the technology alone, for no client either
     std::uint64_t otherSubscriptions = 0;  ///< records of a SIM that is not the chosen one
     std::uint64_t lyingLengths = 0;        ///< records whose lengths do not agree

@@ -95,9 +95,10 @@ std::optional<std::chrono::nanoseconds> Session::deadline() const {
     return earliest;
 }
 
-void Session::want(const RecordCodes& codes) {
+void Session::want(const RecordCodes& codes, const RecordCodes& instead) {
     _wanted = codes;
-    _masks.want(_options.technology ? codes : codes | CampedTechnology::codes());
+    const RecordCodes asked = codes | instead;
+    _masks.want(_options.technology ? asked : asked | CampedTechnology::codes());
     if (_state != State::Running) return;
     tellUnknownCodes();
     askNext();
@@ -207,13 +208,12 @@ void Session::handleRecord(MutableBytes body, std::int32_t subscription) {
     }
     if (!_options.technology) _camped.heard(frame->code, _lastHeard);
     const LogCode code = frame->code;
-    if (_owner.takeRecord(packetOf(body), frame->timestamp)) {
-        ++_counts.delivered;
-    } else if (!_wanted.test(code) && _masks.wants(code)) {
-        ++_counts.listenedTo;
-    } else {
-        ++_counts.forNobody;
+    switch (_owner.takeRecord(packetOf(body), frame->timestamp)) {
+        case Taken::Delivered: ++_counts.delivered; return;
+        case Taken::Refused: ++_counts.refused; return;
+        case Taken::ForNobody: break;
     }
+    ++(!_wanted.test(code) && _masks.wants(code) ? _counts.listenedTo : _counts.forNobody);
 }
 
 void Session::handleEncrypted() {

@@ -20,14 +20,21 @@ class Session {
 public:
     using nanoseconds = std::chrono::nanoseconds;
 
+    /// What becomes of a record.
+    enum class Taken {
+        Delivered,
+        ForNobody,  ///< no client wants it
+        Refused,    ///< clients want it, but not in a layout that nobody knows
+    };
+
     /// Whose session it is. Must not call back into the session.
     class Owner {
     public:
         virtual ~Owner() = default;
         /// Bytes for the modem.
         virtual void sendToModem(ByteView bytes) = 0;
-        /// A record, as clients get it, with the modem's own timestamp; false when no client wants it.
-        virtual bool takeRecord(ByteView packet, std::uint64_t timestamp) = 0;
+        /// A record as the modem worded it, with its own timestamp.
+        virtual Taken takeRecord(ByteView packet, std::uint64_t timestamp) = 0;
     };
 
     struct Options {
@@ -55,8 +62,9 @@ public:
     /// Time has passed: to be called at the deadline.
     void tick();
     std::optional<nanoseconds> deadline() const;
-    /// Which records are wanted from now on, whether or not a port is open.
-    void want(const RecordCodes& codes);
+    /// Which records are wanted from now on, whether or not a port is open; a modem may send `instead` in their place,
+    /// and nothing is said of one that cannot.
+    void want(const RecordCodes& codes, const RecordCodes& instead = {});
     /// Silences the modem; the state is Closed when it is quiet, after two seconds at most.
     void end();
     /// The port has gone: Closed at once.

@@ -15,10 +15,10 @@ using namespace std::chrono_literals;
 
 struct Owner final : wire::Session::Owner {
     void sendToModem(ByteView bytes) override { fuzz::require(bytes.back() == 0x7E, "half a frame was sent"); }
-    bool takeRecord(ByteView packet, std::uint64_t) override {
+    wire::Session::Taken takeRecord(ByteView packet, std::uint64_t) override {
         fuzz::require(packet.size() >= 13 && packet[0] == 1, "a record that is no packet");
         fuzz::require(wire::u16At(packet, 1) + 1U == packet.size(), "a record whose length lies");
-        return true;
+        return wire::Session::Taken::Delivered;
     }
 };
 

@@ -75,6 +75,16 @@ for name, last in {"records": [record, b"\x98\1\0\0\1\0\0\0" + record], "encrypt
                    "refused": [b"\x14" + mask[:8] + mask[12:]], "texts": [b"\x79\0\0\4"]}.items():
     write("session", name, b"".join(struct.pack("<H", len(body)) + body for body in dialogue + last))
 
+# Newer layouts: the master information block of version 2, and part 25 of the serving cell in every mode.
+newer = [(0xB0C1, bytes([2, 73, 0, 0x21, 7, 0, 0, 0xFC, 3, 2, 50])), (0xB0C2, bytes([3]) + bytes(28)),
+         (0xB179, bytes([4]) + bytes(23) + bytes([1, 1, 0, 0]) + bytes(28)), (0xB17F, bytes([5]) + bytes(35)),
+         (0xB180, bytes([5]) + bytes(7) + struct.pack("<I", 1 << 6) + bytes([1]) + bytes(27)),
+         (0xB193, struct.pack("<BBHBBH", 1, 1, 0, 25, 18, 96) + bytes(92)),
+         (0x51FC, bytes(25) + bytes([1]) + bytes(25)), (0x4005, bytes([0x81, 1]) + bytes(5 + 16 + 13)),
+         (0x7150, bytes([0x64, 0xF0, 0, 1, 0x64, 0xF0, 0x70]) + bytes(12)), (0x5B2C, bytes(5))]
+sent = [struct.pack("<BHHQ", 1, 12 + len(body), code, 72659535985485082) + body for code, body in newer]
+write("recordadapter", "newer", b"".join(struct.pack("<H", len(packet)) + packet for packet in sent))
+
 for path in sorted(CAPTURES.glob("*.pcap")):
     raw = path.read_bytes()
     link, messages = packets(raw)
@@ -82,6 +92,10 @@ for path in sorted(CAPTURES.glob("*.pcap")):
     write("capture", path.name, raw)
     write("framing", path.stem, b"".join(messages))
     if link != 147:
+        bare = [message[2:] if message[0] == 0x81 else message for message in messages if len(message) > 15]
+        write("recordadapter", path.stem, b"".join(struct.pack("<H", len(message)) + message for message in bare))
+        write("recordings", f"{path.stem}.dlf", b"".join(message[1:] for message in bare[:40]))
+        write("recordings", f"{path.stem}.frames", b"".join(record_frame(message) for message in messages[:40] if len(message) > 15))
         write("framereader", path.stem, b"".join(record_frame(message) for message in messages[:20] if len(message) > 15))
     for i, message in enumerate(messages[:4]):
         # as one datagram of a port: magic, kind, flags, reserved, id, sequence, length

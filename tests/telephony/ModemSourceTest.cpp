@@ -86,15 +86,16 @@ protected:
         answerRequests();
     }
     void answerRequests() {
+        while (!lines->line->sent.empty()) answerOne();
+    }
+    void answerOne() {
         FakeLine& line = *lines->line;
-        while (!line.sent.empty()) {
-            const Bytes asked = plainBody(line.sent.back());
-            line.sent.clear();
-            if (asked[0] == 0x00) say(test::kVersionAnswer);
-            if (asked[0] == 0x7C) say(test::kBuildIdAnswer);
-            if (asked[0] == 0x73 && asked[4] == 1) say(test::rangesAnswer());
-            if (asked[0] == 0x73 && asked[4] == 3) say(maskAnswer(asked));
-        }
+        const Bytes asked = plainBody(line.sent.back());
+        line.sent.clear();
+        if (asked[0] == 0x00) say(test::kVersionAnswer);
+        if (asked[0] == 0x7C) say(test::kBuildIdAnswer);
+        if (asked[0] == 0x73 && asked[4] == 1) say(test::rangesAnswer());
+        if (asked[0] == 0x73 && asked[4] == 3) say(maskAnswer(asked));
     }
     static Bytes maskAnswer(const Bytes& asked) {
         return joined({Bytes(asked.begin(), asked.begin() + 8), Bytes(4), Bytes(asked.begin() + 8, asked.end())});
@@ -120,19 +121,19 @@ TEST_F(ModemSourceTest, OpensThePortForTheFirstClientOnly) {
     queue.advance(100s);
     EXPECT_EQ(lines->tries, 0);
     EXPECT_EQ(source->description(), "the modem at line");
-    stream({0xB0C2});
+    stream({0x51F4});
     EXPECT_EQ(lines->tries, 1);
     EXPECT_TRUE(lines->line->opened);
     EXPECT_TRUE(lines->line->sent.empty());
     answer();
-    stream({0xB0C2, 0xB0C1});
+    stream({0x51F4, 0x51FF});
     EXPECT_EQ(lines->tries, 1);
-    say(test::recordOf(0xB0C2, 7));
-    EXPECT_EQ(taken, std::vector<Bytes>{test::packetOf(0xB0C2, 7)});
+    say(test::recordOf(0x51F4, 7));
+    EXPECT_EQ(taken, std::vector<Bytes>{test::packetOf(0x51F4, 7)});
 }
 
 TEST_F(ModemSourceTest, ReleasesThePortSixSecondsAfterTheLastClientHasLeft) {
-    stream({0xB0C2});
+    stream({0x51F4});
     answer();
     leave();
     answerRequests();  // to the mask without any code
@@ -146,17 +147,17 @@ TEST_F(ModemSourceTest, ReleasesThePortSixSecondsAfterTheLastClientHasLeft) {
     EXPECT_EQ(lines->alive, 0);
     queue.advance(100s);
     EXPECT_EQ(lines->tries, 1);
-    stream({0xB0C2});
+    stream({0x51F4});
     EXPECT_EQ(lines->tries, 2);
 }
 
 TEST_F(ModemSourceTest, KeepsThePortForAClientThatComesBackInTime) {
-    stream({0xB0C2});
+    stream({0x51F4});
     answer();
     leave();
     answerRequests();
     queue.advance(5s);
-    stream({0xB0C2});
+    stream({0x51F4});
     answerRequests();
     queue.advance(100s);
     EXPECT_EQ(lines->alive, 1);
@@ -165,7 +166,7 @@ TEST_F(ModemSourceTest, KeepsThePortForAClientThatComesBackInTime) {
 
 TEST_F(ModemSourceTest, TriesAgainAfterTenthOfASecondDoublingToOne) {
     lines->isThere = false;
-    stream({0xB0C2});
+    stream({0x51F4});
     EXPECT_EQ(lines->tries, 1);
     EXPECT_EQ(source->state(), "it cannot be opened: No such file or directory");
     for (const auto pause : {100ms, 200ms, 400ms, 800ms, 1000ms, 1000ms}) {
@@ -187,7 +188,7 @@ TEST_F(ModemSourceTest, TriesAgainAfterTenthOfASecondDoublingToOne) {
 
 TEST_F(ModemSourceTest, TriesAtOnceWhenThePortMayHaveCome) {
     lines->isThere = false;
-    stream({0xB0C2});
+    stream({0x51F4});
     queue.advance(5s);
     lines->isThere = true;
     ASSERT_TRUE(lines->watching);
@@ -202,7 +203,7 @@ TEST_F(ModemSourceTest, TriesAtOnceWhenThePortMayHaveCome) {
 }
 
 TEST_F(ModemSourceTest, GoesOnByItselfWhenAModemThatHasGoneIsBack) {
-    stream({0xB0C2});
+    stream({0x51F4});
     answer();
     lines->isThere = false;
     lines->line->listener.lineClosed("it hung up");
@@ -215,16 +216,16 @@ TEST_F(ModemSourceTest, GoesOnByItselfWhenAModemThatHasGoneIsBack) {
     queue.advance(1s);
     answer();
     EXPECT_EQ(source->state(), "");
-    say(test::recordOf(0xB0C2, 8));
-    EXPECT_EQ(taken, std::vector<Bytes>{test::packetOf(0xB0C2, 8)});
+    say(test::recordOf(0x51F4, 8));
+    EXPECT_EQ(taken, std::vector<Bytes>{test::packetOf(0x51F4, 8)});
     EXPECT_EQ(texts().back(), "line: the modem is back");
 }
 
 TEST_F(ModemSourceTest, LeaksNothingWhenItIsUnpluggedAHundredTimes) {
-    stream({0xB0C2});
+    stream({0x51F4});
     for (int i = 0; i < 100; ++i) {
         answer();
-        say(test::recordOf(0xB0C2, 1));
+        say(test::recordOf(0x51F4, 1));
         lines->line->listener.lineClosed("it hung up");
         queue.advance(100ms);
         ASSERT_EQ(lines->alive, 1);
@@ -233,7 +234,7 @@ TEST_F(ModemSourceTest, LeaksNothingWhenItIsUnpluggedAHundredTimes) {
 }
 
 TEST_F(ModemSourceTest, SaysOnceThatAPortIsNoDiagnosticOneAndGoesOnTrying) {
-    stream({0xB0C2});
+    stream({0x51F4});
     for (int i = 0; i < 3; ++i) {
         lines->line->listener.lineOpened();
         queue.advance(3500ms);
@@ -245,7 +246,7 @@ TEST_F(ModemSourceTest, SaysOnceThatAPortIsNoDiagnosticOneAndGoesOnTrying) {
 }
 
 TEST_F(ModemSourceTest, SilencesTheModemWhenTheServiceEnds) {
-    stream({0xB0C2});
+    stream({0x51F4});
     answer();
     lines->line->sent.clear();
     bool done = false;
@@ -267,7 +268,7 @@ TEST_F(ModemSourceTest, EndsAtOnceWhenNoPortIsOpen) {
 }
 
 TEST_F(ModemSourceTest, EndsWhenTheModemGoesWhileItIsSilenced) {
-    stream({0xB0C2});
+    stream({0x51F4});
     answer();
     bool done = false;
     source->end([&] { done = true; });
@@ -306,13 +307,13 @@ TEST_F(ModemSourceTest, RecordsRecordsWithTheModemsTimeOrElseTheMachines) {
     auto file = OutputFile::create(path);
     ASSERT_TRUE(file);
     source->recordTo(Recording(std::move(file).value()));
-    stream({0xB0C2});
+    stream({0x51F4});
     answer();
-    Bytes set = test::recordOf(0xB0C2, 1);
+    Bytes set = test::recordOf(0x51F4, 1);
     const std::uint64_t timestamp = 72659535985485082U;  // 2023-12-06 04:04:26.2273
     for (int i = 0; i < 8; ++i) set[8 + i] = static_cast<std::uint8_t>(timestamp >> 8 * i);
     say(set);
-    Bytes unset = test::recordOf(0xB0C2, 2);
+    Bytes unset = test::recordOf(0x51F4, 2);
     for (int i = 0; i < 8; ++i) unset[8 + i] = i == 0;
     say(unset);
     auto capture = CaptureReader::open(path);
@@ -334,7 +335,7 @@ TEST_F(ModemSourceTest, RecordsFramesAsTheyCome) {
     auto file = OutputFile::create(path);
     ASSERT_TRUE(file);
     source->recordFramesTo(std::move(file).value());
-    stream({0xB0C2});
+    stream({0x51F4});
     lines->line->listener.lineOpened();
     Bytes noise{0x33, 0x7D, 0x5E, 0x7E};
     lines->line->listener.lineGave(noise);
@@ -344,10 +345,47 @@ TEST_F(ModemSourceTest, RecordsFramesAsTheyCome) {
     EXPECT_EQ(std::string(std::istreambuf_iterator<char>(stream), {}), "\x33\x7D\x5E\x7E\x44");
 }
 
-TEST_F(ModemSourceTest, TellsItsPortsStatus) {
-    stream({0xB0C2});
+TEST_F(ModemSourceTest, TurnsNewerLayoutsBeforeAnybodyGetsThem) {
+    stream({0xB0C1});
     answer();
-    say(test::recordOf(0xB0C2, 1, 9));
+    // The master information block of version 2: PCI 73, EARFCN 1825, frame 1020, two antennas, 50 resource blocks.
+    const Bytes payload{2, 73, 0, 0x21, 0x07, 0, 0, 0xFC, 0x03, 2, 50};
+    say(joined({{0x10, 0, 23, 0, 23, 0, 0xC1, 0xB0}, Bytes(8), payload}));
+    const Bytes fixed{1, 73, 0, 0x21, 0x07, 0xFC, 0x03, 2, 50};
+    EXPECT_EQ(taken, std::vector<Bytes>{joined({{1, 21, 0, 0xC1, 0xB0}, Bytes(8), fixed})});
+    EXPECT_EQ((*source->portStatus())["Adapted"], Value(1));
+}
+
+TEST_F(ModemSourceTest, RefusesLayoutsThatItDoesNotKnowAndNamesThemOnce) {
+    stream({0xB0C1});
+    answer();
+    say(test::recordOf(0xB0C1, 9));  // two bytes of version 9
+    say(test::recordOf(0xB0C1, 9));
+    EXPECT_TRUE(taken.empty());
+    EXPECT_EQ(std::ranges::count(texts(), "the modem at line: 0xB0C1 version 9, 2 bytes: not known"), 1);
+    EXPECT_EQ((*source->portStatus())["Refused"], Value(2));
+    EXPECT_EQ((*source->portStatus())["Delivered"], Value(0));
+}
+
+TEST_F(ModemSourceTest, AsksForWhatNewerModemsSendInstead) {
+    stream({0xB17F});
+    lines->line->listener.lineOpened();
+    queue.advance(200ms);
+    Bytes mask;  // of equipment 0xB, with the codes
+    for (int i = 0; i < 100 && !lines->line->sent.empty(); ++i) {
+        const Bytes asked = plainBody(lines->line->sent.back());
+        if (asked[0] == 0x73 && asked[4] == 3 && asked[8] == 0xB) mask.assign(asked.begin() + 16, asked.end());
+        answerOne();
+    }
+    ASSERT_GT(mask.size(), 0x193U / 8);
+    EXPECT_NE(mask[0x17F / 8] & 1 << (0x17F % 8), 0);
+    EXPECT_NE(mask[0x193 / 8] & 1 << (0x193 % 8), 0);
+}
+
+TEST_F(ModemSourceTest, TellsItsPortsStatus) {
+    stream({0x51F4});
+    answer();
+    say(test::recordOf(0x51F4, 1, 9));
     Bytes damaged{0x01, 0x02, 0x03, 0x04, 0x7E};
     lines->line->listener.lineGave(damaged);
     const DictionaryRef port = source->portStatus();

@@ -90,11 +90,11 @@ protected:
             *this, [this] { return now; }, options);
     }
     void sendToModem(ByteView bytes) override { sent.emplace_back(bytes.begin(), bytes.end()); }
-    bool takeRecord(ByteView packet, std::uint64_t timestamp) override {
-        if (!hasClient) return false;
+    wire::Session::Taken takeRecord(ByteView packet, std::uint64_t timestamp) override {
+        if (!hasClient) return wire::Session::Taken::ForNobody;
         taken.emplace_back(packet.begin(), packet.end());
         timestamps.push_back(timestamp);
-        return true;
+        return wire::Session::Taken::Delivered;
     }
 
     void sayRaw(Bytes bytes) { session->receive(bytes); }

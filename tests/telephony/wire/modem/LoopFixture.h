@@ -70,9 +70,9 @@ protected:
     }
 
     void sendToModem(ByteView bytes) override { _modem->receive(bytes, _now); }
-    bool takeRecord(ByteView packet, std::uint64_t) override {
+    wire::Session::Taken takeRecord(ByteView packet, std::uint64_t) override {
         taken.emplace_back(packet.begin(), packet.end());
-        return true;
+        return wire::Session::Taken::Delivered;
     }
 
     /// The modem's packets of a drive, straight from the simulation.

@@ -179,7 +179,7 @@ TEST_F(ImportCommand, ReplacesNoFileAndNeverTheOneItReads) {
     const std::string before = contentsOf(in);
     EXPECT_EQ(kelvoctl({"import", in, "-o", in, "--force"}).status, 1);
     EXPECT_EQ(contentsOf(in), before);
-    directory.write("out.pcap", {1, 2, 3});
+    directory.write("out.pcap", Bytes{1, 2, 3});
     EXPECT_EQ(kelvoctl({"import", in, "-o", out()}).status, 1);
     EXPECT_EQ(contentsOf(out()), "\x01\x02\x03");
     EXPECT_EQ(kelvoctl({"import", in, "-o", out(), "--force"}).status, 0);

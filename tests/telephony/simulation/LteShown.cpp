@@ -76,7 +76,7 @@ void LteShown::connectedMeasurement() {
 void LteShown::servingMeasurement() {
     EXPECT_FALSE(_modem.isConnected());
     const Cell& cell = _modem.serving();
-    const Reading& reading = _modem.reading();
+    const auto& reading = _modem.reading();
     const IdleState& idle = _modem.idle();
     const auto thresholdText = [](const std::optional<int>& dB, const char* unit) {
         return dB ? std::to_string(*dB) + unit : "Not Present";

@@ -258,7 +258,7 @@ TEST(LteSimulation, ReadsQualityAsLevelOverEverythingHeard) {
     lte::Simulation modem(7);
     int readings = 0;
     for (auto message = modem.next(); message.time < 2min; message = modem.next()) {
-        const Reading& reading = modem.modem().reading();
+        const auto& reading = modem.modem().reading();
         const bool isAtTheEnd = reading.rsrq <= -19.5 || reading.rsrq >= -3 || reading.rsrp >= -44;
         if (!modem.modem().hasMeasured() || isAtTheEnd) continue;
         const double blocks = modem.modem().serving().carrier.downlink == 1300 ? 100 : 50;

@@ -66,7 +66,7 @@ void UtranShown::servingCell() {
 void UtranShown::cells() {
     ASSERT_EQ(_played.rows("Neighbor Cell List"), _modem.measurements().size());
     for (std::size_t i = 0; i < _modem.measurements().size(); ++i) {
-        const Measurement& measured = _modem.measurements()[i];
+        const auto& measured = _modem.measurements()[i];
         const Cell& cell = _modem.cells()[measured.cell];
         _section = "Neighbor Cell List/" + std::to_string(i);
         equals("UARFCN", cell.uarfcn);
@@ -75,9 +75,9 @@ void UtranShown::cells() {
         EXPECT_NEAR(level, std::round(level), 0.001);
         EXPECT_TRUE(isInStep(measured.rscp, std::round(level), -115, 1, 91)) << measured.rscp << " as " << level;
         switch (measured.set) {
-            case Measurement::Set::Active: equals("Status", "ASET"); break;
-            case Measurement::Set::Monitored: equals("Status", "MSET"); break;
-            case Measurement::Set::Detected: equals("Status", "DSET"); break;
+            case utran::Measurement::Set::Active: equals("Status", "ASET"); break;
+            case utran::Measurement::Set::Monitored: equals("Status", "MSET"); break;
+            case utran::Measurement::Set::Detected: equals("Status", "DSET"); break;
         }
         equals("inJDCS", measured.isJointlyDetected ? "TRUE" : "FALSE");
     }

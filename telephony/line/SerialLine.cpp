@@ -57,9 +57,10 @@ void SerialLine::read() {
         _listener.lineGave(std::span(_buffer).first(static_cast<std::size_t>(size)));
     }
     if (_muted) return;
-    // The queue's other work has its turn.
+    // The queue's other work has its turn; the line may go meanwhile, before its port does.
     QMetaObject::invokeMethod(
-        _port, [this] { HostEventLoop::call([this] { read(); }); }, Qt::QueuedConnection);
+        _port, [again = _lifetime.whileAlive([this] { read(); })] { HostEventLoop::call(again); },
+        Qt::QueuedConnection);
 }
 
 void SerialLine::close(const std::string& reason) {

@@ -3,6 +3,7 @@
 #include <QSerialPort>
 #include <array>
 
+#include "platform/system/Lifetime.h"
 #include "telephony/line/ModemLine.h"
 
 namespace kelvo {
@@ -32,6 +33,7 @@ private:
     QSerialPort* const _port;  // outlives this object by the rest of its own signal
     bool _muted = false;
     std::array<std::uint8_t, 65'536> _buffer;
+    const Lifetime _lifetime;
 };
 
 }  // namespace kelvo

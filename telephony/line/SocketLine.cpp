@@ -38,7 +38,8 @@ SocketLine::SocketLine(Socket* socket, std::string name, Listener& listener)
     auto* const limit = new QTimer(socket);
     limit->setSingleShot(true);
     const auto heard = [](auto call) { HostEventLoop::call(call); };
-    QObject::connect(limit, &QTimer::timeout, socket, [=, this] { heard([this] { close("no answer"); }); });
+    QObject::connect(limit, &QTimer::timeout, socket,
+                     [heard, late = _lifetime.whileAlive([this] { close("no answer"); })] { heard(late); });
     QObject::connect(socket, &Socket::connected, socket, [=, this] {
         limit->stop();
         heard([this] { _listener.lineOpened(); });
@@ -71,10 +72,11 @@ void SocketLine::read() {
         if (size <= 0) return;
         _listener.lineGave(std::span(_buffer).first(static_cast<std::size_t>(size)));
     }
-    if (_muted) return;
-    // The queue's other work has its turn.
+    if (_muted || !_socket->isOpen()) return;
+    // The queue's other work has its turn; the line may go meanwhile, before its socket does.
     QMetaObject::invokeMethod(
-        _socket, [this] { HostEventLoop::call([this] { read(); }); }, Qt::QueuedConnection);
+        _socket, [again = _lifetime.whileAlive([this] { read(); })] { HostEventLoop::call(again); },
+        Qt::QueuedConnection);
 }
 
 void SocketLine::close(const std::string& reason) {

@@ -5,6 +5,7 @@
 #include <cstdint>
 #include <functional>
 
+#include "platform/system/Lifetime.h"
 #include "telephony/line/ModemLine.h"
 
 namespace kelvo {
@@ -34,6 +35,7 @@ private:
     std::function<void()> _connect;
     bool _muted = false;
     std::array<std::uint8_t, 65'536> _buffer;
+    const Lifetime _lifetime;
 };
 
 }  // namespace kelvo

@@ -6,9 +6,9 @@
 #include <latch>
 #include <thread>
 
-#include "LogGenerator/ShowFields.h"
 #include "LogGenerator/LTE/MeasuredNeighborCells.h"
 #include "LogGenerator/RowWriter.h"
+#include "LogGenerator/ShowFields.h"
 #include "tests/support/Fed.h"
 
 namespace kelvo {

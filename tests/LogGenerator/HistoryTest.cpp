@@ -1,7 +1,7 @@
 #include <gtest/gtest.h>
 
-#include "LogGenerator/ShowFields.h"
 #include "LogGenerator/LogGenerator.h"
+#include "LogGenerator/ShowFields.h"
 #include "platform/system/Environment.h"
 #include "tests/support/ManualClock.h"
 

@@ -4,8 +4,8 @@
 
 #include <algorithm>
 
-#include "LogGenerator/ShowFields.h"
 #include "LogGenerator/GSMUMTS/NeighboringCells.h"
+#include "LogGenerator/ShowFields.h"
 #include "tests/support/CellArray.h"
 #include "tests/support/Shows.h"
 

@@ -7,8 +7,8 @@
 
 namespace kelvo::simulation::gsm {
 
-/// What the phone's receiver has of both layers' cells. Readings are filtered over about a second, as the modem filters them, so
-/// that the fading is mostly gone; each stands until the next measurement.
+/// What the phone's receiver has of both layers' cells. Readings are filtered over about a second, as the modem filters
+/// them, so that the fading is mostly gone; each stands until the next measurement.
 class Air {
 public:
     /// A cell at this Ec/No is not found: the reading goes no lower.

@@ -68,6 +68,7 @@ void writeCandidate(RecordWriter& record, std::size_t at, const Candidate& candi
 
 Bytes servingCellRecord(Time time, const Cell& cell) {
     return RecordWriter(time, 0xB0C2, 38)
+        .u8(13, 2)  // version
         .u16(14, cell.pci)
         .u16(16, cell.carrier.downlink)
         .u16(18, cell.carrier.uplink)
@@ -80,7 +81,7 @@ Bytes servingCellRecord(Time time, const Cell& cell) {
 }
 
 Bytes antennasRecord(Time time, const Cell& cell) {
-    return RecordWriter(time, 0xB0C1, 22).u8(20, cell.antennas).finish();
+    return RecordWriter(time, 0xB0C1, 22).u8(13, 1).u8(20, cell.antennas).finish();  // version 1
 }
 
 Bytes connectedMeasurementRecord(Time time, const Modem& modem) {

@@ -11,6 +11,7 @@ namespace kelvo {
 namespace {
 
 struct Owner {
+    explicit Owner(std::vector<std::string>* to) : heard(to) {}
     std::function<void(int, const std::string&)> callback() {
         return lifetime.whileAlive(
             [this](int number, const std::string& text) { heard->push_back(text + std::to_string(number)); });

@@ -10,9 +10,9 @@ constexpr Technology kFamilies[] = {Technology::GSM, Technology::CDMA, Technolog
 
 /// Where `part` stands in one piece in `whole`; the test fails where it does not.
 std::size_t placeOf(const std::vector<Bytes>& part, const std::vector<Bytes>& whole) {
-    const auto at = std::ranges::search(whole, part);
-    EXPECT_FALSE(at.empty());
-    return static_cast<std::size_t>(at.begin() - whole.begin());
+    const auto at = std::search(whole.begin(), whole.end(), part.begin(), part.end());
+    EXPECT_NE(at, whole.end());
+    return static_cast<std::size_t>(at - whole.begin());
 }
 
 /// Whether `part` are packets of `whole`, in its order.

@@ -15,8 +15,7 @@ class Line {
 public:
     void append(std::string_view text) {
         const std::size_t length = std::min(text.size(), room());
-        std::memcpy(_end, text.data(), length);
-        _end += length;
+        _end = std::copy_n(text.data(), length, _end);
     }
     void append(char c) { append(std::string_view(&c, 1)); }
     template <class... How>

@@ -18,15 +18,17 @@ using test::plainFrame;
 
 /// What a test has of the line that is open.
 struct FakeLine final : ModemLine {
-    FakeLine(Listener& itsListener, int& alive) : listener(itsListener), count(alive) { ++count; }
-    ~FakeLine() override { --count; }
+    FakeLine(Listener& itsListener, std::shared_ptr<int> alive) : listener(itsListener), count(std::move(alive)) {
+        ++*count;
+    }
+    ~FakeLine() override { --*count; }
     std::string name() const override { return "line"; }
     void open() override { opened = true; }
     void send(ByteView frame) override { sent.emplace_back(frame.begin(), frame.end()); }
     void mute() override { muted = true; }
 
     Listener& listener;
-    int& count;
+    std::shared_ptr<int> count;  // a line may outlive its lines
     std::vector<Bytes> sent;
     bool opened = false;
     bool muted = false;
@@ -48,7 +50,7 @@ struct FakeLines final : ModemLines {
     bool isThere = true;
     bool lastAgain = false;
     int tries = 0;
-    int alive = 0;
+    std::shared_ptr<int> alive = std::make_shared<int>(0);
     FakeLine* line = nullptr;
     std::function<void()> watching;
 };
@@ -142,9 +144,9 @@ TEST_F(ModemSourceTest, ReleasesThePortSixSecondsAfterTheLastClientHasLeft) {
     queue.advance(1ms);
     ASSERT_EQ(lines->line->sent.size(), 3U);
     EXPECT_EQ(lines->line->sent[1], (Bytes{0x73, 0, 0, 0, 0, 0, 0, 0, 0xDA, 0x81, 0x7E}));
-    EXPECT_EQ(lines->alive, 1);
+    EXPECT_EQ(*lines->alive, 1);
     queue.advance(200ms);
-    EXPECT_EQ(lines->alive, 0);
+    EXPECT_EQ(*lines->alive, 0);
     queue.advance(100s);
     EXPECT_EQ(lines->tries, 1);
     stream({0x51F4});
@@ -160,7 +162,7 @@ TEST_F(ModemSourceTest, KeepsThePortForAClientThatComesBackInTime) {
     stream({0x51F4});
     answerRequests();
     queue.advance(100s);
-    EXPECT_EQ(lines->alive, 1);
+    EXPECT_EQ(*lines->alive, 1);
     EXPECT_EQ(lines->tries, 1);
 }
 
@@ -208,7 +210,7 @@ TEST_F(ModemSourceTest, GoesOnByItselfWhenAModemThatHasGoneIsBack) {
     lines->isThere = false;
     lines->line->listener.lineClosed("it hung up");
     queue.run();
-    EXPECT_EQ(lines->alive, 0);
+    EXPECT_EQ(*lines->alive, 0);
     EXPECT_EQ(source->state(), "the modem has gone: it hung up");
     queue.advance(100ms);
     EXPECT_TRUE(lines->lastAgain);
@@ -228,7 +230,7 @@ TEST_F(ModemSourceTest, LeaksNothingWhenItIsUnpluggedAHundredTimes) {
         say(test::recordOf(0x51F4, 1));
         lines->line->listener.lineClosed("it hung up");
         queue.advance(100ms);
-        ASSERT_EQ(lines->alive, 1);
+        ASSERT_EQ(*lines->alive, 1);
     }
     EXPECT_EQ(taken.size(), 100U);
 }
@@ -287,7 +289,7 @@ TEST_F(ModemSourceTest, FindsTheTechnologyOutBeforeAnybodyStreams) {
     EXPECT_EQ(source->technology(), Technology::GSM);
     EXPECT_TRUE(taken.empty() || taken.size() == 1);
     queue.advance(10s);  // nobody came
-    EXPECT_EQ(lines->alive, 0);
+    EXPECT_EQ(*lines->alive, 0);
     EXPECT_FALSE(source->technology());
 }
 

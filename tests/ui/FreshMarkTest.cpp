@@ -25,7 +25,7 @@ double luminance(const QColor& color) {
 
 /// From 1 for the same brightness to 21 for black on white (WCAG 2.1, "contrast ratio").
 double contrast(const QColor& a, const QColor& b) {
-    const auto [dark, light] = std::minmax(luminance(a), luminance(b));
+    const auto [dark, light] = std::minmax({luminance(a), luminance(b)});
     return (light + 0.05) / (dark + 0.05);
 }
 

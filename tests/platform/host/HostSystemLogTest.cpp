@@ -175,8 +175,10 @@ TEST(SyslogSocket, FindsADaemonThatHasStartedAnew) {
 }
 
 TEST(SyslogSocket, LosesLinesThatHaveNowhereToGo) {
-    kelvo::SyslogSocket(std::string(200, 'x'), "kelvo").send(LOG_ERR, std::tm{}, "lost");
-    kelvo::SyslogSocket("/nonexistent/log", "kelvo").send(LOG_ERR, std::tm{}, "lost");
+    std::tm time{};
+    time.tm_mday = 1;
+    kelvo::SyslogSocket(std::string(200, 'x'), "kelvo").send(LOG_ERR, time, "lost");
+    kelvo::SyslogSocket("/nonexistent/log", "kelvo").send(LOG_ERR, time, "lost");
 }
 
 TEST(HostSystemLog, WantsWhatItWrites) {

@@ -62,9 +62,9 @@ protected:
                    std::uint8_t bytes[256];
                    const ssize_t count = ::read(port.get(), bytes, sizeof bytes);
                    if (count > 0) answer.insert(answer.end(), bytes, bytes + count);
-                   return answer.size() >= 58;
+                   return answer.size() >= 58 || count == 0;  // it may have turned this reader away
                }) &&
-               answer.front() == 0x00 && answer.back() == 0x7E;
+               answer.size() >= 58 && answer.front() == 0x00 && answer.back() == 0x7E;
     }
     static bool hasEnded(const UniqueFd& port) {
         return runUntil([&] {

@@ -73,7 +73,7 @@ std::FILE* RecordingFile::stream(RecordingFile file) {
     auto cookie = std::make_unique<RecordingFile>(std::move(file));
     std::FILE* stream =
         fopencookie(cookie.get(), "rb", {.read = readStream, .write = nullptr, .seek = nullptr, .close = closeStream});
-    if (stream != nullptr) cookie.release();
+    if (stream != nullptr) static_cast<void>(cookie.release());  // the stream has it now
     return stream;
 }
 

@@ -38,8 +38,8 @@ UniqueFd openTerminal(std::string& path) {
         ::ptsname_r(master.get(), name, sizeof name) != 0)
         return {};
     path = name;
-    // Hung up from the beginning, as it is again whenever its reader goes.
-    UniqueFd(::open(name, O_RDWR | O_NOCTTY | O_CLOEXEC));
+    // Opened and let go at once: the line is hung up from the beginning, as it is again whenever its reader goes.
+    const UniqueFd once(::open(name, O_RDWR | O_NOCTTY | O_CLOEXEC));
     return master;
 }
 

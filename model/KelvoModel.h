@@ -8,6 +8,7 @@
 #include "LogGenerator/LogGenerator.h"
 #include "model/Connection.h"
 #include "model/KelvoModelNode.h"
+#include "model/Trends.h"
 #include "platform/encodings/PropertyList.h"
 #include "platform/system/Lifetime.h"
 #include "platform/system/MainQueue.h"
@@ -63,6 +64,9 @@ public:
     NodeRef topLevelNodes();
     /// The node at `path`, of a tree built as for `topLevelNodes`; none when the tree has no such node.
     NodeRef nodeAtPath(const std::string& path);
+    /// How the values have gone; each rebuild of the tree is one refresh of them. Their time is that of the main queue.
+    const Trends& trends() const { return _trends; }
+    Trends::Time trendTime() const;
     /// Hands one message of the log channel to the generator.
     void updateWithData(ByteView data);
     /// The contents of a snapshot file; none while there is no generator.
@@ -95,6 +99,7 @@ private:
     std::unique_ptr<LogGenerator> _logGenerator;
     NodeRef _nodes;
     NodesByPath _nodesByPath;  // built with _nodes and empty without
+    Trends _trends;
     std::unique_ptr<LocalPort> _recvPort;
     std::unique_ptr<RemotePort> _sendPort;
     std::unique_ptr<RepeatingTimer> _displayUpdateTimer;  // its presence means that the monitor runs

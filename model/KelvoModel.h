@@ -64,6 +64,8 @@ public:
     NodeRef topLevelNodes();
     /// The node at `path`, of a tree built as for `topLevelNodes`; none when the tree has no such node.
     NodeRef nodeAtPath(const std::string& path);
+    /// As `nodeAtPath`, of the tree that is there; none while the next one is not built yet.
+    NodeRef shownNodeAtPath(const std::string& path) const { return _nodesByPath.find(path); }
     /// How the values have gone; each rebuild of the tree is one refresh of them. Their time is that of the main queue.
     const Trends& trends() const { return _trends; }
     Trends::Time trendTime() const;

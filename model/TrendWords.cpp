@@ -68,12 +68,14 @@ std::string spanText(Time span) {
                          : fmt::format("{} minutes", minutes);
 }
 
-std::string ageText(Time age) {
+std::string agoText(Time age) {
     const std::int64_t seconds = in<std::chrono::seconds>(age);
-    if (seconds < 120) return counted(seconds, "second") + " old";
-    if (seconds < 7200) return counted(seconds / 60, "minute") + " old";
-    return counted(seconds / 3600, "hour") + " old";
+    if (seconds < 120) return counted(seconds, "second");
+    if (seconds < 7200) return counted(seconds / 60, "minute");
+    return counted(seconds / 3600, "hour");
 }
+
+std::string ageText(Time age) { return agoText(age) + " old"; }
 
 std::string trendSummary(const Trend& trend, Time from, Time to, Time now) {
     if (trend.points.empty()) return "No readings yet";

@@ -25,7 +25,9 @@ std::string numberText(double number);
 /// "30 seconds", "a minute", "five minutes", "90 seconds", "23 minutes".
 std::string spanText(Trend::Time span);
 
-/// "40 seconds old", "2 minutes old", "3 hours old".
+/// "40 seconds", "2 minutes", "3 hours": how long ago something was.
+std::string agoText(Trend::Time age);
+/// "40 seconds old".
 std::string ageText(Trend::Time age);
 
 /// What a chart of the trend shows from `from` to `to`, for those who do not see it: "-95 dBm, between -101 and -88 in

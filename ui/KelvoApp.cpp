@@ -48,6 +48,7 @@ void KelvoApp::updateStatusForViewController(KelvoPaneController& pane) {
 void KelvoApp::updateViewControllerFromModel() {
     if (!_model) return;  // a refresh that was on its way when the program ended
     reloadPanes();
+    if (_details) _details->reload();
     if (_model->isConnected()) setUpdateMessage(_dateFormatter->stringFromDate(clock().now()));
     updateStatusForViewController(_navController->topViewController());
 }
@@ -71,7 +72,7 @@ void KelvoApp::reloadPanes() {
 void KelvoApp::willShowViewController(KelvoPaneController& pane, bool) { updateStatusForViewController(pane); }
 
 void KelvoApp::showSaveView() {
-    if (_saveViewController || !_model) return;
+    if (_saveViewController || _details || !_model) return;
     _saveViewController = std::make_unique<KelvoSaveViewController>(
         _model->getSaveContents(),
         KelvoSaveViewController::Services{_services.queue, *this, _services.worker, _services.snapshotDirectory});
@@ -84,13 +85,29 @@ void KelvoApp::closeSaveView() {
     Q_EMIT saveViewDismissed();
 }
 
-void KelvoApp::didRemoveSaveView(KelvoSaveViewController* screen) {
-    const auto at = std::find_if(_leavingSaveViews.begin(), _leavingSaveViews.end(),
-                                 [&](const auto& each) { return each.get() == screen; });
-    if (at == _leavingSaveViews.end()) return;
+void KelvoApp::didRemoveSaveView(KelvoSaveViewController* screen) { release(_leavingSaveViews, screen); }
+
+template <class Screen>
+void KelvoApp::release(std::vector<std::unique_ptr<Screen>>& leaving, Screen* screen) {
+    const auto at = std::ranges::find_if(leaving, [&](const auto& each) { return each.get() == screen; });
+    if (at == leaving.end()) return;
     at->release()->deleteLater();  // its view may still be unwinding
-    _leavingSaveViews.erase(at);
+    leaving.erase(at);
 }
+
+void KelvoApp::showDetails(const std::string& path, int row) {
+    if (_details || _saveViewController || !_model) return;
+    _details = std::make_unique<DetailsController>(*_model, path, row, *this);
+    Q_EMIT detailsPresented(_details.get());
+}
+
+void KelvoApp::closeDetails() {
+    if (!_details) return;
+    _leavingDetails.push_back(std::move(_details));
+    Q_EMIT detailsDismissed();
+}
+
+void KelvoApp::didRemoveDetails(DetailsController* details) { release(_leavingDetails, details); }
 
 void KelvoApp::showAlert(const QString& title, const QString& message, const QString& button) {
     _alertTitle = title;
@@ -120,6 +137,7 @@ void KelvoApp::applicationWillTerminate() {
     setUpdateMessage({});
     _dateFormatter.reset();
     closeSaveView();
+    closeDetails();
     if (_window) _window->orderOut();
     _window.reset();
     _model.reset();

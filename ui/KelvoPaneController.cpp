@@ -186,6 +186,15 @@ void KelvoPaneController::didSelectRow(int row) {
     if (_navigationController != nullptr) _navigationController->pushViewController(std::move(pane), true);
 }
 
+void KelvoPaneController::showDetails(int row) {
+    const bool shown = _navigationController == nullptr || &_navigationController->topViewController() == this;
+    if (!shown || row < 0 || row >= rowCount()) return;
+    const NodeRef child = (*_nodes->childNodes())[static_cast<std::size_t>(row)];
+    const bool isOfList = child->displayName() == std::to_string(row);  // so entries are called
+    if (child->childNodes() != nullptr && !isOfList) return;
+    _host.showDetails(pathByAppending(_keyPath, child->displayName()), row);
+}
+
 QString KelvoPaneController::emptyText() const {
     if (!_rows.empty()) return {};
     if (!_nodes) return QString::fromStdString(waitingText(_connection));

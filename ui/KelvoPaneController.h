@@ -73,6 +73,8 @@ public:
 
     /// Pushes the pane of a child that has children; a leaf only loses its highlight.
     Q_INVOKABLE void didSelectRow(int row);
+    /// Presents the details of a value, and those of an entry of a list. Other children that have children have none.
+    Q_INVOKABLE void showDetails(int row);
     Q_INVOKABLE void saveButtonPressed();
 
     int rowCount(const QModelIndex& parent = {}) const override;

@@ -163,7 +163,15 @@ KelvoCell {
 
     TapHandler {
         id: tap
+        objectName: "tap"
         onPressedChanged: if (pressed) row.touched()
         onTapped: row.pane.didSelectRow(row.index)
+        onLongPressed: if (!row.opens) row.pane.showDetails(row.index)
+    }
+
+    TapHandler {
+        acceptedDevices: PointerDevice.Mouse | PointerDevice.TouchPad | PointerDevice.Stylus
+        acceptedButtons: Qt.RightButton
+        onTapped: row.pane.showDetails(row.index)
     }
 }

@@ -1,6 +1,6 @@
-// What a frame of the chart costs while a finger drags it, drawn by the CPU in a window of 412 by 915, with readings every
-// two seconds for half an hour and a second line over the first. Prints the processor time of a frame:
-//     build/bench/bin/chart_bench
+// What a frame of the chart costs while a finger drags it, drawn by the CPU in a window of 412 by 915, with readings
+// every two seconds for half an hour and a second line over the first. Prints the processor time of a frame:
+//     cmake --build --preset release --target chart_bench && build/release/bin/chart_bench
 
 #include <fmt/format.h>
 

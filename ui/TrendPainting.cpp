@@ -1,12 +1,13 @@
 #include "ui/TrendPainting.h"
 
 #include <QFontMetricsF>
+#include <QLineF>
 #include <QPainter>
-#include <QPainterPath>
 #include <algorithm>
 #include <array>
 #include <cmath>
 #include <limits>
+#include <vector>
 
 #include "model/TrendWords.h"
 
@@ -41,36 +42,50 @@ QString beforeNow(Trend::Time time) {
     return seconds % 60 == 0 ? QStringLiteral("-%1 min").arg(seconds / 60) : QStringLiteral("-%1 s").arg(seconds);
 }
 
-/// The points of a run that are drawn: of many in one column of pixels the first, the least, the most and the last.
-class Columns {
+/// A line through many points, as upright strokes side by side, each as thick as the line and as high as what the line
+/// passes through in its column of pixels. Strokes cost next to nothing, where a drawn line costs by its length.
+class Strokes {
 public:
-    explicit Columns(QPolygonF& polygon) : _polygon(polygon) {}
-    ~Columns() { flush(); }
-    Columns(const Columns&) = delete;
-    Columns& operator=(const Columns&) = delete;
+    /// Columns are `width` wide, the first at `left`.
+    Strokes(qreal left, qreal width, std::size_t columns) : _left(left), _width(width), _columns(columns) {}
 
-    void add(QPointF point) {
-        const double column = std::floor(point.x());
-        if (column != _column) flush();
-        _column = column;
-        if (_count++ == 0) _first = _least = _most = point;
-        if (point.y() < _least.y()) _least = point;
-        if (point.y() > _most.y()) _most = point;
-        _last = point;
+    void add(QPointF from, QPointF to) {
+        const double perX = to.x() > from.x() ? (to.y() - from.y()) / (to.x() - from.x()) : 0;
+        const auto at = [&](double x) { return from.y() + (x - from.x()) * perX; };
+        const double end = columnOf(to.x());
+        for (double column = std::max(0.0, columnOf(from.x())); column <= end; ++column) {
+            if (column >= static_cast<double>(_columns.size())) return;
+            const double left = _left + column * _width;
+            Column& reached = _columns[static_cast<std::size_t>(column)];
+            reached.include(left > from.x() ? at(left) : from.y());
+            reached.include(left + _width < to.x() ? at(left + _width) : to.y());
+        }
+    }
+    void paint(QPainter& painter, const QColor& color, bool dashed) const {
+        constexpr double kDash = 6;  // pixels, and two thirds of it until the next
+        for (std::size_t i = 0; i < _columns.size(); ++i) {
+            const Column& column = _columns[i];
+            const double x = static_cast<double>(i) * _width;
+            if (column.least > column.most || (dashed && std::fmod(x, kDash * 5 / 3) >= kDash)) continue;
+            const double height = column.most - column.least + kLineWidth;
+            painter.fillRect(QRectF(_left + x, column.least - kLineWidth / 2, _width, height), color);
+        }
     }
 
 private:
-    void flush() {
-        if (_count > 0) _polygon << _first;
-        if (_count > 2) _polygon << _least << _most;
-        if (_count > 1) _polygon << _last;
-        _count = 0;
-    }
+    struct Column {
+        double least = std::numeric_limits<double>::infinity();
+        double most = -std::numeric_limits<double>::infinity();
+        void include(double y) {
+            least = std::min(least, y);
+            most = std::max(most, y);
+        }
+    };
+    double columnOf(double x) const { return std::floor((x - _left) / _width); }
 
-    QPolygonF& _polygon;
-    double _column = std::numeric_limits<double>::quiet_NaN();
-    int _count = 0;
-    QPointF _first, _least, _most, _last;
+    const double _left;
+    const double _width;
+    std::vector<Column> _columns;
 };
 
 }  // namespace
@@ -186,41 +201,47 @@ void TrendPainting::paintServingCells(const std::vector<TrendChange>& changes) {
 }
 
 void TrendPainting::paintLine(const Trend& trend, const AxisRange& axis, const QColor& color, bool dashed) {
-    QPen pen(color, kLineWidth, Qt::SolidLine, Qt::FlatCap, Qt::BevelJoin);
+    const auto isBefore = [](const Trend::Point& point, Trend::Time time) { return point.at < time; };
+    const auto at = [&](Trend::Time time) {
+        return std::lower_bound(trend.points.begin(), trend.points.end(), time, isBefore);
+    };
+    // Lines that leave the view at its sides are drawn up to them.
+    const std::span<const Trend::Point> points(at(_view.from() - Trend::kGap), at(_view.to() + Trend::kGap));
+    QList<QLineF> lines;
+    lines.reserve(static_cast<qsizetype>(points.size()));
+    for (std::size_t i = 0; i < points.size(); ++i) {
+        const bool follows = i > 0 && points[i].at - points[i - 1].at <= Trend::kGap;
+        const bool goesOn = i + 1 < points.size() && points[i + 1].at - points[i].at <= Trend::kGap;
+        const QPointF here = placeOf(points[i], axis);
+        if (follows) lines.append(QLineF(placeOf(points[i - 1], axis), here));
+        if (!follows && !goesOn) paintDot(here, color);
+    }
+    constexpr int kFewLines = 60;
+    if (lines.size() > kFewLines) return paintStrokes(lines, color, dashed);
+    QPen pen(color, kLineWidth, Qt::SolidLine, Qt::SquareCap);
+    if (dashed) pen = QPen(color, kLineWidth, Qt::CustomDashLine, Qt::FlatCap);
     if (dashed) pen.setDashPattern({3, 2});
     _painter.setPen(pen);
-    const std::span<const Trend::Point> points(trend.points);
-    for (std::size_t begin = 0; begin < points.size();) {
-        std::size_t end = begin + 1;
-        while (end < points.size() && points[end].at - points[end - 1].at <= Trend::kGap) ++end;
-        paintRun(points.subspan(begin, end - begin), axis, color);
-        begin = end;
-    }
+    _painter.drawLines(lines);
 }
 
-void TrendPainting::paintRun(std::span<const Trend::Point> run, const AxisRange& axis, const QColor& color) {
-    const auto isSeen = [&](const Trend::Point& point) {
-        return point.at >= _view.from() - Trend::kGap && point.at <= _view.to() + Trend::kGap;
-    };
-    QPolygonF polygon;
-    {
-        Columns columns(polygon);
-        for (const Trend::Point& point : run) {
-            if (isSeen(point)) columns.add({xOf(point.at), yOf(point.number, axis)});
-        }
-    }
-    if (polygon.size() > 1) return _painter.drawPolyline(polygon);
-    if (polygon.isEmpty()) return;
-    const QPen pen = _painter.pen();  // a reading alone is a dot
+void TrendPainting::paintStrokes(const QList<QLineF>& lines, const QColor& color, bool dashed) {
+    const qreal pixel = 1 / std::max(1.0, _painter.deviceTransform().m11());
+    Strokes strokes(_area.left(), pixel, static_cast<std::size_t>(std::ceil(_area.width() / pixel)) + 1);
+    for (const QLineF& line : lines) strokes.add(line.p1(), line.p2());
+    strokes.paint(_painter, color, dashed);
+}
+
+/// A reading alone.
+void TrendPainting::paintDot(QPointF at, const QColor& color) {
     _painter.setPen(Qt::NoPen);
     _painter.setBrush(color);
-    _painter.drawEllipse(polygon.first(), kLineWidth, kLineWidth);
+    _painter.drawEllipse(at, kLineWidth, kLineWidth);
     _painter.setBrush(Qt::NoBrush);
-    _painter.setPen(pen);
 }
 
 void TrendPainting::paintCursor(const Trend::Point& point) {
-    const QPointF at(xOf(point.at), yOf(point.number, _axis));
+    const QPointF at = placeOf(point, _axis);
     if (at.x() < _area.left() - 1 || at.x() > _area.right() + 1) return;
     _painter.setPen(QPen(_colors.text, 1));
     _painter.drawLine(QPointF(at.x(), _area.top()), QPointF(at.x(), _area.bottom()));

@@ -1,6 +1,7 @@
 #pragma once
 
 #include <QColor>
+#include <QList>
 #include <QRectF>
 #include <QString>
 #include <span>
@@ -41,9 +42,13 @@ private:
     void paintTimeAxis();
     void paintServingCells(const std::vector<TrendChange>& changes);
     void paintLine(const Trend& trend, const AxisRange& axis, const QColor& color, bool dashed);
-    void paintRun(std::span<const Trend::Point> run, const AxisRange& axis, const QColor& color);
+    void paintStrokes(const QList<QLineF>& lines, const QColor& color, bool dashed);
+    void paintDot(QPointF at, const QColor& color);
     void paintCursor(const Trend::Point& point);
     qreal xOf(Trend::Time time) const { return _area.left() + _view.shareOf(time) * _area.width(); }
+    QPointF placeOf(const Trend::Point& point, const AxisRange& axis) const {
+        return {xOf(point.at), yOf(point.number, axis)};
+    }
     qreal yOf(double number, const AxisRange& axis) const {
         return _area.bottom() - (number - axis.low) / (axis.high - axis.low) * _area.height();
     }

@@ -2,13 +2,14 @@
 
 #include "telephony/simulation/FamilySimulation.h"
 #include "telephony/simulation/LTE/Modem.h"
+#include "telephony/simulation/LTE/NewerRecords.h"
 
 namespace kelvo::simulation::lte {
 
-/// An LTE modem on its drive.
+/// An LTE modem on its drive, of the generation that the screens read or a newer one.
 class Simulation final : public FamilySimulation<Network, Air, Modem> {
 public:
-    explicit Simulation(std::uint64_t seed);
+    explicit Simulation(std::uint64_t seed, Generation generation = Generation::Of2010);
 
     Technology technology() const override { return Technology::LTE; }
 
@@ -18,6 +19,7 @@ private:
     void reportServingCell();
     void reportExtended();
 
+    const Wording& _wording;
     Reported<std::size_t> _antennas;
     Reported<std::size_t> _servingCell;
     Reported<std::size_t> _cells;

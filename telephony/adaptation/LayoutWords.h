@@ -36,6 +36,9 @@ struct FixedField {
 
     constexpr FixedField(std::string_view fieldName, int offset, Raw how, Steps worth = {})
         : name(fieldName), at(static_cast<std::uint16_t>(offset)), raw(how), steps(worth) {}
+
+    constexpr int firstBit() const { return 8 * at + raw.lowBit; }
+    constexpr int lastBit() const { return firstBit() + raw.bitWidth() - 1; }
 };
 
 /// What happens to a raw value on its way.
@@ -116,6 +119,8 @@ consteval FixedLayout<N> fixedLayout(std::size_t size, const FixedField (&fields
         if (fields[i].at + fields[i].raw.bytes > size) throw "a field lies past the end";
         for (std::size_t j = 0; j < i; ++j) {
             if (fields[i].name == fields[j].name) throw "a name stands twice";
+            if (fields[i].firstBit() <= fields[j].lastBit() && fields[j].firstBit() <= fields[i].lastBit())
+                throw "two fields share a bit";
         }
     }
     return {size, std::to_array(fields)};
@@ -129,6 +134,8 @@ consteval Move move(const FixedField& to, const NewerField& from) {
         if (from.constant < 0 || from.constant > move.greatest()) throw "a constant does not fit its field";
         move.summand = from.constant;
     }
+    const bool isRounded = from.turn == Turn::Stepped || from.turn == Turn::Constant;
+    if (to.steps.numerator != 0 && !isRounded) throw "the newer field has no steps";
     if (from.turn == Turn::Stepped) {
         if (to.steps.numerator == 0) throw "the fixed field has no steps";
         // Half a step more and rounded down is the nearest step, ties up.

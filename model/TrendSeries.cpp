@@ -21,15 +21,15 @@ std::int64_t TrendSeries::stepped(std::int64_t raw, std::uint64_t difference) {
     return static_cast<std::int64_t>(static_cast<std::uint64_t>(raw) + distance);
 }
 
-void TrendSeries::note(std::uint32_t refresh, const Reading& reading) {
-    const bool isKnown = reading.record != 0 && reading.record == _record;
+void TrendSeries::note(std::uint32_t refresh, const Reading& reading, std::uint64_t record) {
+    const bool isKnown = record != 0 && record == _record;
     if (refresh < _end || isKnown) return;
     if (isEmpty()) {
         _begin = _end = refresh;
         _steps.clear();
         _first = _last;
     }
-    _record = reading.record;
+    _record = record;
     const bool newQuantity = _quantities.empty() || _quantities[_last.quantity] != reading.quantity;
     if (refresh == _end && !newQuantity && !isEmpty() && reading.raw == _last.raw) {
         ++_end;

@@ -19,9 +19,9 @@ public:
         const Quantity* quantity;  ///< never null
     };
 
-    /// What stands there at `refresh`, which is not before one noted already. A reading of a record that was noted
-    /// before is no new reading; while nobody counts records, every one is.
-    void note(std::uint32_t refresh, const Reading& reading);
+    /// What record `record` reported, as seen at `refresh`, which is not before one noted already. A reading of a
+    /// record that was noted before is no new reading; while nobody counts records, and they are 0, every one is.
+    void note(std::uint32_t refresh, const Reading& reading, std::uint64_t record);
     /// Samples before `refresh` are not wanted any more; a few of them may stay.
     void forgetBefore(std::uint32_t refresh);
 

@@ -61,7 +61,7 @@ private:
         const Reading* reading = value.reading();
         const bool isName = shortNameOf(key) != nullptr;
         if (reading != nullptr && !isName && reading->quantity->measure(reading->raw)) {
-            return _trends.noteNumber(_name, *reading);
+            return _trends.noteNumber(_name, *reading, value.record());
         }
         if (isName && _openArrays > 0) return;  // is the row's name
         if (const std::string* text = value.string()) _trends.noteText(_name, key, *text, _openArrays > 0);
@@ -137,12 +137,12 @@ T* Trends::find(ByName<T>& all, std::string_view name) {
     return &all.emplace(std::string(name), T()).first->second;
 }
 
-void Trends::noteNumber(std::string_view name, const Reading& reading) {
-    _newestRecord = std::max(_newestRecord, reading.record);
+void Trends::noteNumber(std::string_view name, const Reading& reading, std::uint64_t record) {
+    _newestRecord = std::max(_newestRecord, record);
     // A value that nobody writes any more stays on its screen: that is no new reading, and begins no trend.
-    const bool isOld = reading.record != 0 && reading.record <= _newestRecordBefore;
+    const bool isOld = record != 0 && record <= _newestRecordBefore;
     if (isOld && !_numbers.contains(name)) return;
-    if (TrendSeries* series = find(_numbers, name)) series->note(_refresh, reading);
+    if (TrendSeries* series = find(_numbers, name)) series->note(_refresh, reading, record);
 }
 
 void Trends::noteText(std::string_view name, std::string_view key, const std::string& text, bool isInList) {

@@ -76,7 +76,7 @@ private:
 
     template <class T>
     T* find(ByName<T>& all, std::string_view name);
-    void noteNumber(std::string_view name, const Reading& reading);
+    void noteNumber(std::string_view name, const Reading& reading, std::uint64_t record);
     void noteText(std::string_view name, std::string_view key, const std::string& text, bool isInList);
     void noteServingCell(std::string_view key, const std::string& text, int rank);
     void forgetOld();

@@ -1,11 +1,13 @@
 #include "ui/DetailsController.h"
 
 #include <QClipboard>
+#include <QDateTime>
 #include <QGuiApplication>
 #include <algorithm>
 
 #include "model/LevelGrades.h"
 #include "model/TrendWords.h"
+#include "ui/RecordDump.h"
 #include "ui/ScreenHost.h"
 #include "ui/TrendCandidates.h"
 
@@ -13,6 +15,12 @@ namespace kelvo {
 namespace {
 
 QString shown(std::string_view text) { return QString::fromUtf8(text.data(), static_cast<qsizetype>(text.size())); }
+
+QString modemTimeText(SystemTime time) {
+    const auto milliseconds = std::chrono::duration_cast<std::chrono::milliseconds>(time.time_since_epoch());
+    return QDateTime::fromMSecsSinceEpoch(milliseconds.count(), Qt::UTC)
+        .toString(QStringLiteral("'Modem time' yyyy-MM-dd HH:mm:ss.zzz 'UTC'"));
+}
 
 }  // namespace
 
@@ -44,13 +52,28 @@ std::string DetailsController::leafOf(const KelvoModelNode& node, const std::str
 void DetailsController::reload() {
     const Trends& trends = _model.trends();
     const NodeRef node = _model.shownNodeAtPath(trends.pathOf(_name));
-    if (node && node->value() != nullptr) _valueText = QString::fromStdString(*node->value());
+    if (node && node->value() != nullptr) {
+        _valueText = QString::fromStdString(*node->value());
+        readProvenance(*node);
+    }
     _trend = trends.trend(_name);
     _comparison = _comparisonName.empty() ? Trend() : trends.trend(_comparisonName);
     _servingCells = trends.servingCells();
     _now = _model.trendTime();
     readChanges();
     Q_EMIT changed();
+}
+
+void DetailsController::readProvenance(const KelvoModelNode& node) {
+    const auto from = _model.provenance(node);
+    if (!from) return;  // what was known of the record is still true but for its age
+    _written = QStringLiteral("%1 ago, by record %2")
+                   .arg(QString::fromStdString(agoText(std::chrono::duration_cast<Trend::Time>(from->age))))
+                   .arg(from->record);
+    _record = QString::fromStdString(describe(*from));
+    _modemTime = from->modemTime ? modemTimeText(*from->modemTime) : QString();
+    _dump = recordDump(from->bytes, from->place);
+    _dumpWords = placeText(from->bytes, from->place);
 }
 
 void DetailsController::readChanges() {

@@ -25,6 +25,11 @@ class DetailsController : public QObject {
     Q_PROPERTY(QString place READ place CONSTANT)
     Q_PROPERTY(int row READ row CONSTANT)
     Q_PROPERTY(QString valueText READ valueText NOTIFY changed)
+    Q_PROPERTY(QString written READ written NOTIFY changed)
+    Q_PROPERTY(QString record READ record NOTIFY changed)
+    Q_PROPERTY(QString modemTime READ modemTime NOTIFY changed)
+    Q_PROPERTY(QString dump READ dump NOTIFY changed)
+    Q_PROPERTY(QString dumpWords READ dumpWords NOTIFY changed)
     Q_PROPERTY(bool hasTrend READ hasTrend NOTIFY changed)
     Q_PROPERTY(QStringList changes READ changes NOTIFY changed)
     Q_PROPERTY(QString comparedWith READ comparedWith NOTIFY comparisonChanged)
@@ -39,6 +44,12 @@ public:
     const QString& place() const { return _place; }  ///< the screens that lead to it, and what its row is about
     int row() const { return _row; }
     const QString& valueText() const { return _valueText; }
+    // Where the value comes from; each is empty when that is not known.
+    const QString& written() const { return _written; }      ///< "4 seconds ago, by record 4711"
+    const QString& record() const { return _record; }        ///< the record's kind: "0xb17f  LTE serving cell, idle"
+    const QString& modemTime() const { return _modemTime; }  ///< by the modem's clock
+    const QString& dump() const { return _dump; }            ///< as of `recordDump`
+    const QString& dumpWords() const { return _dumpWords; }  ///< where the value stands in it
     bool hasTrend() const { return !_trend.points.empty(); }
     /// Of a text: what stood there and since when, the latest first.
     const QStringList& changes() const { return _changes; }
@@ -73,6 +84,7 @@ private:
     /// The path of the leaf that stands for the node at `path`: itself, or the main level of a list's row.
     std::string leafOf(const KelvoModelNode& node, const std::string& path) const;
     void readChanges();
+    void readProvenance(const KelvoModelNode& node);
 
     const KelvoModel& _model;
     ScreenHost& _host;
@@ -81,6 +93,11 @@ private:
     QString _title;
     QString _place;
     QString _valueText;
+    QString _written;
+    QString _record;
+    QString _modemTime;
+    QString _dump;
+    QString _dumpWords;
     Trend _trend;
     std::string _comparisonName;
     Trend _comparison;

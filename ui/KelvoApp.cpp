@@ -7,6 +7,8 @@
 
 namespace kelvo {
 
+using namespace std::chrono_literals;
+
 KelvoApp::KelvoApp(Services services) : _services(std::move(services)) {}
 
 KelvoApp::~KelvoApp() = default;
@@ -28,6 +30,7 @@ void KelvoApp::applicationDidFinishLaunching() {
     _navController->setDelegate(this);
     _window->setRootScreen(*this);
     _navController->viewWillAppear();
+    _agingTimer = _services.queue.repeat(2s, _lifetime.whileAlive([this] { letValuesAge(); }));
     _window->makeKeyAndVisible();
     _services.queue.post(_lifetime.whileAlive([this] {
         if (_model) _model->restartMonitor();
@@ -101,6 +104,18 @@ void KelvoApp::showDetails(const std::string& path, int row) {
     Q_EMIT detailsPresented(_details.get());
 }
 
+std::optional<std::chrono::milliseconds> KelvoApp::ageOf(const KelvoModelNode& node) const {
+    const auto provenance = _model ? _model->provenance(node) : std::nullopt;
+    if (!provenance) return std::nullopt;
+    return std::chrono::duration_cast<std::chrono::milliseconds>(provenance->age);
+}
+
+// Values grow older whether or not records come, and when the connection is lost.
+void KelvoApp::letValuesAge() {
+    _navController->topViewController().updateAges();
+    if (_details) _details->reload();
+}
+
 void KelvoApp::closeDetails() {
     if (!_details) return;
     _leavingDetails.push_back(std::move(_details));
@@ -138,6 +153,7 @@ void KelvoApp::applicationWillTerminate() {
     _dateFormatter.reset();
     closeSaveView();
     closeDetails();
+    _agingTimer.reset();
     if (_window) _window->orderOut();
     _window.reset();
     _model.reset();

@@ -76,6 +76,7 @@ public:
     /// The screen no longer draws a save screen that was closed.
     Q_INVOKABLE void didRemoveSaveView(kelvo::KelvoSaveViewController* screen);
 
+    std::optional<std::chrono::milliseconds> ageOf(const KelvoModelNode& node) const override;
     void showDetails(const std::string& path, int row) override;
     void closeDetails() override;
     /// The screen no longer draws details that were closed.
@@ -102,6 +103,7 @@ private:
     void getSaveButtonPref();
     void reloadPanes();
     void _setGSMRSSI(bool shown);
+    void letValuesAge();
 
     const Services _services;
     std::unique_ptr<KelvoModel> _model;
@@ -117,6 +119,7 @@ private:
     QString _alertTitle;
     QString _alertMessage;
     QString _alertButton;
+    std::unique_ptr<RepeatingTimer> _agingTimer;
     bool _terminated = false;
     std::unique_ptr<Window> _window;  // behind the rest, so that nothing it draws goes before it
     const Lifetime _lifetime;         // tasks on the queue outlive the application

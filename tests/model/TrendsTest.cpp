@@ -37,7 +37,7 @@ const Whole kWhole;
 
 Value reading(std::int64_t raw, std::uint64_t record = 0, const Quantity& quantity = kLevel) {
     Value value;
-    value.set(Reading{raw, &quantity, record});
+    value.set(Reading{raw, &quantity}, record);
     return value;
 }
 

@@ -12,6 +12,7 @@ public:
     bool allowSaveButton() const override { return savingAllowed; }
     void showSaveView() override { ++saveViewsShown; }
     void closeSaveView() override { ++saveViewsClosed; }
+    std::optional<std::chrono::milliseconds> ageOf(const KelvoModelNode&) const override { return age; }
     void showDetails(const std::string& path, int) override { detailsShown.push_back(path); }
     void closeDetails() override { ++detailsClosed; }
     void showAlert(const QString& title, const QString& message, const QString& button) override {
@@ -24,6 +25,7 @@ public:
     int saveViewsClosed = 0;
     std::vector<std::string> detailsShown;
     int detailsClosed = 0;
+    std::optional<std::chrono::milliseconds> age;  // of every value
     QStringList alerts;
 };
 

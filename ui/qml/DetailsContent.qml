@@ -31,14 +31,30 @@ Column {
         font.pixelSize: 13
     }
 
-    FigureText {
+    Line {
         objectName: "largeValue"
         text: content.details.valueText
-        maximumWidth: content.width - 2 * content.padding
+        wrapMode: Text.WrapAtWordBoundaryOrAnywhere
         color: Theme.text
-        font.pixelSize: 32
-        Accessible.role: Accessible.StaticText
-        Accessible.name: text
+        font.pixelSize: text.length > 16 ? 20 : 32
+    }
+
+    Column {
+        width: content.width - 2 * content.padding
+        spacing: 2
+
+        Line {
+            objectName: "written"
+            text: content.details.written
+        }
+        Line {
+            objectName: "record"
+            text: content.details.record
+        }
+        Line {
+            objectName: "modemTime"
+            text: content.details.modemTime
+        }
     }
 
     TrendPanel {
@@ -55,5 +71,21 @@ Column {
             required property string modelData
             text: modelData
         }
+    }
+
+    Line {
+        objectName: "dumpWords"
+        text: content.details.dumpWords
+    }
+
+    Text {
+        objectName: "dump"
+        width: content.width - 2 * content.padding
+        visible: text !== ""
+        text: content.details.dump
+        textFormat: Text.StyledText
+        color: Theme.secondaryText
+        font { family: "monospace"; pixelSize: 13 }
+        Accessible.ignored: true  // the words above say what matters
     }
 }

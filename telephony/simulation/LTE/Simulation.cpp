@@ -3,25 +3,11 @@
 #include "telephony/simulation/LTE/Records.h"
 
 namespace kelvo::simulation::lte {
-namespace {
 
 using namespace std::chrono_literals;
 
-constexpr int kRoutingArea = 1;
-
-}  // namespace
-
 Simulation::Simulation(std::uint64_t seed, Generation generation)
-    : FamilySimulation(seed, 4s), _wording(wordingOf(generation)) {}
-
-void Simulation::step() {
-    _user.moveTo(now());
-    _air.moveTo(now());
-    _modem.step(now(), _user);
-    reportServingCell();
-    reportMeasurements();
-    reportExtended();
-}
+    : RegisteredSimulation(seed, 4s), _wording(wordingOf(generation)) {}
 
 void Simulation::reportServingCell() {
     const std::size_t cell = _modem.servingIndex();
@@ -36,14 +22,6 @@ void Simulation::reportMeasurements() {
     emit(_wording.servingMeasurement(now(), _modem.serving(), _modem.reading(), _modem.idle()));
     if (!_modem.neighbors().empty()) emit(_wording.neighborMeasurement(now(), _modem));
     emit(candidatesRecord(now(), _modem));
-}
-
-void Simulation::reportExtended() {
-    const std::size_t cell = _modem.servingIndex();
-    if (_cells.isDue(now(), cell, 20s)) emit(cellInformationRecord(now(), monitoredCells(_modem)));
-    if (_contexts.isDue(now(), _modem.isOnCall(), 30s)) emit(pdpContextsRecord(now(), pdpContexts(_modem)));
-    const int area = _modem.registeredArea();
-    if (_sim.isDue(now(), area, 60s)) emit(simFilesRecord(now(), testNetworkSim(area, kRoutingArea)));
 }
 
 }  // namespace kelvo::simulation::lte

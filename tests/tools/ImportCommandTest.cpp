@@ -9,9 +9,9 @@ namespace {
 using test::contentsOf;
 using test::expectFailure;
 using test::Finished;
-using test::framed;
 using test::KelvoctlTest;
 using test::kTicks;
+using test::plainFrame;
 using test::plainRecord;
 using test::recordBodyOf;
 using test::operator+=;

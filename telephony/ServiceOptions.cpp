@@ -56,6 +56,7 @@ ParsedOptions parseServiceOptions(int argc, const char* const* argv) {
     std::string word;
     std::string speed = "1";
     std::string port;
+    std::string managedModem;
     std::string portTechnology = "auto";
     bool remote = false;
     CLI::App app(
@@ -84,7 +85,21 @@ ParsedOptions parseServiceOptions(int argc, const char* const* argv) {
                                    "A modem's diagnostic port: the node of one that is plugged in, a serial node or\n"
                                    "device, or the socket that a router on the phone offers")
                       ->type_name("auto|PATH|tcp:HOST:PORT|unix:PATH");
-    source->require_option(1);
+    auto* manager =
+        source
+            ->add_option("--modemmanager", managedModem,
+                         "What ModemManager knows of the phone: SIM, cells, data contexts, levels; alone, "
+                         "or beside\n--port, which then measures. MODEM is an index, a path or an equipment "
+                         "identity; the\nfirst without")
+            ->type_name("[MODEM]")
+            ->expected(0, 1);
+    source->require_option(1, 2);
+    for (auto* one : {replay, simulate, status, modem}) {
+        for (auto* other : {replay, simulate, status, modem}) {
+            if (one != other) one->excludes(other);
+        }
+        if (one != modem) manager->excludes(one);
+    }
     auto* loop = app.add_flag("--loop", options.loop, "Start the capture again after its last packet");
     auto* seed = app.add_option_function<std::string>(
                         "--seed", [&options](const std::string& text) { options.seed = seedOf(text); },
@@ -124,12 +139,14 @@ ParsedOptions parseServiceOptions(int argc, const char* const* argv) {
     json->needs(status);
     for (auto* option : {technology, subscription, allowRemote, noLines, recordFrames}) option->needs(modem);
     pace->excludes(modem);
+    pace->excludes(manager);
     for (auto* option : {pace, record}) option->excludes(status);
     try {
         app.parse(argc, argv);
         if (options.force && options.record.empty() && options.recordFrames.empty())
             throw CLI::RequiresError("--force", "--record or --record-frames");
         if (modem->count() > 0) options.port = portOf(port, remote);
+        if (manager->count() > 0) options.modemManager = managedModem;
     } catch (const CLI::CallForHelp&) {
         fmt::print("{}", app.help());
         return {std::nullopt, 0};

@@ -7,8 +7,8 @@
 
 namespace kelvo {
 
-/// Decodes the messages of one technology family. It keeps nothing of the decoded picture itself: that lives in the
-/// state dictionary, which outlives generators and is passed to every call.
+/// Decodes the messages of one technology family. It keeps nothing of what it decodes: that lives in the state
+/// dictionary, which outlives generators and is passed to every call.
 ///
 /// The state's keys: "Template" (dictionary), "Display" (dictionary; the live values, which sections update in place),
 /// "ExtraInfo" (dictionary), "Lookup" (dictionary, CDMA only), "DisplayState" (data: the raw log since the last

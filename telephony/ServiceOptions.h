@@ -8,6 +8,7 @@
 #include "telephony/PacedSource.h"
 #include "telephony/line/PortAddress.h"
 #include "telephony/line/SerialLine.h"
+#include "telephony/simulation/Generation.h"
 #include "telephony/wire/Session.h"
 
 namespace kelvo {
@@ -20,6 +21,7 @@ struct ServiceOptions {
     bool loop = false;
     Technology simulate = Technology::LTE;
     std::uint64_t seed = 1;
+    simulation::Generation generation = simulation::Generation::Of2010;
     PacedSource::Speed speed = 1.0;
     std::optional<PortAddress> port;          ///< none: a capture or a simulation
     std::optional<std::string> modemManager;  ///< which of its modems, empty: the first; none: it is not asked

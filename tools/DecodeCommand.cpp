@@ -13,6 +13,7 @@
 #include "platform/system/Environment.h"
 #include "platform/system/OutputFile.h"
 #include "telephony/recordings/RecordingKind.h"
+#include "tools/Command.h"
 #include "tools/CommandFailure.h"
 #include "tools/DisplayJson.h"
 #include "tools/DisplayText.h"
@@ -175,7 +176,7 @@ void decode(const Options& options) {
 }  // namespace
 
 void addDecodeCommand(CLI::App& app) {
-    CLI::App& command = *app.add_subcommand("decode", "Shows what the messages of a capture give on the screens");
+    CLI::App& command = addCommand(app, "decode", "Shows what the messages of a capture give on the screens");
     const auto options = std::make_shared<Options>();
     command.add_option("FILE", options->file, "A classic pcap file, one log message a packet")->required();
     addTechnologyOption(command, options->technology, "Decodes as this technology, whatever the link type says");

@@ -3,6 +3,7 @@
 #include <algorithm>
 #include <cmath>
 
+#include "telephony/adaptation/CarryOut.h"
 #include "telephony/adaptation/LteLayouts.h"
 
 namespace kelvo::adaptation {

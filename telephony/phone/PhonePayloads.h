@@ -33,7 +33,7 @@ struct SimFiles {
     bool operator==(const SimFiles&) const = default;
 };
 
-/// One cell as the telephony service's cell monitor words it. A value that is none is not in the record.
+/// One cell as the telephony service's cell monitor describes it. A value that is none is not in the record.
 struct MonitoredCell {
     enum class Technology { GSM, UMTS, UTRAN2, LTE };
     static constexpr int kNoValue = 32767;  ///< under RSSI, RSCP and Ec/N0: known, but not measured now

@@ -12,6 +12,9 @@ using phone::MonitoredCell;
 using phone::PdpContext;
 using phone::SimFiles;
 
+/// So many neighbors are monitored beside the serving cell, where the strongest are listed.
+inline constexpr std::size_t kMonitoredNeighbors = 2;
+
 /// A SIM of the test network MCC 001, MNC 01 (ITU-T E.212) that was last registered in this area: the files that name
 /// an area follow it, the others never change.
 SimFiles testNetworkSim(int locationAreaCode, int routingAreaCode);

@@ -5,11 +5,6 @@
 #include "telephony/simulation/LTE/Modem.h"
 
 namespace kelvo::simulation::lte {
-namespace {
-
-constexpr std::size_t kMonitoredNeighbors = 2;
-
-}  // namespace
 
 std::vector<MonitoredCell> monitoredCells(const Modem& modem) {
     const Cell& serving = modem.serving();

@@ -3,11 +3,6 @@
 #include "telephony/simulation/UTRAN/Modem.h"
 
 namespace kelvo::simulation::utran {
-namespace {
-
-constexpr std::size_t kMonitoredNeighbors = 2;
-
-}  // namespace
 
 std::vector<MonitoredCell> monitoredCells(const Modem& modem) {
     using enum MonitoredCell::Technology;

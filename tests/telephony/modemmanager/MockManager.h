@@ -60,16 +60,14 @@ public:
         modem["org.freedesktop.ModemManager1.Modem.Location"] = {{"Enabled", 1U}};
         parts[simPath(index)] = {{"SimIdentifier", QString("890010100000012345%1").arg(index)},
                                  {"OperatorName", "Provider"}};
-        parts[bearerPath(index)] = {{"Connected", true},
-                                    {"Suspended", false},
-                                    {"ProfileId", 1},
-                                    {"Ip4Config", QVariantMap{{"address", "10.20.30.40"}}},
-                                    {"Properties", QVariantMap{{"apn", "internet"},
-                                                               {"ip-type", 1U},
-                                                               {"user", "ada"},
-                                                               {"password", "secret"}}},
-                                    {"Stats", QVariantMap{{"downlink-speed", qulonglong(150'000'000)},
-                                                          {"uplink-speed", qulonglong(50'000'000)}}}};
+        parts[bearerPath(index)] = {
+            {"Connected", true},
+            {"Suspended", false},
+            {"ProfileId", 1},
+            {"Ip4Config", QVariantMap{{"address", "10.20.30.40"}}},
+            {"Properties", QVariantMap{{"apn", "internet"}, {"ip-type", 1U}, {"user", "ada"}, {"password", "secret"}}},
+            {"Stats",
+             QVariantMap{{"downlink-speed", qulonglong(150'000'000)}, {"uplink-speed", qulonglong(50'000'000)}}}};
     }
 
     /// Tells everybody that a modem has come, or has gone.

@@ -22,9 +22,9 @@ constexpr const char* kUnauthorized = "org.freedesktop.ModemManager1.Error.Core.
 constexpr const char* kUnsupportedCall = "org.freedesktop.ModemManager1.Error.Core.Unsupported";
 constexpr const char* kAccessDenied = "org.freedesktop.DBus.Error.AccessDenied";
 
-const QVariantMap kServingLte{{"cell-type", 5U}, {"serving", true},       {"operator-id", "00101"}, {"tac", "7"},
-                              {"ci", "1234501"}, {"physical-ci", "12D"}, {"earfcn", 1300U},       {"rsrp", -100.0},
-                              {"rsrq", -8.0}};
+const QVariantMap kServingLte{{"cell-type", 5U}, {"serving", true}, {"operator-id", "00101"},
+                              {"tac", "7"},      {"ci", "1234501"}, {"physical-ci", "12D"},
+                              {"earfcn", 1300U}, {"rsrp", -100.0},  {"rsrq", -8.0}};
 
 class ModemManagerTest : public testing::Test {
 protected:
@@ -41,7 +41,8 @@ protected:
     void followModem(const std::string& wanted = "") {
         if (mock->modems.empty()) mock->addModem(0);
         follow(wanted);
-        ASSERT_TRUE(until([this] { return !phone().sim.iccid.empty() && phone().contexts && !phone().contexts->empty(); }));
+        ASSERT_TRUE(
+            until([this] { return !phone().sim.iccid.empty() && phone().contexts && !phone().contexts->empty(); }));
     }
     template <class Condition>
     bool until(Condition condition) {
@@ -58,9 +59,8 @@ protected:
     }
     const phone::PhoneState& phone() const { return manager->phone(); }
     std::size_t lines(std::string_view words) const {
-        return static_cast<std::size_t>(std::ranges::count_if(log.lines(), [&](const auto& line) {
-            return line.text.find(words) != std::string::npos;
-        }));
+        return static_cast<std::size_t>(std::ranges::count_if(
+            log.lines(), [&](const auto& line) { return line.second.find(words) != std::string::npos; }));
     }
 
     test::PrivateBus bus;
@@ -261,10 +261,8 @@ TEST_F(ModemManagerTest, NamesThePolicyOfABusThatLetsRootAloneAsk) {
 TEST_F(ModemManagerTest, TakesTheFirstOfSeveralModemsOrTheOneThatIsNamed) {
     mock->addModem(10);
     mock->addModem(2);
-    const std::pair<const char*, const char*> names[] = {{"", "2"},
-                                                         {"10", "10"},
-                                                         {"/org/freedesktop/ModemManager1/Modem/10", "10"},
-                                                         {"8600000000000010", "10"}};
+    const std::pair<const char*, const char*> names[] = {
+        {"", "2"}, {"10", "10"}, {"/org/freedesktop/ModemManager1/Modem/10", "10"}, {"8600000000000010", "10"}};
     for (const auto& [wanted, index] : names) {
         follow(wanted);
         EXPECT_TRUE(until([&] { return phone().modem == index; })) << wanted;
@@ -383,7 +381,8 @@ TEST_F(ModemManagerTest, SaysThatThereIsNoBusAndTriesAgain) {
     manager = std::make_unique<ModemManager>(
         [&] {
             ++opened;
-            return QDBusConnection::connectToBus(opened == 1 ? "unix:path=/nonexistent/bus" : bus.address(), "follower");
+            return QDBusConnection::connectToBus(opened == 1 ? "unix:path=/nonexistent/bus" : bus.address(),
+                                                 "follower");
         },
         ::getuid(), "", queue);
     mock->addModem(0);

@@ -20,8 +20,9 @@ SerialLine::SerialLine(std::string path, Options options, Listener& listener)
         // What a pseudo-terminal has not (control lines) is no reason to give it up.
         if (error == QSerialPort::NoError || error == QSerialPort::UnsupportedOperationError || !_port->isOpen())
             return;
-        // The system's own words for a node that has gone are those of whatever was tried last.
-        const bool gone = error == QSerialPort::ResourceError;
+        // The system's own words for a node that has gone are those of whatever was tried last: an end is no error to
+        // it.
+        const bool gone = error == QSerialPort::ResourceError || error == QSerialPort::ReadError;
         const std::string reason = gone ? "it hung up" : _port->errorString().toStdString();
         HostEventLoop::call([&] { close(reason); });
     });

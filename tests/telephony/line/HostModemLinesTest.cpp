@@ -1,8 +1,6 @@
 #include "telephony/line/HostModemLines.h"
 
-#include <fcntl.h>
 #include <gtest/gtest.h>
-#include <stdlib.h>
 #include <termios.h>
 #include <unistd.h>
 
@@ -12,13 +10,14 @@
 #include <QTcpSocket>
 #include <fstream>
 
-#include "platform/host/UniqueFd.h"
 #include "tests/support/EventLoop.h"
+#include "tests/support/PseudoTerminal.h"
 #include "tests/support/TemporaryDirectory.h"
 
 namespace kelvo {
 namespace {
 
+using test::PseudoTerminal;
 using test::runUntil;
 
 struct Heard final : ModemLine::Listener {
@@ -35,23 +34,6 @@ Result<std::unique_ptr<ModemLine>> lineTo(const std::string& address, Heard& hea
     HostModemLines lines(*PortAddress::parse(address, false), {});
     return lines.next(heard, false);
 }
-
-/// The modem's end of a pseudo-terminal.
-struct PseudoTerminal {
-    PseudoTerminal() : modem(::posix_openpt(O_RDWR | O_NOCTTY | O_NONBLOCK)) {
-        EXPECT_EQ(::grantpt(modem.get()), 0);
-        EXPECT_EQ(::unlockpt(modem.get()), 0);
-        path = ::ptsname(modem.get());
-    }
-    Bytes read() const {
-        Bytes bytes(1000);
-        const ssize_t size = ::read(modem.get(), bytes.data(), bytes.size());
-        bytes.resize(static_cast<std::size_t>(std::max<ssize_t>(size, 0)));
-        return bytes;
-    }
-    UniqueFd modem;
-    std::string path;
-};
 
 const Bytes kFrame{0x00, 0x0D, 0x0A, 0x11, 0x13, 0x03, 0x04, 0x7F, 0xFF, 0x7E};  // what a terminal would interpret
 

@@ -148,6 +148,7 @@ void ModemSource::settle() {
         if (!std::exchange(_trouble, {}).empty()) logLine(Level::Notice, "%s: the modem is back", _line->name());
     }
     if (!isNeeded()) _session.end();
+    _line->mayGather(_session.state() == State::Running && !_session.isAsking());
     if (_session.state() == State::Closed) return hangUp();
     arm();
 }

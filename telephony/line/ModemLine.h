@@ -29,6 +29,9 @@ public:
     virtual void open() = 0;
     /// Sends one frame; it goes at the modem's pace.
     virtual void send(ByteView frame) = 0;
+    /// Whether what comes may gather for some milliseconds before it is given, since nobody waits for an answer; not at
+    /// first.
+    virtual void mayGather(bool) {}
     /// The listener hears nothing of it any more. The port itself is closed with the line.
     virtual void mute() = 0;
 };

@@ -11,7 +11,7 @@ constexpr qint64 kReadBuffer = 1 << 20;
 }  // namespace
 
 SerialLine::SerialLine(std::string path, Options options, Listener& listener)
-    : _path(std::move(path)), _options(options), _listener(listener), _port(new QSerialPort) {
+    : _path(std::move(path)), _options(options), _listener(listener), _port(new QSerialPort), _rest(*_port) {
     _port->setPortName(QString::fromStdString(_path));
     _port->setBaudRate(QSerialPort::Baud115200);
     _port->setReadBufferSize(kReadBuffer);
@@ -52,9 +52,11 @@ void SerialLine::mute() {
 }
 
 void SerialLine::read() {
+    std::size_t given = 0;
     for (int i = 0; i < kReadsPerTurn && !_muted; ++i) {
         const qint64 size = _port->read(reinterpret_cast<char*>(_buffer.data()), static_cast<qint64>(_buffer.size()));
-        if (size <= 0) return;
+        if (size <= 0) return _rest.after(given);
+        given += static_cast<std::size_t>(size);
         _listener.lineGave(std::span(_buffer).first(static_cast<std::size_t>(size)));
     }
     if (_muted) return;

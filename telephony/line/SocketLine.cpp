@@ -33,7 +33,7 @@ std::unique_ptr<ModemLine> SocketLine::toUnix(std::string path, Listener& listen
 
 template <class Socket>
 SocketLine::SocketLine(Socket* socket, std::string name, Listener& listener)
-    : _name(std::move(name)), _listener(listener), _socket(socket) {
+    : _name(std::move(name)), _listener(listener), _socket(socket), _rest(*socket) {
     socket->setReadBufferSize(kReadBuffer);
     auto* const limit = new QTimer(socket);
     limit->setSingleShot(true);
@@ -67,9 +67,11 @@ void SocketLine::mute() {
 }
 
 void SocketLine::read() {
+    std::size_t given = 0;
     for (int i = 0; i < kReadsPerTurn && !_muted && _socket->isOpen(); ++i) {
         const qint64 size = _socket->read(reinterpret_cast<char*>(_buffer.data()), static_cast<qint64>(_buffer.size()));
-        if (size <= 0) return;
+        if (size <= 0) return _rest.after(given);
+        given += static_cast<std::size_t>(size);
         _listener.lineGave(std::span(_buffer).first(static_cast<std::size_t>(size)));
     }
     if (_muted || !_socket->isOpen()) return;

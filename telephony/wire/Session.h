@@ -73,6 +73,8 @@ public:
     void forgetTechnology();
 
     State state() const { return _state; }
+    /// Whether an answer is waited for.
+    bool isAsking() const { return _requester.isWaiting(); }
     /// Why the session ended by itself; empty when it did not.
     const std::string& failure() const { return _failure; }
     /// None: not known yet.

@@ -19,12 +19,14 @@ struct FakeLine final : ModemLine {
     std::string name() const override { return "line"; }
     void open() override { opened = true; }
     void send(ByteView frame) override { sent.emplace_back(frame.begin(), frame.end()); }
+    void mayGather(bool may) override { gathers = may; }
     void mute() override { muted = true; }
 
     Listener& listener;
     std::shared_ptr<int> count;  // a line may outlive its lines
     std::vector<Bytes> sent;
     bool opened = false;
+    bool gathers = false;
     bool muted = false;
 };
 

@@ -23,6 +23,22 @@ TEST_F(ModemSourceTest, OpensThePortForTheFirstClientOnly) {
     EXPECT_EQ(taken, std::vector<Bytes>{test::packetOf(0x51F4, 7)});
 }
 
+TEST_F(ModemSourceTest, LetsRecordsGatherAtThePortWhileNobodyWaitsForAnAnswer) {
+    stream({0x51F4});
+    lines->line->listener.lineOpened();
+    EXPECT_FALSE(lines->line->gathers);
+    queue.advance(200ms);
+    EXPECT_FALSE(lines->line->gathers);
+    answerRequests();
+    EXPECT_TRUE(lines->line->gathers);
+    stream({0x51F4, 0x51FF});  // a mask is asked for
+    EXPECT_FALSE(lines->line->gathers);
+    answerRequests();
+    EXPECT_TRUE(lines->line->gathers);
+    source->end([] {});
+    EXPECT_FALSE(lines->line->gathers);
+}
+
 TEST_F(ModemSourceTest, ReleasesThePortSixSecondsAfterTheLastClientHasLeft) {
     stream({0x51F4});
     answer();

@@ -61,6 +61,28 @@ TEST(SerialLine, CarriesEveryByteBothWays) {
     EXPECT_TRUE(heard.closed.empty());
 }
 
+TEST(SerialLine, GivesAllThatGathersAndAtOnceWhatIsWaitedFor) {
+    PseudoTerminal terminal;
+    Heard heard;
+    auto line = lineTo(terminal.path, heard);
+    (*line)->open();
+    for (const bool gathers : {true, false, true}) {
+        (*line)->mayGather(gathers);
+        heard.given.clear();
+        Bytes sent;
+        for (int piece = 0; piece < 20; ++piece) {
+            ASSERT_TRUE(terminal.write(kFrame));
+            sent.insert(sent.end(), kFrame.begin(), kFrame.end());
+            test::settle();
+        }
+        ASSERT_TRUE(runUntil([&] { return heard.given.size() >= sent.size(); }));
+        EXPECT_EQ(heard.given, sent);
+    }
+    ASSERT_TRUE(terminal.write(kFrame));  // into a rest, and the modem goes
+    terminal.modem.reset();
+    ASSERT_TRUE(runUntil([&] { return !heard.closed.empty(); }));
+}
+
 TEST(SerialLine, TellsOnceThatTheModemHasGone) {
     PseudoTerminal terminal;
     Heard heard;

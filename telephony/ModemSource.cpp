@@ -98,7 +98,11 @@ void ModemSource::lineClosed(const std::string& reason) {
     dropLine();
     if (_ending) return finish();
     if (!isNeeded()) return release();
-    tell((talked ? "the modem has gone: " : "it cannot be opened: ") + reason);
+    if (talked) {
+        tell("the modem has gone: " + reason);
+    } else if (_trouble.empty() || reason != kNobodyIsThere) {
+        tell("it cannot be opened: " + reason);
+    }
     retry();
 }
 

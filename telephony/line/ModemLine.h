@@ -7,6 +7,9 @@
 
 namespace kelvo {
 
+/// Why a line cannot be opened whose far end is not there: no news of a modem that has gone.
+inline constexpr const char* kNobodyIsThere = "nobody is there";
+
 /// A way to a modem's diagnostic port. Opened once; whoever wants to open it again makes another. Main queue only.
 class ModemLine {
 public:

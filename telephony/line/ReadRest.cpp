@@ -6,7 +6,7 @@ namespace kelvo {
 namespace {
 
 constexpr int kRestMs = 40;
-constexpr qint64 kOftenMs = 50;  // what comes more seldom wakes nobody up too often
+constexpr qint64 kOftenMs = 50;      // what comes more seldom wakes nobody up too often
 constexpr std::size_t kMuch = 4000;  // what a terminal holds: more waits already
 
 }  // namespace

@@ -128,6 +128,19 @@ TEST_F(ModemSourceTest, GoesOnByItselfWhenAModemThatHasGoneIsBack) {
     EXPECT_EQ(texts().back(), "line: the modem is back");
 }
 
+TEST_F(ModemSourceTest, TellsAModemThatHasGoneOnceAndWhatIsNewAboutIt) {
+    stream({0x51F4});
+    answer();
+    lines->line->listener.lineClosed("it hung up");
+    queue.advance(100ms);
+    lines->line->listener.lineClosed("nobody is there");
+    queue.advance(200ms);
+    EXPECT_EQ(source->state(), "the modem has gone: it hung up");
+    EXPECT_EQ(texts(), std::vector<std::string>{"the modem at line: the modem has gone: it hung up; trying again"});
+    lines->line->listener.lineClosed("Permission denied");
+    EXPECT_EQ(source->state(), "it cannot be opened: Permission denied");
+}
+
 TEST_F(ModemSourceTest, LeaksNothingWhenItIsUnpluggedAHundredTimes) {
     stream({0x51F4});
     for (int i = 0; i < 100; ++i) {

@@ -162,7 +162,27 @@ TEST(SocketLine, SaysWhyNobodyIsThere) {
         (*line)->open();
         ASSERT_TRUE(runUntil([&] { return !heard.closed.empty(); })) << address;
         EXPECT_EQ(heard.opened, 0);
-        EXPECT_EQ(heard.closed.size(), 1U);
+        EXPECT_EQ(heard.closed, std::vector<std::string>{"nobody is there"});
+    }
+}
+
+TEST(SocketLine, SaysInOneWayThatItWasHungUp) {
+    const test::TemporaryDirectory directory;
+    const std::string path = directory.path() / "router";
+    QLocalServer local;
+    ASSERT_TRUE(local.listen(QString::fromStdString(path)));
+    QTcpServer tcp;
+    ASSERT_TRUE(tcp.listen(QHostAddress::LocalHost));
+    for (const std::string& address : {"unix:" + path, "tcp:127.0.0.1:" + std::to_string(tcp.serverPort())}) {
+        Heard heard;
+        auto line = lineTo(address, heard);
+        (*line)->open();
+        ASSERT_TRUE(runUntil(
+            [&] { return heard.opened == 1 && (local.hasPendingConnections() || tcp.hasPendingConnections()); }));
+        if (QLocalSocket* modem = local.nextPendingConnection()) modem->disconnectFromServer();
+        if (QTcpSocket* modem = tcp.nextPendingConnection()) modem->disconnectFromHost();
+        ASSERT_TRUE(runUntil([&] { return !heard.closed.empty(); }));
+        EXPECT_EQ(heard.closed, std::vector<std::string>{"it hung up"});
     }
 }
 

@@ -48,6 +48,12 @@ std::string checkPortTechnology(const std::string& word) {
     return fmt::format("{} is none of gsm, cdma, lte, utran, auto", word);
 }
 
+simulation::Generation generationOf(Technology technology, const std::string& year) {
+    const auto generation = simulation::generationOf(technology, year);
+    if (!generation) throw CLI::ValidationError("--generation", generation.error().reason);
+    return *generation;
+}
+
 std::uint64_t seedOf(const std::string& text) {
     const auto seed = wholeNumber(text);
     if (!seed) throw CLI::ValidationError("--seed", seed.error().reason);
@@ -112,6 +118,11 @@ private:
             ->type_name("N")
             ->default_str(std::to_string(_options.seed))
             ->needs(_simulate);
+        _generation = _app.add_option("--generation", _year,
+                                      "The year of the simulated modem: newer ones word an LTE or GSM/UMTS drive in\n"
+                                      "newer layouts; otherwise 2010")
+                          ->type_name("2010|2014|2018")
+                          ->needs(_simulate);
         _app.add_option("--speed", _speed,
                         "So many times faster than it was, or \"max\": as fast as the quickest client reads")
             ->type_name("X|max")
@@ -161,12 +172,14 @@ private:
         if (_port->count() > 0) _options.port = portOf(_portName, _remote);
         if (_simulate->count() > 0)
             _options.simulate = *technologyBy(&TechnologyNames::word, std::string_view(_simulated));
+        if (_generation->count() > 0) _options.generation = generationOf(_options.simulate, _year);
         _options.session.technology = technologyBy(&TechnologyNames::word, std::string_view(_portTechnology));
         _options.speed = speedOf(_speed);
     }
 
     ServiceOptions _options;
     std::string _simulated;
+    std::string _year;
     std::string _speed = "1";
     std::string _portName;
     std::string _portTechnology = "auto";
@@ -177,6 +190,7 @@ private:
         "kelvo-telephonyd"};
     CLI::Option* _replay = nullptr;
     CLI::Option* _simulate = nullptr;
+    CLI::Option* _generation = nullptr;
     CLI::Option* _status = nullptr;
     CLI::Option* _port = nullptr;
 };

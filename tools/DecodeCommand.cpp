@@ -8,16 +8,19 @@
 #include <utility>
 
 #include "LogGenerator/Factory.h"
+#include "LogGenerator/RecordLedger.h"
 #include "model/Snapshot.h"
 #include "platform/host/Capture.h"
 #include "platform/system/Environment.h"
 #include "platform/system/OutputFile.h"
 #include "telephony/recordings/RecordingKind.h"
+#include "tools/Command.h"
 #include "tools/CommandFailure.h"
 #include "tools/DisplayJson.h"
 #include "tools/DisplayText.h"
 #include "tools/FamilyCodes.h"
 #include "tools/NumberOption.h"
+#include "tools/ProvenanceJson.h"
 #include "tools/StandardOutput.h"
 #include "tools/TechnologyOption.h"
 
@@ -32,6 +35,7 @@ struct Options {
     std::optional<std::string> save;
     bool log = false;
     bool json = false;
+    bool provenance = false;
     bool force = false;
 };
 
@@ -67,6 +71,8 @@ struct Decoded {
     std::size_t messages = 0;
     std::size_t understood = 0;  ///< of them: records of the family
     Value display;
+    RecordLedger records;
+    std::chrono::nanoseconds end{0};  ///< the last message's time
     std::optional<Failure> breakOff;  ///< where the capture can be read no further, and why
 };
 
@@ -87,6 +93,13 @@ void orTell(const Options& options, std::size_t packet, Work work) {
     }
 }
 
+void update(Decoded& decoded, LogGenerator& generator, Dictionary& state, ByteView message) {
+    if (decoded.records.isFull()) decoded.records.forgetAllBut(state["Display"]);
+    const ByteView packet = generator.takesPackets() ? RecordLedger::packetOf(message) : ByteView();
+    const RecordLedger::Counted counted(decoded.records, packet, decoded.end);
+    generator.updateState(state, message);
+}
+
 Decoded decodeAll(const Options& options, CaptureReader& reader, LogGenerator& generator, Dictionary& state) {
     const FamilyCodes codes(*generator.getStartCommand());
     Decoded decoded;
@@ -99,8 +112,9 @@ Decoded decodeAll(const Options& options, CaptureReader& reader, LogGenerator& g
         } else {
             ++decoded.messages;
             decoded.understood += codes.include((*packet)->bytes) ? 1 : 0;
+            decoded.end = (*packet)->time.time_since_epoch();
             orTell(options, decoded.messages, [&] {
-                generator.updateState(state, (*packet)->bytes);
+                update(decoded, generator, state, (*packet)->bytes);
                 if (options.refreshEvery && decoded.messages % *options.refreshEvery == 0) {
                     generator.generateLogUsingState(state);
                 }
@@ -162,7 +176,10 @@ void decode(const Options& options) {
 
     if (options.json) {
         nlohmann::ordered_json json = {
-            {"technology", names.name}, {"messages", decoded.messages}, {"display", jsonFrom(decoded.display)}};
+            {"technology", names.name},
+            {"messages", decoded.messages},
+            {"display", options.provenance ? jsonWithProvenance(decoded.display, decoded.records, decoded.end)
+                                           : jsonFrom(decoded.display)}};
         if (options.log) json["log"] = log.json();
         writeToStandardOutput(printedJson(json));
     } else {
@@ -175,7 +192,7 @@ void decode(const Options& options) {
 }  // namespace
 
 void addDecodeCommand(CLI::App& app) {
-    CLI::App& command = *app.add_subcommand("decode", "Shows what the messages of a capture give on the screens");
+    CLI::App& command = addCommand(app, "decode", "Shows what the messages of a capture give on the screens");
     const auto options = std::make_shared<Options>();
     command.add_option("FILE", options->file, "A classic pcap file, one log message a packet")->required();
     addTechnologyOption(command, options->technology, "Decodes as this technology, whatever the link type says");
@@ -186,8 +203,12 @@ void addDecodeCommand(CLI::App& app) {
             ->type_name("OUT.kelvo");
     command.add_flag("--force", options->force, "Replaces a file that is there already")->needs(save);
     command.add_flag("--log", options->log, "Shows the system log's lines as well, before the display");
-    command.add_flag("--json", options->json,
-                     "Prints one JSON object: technology, messages, display and, with --log, log");
+    CLI::Option* json = command.add_flag("--json", options->json,
+                                         "Prints one JSON object: technology, messages, display and, with --log, log");
+    command
+        .add_flag("--provenance", options->provenance,
+                  "Tells of every value its number and unit, the record that wrote it last, and its age")
+        ->needs(json);
     command.footer(
         "Of a capture that breaks off, the good part is shown; then one line tells where it ends, and the status is "
         "1.\n"
@@ -195,6 +216,7 @@ void addDecodeCommand(CLI::App& app) {
         "Examples:\n"
         "  kelvoctl decode drive.pcap\n"
         "  kelvoctl decode --json drive.pcap | jq .display\n"
+        "  kelvoctl decode --json --provenance drive.pcap | jq '.display.\"Serving Cell Measurements\"'\n"
         "  kelvoctl decode --log drive.pcap | grep '^\\[3\\]'\n"
         "  kelvoctl decode --refresh-every 50 --save drive.kelvo drive.pcap\n");
     command.callback([options] { decode(*options); });

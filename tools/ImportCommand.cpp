@@ -9,6 +9,7 @@
 #include "LogGenerator/Framing.h"
 #include "platform/host/Capture.h"
 #include "platform/system/Environment.h"
+#include "tools/Command.h"
 #include "tools/CommandFailure.h"
 #include "tools/DisplayJson.h"
 #include "tools/DisplayText.h"
@@ -128,7 +129,7 @@ struct Written {
     std::uint64_t records = 0;
     std::uint64_t turned = 0;
     std::uint64_t refused = 0;
-    std::uint64_t ofOthers = 0;  ///< another family's, another SIM's, outside the times
+    std::uint64_t ofOthers = 0;  ///< no code of Kelvo's, another family's, another SIM's, outside the times
 };
 
 Written writeCapture(const Options& options, const RecordSurvey& survey, Technology technology, CaptureWriter& writer) {
@@ -148,7 +149,8 @@ Written writeCapture(const Options& options, const RecordSurvey& survey, Technol
         adapted.packet = message;
         if (!next->isTree) adapted = adapter.adapt(stripPrefix(message));
         const bool refused = adapted.outcome == Adapted::Outcome::Refused;
-        if (!asked || (!refused && !codes.include(adapted.packet))) {
+        const bool ours = refused ? adapted.refusal != adaptation::Refusal::NotOurs : codes.include(adapted.packet);
+        if (!asked || !ours) {
             ++written.ofOthers;
             continue;
         }
@@ -190,8 +192,8 @@ void import(const Options& options) {
 }  // namespace
 
 void addImportCommand(CLI::App& app) {
-    CLI::App& command = *app.add_subcommand(
-        "import", "Makes a capture of recordings: streams of diagnostic frames, DLF files, captures, snapshots");
+    CLI::App& command = addCommand(
+        app, "import", "Makes a capture of recordings: streams of diagnostic frames, DLF files, captures, snapshots");
     const auto options = std::make_shared<Options>();
     command.add_option("FILE", options->files, "What to read, told by its content; packed with gzip or not")
         ->required();

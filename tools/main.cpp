@@ -10,6 +10,7 @@
 #include "tools/DecodeCommand.h"
 #include "tools/DisplayText.h"
 #include "tools/DoctorCommand.h"
+#include "tools/ExplainCommand.h"
 #include "tools/ImportCommand.h"
 #include "tools/SnapshotCommand.h"
 #include "tools/StartCommandCommand.h"
@@ -48,6 +49,7 @@ int main(int argc, char** argv) {
     kelvo::addImportCommand(app);
     kelvo::addStartCommandCommand(app);
     kelvo::addDoctorCommand(app);
+    kelvo::addExplainCommand(app);
     try {
         app.parse(argc, argv);
         return 0;

@@ -109,7 +109,20 @@ private:
                                  "A modem's diagnostic port: the node of one that is plugged in, a serial node or\n"
                                  "device, or the socket that a router on the phone offers")
                     ->type_name("auto|PATH|tcp:HOST:PORT|unix:PATH");
-        source->require_option(1);
+        _manager = source
+                       ->add_option("--modemmanager", _managedModem,
+                                    "What ModemManager knows of the phone: SIM, cells, data contexts, levels; alone, "
+                                    "or beside\n--port, which then measures. MODEM is an index, a path or an equipment "
+                                    "identity; the\nfirst without")
+                       ->type_name("[MODEM]")
+                       ->expected(0, 1);
+        source->require_option(1, 2);
+        for (auto* one : {_replay, _simulate, _status, _port}) {
+            for (auto* other : {_replay, _simulate, _status, _port}) {
+                if (one != other) one->excludes(other);
+            }
+            if (one != _port) _manager->excludes(one);
+        }
     }
     void addReplayAndSimulation() {
         _app.add_flag("--loop", _options.loop, "Start the capture again after its last packet")->needs(_replay);
@@ -129,6 +142,7 @@ private:
             ->check(checkSpeed)
             ->capture_default_str()
             ->excludes(_port)
+            ->excludes(_manager)
             ->excludes(_status);
     }
     void addRecordings() {
@@ -170,6 +184,7 @@ private:
         if (records && _options.record == _options.recordFrames)
             throw CLI::ValidationError("--record", "its file is that of --record-frames");
         if (_port->count() > 0) _options.port = portOf(_portName, _remote);
+        if (_manager->count() > 0) _options.modemManager = _managedModem;
         if (_simulate->count() > 0)
             _options.simulate = *technologyBy(&TechnologyNames::word, std::string_view(_simulated));
         if (_generation->count() > 0) _options.generation = generationOf(_options.simulate, _year);
@@ -182,6 +197,7 @@ private:
     std::string _year;
     std::string _speed = "1";
     std::string _portName;
+    std::string _managedModem;
     std::string _portTechnology = "auto";
     bool _remote = false;
     CLI::App _app{
@@ -193,6 +209,7 @@ private:
     CLI::Option* _generation = nullptr;
     CLI::Option* _status = nullptr;
     CLI::Option* _port = nullptr;
+    CLI::Option* _manager = nullptr;
 };
 
 }  // namespace

@@ -10,8 +10,8 @@
 namespace kelvo::check {
 
 constexpr void field(Raw raw, const Shown& shown) {
-    if (raw.lowBit + raw.bitWidth() > raw.bytes * 8) throw "the bits lie beyond the number";
-    if (raw.bitWidth() == 32 && !raw.isSigned && shown.saysNoSign()) throw "32 bits need a word on their sign";
+    if (raw.lowBit + raw.width > raw.bytes * 8) throw "the bits lie beyond the number";
+    if (raw.width == 32 && !raw.isSigned && shown.saysNoSign()) throw "32 bits must say whether they are signed";
 }
 
 /// `size` is that of the record or entry in which the fields lie.
@@ -20,7 +20,7 @@ constexpr void fields(std::size_t size, const Field (&fields)[N]) {
     for (std::size_t i = 0; i < N; ++i) {
         if (fields[i].at + fields[i].raw.bytes > size) throw "a field lies past the end";
         for (std::size_t j = 0; j < i; ++j) {
-            if (fields[i].key == fields[j].key) throw "a key stands twice";
+            if (fields[i].key == fields[j].key) throw "a key is used twice";
         }
     }
 }

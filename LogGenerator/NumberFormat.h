@@ -22,9 +22,8 @@ inline constexpr Unit inSeconds{"s",        " sec"};
 inline constexpr Unit pnOffset {"64 chips", " × 64chips"};  ///< in steps of 64 chips, 3GPP2 C.S0024
 // clang-format on
 
-/// How a number is written: a printf format with one conversion, taken apart at compile time ("%d", "%+d", "%u",
-/// "%06x",
-/// "%4.2f" and so on, with text around it), and the unit behind the number.
+/// How a number is written: a printf format with one conversion and text around it ("%d", "%+d", "%u", "%06x",
+/// "%4.2f"), taken apart at compile time, and the unit behind the number.
 struct NumberFormat {
     std::string_view before;
     std::string_view after;
@@ -52,11 +51,11 @@ struct NumberFormat {
         if (i < text.size() && text[i] == 'l') ++i;
         conversion = i < text.size() ? text[i] : '\0';
         if (conversion != 'd' && conversion != 'u' && conversion != 'x' && conversion != 'f') {
-            throw "a format that is not printed here";
+            throw "this conversion is not supported";
         }
-        if (zeros && conversion != 'x') throw "zeros before a sign are not printed here";
+        if (zeros && conversion != 'x') throw "leading zeros are supported for %x only";
         after = text.substr(i + 1);
-        if (after.find('%') != std::string_view::npos) throw "one conversion a format";
+        if (after.find('%') != std::string_view::npos) throw "a format has one conversion";
     }
 
     /// Makes `text` a whole number; 'u' and 'x' are for numbers that are not negative.

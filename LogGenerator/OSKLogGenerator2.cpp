@@ -72,7 +72,7 @@ void OSKLogGenerator2::updateWithData(ByteView data) {
         try {
             section->updateWithData(packet, code);
         } catch (const LogCode_0xFF0000::UnknownDataException&) {
-            // Contained here: the section has written its error line, the others go on and the record is kept.
+            // It ends here: the section has written its error line, the others go on and the record is kept.
         }
     }
 }

@@ -1,5 +1,6 @@
 #include "LogGenerator/Shown.h"
 
+#include <algorithm>
 #include <bit>
 #include <cmath>
 
@@ -26,17 +27,10 @@ struct Print {
     void operator()(const Shown::Flag& way) const { text.assign(raw != 0 ? way.nonZero : way.zero); }
     void operator()(const Shown::Name& way) const {
         const auto value = static_cast<std::uint32_t>(raw);
-        if (value < way.rows.size() && way.rows[value].raw == value) {  // a table without gaps
-            text.assign(way.rows[value].text);
-            return;
-        }
-        for (const ValueRow& row : way.rows) {
-            if (row.raw == value) {
-                text.assign(row.text);
-                return;
-            }
-        }
-        way.fallback.print(text, raw);
+        const bool isInPlace = value < way.rows.size() && way.rows[value].raw == value;  // a table without gaps
+        const auto row = isInPlace ? way.rows.begin() + value : std::ranges::find(way.rows, value, &ValueRow::raw);
+        if (row == way.rows.end()) return way.fallback.print(text, raw);
+        text.assign(row->text);
     }
 };
 

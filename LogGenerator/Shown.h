@@ -135,7 +135,7 @@ public:
     constexpr ShownReal(const char* format, Unit unit) : _format(format, unit) {}
 
     void print(std::string& text, std::int64_t raw) const override;
-    /// None for what is no number on the number line.
+    /// None for an infinity and for not-a-number.
     std::optional<Measurement> measure(std::int64_t raw) const override;
 
 private:

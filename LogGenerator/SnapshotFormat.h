@@ -3,8 +3,7 @@
 #include <string_view>
 
 /// What a snapshot file holds, for its writers and readers: one XML property list,
-///     { "Timestamp": when its screen was opened, in UTC, "Data": [ entry, … ], "Description": what the user says of it
-///     }
+///     { "Timestamp": when its screen was opened, in UTC, "Data": [ entry, … ], "Description": the user's words }
 /// An entry is one snapshot of the history, oldest first,
 ///     { "DisplayState": the raw records, or a cell monitor's tree, "Display": what the screens showed,
 ///       "ExtraInfo": dictionary, "Date": when, in local time, "Description": "Snapshot (<date>)" }

@@ -16,6 +16,7 @@
 #include <filesystem>
 #include <optional>
 
+#include "LogGenerator/Factory.h"
 #include "bench/Families.h"
 #include "model/KelvoModel.h"
 #include "platform/encodings/PropertyList.h"
@@ -24,6 +25,7 @@
 #include "platform/host/HostTelephonyClient.h"
 #include "platform/system/DirectoryResources.h"
 #include "platform/system/Environment.h"
+#include "platform/telephony/LogChannelProtocol.h"
 #include "telephony/TelephonyService.h"
 
 namespace {
@@ -147,10 +149,9 @@ int receive(const std::filesystem::path& directory, const Run& run, int number) 
         local->schedule();
         const auto connection = telephony.createServerConnection({});
         channel = ports.openRemote(connection->networkMonitorCreateLogChannel(name).portName);
-        const auto start = writeXmlPropertyList(
-            Dictionary::make({{"SetState", "Streaming"},
-                              {"SetOskraLogCodes", Array::make({0xB0C1, 0xB0C2, 0xB179, 0xB17F, 0xB180, 0xB186})}}));
-        if (!channel || !channel->request(0, *start, 1s, std::nullopt)) return 1;
+        const auto start =
+            writeXmlPropertyList(generatorFromTechnology(namesOf(Technology::LTE).identifier)->getStartCommand());
+        if (!channel || !channel->request(kPLLogChannelMessageId, *start, 1s, std::nullopt)) return 1;
     }
     const auto watch = queue.repeat(100ms, [&] {
         if (ports.isQuiet()) QCoreApplication::quit();

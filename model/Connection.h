@@ -33,9 +33,8 @@ struct Connection {
 /// minutes from two on): in place of rows while there are none, and beside the status else. Empty while records come.
 std::string connectionText(const Connection& connection);
 
-/// What a screen without any reading says in place of rows: the reason why there are none. As `connectionText`, but
-/// that a modem which keeps silent from the start is called so: the length of the silence stands beside the status.
-/// Never empty.
+/// What a screen without any reading says in place of rows: the reason why there are none. As `connectionText`, except
+/// for a modem that has been silent from the start, whose silence is told here without its length. Never empty.
 std::string waitingText(const Connection& connection);
 
 /// The status text of every screen: when its values are from, as `updateMessage` says, or that there is no connection.

@@ -216,10 +216,22 @@ NodeRef KelvoModel::nodeAtPath(const std::string& path) {
 }
 
 void KelvoModel::updateWithData(ByteView data) {
-    if (_logGenerator) _logGenerator->updateState(*_state, data);
+    const std::chrono::nanoseconds now = _services.queue.now();
+    if (_logGenerator) {
+        if (_records.isFull()) _records.forgetAllBut((*_state)["Display"]);
+        const ByteView packet = _logGenerator->takesPackets() ? RecordLedger::packetOf(data) : ByteView();
+        const RecordLedger::Counted counted(_records, packet, now);
+        _logGenerator->updateState(*_state, data);
+    }
     _updated = true;
     _receiving = true;
-    _silentSince = _services.queue.now();
+    _silentSince = now;
+}
+
+std::optional<Provenance> KelvoModel::provenance(const KelvoModelNode& node) const {
+    auto provenance = provenanceOf(node.record(), _records, _services.queue.now());
+    if (provenance && node.reading() != nullptr) provenance->place = node.reading()->place;
+    return provenance;
 }
 
 ArrayRef KelvoModel::getSaveContents() {

@@ -8,6 +8,7 @@
 #include "LogGenerator/LogGenerator.h"
 #include "model/Connection.h"
 #include "model/KelvoModelNode.h"
+#include "model/Provenance.h"
 #include "platform/encodings/PropertyList.h"
 #include "platform/system/Lifetime.h"
 #include "platform/system/MainQueue.h"
@@ -63,6 +64,11 @@ public:
     NodeRef topLevelNodes();
     /// The node at `path`, of a tree built as for `topLevelNodes`; none when the tree has no such node.
     NodeRef nodeAtPath(const std::string& path);
+    /// Where a node's value comes from; none when no record has written it, or another has written in its place since
+    /// the tree was built. Ages go on while no records come and when the connection is lost.
+    std::optional<Provenance> provenance(const KelvoModelNode& node) const;
+    /// The stream's time now: that of the records, going on by the clock behind the last one.
+    std::chrono::microseconds streamTime() const { return _records.streamTime(_services.queue.now()); }
     /// Hands one message of the log channel to the generator.
     void updateWithData(ByteView data);
     /// The contents of a snapshot file; none while there is no generator.
@@ -91,6 +97,7 @@ private:
 
     const Services _services;
     const DictionaryRef _state = Dictionary::make();                 // outlives every restart and every generator
+    RecordLedger _records;                                           // likewise: the display's values outlive them
     std::vector<std::unique_ptr<LogGenerator>> _replacedGenerators;  // none is released before the model goes
     std::unique_ptr<LogGenerator> _logGenerator;
     NodeRef _nodes;

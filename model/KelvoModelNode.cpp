@@ -29,12 +29,10 @@ std::string_view nameOfSortedKey(std::string_view key) {
 class TreeBuilder {
 public:
     NodeRef build(std::string name, const Value& object) {
-        if (const std::string* text = object.string()) {
-            return std::make_shared<KelvoModelLeafNode>(std::move(name), *text);
-        }
+        if (object.string() != nullptr) return std::make_shared<KelvoModelLeafNode>(std::move(name), object);
         const bool inner = object.dictionary() || object.array();
         if (!inner || _depth == KelvoModelNode::kMaxDepth) {
-            return std::make_shared<KelvoModelLeafNode>(std::move(name), "(unknown)");
+            return std::make_shared<KelvoModelLeafNode>(std::move(name), std::string("(unknown)"));
         }
         ++_depth;
         auto children = object.array() ? childrenOf(*object.array()) : childrenOf(*object.dictionary());

@@ -16,8 +16,8 @@ class RecordSink {
 public:
     virtual ~RecordSink() = default;
 
-    /// Takes one record, exactly as clients get it; false when no client wants it. `record` is
-    /// borrowed for the call. Never blocks.
+    /// Takes one record, exactly as clients get it; false when no client wants it. `record` is borrowed for the call.
+    /// Never blocks.
     virtual bool take(ByteView record) = 0;
     /// True while some client has read all it was given: a source without a clock of its own goes on only then.
     virtual bool isHungry() const = 0;

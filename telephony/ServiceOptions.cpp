@@ -43,6 +43,12 @@ PortAddress portOf(const std::string& text, bool remote) {
     return std::move(address).value();
 }
 
+simulation::Generation generationOf(Technology technology, const std::string& year) {
+    const auto generation = simulation::generationOf(technology, year);
+    if (!generation) throw CLI::ValidationError("--generation", generation.error().reason);
+    return *generation;
+}
+
 std::uint64_t seedOf(const std::string& text) {
     const auto seed = wholeNumber(text);
     if (!seed) throw CLI::ValidationError("--seed", seed.error().reason);
@@ -54,6 +60,7 @@ std::uint64_t seedOf(const std::string& text) {
 ParsedOptions parseServiceOptions(int argc, const char* const* argv) {
     ServiceOptions options;
     std::string word;
+    std::string year;
     std::string speed = "1";
     std::string port;
     std::string portTechnology = "auto";
@@ -91,6 +98,10 @@ ParsedOptions parseServiceOptions(int argc, const char* const* argv) {
                         "Which drive to simulate")
                      ->type_name("N")
                      ->default_str(std::to_string(options.seed));
+    auto* generation = app.add_option("--generation", year,
+                                      "The year of the simulated modem: newer ones word an LTE or GSM/UMTS drive in\n"
+                                      "newer layouts; otherwise 2010")
+                           ->type_name("2010|2014|2018");
     auto* pace = app.add_option("--speed", speed,
                                 "So many times faster than it was, or \"max\": as fast as the quickest client reads")
                      ->type_name("X|max")
@@ -121,6 +132,7 @@ ParsedOptions parseServiceOptions(int argc, const char* const* argv) {
     app.set_version_flag("--version", "kelvo-telephonyd " KELVO_VERSION);
     loop->needs(replay);
     seed->needs(simulate);
+    generation->needs(simulate);
     json->needs(status);
     for (auto* option : {technology, subscription, allowRemote, noLines, recordFrames}) option->needs(modem);
     pace->excludes(modem);
@@ -130,6 +142,8 @@ ParsedOptions parseServiceOptions(int argc, const char* const* argv) {
         if (options.force && options.record.empty() && options.recordFrames.empty())
             throw CLI::RequiresError("--force", "--record or --record-frames");
         if (modem->count() > 0) options.port = portOf(port, remote);
+        if (simulate->count() > 0) options.simulate = *technologyBy(&TechnologyNames::word, std::string_view(word));
+        if (generation->count() > 0) options.generation = generationOf(options.simulate, year);
     } catch (const CLI::CallForHelp&) {
         fmt::print("{}", app.help());
         return {std::nullopt, 0};
@@ -141,7 +155,6 @@ ParsedOptions parseServiceOptions(int argc, const char* const* argv) {
         return {std::nullopt, 1};
     }
     options.session.technology = technologyBy(&TechnologyNames::word, std::string_view(portTechnology));
-    if (simulate->count() > 0) options.simulate = *technologyBy(&TechnologyNames::word, std::string_view(word));
     options.speed = speedOf(speed);
     return {options, 0};
 }

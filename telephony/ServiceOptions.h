@@ -7,6 +7,7 @@
 #include "telephony/PacedSource.h"
 #include "telephony/line/PortAddress.h"
 #include "telephony/line/SerialLine.h"
+#include "telephony/simulation/Generation.h"
 #include "telephony/wire/Session.h"
 
 namespace kelvo {
@@ -19,6 +20,7 @@ struct ServiceOptions {
     bool loop = false;
     Technology simulate = Technology::LTE;
     std::uint64_t seed = 1;
+    simulation::Generation generation = simulation::Generation::Of2010;
     PacedSource::Speed speed = 1.0;
     std::optional<PortAddress> port;  ///< none: a capture or a simulation
     wire::Session::Options session;

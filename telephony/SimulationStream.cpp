@@ -6,11 +6,15 @@
 
 namespace kelvo {
 
-SimulationStream::SimulationStream(Technology technology, std::uint64_t seed)
-    : _seed(seed), _modem(simulation::makeSimulation(technology, seed)) {}
+using simulation::Generation;
+
+SimulationStream::SimulationStream(Technology technology, std::uint64_t seed, Generation generation)
+    : _seed(seed), _generation(generation), _modem(simulation::makeSimulation(technology, seed, generation)) {}
 
 std::string SimulationStream::description() const {
-    return fmt::format("a simulated {} modem, seed {}", namesOf(technology()).name, _seed);
+    const std::string year =
+        _generation == Generation::Of2010 ? std::string() : fmt::format(" of {}", simulation::yearOf(_generation));
+    return fmt::format("a simulated {} modem{}, seed {}", namesOf(technology()).name, year, _seed);
 }
 
 std::optional<CapturePacket> SimulationStream::next() {

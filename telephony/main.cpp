@@ -14,6 +14,7 @@
 #include "platform/host/UnixSignals.h"
 #include "platform/system/Environment.h"
 #include "platform/telephony/TelephonyProtocol.h"
+#include "telephony/AdaptedStream.h"
 #include "telephony/CaptureStream.h"
 #include "telephony/ModemSource.h"
 #include "telephony/ServiceOptions.h"
@@ -33,8 +34,13 @@ int fail(const Failure& failure) {
 }
 
 Result<std::unique_ptr<RecordStream>> openStream(const ServiceOptions& options) {
-    if (options.replay.empty())
-        return std::unique_ptr<RecordStream>(std::make_unique<SimulationStream>(options.simulate, options.seed));
+    if (options.replay.empty()) {
+        std::unique_ptr<RecordStream> modem =
+            std::make_unique<SimulationStream>(options.simulate, options.seed, options.generation);
+        if (options.generation != simulation::Generation::Of2010)
+            modem = std::make_unique<AdaptedStream>(std::move(modem));
+        return modem;
+    }
     auto capture = CaptureStream::open(options.replay, options.loop);
     if (!capture) return capture.error();
     return std::unique_ptr<RecordStream>(std::move(capture).value());

@@ -14,6 +14,7 @@
 #include "platform/system/OutputFile.h"
 #include "telephony/recordings/RecordingKind.h"
 #include "tools/CapturePackets.h"
+#include "tools/Command.h"
 #include "tools/DisplayJson.h"
 #include "tools/DisplayText.h"
 #include "tools/FamilyCodes.h"
@@ -172,7 +173,7 @@ void decode(const Options& options) {
 }  // namespace
 
 void addDecodeCommand(CLI::App& app) {
-    CLI::App& command = *app.add_subcommand("decode", "Shows what the messages of a capture give on the screens");
+    CLI::App& command = addCommand(app, "decode", "Shows what the messages of a capture give on the screens");
     const auto options = std::make_shared<Options>();
     command.add_option("FILE", options->file, "A classic pcap file, one log message a packet")->required();
     addTechnologyOption(command, options->technology, "Decodes as this technology, whatever the link type says");
@@ -183,8 +184,9 @@ void addDecodeCommand(CLI::App& app) {
             ->type_name("OUT.kelvo");
     command.add_flag("--force", options->force, "Replaces a file that is there already")->needs(save);
     command.add_flag("--log", options->log, "Shows the system log's lines as well, before the display");
-    command.add_flag("--overview", options->overview,
-                     "Shows what the values mean together instead: the serving cell, the cells around, what happened")
+    command
+        .add_flag("--overview", options->overview,
+                  "Shows what the values mean together instead: the serving cell, the cells around, what happened")
         ->excludes("--save", "--log", "--refresh-every");
     command.add_flag("--json", options->json,
                      "Prints one JSON object: technology, messages, display and, with --log, log");

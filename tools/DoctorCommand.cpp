@@ -3,6 +3,7 @@
 #include <QCoreApplication>
 #include <memory>
 
+#include "tools/Command.h"
 #include "tools/CommandFailure.h"
 #include "tools/DisplayJson.h"
 #include "tools/StandardOutput.h"
@@ -41,8 +42,8 @@ void examineSystem(const Options& options) {
 }  // namespace
 
 void addDoctorCommand(CLI::App& app) {
-    CLI::App& command = *app.add_subcommand(
-        "doctor", "Tells which port a modem is behind, what is in the way, and what to do next; changes nothing");
+    CLI::App& command = addCommand(
+        app, "doctor", "Tells which port a modem is behind, what is in the way, and what to do next; changes nothing");
     const auto options = std::make_shared<Options>();
     command
         .add_option("--port", options->port,

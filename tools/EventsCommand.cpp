@@ -10,6 +10,7 @@
 #include "platform/encodings/Utf8.h"
 #include "telephony/recordings/RecordingKind.h"
 #include "tools/CapturePackets.h"
+#include "tools/Command.h"
 #include "tools/FollowedCapture.h"
 #include "tools/OverviewJson.h"
 #include "tools/OverviewText.h"
@@ -72,8 +73,9 @@ void listEvents(const Options& options) {
 }  // namespace
 
 void addEventsCommand(CLI::App& app) {
-    CLI::App& command = *app.add_subcommand(
-        "events", "Lists what happened in captures: changes of cell, state, area and registration, contexts, service");
+    CLI::App& command =
+        addCommand(app, "events",
+                   "Lists what happened in captures: changes of cell, state, area and registration, contexts, service");
     const auto options = std::make_shared<Options>();
     command.add_option("FILE", options->files, "Classic pcap files, one log message a packet")->required();
     addTechnologyOption(command, options->technology, "Decodes as this technology, whatever the link type says");

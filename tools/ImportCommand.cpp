@@ -9,6 +9,7 @@
 #include "LogGenerator/Framing.h"
 #include "platform/host/Capture.h"
 #include "platform/system/Environment.h"
+#include "tools/Command.h"
 #include "tools/CommandFailure.h"
 #include "tools/DisplayJson.h"
 #include "tools/DisplayText.h"
@@ -190,8 +191,8 @@ void import(const Options& options) {
 }  // namespace
 
 void addImportCommand(CLI::App& app) {
-    CLI::App& command = *app.add_subcommand(
-        "import", "Makes a capture of recordings: streams of diagnostic frames, DLF files, captures, snapshots");
+    CLI::App& command = addCommand(
+        app, "import", "Makes a capture of recordings: streams of diagnostic frames, DLF files, captures, snapshots");
     const auto options = std::make_shared<Options>();
     command.add_option("FILE", options->files, "What to read, told by its content; packed with gzip or not")
         ->required();

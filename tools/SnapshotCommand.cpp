@@ -7,6 +7,7 @@
 #include <utility>
 
 #include "platform/system/OutputFile.h"
+#include "tools/Command.h"
 #include "tools/CommandFailure.h"
 #include "tools/DisplayJson.h"
 #include "tools/DisplayText.h"
@@ -96,8 +97,8 @@ void showSnapshot(const Options& options) {
 }  // namespace
 
 void addSnapshotCommand(CLI::App& app) {
-    CLI::App& command = *app.add_subcommand(
-        "snapshot", "Lists what a saved snapshot holds, shows its entries and extracts its records");
+    CLI::App& command =
+        addCommand(app, "snapshot", "Lists what a saved snapshot holds, shows its entries and extracts its records");
     const auto options = std::make_shared<Options>();
     command.add_option("FILE", options->file, "A snapshot file, KelvoSnapshot-….kelvo")->required();
     CLI::Option* entry =

@@ -6,6 +6,7 @@
 
 #include "LogGenerator/Factory.h"
 #include "platform/encodings/PropertyList.h"
+#include "tools/Command.h"
 #include "tools/CommandFailure.h"
 #include "tools/StandardOutput.h"
 #include "tools/TechnologyOption.h"
@@ -23,9 +24,9 @@ void printStartCommand(Technology technology) {
 }  // namespace
 
 void addStartCommandCommand(CLI::App& app) {
-    CLI::App& command = *app.add_subcommand(
-        "start-command",
-        "Prints the start command of a technology, the log codes it asks for, as an XML property list");
+    CLI::App& command =
+        addCommand(app, "start-command",
+                   "Prints the start command of a technology, the log codes it asks for, as an XML property list");
     const auto technology = std::make_shared<std::optional<Technology>>();
     addTechnologyOption(command, *technology, "The technology")->required();
     command.footer("Example:\n  kelvoctl start-command --technology lte\n");

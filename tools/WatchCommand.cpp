@@ -20,6 +20,7 @@
 #include "platform/host/HostTelephonyClient.h"
 #include "platform/host/UnixSignals.h"
 #include "platform/system/Environment.h"
+#include "tools/Command.h"
 #include "tools/DisplayText.h"
 #include "tools/RetryLog.h"
 #include "tools/WatchView.h"
@@ -157,7 +158,7 @@ void watch() {
 }  // namespace
 
 void addWatchCommand(CLI::App& app) {
-    CLI::App& command = *app.add_subcommand("watch", "Shows the live screens, refreshed every two seconds");
+    CLI::App& command = addCommand(app, "watch", "Shows the live screens, refreshed every two seconds");
     command.footer(
         "On a terminal: arrows, PageUp, PageDown, Home and End scroll, q quits. What does not fit ends with \"…\"; "
         "Left\n"

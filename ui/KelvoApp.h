@@ -65,8 +65,8 @@ public:
     void updateStatusForViewController(KelvoPaneController& pane);
     /// Reloads every pane from the model, bottom first; a pane whose path is gone takes itself and all above with it.
     void updateViewControllerFromModel();
-    /// A lost connection is told even when nothing new has come, and so are records that stay away: screens with values
-    /// must not pass for current.
+    /// Tells every pane of a lost connection, and of records that stay away, even when nothing new has come: old values
+    /// must not pass for current ones.
     void connectionChanged();
     void willShowViewController(KelvoPaneController& pane, bool animated) override;
 

@@ -45,8 +45,8 @@ void KelvoPaneController::setTitle() {
 // More are beyond what a modem reports and would hold the window up: such lists begin anew.
 constexpr std::size_t kMostComparisons = 4'000'000;
 
-// Only what differs is told: rows that stay keep their place, their highlight and the finger on them. Children that
-// swapped places are taken out and put in again.
+// The view is told of differences only: rows that stay keep their place, their highlight and the finger on them.
+// Children that swapped places are taken out and put in again.
 void KelvoPaneController::reloadData(const std::vector<Row>& rows) {
     const auto same = [](const Row& row, const Row& other) { return row.isSameChild(other); };
     const bool differs = !std::ranges::equal(_rows, rows, same);

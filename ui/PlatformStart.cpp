@@ -39,7 +39,7 @@ void PlatformStart::fail(const QString& reason) {
     const QString told = reasons.isEmpty() ? reason.simplified() : reasons.join(QStringLiteral("; "));
     fmt::print(stderr, "kelvo: no window can be opened: {}\n", told.toStdString());
     std::fflush(stderr);
-    std::_Exit(EXIT_FAILURE);  // as the abort would, but for the status: half a platform is not fit to be taken down
+    std::_Exit(EXIT_FAILURE);  // as the abort would, but for the status: a half-started platform cannot be taken down
 }
 
 }  // namespace kelvo

@@ -19,7 +19,7 @@ struct Scale {
     double decibels(std::int64_t energy) const {
         const double total = 9 * normaliser * normaliser * factor;
         const double ratio = std::ldexp(static_cast<double>(energy), 2 * exponent - 3) / total - 1 / normaliser;
-        return 10 * std::log10(std::fmax(ratio, 0.00001));  // fmax prefers a number to what is none
+        return 10 * std::log10(std::fmax(ratio, 0.00001));  // of a number and a NaN, fmax takes the number
     }
 };
 

@@ -11,8 +11,8 @@
 /// pair with a "2". The first record of a link primes them and shows "".
 ///
 /// The sequence number wraps around; a record whose number has not grown leaves the rate shown, and takes part in the
-/// next one. A total that has shrunk, as after a restart of the counters alone, gives a negative rate: plainly no
-/// reading, and gone with the next record.
+/// next one. A total that has shrunk, as after a restart of the counters alone, gives a negative rate, which is
+/// plainly wrong and replaced by the next record.
 namespace kelvo {
 
 /// 0x1192: the forward link.

@@ -19,9 +19,9 @@ public:
     Value generateLogUsingState(Dictionary& state) override;
     DictionaryRef getStartCommand() override;
 
-    /// Decodes one message and keeps its packet for the raw log, also when its decoder refuses it. Messages that are
-    /// no packet leave no trace, and codes that were not asked for none but the line that tells of a wrong log type. A
-    /// null lookup shows nothing.
+    /// Decodes one message and keeps its packet for the raw log, also when its decoder refuses it. A message that is
+    /// no packet is ignored, and so is a code that was not asked for, but for the line about a wrong log type. With a
+    /// null lookup nothing is shown.
     void updateFromLog(ByteView data, const DictionaryRef& usingLookup, Dictionary& usingState);
 
     /// Fills `storeDisplayIntoDict` with the template's screens, every value still "", and `storeLookupIntoDict` with

@@ -13,7 +13,7 @@ void C2KPilotList::add(std::size_t position, std::int64_t pn, double level, cons
 }
 
 Value C2KPilotList::rowsOrNone() const {
-    if (_rows->size() == 1) return "(none)";  // the mark of the key order alone
+    if (_rows->size() == 1) return "(none)";  // nothing but the mark of the key order
     return _rows;
 }
 

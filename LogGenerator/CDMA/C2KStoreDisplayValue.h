@@ -6,7 +6,7 @@
 #include "LogGenerator/ShowFields.h"
 #include "platform/values/Dictionary.h"
 
-/// The road from a decoder to the screens. A lookup maps lookup keys to arrays of bindings; a binding is a dictionary
+/// How a decoded value reaches the screens. A lookup maps lookup keys to arrays of bindings; a binding is a dictionary
 /// with "dict", the live display dictionary itself, and "key", the display key in it. A null lookup shows nothing.
 namespace kelvo {
 

@@ -42,7 +42,7 @@ constexpr auto kNoIds = record(code::kCDMASystem, kMinimum, {
     {  46, i32, "kSystemId",         kUnknownSystem           },
     {  46, i32, "kNetworkId",        kUnknownSystem           },
 });
-constexpr auto kStation = record(code::kCDMASystem, kMinimum + 15, {  // intended: the base station lies past what a record must have
+constexpr auto kStation = record(code::kCDMASystem, kMinimum + 15, {  // intended: the base station lies past the least length of a record
     { 131, u8,  "kPacketZoneId",     decimal                  },
     { 184, u16, "kBaseId",           decimal                  },
     { 133, u8,  "kProtocolRevision", decimal                  },

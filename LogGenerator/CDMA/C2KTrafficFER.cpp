@@ -22,7 +22,7 @@ float filtered(bool erased, const Number* previous) {
     return rate;
 }
 
-/// The percentage is for the eye alone: it is multiplied in double precision, in which it is printed anyway.
+/// The percentage is only shown: it is computed in double precision, in which it is printed anyway.
 void show(const ShownReal& quantity, double rate, const DictionaryRef& lookup) {
     Value shown;
     showReal(shown, 100 * rate, quantity);

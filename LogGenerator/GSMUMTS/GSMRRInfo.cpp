@@ -9,7 +9,7 @@ namespace kelvo {
 namespace {
 
 // clang-format off
-constexpr ValueTable kStates({  // the blanks within 13, 19 and 21 are meant to be there
+constexpr ValueTable kStates({  // the blanks within 13, 19 and 21 are intended
     {  0, "RR_INACTIVE"                          },
     {  1, "RR_GOING_ACTIVE"                      },
     {  2, "RR_GOING_INACTIVE"                    },

@@ -29,7 +29,7 @@ inline constexpr KnownCode kGPRSNetworkControl    {0x51F5, "GPRS network control
 inline constexpr KnownCode kGPRSCellOptions       {0x51F6, "GPRS cell options",                   "3GPP TS 44.060, 12.24"};
 inline constexpr KnownCode kMobileAllocation      {0x51F8, "GSM mobile allocation",               "3GPP TS 44.018, 10.5.2.21"};
 inline constexpr KnownCode kGPRSBroadcastChannel  {0x51FB, "GPRS packet broadcast channel",       "3GPP TS 45.002, 3.3"};
-/// Newer modems' in place of kGSMReselection; no section shows it.
+/// Newer modems send it in place of kGSMReselection; no section shows it.
 inline constexpr KnownCode kGPRSReselection       {0x51FC, "GPRS cell reselection",               "3GPP TS 45.008, 10.1"};
 inline constexpr KnownCode kGPRSSystemInformation {0x51FD, "GPRS packet system information",      "3GPP TS 44.060, 11.2"};
 inline constexpr KnownCode kGSMNeighborIdentities {0x51FF, "GSM neighbor cells, BSIC",            "3GPP TS 45.008, 7.2"};

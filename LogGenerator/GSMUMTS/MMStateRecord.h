@@ -10,7 +10,7 @@ struct MMStateRecord {
     static constexpr std::size_t kMinimum = 16;
 
     // clang-format off
-    /// 1, 2, 4, 11, 12, 16 and 24 have no name; the blanks within 20 and 21 are meant to be there.
+    /// 1, 2, 4, 11, 12, 16 and 24 have no name; the blanks within 20 and 21 are intended.
     static constexpr auto kStates = ValueTable({
         {  0, "MM_NULL"                                        },
         {  3, "MM_LOCATION_UPDATE_INITIATED"                   },

@@ -24,7 +24,7 @@ void NeighboringCells::updateWithData(ByteView data, LogCode logCode) {
     switch (logCode) {
         case code::kGSMReselection: showMeasurements(data); break;
         case code::kGSMNeighborIdentities: keepIdentities(data); break;
-        case code::kCellArray: showCellArray(data); break;
+        case code::kCellArray: showNeighbors(list(), data, kPLCellMonitorRadioAccessTechnologyGSM, kNeighbor); break;
         default: reportUnknown(logCode);
     }
 }
@@ -51,10 +51,6 @@ void NeighboringCells::showMeasurements(ByteView data) {
         const auto bsic = arfcnToBsic.find(record.read(entries.offsetOf(i), u16));
         if (bsic != arfcnToBsic.end()) showValue(cell.next("BSIC"), bsic->second, decimal);
     }
-}
-
-void NeighboringCells::showCellArray(ByteView data) {
-    showNeighbors(list(), data, kPLCellMonitorRadioAccessTechnologyGSM, kNeighbor);
 }
 
 }  // namespace kelvo

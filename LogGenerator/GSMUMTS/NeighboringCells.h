@@ -20,7 +20,6 @@ public:
 private:
     void showMeasurements(ByteView data);
     void keepIdentities(ByteView data);
-    void showCellArray(ByteView data);
 
     std::unordered_map<std::int64_t, std::int64_t> arfcnToBsic;  ///< of the last record with identities
 };

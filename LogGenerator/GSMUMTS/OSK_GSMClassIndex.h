@@ -27,13 +27,14 @@
 #include "LogGenerator/GSMUMTS/VirtualActiveSet.h"
 #include "LogGenerator/PhoneServices/PDPContextList.h"
 #include "LogGenerator/PhoneServices/SimInfo.h"
+#include "platform/system/Environment.h"
 
 namespace kelvo {
 
 /// The GSM/UMTS sections. Those that share a log code see a record in the order of the members.
 class OSK_GSMClassIndex final : public ClassIndex {
 public:
-    ~OSK_GSMClassIndex() override;
+    ~OSK_GSMClassIndex() override { printLine("Deallocing OSK_GSMClassIndex"); }
 
 private:
     ActiveSet objActiveSet{classDict, codeDictionary};

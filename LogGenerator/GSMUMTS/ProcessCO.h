@@ -1,20 +1,18 @@
 #pragma once
 
-#include "LogGenerator/GSMUMTS/GSMUMTSCodes.h"
 #include "LogGenerator/GSMUMTS/MMStateRecord.h"
-#include "LogGenerator/GSMUMTS/ProcessSection.h"
+#include "LogGenerator/GSMUMTS/RegistrationRecord.h"
+#include "LogGenerator/LayoutSection.h"
 
 namespace kelvo {
 
 /// Mobility management in short: the circuit-switched state and the registration state.
-class ProcessCO final : public ProcessSection<ProcessCO> {
+class ProcessCO final : public LayoutSection<ProcessCO, MMStateRecord::kState, RegistrationRecord::kState> {
 public:
     static constexpr std::string_view kSectionName = "Process CO";
     static constexpr std::string_view kTraceWord = "ProcessCS";  // ProcessCS's word, on purpose
-    static constexpr LogCode kLogCodes[] = {code::kMMState, code::kRegistration};
-    static constexpr const auto& kState = MMStateRecord::kState;
 
-    using ProcessSection::ProcessSection;
+    using LayoutSection::LayoutSection;
 };
 
 }  // namespace kelvo

@@ -1,17 +1,13 @@
 #pragma once
 
 #include "LogGenerator/GSMUMTS/GSMUMTSCodes.h"
-#include "LogGenerator/GSMUMTS/ProcessSection.h"
+#include "LogGenerator/GSMUMTS/RegistrationRecord.h"
+#include "LogGenerator/LayoutSection.h"
 
 namespace kelvo {
 
-/// Packet-switched mobility management, GMM (3GPP TS 24.008). Its states stand under the circuit-switched keys.
-class ProcessPS final : public ProcessSection<ProcessPS> {
-public:
-    static constexpr std::string_view kSectionName = "Process PS";
-    static constexpr std::string_view kTraceWord = "ProcessPS";
-    static constexpr LogCode kLogCodes[] = {code::kGMMState, code::kRegistration};
-
+/// 0x7130: packet-switched mobility management, as the modem numbers its states.
+struct GMMStateRecord {
     // clang-format off
     static constexpr auto kStates = ValueTable({
         { 0, "GMM_NULL"                          },
@@ -46,14 +42,21 @@ public:
         { 3, "GMM_GU3_ROUTING_AREA_NOT_ALLOWED" },
     }, "Unknown");
 
-    static constexpr auto kState = record(code::kGMMState, 16, {
+    static constexpr auto kWhole = record(code::kGMMState, 16, {
         { 13, u8, "MM State",            label(kStates)       },
         { 14, u8, "MM Sub State",        label(kSubStates)    },
         { 15, u8, "Attach Reject Cause", label(kUpdateStatus) },
     });
     // clang-format on
+};
 
-    using ProcessSection::ProcessSection;
+/// Packet-switched mobility management, GMM (3GPP TS 24.008). Its states stand under the circuit-switched keys.
+class ProcessPS final : public LayoutSection<ProcessPS, GMMStateRecord::kWhole, RegistrationRecord::kState> {
+public:
+    static constexpr std::string_view kSectionName = "Process PS";
+    static constexpr std::string_view kTraceWord = "ProcessPS";
+
+    using LayoutSection::LayoutSection;
 };
 
 }  // namespace kelvo

@@ -24,7 +24,7 @@ void UMTSSet::updateWithData(ByteView data, LogCode logCode) {
     logLine(Level::Warning, "UMTSSet");
     switch (logCode) {
         case code::kNeighborRanking: showRanking(data); break;
-        case code::kCellArray: showCellArray(data); break;
+        case code::kCellArray: showNeighbors(list(), data, kPLCellMonitorRadioAccessTechnologyUMTS, kNeighbor); break;
         default: reportUnknown(logCode);
     }
 }
@@ -33,10 +33,6 @@ void UMTSSet::showRanking(ByteView data) {
     using Layout = NeighborRankingRecord;
     if (data.size() < Layout::kMinimum) return;
     showRows(list(), data, Layout::umtsCells(RecordView(data)), Layout::kUMTSCell.fields);
-}
-
-void UMTSSet::showCellArray(ByteView data) {
-    showNeighbors(list(), data, kPLCellMonitorRadioAccessTechnologyUMTS, kNeighbor);
 }
 
 }  // namespace kelvo

@@ -17,7 +17,6 @@ public:
 
 private:
     void showRanking(ByteView data);
-    void showCellArray(ByteView data);
 };
 
 }  // namespace kelvo

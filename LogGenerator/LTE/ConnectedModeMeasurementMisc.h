@@ -1,18 +1,18 @@
 #pragma once
 
-#include "LogGenerator/Base.h"
-#include "LogGenerator/LTE/LTECodes.h"
+#include "LogGenerator/LTE/IntraFrequencyRecord.h"
+#include "LogGenerator/LayoutSection.h"
 
 namespace kelvo {
 
 /// The serving cell's filtered power and quality in connected mode.
-class ConnectedModeMeasurementMisc final : public Section<ConnectedModeMeasurementMisc> {
+class ConnectedModeMeasurementMisc final
+    : public LayoutSection<ConnectedModeMeasurementMisc, IntraFrequencyRecord::kServingCell> {
 public:
     static constexpr std::string_view kSectionName = "Connected mode LTE Intra-frequency Measurement";
-    static constexpr LogCode kLogCodes[] = {code::kLTEIntraFrequency};
+    static constexpr std::string_view kTraceWord = kSectionName;
 
-    using Section::Section;
-    void updateWithData(ByteView data, LogCode logCode) override;
+    using LayoutSection::LayoutSection;
 };
 
 }  // namespace kelvo

@@ -12,13 +12,14 @@
 #include "LogGenerator/LTE/ServingCellMeasurement.h"
 #include "LogGenerator/PhoneServices/PDPContextList.h"
 #include "LogGenerator/PhoneServices/SimInfo.h"
+#include "platform/system/Environment.h"
 
 namespace kelvo {
 
 /// The LTE sections. Those that share a log code see a record in the order of the members.
 class LTEClassIndex final : public ClassIndex {
 public:
-    ~LTEClassIndex() override;
+    ~LTEClassIndex() override { printLine("Deallocing LTEClassIndex"); }
 
 private:
     LTEServingCellInfo objLTEServingCellInfo{classDict, codeDictionary};

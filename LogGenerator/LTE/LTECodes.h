@@ -14,7 +14,7 @@ inline constexpr KnownCode kLTEIntraFrequency        {0xB179, "LTE intra-frequen
 inline constexpr KnownCode kLTEServingCellIdle       {0xB17F, "LTE serving cell, idle",             "3GPP TS 36.304, 5.2.3"};
 inline constexpr KnownCode kLTENeighborCellsIdle     {0xB180, "LTE neighbor cells, idle",           "3GPP TS 36.304, 5.2.4"};
 inline constexpr KnownCode kLTEReselectionCandidates {0xB186, "LTE reselection candidates",         "3GPP TS 36.304, 5.2.4"};
-/// Newer modems' in place of kLTEServingCellIdle; no section shows it.
+/// Newer modems send it in place of kLTEServingCellIdle; no section shows it.
 inline constexpr KnownCode kLTEServingCellEveryMode  {0xB193, "LTE serving cell, every mode",       "3GPP TS 36.214, 5.1"};
 
 inline constexpr std::array kLTE = {

@@ -1,18 +1,17 @@
 #pragma once
 
-#include "LogGenerator/Base.h"
-#include "LogGenerator/LTE/LTECodes.h"
+#include "LogGenerator/LTE/IdleNeighborsRecord.h"
+#include "LogGenerator/LayoutSection.h"
 
 namespace kelvo {
 
 /// What the idle-mode neighbor measurements have in common; the cells are NeighborCellsList's.
-class NeighborMeasurementMisc final : public Section<NeighborMeasurementMisc> {
+class NeighborMeasurementMisc final : public LayoutSection<NeighborMeasurementMisc, IdleNeighborsRecord::kFrequency> {
 public:
     static constexpr std::string_view kSectionName = "Neighbor Measurements";
-    static constexpr LogCode kLogCodes[] = {code::kLTENeighborCellsIdle};
+    static constexpr std::string_view kTraceWord = kSectionName;
 
-    using Section::Section;
-    void updateWithData(ByteView data, LogCode logCode) override;
+    using LayoutSection::LayoutSection;
 };
 
 }  // namespace kelvo

@@ -1,18 +1,18 @@
 #pragma once
 
-#include "LogGenerator/Base.h"
-#include "LogGenerator/LTE/LTECodes.h"
+#include "LogGenerator/LTE/ReselectionCandidatesRecord.h"
+#include "LogGenerator/LayoutSection.h"
 
 namespace kelvo {
 
 /// The cell that the reselection candidates would replace; the candidates are ReselectionCandidatesList's.
-class ReselectionCandidatesMisc final : public Section<ReselectionCandidatesMisc> {
+class ReselectionCandidatesMisc final
+    : public LayoutSection<ReselectionCandidatesMisc, ReselectionCandidatesRecord::kServingCell> {
 public:
     static constexpr std::string_view kSectionName = "Reselection Candidates";
-    static constexpr LogCode kLogCodes[] = {code::kLTEReselectionCandidates};
+    static constexpr std::string_view kTraceWord = kSectionName;
 
-    using Section::Section;
-    void updateWithData(ByteView data, LogCode logCode) override;
+    using LayoutSection::LayoutSection;
 };
 
 }  // namespace kelvo

@@ -58,7 +58,7 @@ const Dictionary* firstCell(const Array& cells, std::string_view technology, std
     return nullptr;
 }
 
-/// The values of a cell, each with its field; what is no 32-bit integer has its line on the log instead.
+/// The values of a cell, each with its field; a value that is no 32-bit integer is reported on the log instead.
 template <class Show>
 void eachValue(const Dictionary& cell, std::span<const CellField> fields, Show show) {
     for (const CellField& field : fields) {

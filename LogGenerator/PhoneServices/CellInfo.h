@@ -35,7 +35,7 @@ struct CellField {
 };
 
 /// Shows each field in order; one that fails leaves its display key as it was. With a null `shown` the failures are
-/// told all the same. The fields are static data.
+/// logged all the same. The fields are static data.
 void showCell(const DictionaryRef& shown, const Dictionary& cell, std::span<const CellField> fields);
 
 /// Shows the first serving cell of `technology` in a packet's cell-information array; without one nothing changes.

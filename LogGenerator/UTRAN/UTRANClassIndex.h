@@ -9,13 +9,14 @@
 #include "LogGenerator/UTRAN/TRCHBLERMeasurement.h"
 #include "LogGenerator/UTRAN/UTRANNeighbhorMeasurements.h"
 #include "LogGenerator/UTRAN/UTRANServingCellInfo.h"
+#include "platform/system/Environment.h"
 
 namespace kelvo {
 
 /// The UTRAN sections. Those that share a log code see a record in the order of the members.
 class UTRANClassIndex final : public ClassIndex {
 public:
-    ~UTRANClassIndex() override;
+    ~UTRANClassIndex() override { printLine("Deallocing UTRANClassIndex"); }
 
 private:
     RRC_State rrc_state{classDict, codeDictionary};

@@ -7,8 +7,7 @@
 namespace kelvo {
 
 /// The generator of UTRAN modems: the sections of UTRANClassIndex fill the first template among the resources whose
-/// name contains "UTRAN" in any case. Without such a template it stays half built: nothing
-/// is logged, and it decodes nothing.
+/// name contains "UTRAN" in any case. Without such a template it stays half built: it logs nothing and decodes nothing.
 class UTRANLogGenerator final : public OSKLogGenerator2 {
 public:
     UTRANLogGenerator();

@@ -12,7 +12,7 @@ void HostLocalPort::invalidate() {
     if (!isValid()) return;
     _server->close();
     const auto callback = std::exchange(_invalidationCallback, nullptr);
-    if (callback) callback(*this);  // the last word: it may destroy the port
+    if (callback) callback(*this);  // last of all: it may destroy the port
 }
 
 }  // namespace kelvo

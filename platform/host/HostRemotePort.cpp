@@ -85,7 +85,7 @@ void HostRemotePort::invalidate() {
     _writable.reset();
     _connection.reset();
     const auto callback = std::exchange(_invalidationCallback, nullptr);
-    if (callback) callback(*this);  // the last word: it may destroy the port
+    if (callback) callback(*this);  // last of all: it may destroy the port
 }
 
 void HostRemotePort::setInvalidationCallback(std::function<void(RemotePort&)> callback) {

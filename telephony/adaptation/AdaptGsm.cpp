@@ -13,15 +13,13 @@ namespace {
 /// The generations of 0x4005: where the list of UMTS cells starts, which the list of GSM cells follows.
 struct RankingLayout {
     std::size_t start;
-    std::size_t umtsSize;
-    std::span<const Move> umts;
-    std::size_t gsmSize;
-    std::span<const Move> gsm;
+    Turning umts;
+    Turning gsm;
 };
 constexpr std::array<RankingLayout, 3> kRankings = {{
-    {2, kRankedUmtsCellV0.size, kRankedUmtsCellV0.moves, kRankedGsmCellV0.size, kRankedGsmCellV0.moves},
-    {2, kRankedUmtsCellV1.size, kRankedUmtsCellV1.moves, kRankedGsmCellV1.size, kRankedGsmCellV1.moves},
-    {7, kRankedUmtsCellV2.size, kRankedUmtsCellV2.moves, kRankedGsmCellV2.size, kRankedGsmCellV2.moves},
+    {2, turning<kRankedUmtsCellV0>, turning<kRankedGsmCellV0>},
+    {2, turning<kRankedUmtsCellV1>, turning<kRankedGsmCellV1>},
+    {7, turning<kRankedUmtsCellV2>, turning<kRankedGsmCellV2>},
 }};
 constexpr std::size_t kRankingListsAt = 2;  // in the fixed layout
 
@@ -40,8 +38,8 @@ std::optional<Refusal> RecordAdapter::adaptRanking(ByteView payload) {
     const RankingLayout& layout = kRankings[version];
     const auto umtsCells = static_cast<std::size_t>(record.read(0, u8.bits(0, 5)));
     const auto gsmCells = static_cast<std::size_t>(record.read(1, u8.bits(0, 5)));
-    const std::size_t gsmAt = layout.start + umtsCells * layout.umtsSize;
-    if (payload.size() != gsmAt + gsmCells * layout.gsmSize) return Refusal::NotKnown;
+    const std::size_t gsmAt = layout.start + umtsCells * layout.umts.size;
+    if (payload.size() != gsmAt + gsmCells * layout.gsm.size) return Refusal::NotKnown;
     const bool isFixed = version == 0 && (umtsCells == 0 || gsmCells == 0) && record.read(1, u8) < 64;
     if (isFixed) return passes(), std::nullopt;
 
@@ -53,10 +51,9 @@ std::optional<Refusal> RecordAdapter::adaptRanking(ByteView payload) {
     std::fill_n(payloadMade(), size, std::uint8_t{0});
     payloadMade()[umts ? 0 : 1] = static_cast<std::uint8_t>(count);
     for (std::size_t i = 0; i < count; ++i) {
-        const std::size_t at = umts ? layout.start + i * layout.umtsSize : gsmAt + i * layout.gsmSize;
-        if (!carryOut(umts ? layout.umts : layout.gsm, record, at, payloadMade() + kRankingListsAt + i * fixedSize)) {
-            return Refusal::DoesNotFit;
-        }
+        const std::size_t at = umts ? layout.start + i * layout.umts.size : gsmAt + i * layout.gsm.size;
+        std::uint8_t* cell = payloadMade() + kRankingListsAt + i * fixedSize;
+        if (!(umts ? layout.umts : layout.gsm).carryOut(payload.subspan(at), cell)) return Refusal::DoesNotFit;
     }
     _result.leftOut = umts ? static_cast<int>(gsmCells) : 0;
     return turned(size, _result.kind.code);
@@ -78,10 +75,10 @@ std::optional<Refusal> RecordAdapter::adaptCells(ByteView payload) {
     }
     const std::size_t size = kCells.size + count * kNeighborCell.size;
     std::fill_n(payloadMade(), size, std::uint8_t{0});
-    bool fits = carryOut(kExtendedCells.moves, record, 0, payloadMade());
+    bool fits = carryOut<kExtendedCells>(payload, payloadMade());
     for (std::size_t i = 0; i < count; ++i) {
-        fits &= carryOut(kExtendedNeighborCell.moves, record, kExtendedCells.size + i * kExtendedNeighborCell.size,
-                         payloadMade() + kCells.size + i * kNeighborCell.size);
+        fits &= carryOut<kExtendedNeighborCell>(payload.subspan(kExtendedCells.size + i * kExtendedNeighborCell.size),
+                                                payloadMade() + kCells.size + i * kNeighborCell.size);
     }
     if (!fits) return Refusal::DoesNotFit;
     return turned(size, 0x5137);

@@ -13,13 +13,13 @@ std::optional<Refusal> RecordAdapter::adaptMasterInformation(ByteView payload) {
     _result.kind.version = version;
     if (version == 1 && payload.size() == kMasterInformation.size) return passes(), std::nullopt;
     if (version == 2 && payload.size() == kMasterInformationV2.size) {
-        return turn(kMasterInformationV2.moves, payload, kMasterInformation.size);
+        return turn(turning<kMasterInformationV2>, payload, kMasterInformation.size);
     }
     if (version == 3 && payload.size() == kMasterInformationV3.size) {
-        return turn(kMasterInformationV3.moves, payload, kMasterInformation.size);
+        return turn(turning<kMasterInformationV3>, payload, kMasterInformation.size);
     }
     if (version == 17 && payload.size() == kMasterInformationV17.size) {
-        return turn(kMasterInformationV17.moves, payload, kMasterInformation.size);
+        return turn(turning<kMasterInformationV17>, payload, kMasterInformation.size);
     }
     return Refusal::NotKnown;
 }
@@ -29,7 +29,7 @@ std::optional<Refusal> RecordAdapter::adaptServingCell(ByteView payload) {
     _result.kind.version = version;
     if (version == 2 && payload.size() == kServingCell.size) return passes(), std::nullopt;
     if (version == 3 && payload.size() == kServingCellV3.size)
-        return turn(kServingCellV3.moves, payload, kServingCell.size);
+        return turn(turning<kServingCellV3>, payload, kServingCell.size);
     return Refusal::NotKnown;
 }
 
@@ -37,13 +37,12 @@ namespace {
 
 /// The generations of 0xB179: where the lists start and what their entries are.
 struct ConnectedLayout {
-    std::size_t header;
-    std::span<const Move> headerMoves;
+    Turning header;
     std::size_t countsAt;
-    std::span<const Move> detectedMoves;
+    Turning detected;
 };
-constexpr ConnectedLayout kConnected3{kConnectedV3.size, kConnectedV3.moves, 22, kDetectedCellV3.moves};
-constexpr ConnectedLayout kConnected4{kConnectedV4.size, kConnectedV4.moves, 24, kDetectedCellV4.moves};
+constexpr ConnectedLayout kConnected3{turning<kConnectedV3>, 22, turning<kDetectedCellV3>};
+constexpr ConnectedLayout kConnected4{turning<kConnectedV4>, 24, turning<kDetectedCellV4>};
 constexpr std::size_t kServingCellIndexAt = 4;
 
 }  // namespace
@@ -63,21 +62,21 @@ std::optional<Refusal> RecordAdapter::adaptConnected(ByteView payload) {
     const ConnectedLayout& layout = version == 3 ? kConnected3 : kConnected4;
     const std::size_t measured = count(layout.countsAt);
     const std::size_t detected = count(layout.countsAt + 1);
-    const std::size_t detectedAt = layout.header + measured * kMeasuredCellV3.size;
+    const std::size_t detectedAt = layout.header.size + measured * kMeasuredCellV3.size;
     if (payload.size() != detectedAt + detected * kDetectedCellV3.size) return Refusal::NotKnown;
     if (record.read(kServingCellIndexAt, u8) != 0) return Refusal::SecondaryCell;
 
     const std::size_t fixedDetectedAt = kConnected.size + measured * kMeasuredCell.size;
     const std::size_t size = fixedDetectedAt + detected * kDetectedCell.size;
     std::fill_n(payloadMade(), size, std::uint8_t{0});
-    bool fits = carryOut(layout.headerMoves, record, 0, payloadMade());
+    bool fits = layout.header.carryOut(payload, payloadMade());
     for (std::size_t i = 0; i < measured; ++i) {
-        fits &= carryOut(kMeasuredCellV3.moves, record, layout.header + i * kMeasuredCellV3.size,
-                         payloadMade() + kConnected.size + i * kMeasuredCell.size);
+        fits &= carryOut<kMeasuredCellV3>(payload.subspan(layout.header.size + i * kMeasuredCellV3.size),
+                                          payloadMade() + kConnected.size + i * kMeasuredCell.size);
     }
     for (std::size_t i = 0; i < detected; ++i) {
-        fits &= carryOut(layout.detectedMoves, record, detectedAt + i * kDetectedCellV3.size,
-                         payloadMade() + fixedDetectedAt + i * kDetectedCell.size);
+        fits &= layout.detected.carryOut(payload.subspan(detectedAt + i * kDetectedCellV3.size),
+                                         payloadMade() + fixedDetectedAt + i * kDetectedCell.size);
     }
     if (!fits) return Refusal::DoesNotFit;
     if (version == 4) tellChannel(record.read(8, u32));
@@ -113,14 +112,13 @@ std::optional<Refusal> RecordAdapter::adaptNeighbors(ByteView payload) {
 
     const std::size_t size = kNeighbors.size + cells * kNeighbor.size;
     std::fill_n(payloadMade(), size, std::uint8_t{0});
-    bool fits =
-        carryOut(wide ? std::span<const Move>(kNeighborsV5.moves) : kNeighborsV4.moves, record, 0, payloadMade());
+    bool fits = wide ? carryOut<kNeighborsV5>(payload, payloadMade()) : carryOut<kNeighborsV4>(payload, payloadMade());
     writeBits(payloadMade() + kNeighborCountLessOne.at, kNeighborCountLessOne.raw,
               static_cast<std::uint32_t>(cells - 1));
     std::uint8_t* cell = payloadMade() + kNeighbors.size;
     for (std::size_t place = 0; place < places; ++place) {
         if (isEmpty(place)) continue;
-        fits &= carryOut(kNeighborV4.moves, record, start + place * stride, cell);
+        fits &= carryOut<kNeighborV4>(payload.subspan(start + place * stride), cell);
         cell += kNeighbor.size;
     }
     if (!fits) return Refusal::DoesNotFit;

@@ -53,7 +53,8 @@ std::optional<Refusal> RecordAdapter::adaptIdle(ByteView payload) {
     if (version > 5 || flag > 1) return Refusal::NotKnown;
     const bool wide = version == 5;
     if (payload.size() != (wide ? kIdleV5.size : kIdleV3.size) + flag * kRelease9Word) return Refusal::NotKnown;
-    const auto refusal = wide ? turn(kIdleV5.moves, payload, kIdle.size) : turn(kIdleV3.moves, payload, kIdle.size);
+    const auto refusal =
+        wide ? turn(turning<kIdleV5>, payload, kIdle.size) : turn(turning<kIdleV3>, payload, kIdle.size);
     if (!refusal) {
         _idleCells.remember(static_cast<std::uint32_t>(record.read(4, wide ? u32 : u16)),
                             static_cast<std::uint16_t>(read(kPci, RecordView(_result.packet.subspan(kHeader)))),
@@ -70,16 +71,15 @@ constexpr std::size_t kPartHeader = 4;
 /// The generations of part 25: its body's size, where the first cell is and how far apart the places for cells are.
 struct AnyModeLayout {
     std::uint8_t version;
-    std::size_t body;
+    Turning body;
     std::size_t firstCell;
     std::size_t stride;
-    std::span<const Move> moves;
     bool isList;  // a count of cells at 4, and a bit that marks the serving one
 };
 constexpr auto kAnyModeLayouts = std::to_array<AnyModeLayout>({
-    {18, kAnyModeV18.size, 4, 88, kAnyModeV18.moves, false},
-    {19, kAnyModeV19.size, 8, 88, kAnyModeV19.moves, true},
-    {36, kAnyModeV36.size, 8, 128, kAnyModeV36.moves, true},
+    {18, turning<kAnyModeV18>, 4, 88, false},
+    {19, turning<kAnyModeV19>, 8, 88, true},
+    {36, turning<kAnyModeV36>, 8, 128, true},
 });
 constexpr std::int64_t kCellPlaces = 4;
 
@@ -111,7 +111,7 @@ std::optional<Refusal> RecordAdapter::adaptAnyMode(ByteView payload) {
 
     const ByteView body = part.subspan(kPartHeader);
     const auto layout = std::ranges::find(kAnyModeLayouts, part[1], &AnyModeLayout::version);
-    if (layout == kAnyModeLayouts.end() || body.size() != layout->body) return Refusal::NotKnown;
+    if (layout == kAnyModeLayouts.end() || body.size() != layout->body.size) return Refusal::NotKnown;
     const RecordView view(body);
     const std::int64_t cells = layout->isList ? view.read(4, u16) : 1;
     if (cells < 1 || cells > kCellPlaces) return Refusal::NotKnown;
@@ -120,22 +120,23 @@ std::optional<Refusal> RecordAdapter::adaptAnyMode(ByteView payload) {
         const bool isPrimary = view.read(at, u16.bits(9, 11)) == 0;
         const bool isServing = !layout->isList || view.read(at, u16.bit(12)) == 1;
         if (!isPrimary || !isServing) continue;
+        if (i == 0) return deriveIdle(body, layout->body);
         // The layout has the places of the first cell: the part's own fields and then this cell's.
         std::array<std::uint8_t, 8 + 128> cell{};
         std::copy_n(body.begin(), layout->firstCell, cell.begin());
         std::copy_n(body.begin() + static_cast<std::ptrdiff_t>(at), layout->stride,
                     cell.begin() + static_cast<std::ptrdiff_t>(layout->firstCell));
-        return deriveIdle(ByteView(cell), layout->moves);
+        return deriveIdle(ByteView(cell), layout->body);
     }
     return Refusal::NoServingCell;
 }
 
 /// A 0xB17F of what a cell of the part says, completed by the cell's last real 0xB17F.
-std::optional<Refusal> RecordAdapter::deriveIdle(ByteView cell, std::span<const Move> moves) {
+std::optional<Refusal> RecordAdapter::deriveIdle(ByteView cell, const Turning& layout) {
     std::uint8_t* made = payloadMade();
     std::fill_n(made, kIdle.size, std::uint8_t{0});
     const RecordView source(cell);
-    if (!carryOut(moves, source, 0, made)) return Refusal::DoesNotFit;
+    if (!layout.carryOut(cell, made)) return Refusal::DoesNotFit;
     const auto earfcn = static_cast<std::uint32_t>(source.read(0, u32));
     tellChannel(earfcn);
 

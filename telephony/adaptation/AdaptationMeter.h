@@ -21,10 +21,8 @@ public:
     std::uint64_t turned() const { return _turned; }
     std::uint64_t refused() const { return _refused; }
     std::uint64_t derived() const { return _completed + _neutral; }  ///< 0xB17F made of 0xB193
-    std::uint64_t neutral() const {
-        return _neutral;
-    }  ///< of these, of a cell without a real 0xB17F: without its
-       ///< priority, limits, search thresholds and rules
+    /// Of these, how many lack priority, limits, search thresholds and rules: of a cell without a real 0xB17F.
+    std::uint64_t neutral() const { return _neutral; }
     std::uint64_t extendedChannels() const { return _extendedChannels; }
     std::optional<std::uint32_t> lastExtendedChannel() const { return _lastExtendedChannel; }
     std::uint64_t leftOut() const { return _leftOut; }  ///< list entries that the fixed layout cannot say

@@ -20,7 +20,7 @@ public:
 private:
     static constexpr std::size_t kCells = 64;
     struct Cell {
-        std::uint64_t heard = 0;  // 0: an empty place
+        std::uint64_t heard = 0;
         std::uint32_t earfcn = 0;
         std::uint16_t pci = 0;
         Payload payload{};
@@ -29,6 +29,7 @@ private:
     Cell* find(std::uint32_t earfcn, std::uint16_t pci);
 
     std::array<Cell, kCells> _cells{};
+    std::size_t _used = 0;  // places, from the first on
     std::uint64_t _heard = 0;
 };
 

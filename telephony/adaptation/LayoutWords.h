@@ -1,14 +1,14 @@
 #pragma once
 
+#include <algorithm>
 #include <array>
+#include <bit>
 #include <cstddef>
 #include <cstdint>
 #include <limits>
-#include <span>
 #include <string_view>
 
 #include "LogGenerator/RecordView.h"
-#include "platform/values/Bytes.h"
 
 /// The words in which newer layouts of a record are turned into the fixed one. A fixed layout is a list of named
 /// fields; a newer one says for each of those names where the value lies in it, in which steps, or what stands there
@@ -36,6 +36,9 @@ struct FixedField {
 
     constexpr FixedField(std::string_view fieldName, int offset, Raw how, Steps worth = {})
         : name(fieldName), at(static_cast<std::uint16_t>(offset)), raw(how), steps(worth) {}
+
+    constexpr int firstBit() const { return 8 * at + raw.lowBit; }
+    constexpr int lastBit() const { return firstBit() + raw.width - 1; }
 };
 
 /// What happens to a raw value on its way.
@@ -74,18 +77,19 @@ constexpr NewerField notToBeHad(std::string_view name, std::int64_t value) { ret
 /// The version that adapted records carry.
 constexpr NewerField always(std::string_view name, std::int64_t value) { return {name, value}; }
 
-/// One value's way from a newer record to the fixed one: raw x factor + summand, divided and rounded down.
+/// One value's way from a newer record to the fixed one: raw x factor + summand, divided by a power of two and rounded
+/// down.
 struct Move {
     std::uint16_t from;
     Raw fromRaw;
     std::uint16_t to;
     Raw toRaw;
     Turn turn;
+    std::uint8_t shift = 0;
     std::int64_t factor = 1;
     std::int64_t summand = 0;  ///< of a constant: its value
-    std::int64_t divisor = 1;
 
-    constexpr std::int64_t greatest() const { return (std::int64_t{1} << toRaw.bitWidth()) - 1; }
+    constexpr std::int64_t greatest() const { return (std::int64_t{1} << toRaw.width) - 1; }
 };
 
 template <std::size_t N>
@@ -107,6 +111,15 @@ template <std::size_t N>
 struct NewerLayout {
     std::size_t size;
     std::array<Move, N> moves;
+
+    /// Where the last of what is read ends.
+    consteval std::size_t reach() const {
+        std::size_t reach = 0;
+        for (const Move& move : moves) {
+            if (move.turn != Turn::Constant) reach = std::max<std::size_t>(reach, move.from + move.fromRaw.bytes);
+        }
+        return reach;
+    }
 };
 
 /// `size` bytes: those of the record before its lists, or of a list's entry.
@@ -114,8 +127,11 @@ template <std::size_t N>
 consteval FixedLayout<N> fixedLayout(std::size_t size, const FixedField (&fields)[N]) {
     for (std::size_t i = 0; i < N; ++i) {
         if (fields[i].at + fields[i].raw.bytes > size) throw "a field lies past the end";
+        if (fields[i].raw.bytes == 3 || fields[i].raw.isBigEndian) throw "a field is no little-endian number";
         for (std::size_t j = 0; j < i; ++j) {
             if (fields[i].name == fields[j].name) throw "a name stands twice";
+            if (fields[i].firstBit() <= fields[j].lastBit() && fields[j].firstBit() <= fields[i].lastBit())
+                throw "two fields share a bit";
         }
     }
     return {size, std::to_array(fields)};
@@ -129,14 +145,18 @@ consteval Move move(const FixedField& to, const NewerField& from) {
         if (from.constant < 0 || from.constant > move.greatest()) throw "a constant does not fit its field";
         move.summand = from.constant;
     }
+    const bool isRounded = from.turn == Turn::Stepped || from.turn == Turn::Constant;
+    if (to.steps.numerator != 0 && !isRounded) throw "the newer field has no steps";
     if (from.turn == Turn::Stepped) {
         if (to.steps.numerator == 0) throw "the fixed field has no steps";
         // Half a step more and rounded down is the nearest step, ties up.
         move.factor = std::int64_t{2} * from.steps.numerator * to.steps.denominator;
-        move.divisor = std::int64_t{2} * from.steps.denominator * to.steps.numerator;
+        const std::int64_t divisor = std::int64_t{2} * from.steps.denominator * to.steps.numerator;
         move.summand =
             std::int64_t{2} * (from.steps.offset - to.steps.offset) * from.steps.denominator * to.steps.denominator +
-            move.divisor / 2;
+            divisor / 2;
+        if (!std::has_single_bit(static_cast<std::uint64_t>(divisor))) throw "the steps are no power of two apart";
+        move.shift = static_cast<std::uint8_t>(std::countr_zero(static_cast<std::uint64_t>(divisor)));
     }
     return move;
 }
@@ -153,6 +173,7 @@ consteval NewerLayout<N> newerLayout(const FixedLayout<N>& fixed, std::size_t si
         for (const NewerField& field : fields) {
             if (field.name != fixed.fields[i].name) continue;
             if (field.turn != Turn::Constant && field.at + field.raw.bytes > size) throw "a field lies past the end";
+            if (field.raw.bytes == 3 || field.raw.isBigEndian) throw "a field is no little-endian number";
             layout.moves[i] = detail::move(fixed.fields[i], field);
             ++found;
         }
@@ -160,12 +181,5 @@ consteval NewerLayout<N> newerLayout(const FixedLayout<N>& fixed, std::size_t si
     }
     return layout;
 }
-
-/// Carries out `moves`: reads `from` at `fromBase` plus their offsets, writes to `to`, whose bytes there are 0. False
-/// when a value does not fit and may not be cut.
-bool carryOut(std::span<const Move> moves, RecordView from, std::size_t fromBase, std::uint8_t* to);
-
-/// Replaces the bits of one field.
-void writeBits(std::uint8_t* at, Raw raw, std::uint32_t value);
 
 }  // namespace kelvo::adaptation

@@ -27,22 +27,19 @@ inline constexpr auto kMasterInformation = fixedLayout(9, {
     { "antenna ports",      7, u8  },
     { "resource blocks",    8, u8  },
 });
-inline constexpr auto kMasterInformationV2 = newerLayout(kMasterInformation, 11, {
-    always("version", 1),
-    { "PCI",                1, u16 },
-    { "EARFCN",             3, u32, Turn::Channel },
-    { "frame number",       7, u16 },
-    { "antenna ports",      9, u8  },
-    { "resource blocks",   10, u8  },
-});
-inline constexpr auto kMasterInformationV3 = newerLayout(kMasterInformation, 12, {
-    always("version", 1),
-    { "PCI",                1, u16 },
-    { "EARFCN",             3, u32, Turn::Channel },
-    { "frame number",       7, u16 },
-    { "antenna ports",      9, u8  },
-    { "resource blocks",   10, u8  },
-});
+/// Versions 2 and 3 differ in their length alone.
+consteval auto newerMasterInformation(std::size_t size) {
+    return newerLayout(kMasterInformation, size, {
+        always("version", 1),
+        { "PCI",                1, u16 },
+        { "EARFCN",             3, u32, Turn::Channel },
+        { "frame number",       7, u16 },
+        { "antenna ports",      9, u8  },
+        { "resource blocks",   10, u8  },
+    });
+}
+inline constexpr auto kMasterInformationV2 = newerMasterInformation(11);
+inline constexpr auto kMasterInformationV3 = newerMasterInformation(12);
 inline constexpr auto kMasterInformationV17 = newerLayout(kMasterInformation, 18, {  // narrow-band
     always("version", 1),
     { "PCI",                1, u16 },
@@ -97,26 +94,21 @@ inline constexpr auto kConnected = fixedLayout(16, {
     { "measured cells",     14, u8  },
     { "detected cells",     15, u8  },
 });
-inline constexpr auto kConnectedV3 = newerLayout(kConnected, 24, {
-    always("version", 2),
-    { "EARFCN",              8, u16 },
-    { "PCI",                10, u16 },
-    { "frame and sub-frame", 12, u16 },
-    { "filtered RSRP",      14, i16, kRsrp16 },
-    { "filtered RSRQ",      18, i16, kRsrq16 },
-    { "measured cells",     22, u8  },
-    { "detected cells",     23, u8  },
-});
-inline constexpr auto kConnectedV4 = newerLayout(kConnected, 28, {
-    always("version", 2),
-    { "EARFCN",              8, u32, Turn::Channel },
-    { "PCI",                12, u16 },
-    { "frame and sub-frame", 14, u16 },
-    { "filtered RSRP",      16, i16, kRsrp16 },
-    { "filtered RSRQ",      20, i16, kRsrq16 },
-    { "measured cells",     24, u8  },
-    { "detected cells",     25, u8  },
-});
+/// Versions 3 and 4 differ in the width of the channel, and so in where the PCI and what follows it start.
+consteval auto newerConnected(std::size_t size, NewerField earfcn, int pci) {
+    return newerLayout(kConnected, size, {
+        always("version", 2),
+        earfcn,
+        { "PCI",                 pci,      u16 },
+        { "frame and sub-frame", pci +  2, u16 },
+        { "filtered RSRP",       pci +  4, i16, kRsrp16 },
+        { "filtered RSRQ",       pci +  8, i16, kRsrq16 },
+        { "measured cells",      pci + 12, u8  },
+        { "detected cells",      pci + 13, u8  },
+    });
+}
+inline constexpr auto kConnectedV3 = newerConnected(24, { "EARFCN", 8, u16 }, 10);
+inline constexpr auto kConnectedV4 = newerConnected(28, { "EARFCN", 8, u32, Turn::Channel }, 12);
 inline constexpr auto kMeasuredCell = fixedLayout(6, {
     { "PCI",  0, u16 },
     { "RSRP", 2, u16, kRsrpQuarter },

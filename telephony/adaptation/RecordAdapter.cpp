@@ -77,11 +77,11 @@ std::optional<Refusal> RecordAdapter::turned(std::size_t payloadSize, LogCode co
 }
 
 /// A record without lists.
-std::optional<Refusal> RecordAdapter::turn(std::span<const Move> moves, ByteView payload, std::size_t fixedSize) {
+std::optional<Refusal> RecordAdapter::turn(const Turning& layout, ByteView payload, std::size_t fixedSize) {
     std::fill_n(payloadMade(), fixedSize, std::uint8_t{0});
+    if (!layout.carryOut(payload, payloadMade())) return Refusal::DoesNotFit;
     const RecordView record(payload);
-    if (!carryOut(moves, record, 0, payloadMade())) return Refusal::DoesNotFit;
-    for (const Move& move : moves) {
+    for (const Move& move : layout.moves) {
         if (move.turn == Turn::Channel) tellChannel(record.read(move.from, move.fromRaw));
     }
     return turned(fixedSize, _result.kind.code);

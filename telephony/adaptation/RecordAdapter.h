@@ -3,11 +3,10 @@
 #include <array>
 #include <cstdint>
 #include <optional>
-#include <span>
 
 #include "platform/values/Bytes.h"
+#include "telephony/adaptation/CarryOut.h"
 #include "telephony/adaptation/IdleCells.h"
-#include "telephony/adaptation/LayoutWords.h"
 #include "telephony/adaptation/Refusal.h"
 
 namespace kelvo::adaptation {
@@ -53,8 +52,8 @@ private:
     std::optional<Refusal> adaptCells(ByteView payload);
     std::optional<Refusal> adaptNetworks(ByteView payload);
 
-    std::optional<Refusal> deriveIdle(ByteView part, std::span<const Move> moves);
-    std::optional<Refusal> turn(std::span<const Move> moves, ByteView payload, std::size_t fixedSize);
+    std::optional<Refusal> deriveIdle(ByteView part, const Turning& layout);
+    std::optional<Refusal> turn(const Turning& layout, ByteView payload, std::size_t fixedSize);
     void passes() { _result.outcome = Adapted::Outcome::Passed; }
     std::optional<Refusal> turned(std::size_t payloadSize, LogCode code);
     std::uint8_t* payloadMade() { return _made.data() + kHeader; }

@@ -10,7 +10,7 @@ namespace kelvo {
 /// A way to a modem's diagnostic port. Opened once; whoever wants to open it again makes another. Main queue only.
 class ModemLine {
 public:
-    /// Whoever uses the line. It mutes the line if it pleases, but must not destroy it during these calls.
+    /// Whoever uses the line. It may mute the line during these calls, but must not destroy it.
     class Listener {
     public:
         virtual ~Listener() = default;

@@ -37,10 +37,11 @@ SimFiles testNetworkSim();
 /// Record 0xff0000.
 Bytes simFilesRecord(Time time, const SimFiles& files);
 
-/// One cell as the telephony service's cell monitor words it. A value that is none is not in the record.
+/// One cell as the telephony service's cell monitor describes it. A value that is none is not in the record.
 struct MonitoredCell {
     enum class Technology { GSM, UMTS, UTRAN2, LTE };
-    static constexpr int kNoValue = 32767;  ///< under RSSI, RSCP and Ec/N0: known, but not measured now
+    static constexpr int kNoValue = 32767;        ///< under RSSI, RSCP and Ec/N0: known, but not measured now
+    static constexpr std::size_t kNeighbors = 2;  ///< beside the serving cell, where the strongest are listed
 
     Technology technology = Technology::GSM;
     bool isServing = false;
@@ -70,6 +71,7 @@ struct PdpContext {
     std::string state = {};  ///< "Active", "Inactive"
     std::string address = {};
     std::string qos = {};  ///< traffic class or QoS class identifier
+    bool operator==(const PdpContext&) const = default;
 };
 
 /// Record 0xff0002: the contexts in this order.

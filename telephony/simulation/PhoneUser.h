@@ -5,7 +5,7 @@
 
 namespace kelvo::simulation {
 
-/// What the one who carries the phone does with it: rests, reads pages, talks.
+/// The person who carries the phone, and uses it in turns: rests, reads pages, talks.
 class PhoneUser {
 public:
     enum class Activity { Resting, Browsing, Talking };
@@ -22,9 +22,10 @@ public:
     bool isTalking() const { return _activity == Activity::Talking; }
     /// In a call: the other one speaks.
     bool isListening() const { return isTalking() && _isPausing; }
-    /// The part of the link that what they do asks for, 0 to 1: a page much, reading it and a call none.
+    /// The share of the link that they need at the moment, 0 to 1: for loading a page much, for reading it and for a
+    /// call none.
     double demand() const { return _demand; }
-    /// How often they have begun to browse.
+    /// How often browsing has begun.
     int sessions() const { return _sessions; }
 
 private:

@@ -30,6 +30,7 @@ using Psc    = RadioNumber<struct PscName,      511>;  ///< primary scrambling c
 using CellParameterId = RadioNumber<struct CellParameterIdName, 127>;  ///< of TD-SCDMA: TS 25.223, section 7
 using Pci    = RadioNumber<struct PciName,      503>;  ///< physical cell identity of LTE: TS 36.211, section 6.11
 using PnOffset = RadioNumber<struct PnOffsetName, 511>;  ///< of a CDMA2000 pilot, in units of 64 chips: 3GPP2 C.S0002
+using CdmaChannel = RadioNumber<struct CdmaChannelName, 2047>;  ///< carrier of CDMA2000 in its band class: 3GPP2 C.S0057
 // clang-format on
 
 }  // namespace kelvo::simulation

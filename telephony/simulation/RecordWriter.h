@@ -8,7 +8,7 @@
 
 namespace kelvo::simulation {
 
-/// Builds one log record as the modem's log service words it: the 2-byte prefix that begins with 0x81, the 13-byte
+/// Builds one log record as the modem's log service writes it: the 2-byte prefix that begins with 0x81, the 13-byte
 /// header and the payload, little-endian. Offsets count from the log type byte, which follows the prefix. A record
 /// grows to what is written to it; bytes in between are zero. Values are cut to their width.
 class RecordWriter {

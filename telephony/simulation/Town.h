@@ -20,6 +20,13 @@ struct Sector {
 inline constexpr int kMcc = 1;
 inline constexpr int kMnc = 1;
 
+/// A location area of a network, and the routing area within it.
+struct Area {
+    int lac = 0;
+    int rac = 0;
+    bool operator==(const Area&) const = default;
+};
+
 /// How a network was built.
 struct TownPlan {
     double radius = 2500;       ///< metres: sites up to here

@@ -4,7 +4,7 @@
 
 #include "platform/values/Bytes.h"
 
-/// Numbers as the diagnostic port words them. What is read lies inside the bytes; the caller has looked.
+/// Numbers as on the diagnostic port. The caller has made sure that what is read lies inside the bytes.
 namespace kelvo::wire {
 
 inline std::uint16_t u16At(ByteView bytes, std::size_t at) {

@@ -325,7 +325,8 @@ void Session::tell(Level level, const std::string& text) const { logLine(level, 
 
 void Session::tellUnknownCodes() {
     auto codes = _masks.takeUnknown();
-    std::erase_if(codes, [this](LogCode code) { return !_wanted.test(code); });  // the service's own are no matter
+    std::erase_if(codes,
+                  [this](LogCode code) { return !_wanted.test(code); });  // clients are not told of the service's own
     if (!codes.empty()) tell(Level::Warning, "this modem cannot send: " + listOf(codes));
 }
 

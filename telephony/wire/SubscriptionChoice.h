@@ -6,7 +6,7 @@
 namespace kelvo::wire {
 
 /// Whose records are shown on a phone with several SIMs: of the chosen one, or of the first that sends. The choice
-/// holds when the modem comes back. Records that name no subscription (unwrapped ones, 0 and -1) are everybody's.
+/// holds when the modem comes back. Records that name no subscription (unwrapped ones, 0 and -1) always pass.
 class SubscriptionChoice {
 public:
     explicit SubscriptionChoice(std::optional<std::int32_t> chosen) : _chosen(chosen) {}

@@ -4,6 +4,7 @@
 
 #include "LogGenerator/ClassIndex.h"
 #include "platform/system/Environment.h"
+#include "tests/support/CapturedOutput.h"
 #include "tests/support/RecordingLog.h"
 
 namespace kelvo {
@@ -90,16 +91,12 @@ TEST(ClassIndex, WritesItsProgressToTheLog) {
 }
 
 TEST(ClassIndex, SaysOnStandardOutputThatItGoes) {
-    char* text = nullptr;
-    std::size_t size = 0;
-    std::FILE* output = open_memstream(&text, &size);
+    const test::CapturedOutput output;
     {
-        const Environment::Scope environment({.standardOutput = output});
+        const Environment::Scope environment({.standardOutput = output.file()});
         const TwoSections index;
     }
-    std::fclose(output);
-    EXPECT_STREQ(text, "Deallocing ClassIndex\n");
-    std::free(text);
+    EXPECT_EQ(output.text(), "Deallocing ClassIndex\n");
 }
 
 }  // namespace

@@ -3,8 +3,6 @@
 #include <gtest/gtest.h>
 
 #include <algorithm>
-#include <cstdio>
-#include <cstdlib>
 #include <memory>
 #include <string>
 #include <vector>
@@ -12,6 +10,7 @@
 #include "model/KelvoModel.h"
 #include "platform/system/DirectoryResources.h"
 #include "platform/system/Environment.h"
+#include "tests/support/CapturedOutput.h"
 #include "tests/support/FakePorts.h"
 #include "tests/support/FakeTelephony.h"
 #include "tests/support/ManualClock.h"
@@ -82,35 +81,13 @@ protected:
                                  .encode = encode});
     }
 
-    /// The program's standard output.
-    class Output {
-    public:
-        Output() = default;
-        ~Output() {
-            std::fclose(_file);
-            std::free(_text);
-        }
-        Output(const Output&) = delete;
-        Output& operator=(const Output&) = delete;
-        std::FILE* file() const { return _file; }
-        std::string text() const {
-            std::fflush(_file);
-            return _text;
-        }
-
-    private:
-        char* _text = nullptr;
-        std::size_t _size = 0;
-        std::FILE* _file = open_memstream(&_text, &_size);
-    };
-
     ManualQueue queue;
     FakePorts ports;
     FakeTelephony telephony;
     RecordingLog log;
     ManualClock clock;
     DirectoryResources resources{KELVO_RESOURCE_DIR};
-    Output output;
+    CapturedOutput output;
     Environment::Scope environment{
         {.log = &log, .clock = &clock, .resources = &resources, .standardOutput = output.file()}};
     int updates = 0;  // of the screens

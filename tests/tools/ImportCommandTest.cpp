@@ -30,7 +30,7 @@ const Bytes kNewServingCell = payload(
 struct ImportCommand : KelvoctlTest {
     std::string frames(const std::string& name, const std::vector<Bytes>& records) {
         Bytes bytes;
-        for (const Bytes& record : records) bytes += framed(recordBodyOf(record));
+        for (const Bytes& record : records) bytes += plainFrame(recordBodyOf(record));
         return directory.write(name, bytes);
     }
     std::string out() { return path("out.pcap"); }
@@ -130,7 +130,7 @@ TEST_F(ImportCommand, TakesOneSim) {
     const auto wrapped = [](int subscription, const Bytes& record) {
         Bytes body = {0x98, 1, 0, 0, static_cast<std::uint8_t>(subscription), 0, 0, 0};
         body += recordBodyOf(record);
-        return framed(body);
+        return plainFrame(body);
     };
     Bytes bytes = wrapped(2, plainRecord(0xB0C2, kTicks, Bytes(25, 2)));
     bytes += wrapped(1, plainRecord(0xB0C1, kTicks + 800, payload(9, {{0, 1}})));
@@ -142,11 +142,11 @@ TEST_F(ImportCommand, TakesOneSim) {
 }
 
 TEST_F(ImportCommand, TellsOfDamageAndGoesOn) {
-    Bytes bytes = framed(recordBodyOf(plainRecord(0xB0C2, kTicks, Bytes(25, 2))));
+    Bytes bytes = plainFrame(recordBodyOf(plainRecord(0xB0C2, kTicks, Bytes(25, 2))));
     Bytes flipped = bytes;
     flipped[10] ^= 1;
     bytes += flipped;
-    bytes += framed(recordBodyOf(plainRecord(0xB0C2, kTicks + 800, Bytes(25, 2))));
+    bytes += plainFrame(recordBodyOf(plainRecord(0xB0C2, kTicks + 800, Bytes(25, 2))));
     const std::string in = directory.write("drive", bytes);
     const Finished done = kelvoctl({"import", in, "-o", out()});
     EXPECT_EQ(done.status, 0);

@@ -23,6 +23,20 @@ protected:
         scene->settle();
         return *scene;
     }
+    /// Shows 30 branches above 30 leaves and scrolls to the last leaf, in rows that showed branches before. The list.
+    QQuickItem* startWithRecycledRows() {
+        start();
+        const DictionaryRef display = Dictionary::make();
+        for (int row = 0; row < 30; ++row) display->set("Branch " + std::to_string(row), Array::make());
+        for (int row = 0; row < 30; ++row) display->set("Leaf " + std::to_string(row), "value");
+        scene->show(display);
+        QQuickItem* list = scene->itemOfType("QQuickListView");
+        for (int y = 0; y <= 2400; y += 100) {
+            list->setProperty("contentY", y);
+            scene->settle();
+        }
+        return list;
+    }
     std::size_t depth() { return scene->app().navigation()->viewControllers().size(); }
     void expectTop(const char* title) {
         scene->settle();

@@ -286,16 +286,7 @@ TEST_F(Screen, KeepsTheScrollPositionAndTheRowsThroughAReload) {
 }
 
 TEST_F(Screen, ShowsEveryRecycledRowEitherWholeOrByItsNameOnly) {
-    start();
-    const DictionaryRef display = Dictionary::make();
-    for (int row = 0; row < 30; ++row) display->set("Branch " + std::to_string(row), Array::make());
-    for (int row = 0; row < 30; ++row) display->set("Leaf " + std::to_string(row), "value");
-    scene->show(display);
-    QQuickItem* list = scene->itemOfType("QQuickListView");
-    for (int y = 0; y <= 2400; y += 100) {
-        list->setProperty("contentY", y);
-        scene->settle();
-    }
+    startWithRecycledRows();
     int byNameOnly = 0;
     for (int leaf = 22; leaf < 29; ++leaf) {
         const KelvoCell* row = scene->row(text("Leaf ") + QString::number(leaf));

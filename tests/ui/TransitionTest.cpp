@@ -146,16 +146,7 @@ TEST_F(TransitionTest, MarksEveryRowThatOpensAndNoOther) {
 }
 
 TEST_F(TransitionTest, MarksRowsThatOpenAmongRecycledOnes) {
-    start();
-    const DictionaryRef display = Dictionary::make();
-    for (int row = 0; row < 30; ++row) display->set("Branch " + std::to_string(row), Array::make());
-    for (int row = 0; row < 30; ++row) display->set("Leaf " + std::to_string(row), "value");
-    scene->show(display);
-    QQuickItem* list = scene->itemOfType("QQuickListView");
-    for (int y = 0; y <= 2400; y += 100) {
-        list->setProperty("contentY", y);
-        scene->settle();
-    }
+    QQuickItem* list = startWithRecycledRows();
     for (int leaf = 22; leaf < 29; ++leaf) {
         EXPECT_FALSE(shows(text("Leaf ") + QString::number(leaf), "disclosure")) << leaf;
     }

@@ -27,7 +27,7 @@ KelvoCell {
         return true;
     }
 
-    // What was swiped to has gone with a value that is shorter than the one before; a finger on the row keeps it.
+    // A shorter value may end before the place that was swiped to; a finger on the row keeps the place.
     onValueWidthChanged: {
         if (valueWidth < lastValueWidth && !strip.dragging) {
             strip.cancelFlick();
@@ -148,7 +148,7 @@ KelvoCell {
         border { width: 2; color: Theme.accent }
     }
 
-    // A value that changed stands out at once and calms down slowly. The line under it is for the sun and for eyes that
+    // A value that changed stands out at once and calms down slowly. The line under it is for bright light and for eyes that
     // tell colours apart badly: accent and text colour differ in their hue alone.
     states: State {
         name: "fresh"

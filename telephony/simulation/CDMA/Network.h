@@ -12,11 +12,11 @@ namespace kelvo::simulation::cdma {
 /// A carrier of 3GPP2 C.S0057.
 struct Carrier {
     int bandClass;
-    int channel;
+    CdmaChannel channel;
     double downlinkMHz;
 };
-inline constexpr Carrier kOneXCarrier{0, 283, 878.49};   // 870 MHz and 30 kHz a channel
-inline constexpr Carrier kEvdoCarrier{1, 475, 1953.75};  // 1930 MHz and 50 kHz a channel
+inline constexpr Carrier kOneXCarrier{0, CdmaChannel(283), 878.49};   // 870 MHz and 30 kHz a channel
+inline constexpr Carrier kEvdoCarrier{1, CdmaChannel(475), 1953.75};  // 1930 MHz and 50 kHz a channel
 
 /// A registration zone, which is a packet zone and an EV-DO subnet too.
 struct Zone {

@@ -53,7 +53,7 @@ void Simulation::reportEvdo() {
     emit(fingersRecord(now(), status.fingers));
 }
 
-/// The first two records make the first rate; after that a link at rest is told of seldom.
+/// The first two records make the first rate; after that a link at rest is reported seldom.
 void Simulation::reportPackets() {
     const PacketCounters& counters = _modem.evdo().counters();
     const bool isFirst = now() == 500ms || now() == 1500ms;

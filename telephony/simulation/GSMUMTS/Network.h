@@ -10,13 +10,6 @@ namespace kelvo::simulation::gsm {
 
 enum class Rat { GSM, UMTS };
 
-/// A location area and the routing area within it.
-struct Area {
-    int lac = 0;
-    int rac = 0;
-    bool operator==(const Area&) const = default;
-};
-
 /// What a GSM cell's system information 13 says of packet data (3GPP TS 44.018, 10.5.2.37b). The numbers are the
 /// codes on the air.
 struct GprsOptions {

@@ -103,7 +103,8 @@ struct World {
     const Modem& modem;
 };
 
-// What the modem has to report of the world. Those that take a random draw anew each time: who asks keeps them.
+// What the modem has to report of the world. Those that take a random source draw anew each time, so the caller keeps
+// what it gets.
 GsmMeasurement gsmMeasurement(const World& world);
 RrStatus rrStatus(const World& world);
 ServingNetwork servingNetwork(const World& world);

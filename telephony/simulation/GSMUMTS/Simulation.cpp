@@ -22,7 +22,8 @@ Journey journeyFromCentre(Random& random) {
 
 }  // namespace
 
-Simulation::Simulation(std::uint64_t seed) : FamilySimulation(seed, 1400ms, journeyFromCentre) {}
+Simulation::Simulation(std::uint64_t seed, Generation generation)
+    : FamilySimulation(seed, 1400ms, journeyFromCentre), _wording(wordingOf(generation)) {}
 
 void Simulation::step() {
     const bool isMeasurement = every(kMeasurement);
@@ -71,7 +72,7 @@ void Simulation::reportMobility() {
     const ServingNetwork network = servingNetwork(world());
     if (_servingNetwork.isDue(now(), network, 4s)) emit(servingNetworkRecord(now(), network));
     const auto plmns = equivalentPlmns(world());
-    if (_equivalents.isDue(now(), plmns, 20s)) emit(equivalentPlmnsRecord(now(), plmns));
+    if (_equivalents.isDue(now(), plmns, 20s)) emit(_wording.equivalentPlmns(now(), plmns));
 }
 
 /// Out of a connection, in turns of three: what is ranked of GSM, what of UMTS.
@@ -81,7 +82,7 @@ void Simulation::reportRanking() {
     const auto gsm = rankedGsmCells(world());
     const bool isGsmsTurn = umts.empty() || (!gsm.empty() && _rankings / 3 % 2 == 0);
     ++_rankings;
-    emit(isGsmsTurn ? gsmRankingRecord(now(), gsm) : umtsRankingRecord(now(), umts));
+    emit(isGsmsTurn ? _wording.gsmRanking(now(), gsm) : _wording.umtsRanking(now(), umts));
 }
 
 void Simulation::reportGsm() {
@@ -92,7 +93,7 @@ void Simulation::reportGsm() {
     if (every(isDedicated ? kSlowMeasurement / 2 : kSlowMeasurement, 320ms)) {
         const GsmMeasurement measurement = gsmMeasurement(world());
         if (_decoded.isDue(now(), cell(), 4s)) emit(decodedCellsRecord(now(), measurement.neighbors));
-        emit(measurementRecord(now(), measurement));
+        emit(_wording.gsmMeasurement(now(), measurement));
     }
     if (_allocation.isDue(now(), {cell(), isDedicated}, 20s) && isDedicated)
         emit(mobileAllocationRecord(now(), serving));
@@ -116,7 +117,7 @@ void Simulation::reportGsmChannel(const GsmCell& cell) {
 }
 
 void Simulation::reportUmts() {
-    if (_servingUmts.isDue(now(), cell(), 8s)) emit(rrcCellRecord(now(), _network.umtsCells[_modem.serving()]));
+    if (_servingUmts.isDue(now(), cell(), 8s)) emit(_wording.rrcCell(now(), _network.umtsCells[_modem.serving()]));
     if (_rrcState.isDue(now(), _modem.rrcState(), 480ms)) emit(rrcStateRecord(now(), _modem.rrcState()));
     const bool isCiphered = _modem.link() != Link::None && _modem.link() != Link::Opening;
     if (_ciphering.isDue(now(), isCiphered, 8s)) emit(cipheringRecord(now(), isCiphered));

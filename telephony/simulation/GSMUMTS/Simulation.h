@@ -3,15 +3,16 @@
 #include <optional>
 
 #include "telephony/simulation/FamilySimulation.h"
-#include "telephony/simulation/GSMUMTS/Reports.h"
+#include "telephony/simulation/GSMUMTS/NewerRecords.h"
 
 namespace kelvo::simulation::gsm {
 
 /// A GSM and UMTS modem on its drive. It is switched on in the centre of the town, registers through GSM, finds UMTS
-/// within two seconds and drives on, in the centre mostly in UMTS, outside in GSM.
+/// within two seconds and drives on, in the centre mostly in UMTS, outside in GSM. It is of the generation that the
+/// screens read, or of a newer one.
 class Simulation final : public FamilySimulation<Network, Air, Modem> {
 public:
-    explicit Simulation(std::uint64_t seed);
+    explicit Simulation(std::uint64_t seed, Generation generation = Generation::Of2010);
 
     Technology technology() const override { return Technology::GSM; }
 
@@ -44,9 +45,13 @@ private:
     void reportUmtsChannel();
     void reportBlocks(Time window);
 
+    void emit(Bytes message) {
+        FamilySimulation::emit(_wording.hasTwoSims ? ofFirstSim(std::move(message)) : std::move(message));
+    }
     World world() const { return {_network, _air, _modem}; }
     Cell cell() const { return {_modem.rat(), _modem.serving()}; }
 
+    const Wording& _wording;
     LastReports _lastReports;
     std::optional<Window> _blocks;  // those not yet reported
 

@@ -68,7 +68,7 @@ void Modem::markReported() {
     for (const UmtsNeighbor& neighbor : _status.umts) _reported.insert(neighbor.sector);
 }
 
-LocationArea Modem::area() const {
+Area Modem::area() const {
     if (_status.access == RadioAccess::None) return {};
     return _status.access == RadioAccess::Gsm ? _network.gsmCells[_status.serving].area
                                               : _network.umtsCells[_status.serving].area;

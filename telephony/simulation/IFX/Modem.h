@@ -25,7 +25,7 @@ public:
     /// The status has been sent: the network may move the phone to the UMTS neighbors in it.
     void markReported();
     /// Of the serving cell.
-    LocationArea area() const;
+    Area area() const;
 
 private:
     // The most that are listed, without the serving one.

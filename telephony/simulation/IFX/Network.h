@@ -7,19 +7,12 @@
 
 namespace kelvo::simulation::ifx {
 
-/// A location and routing area of one of the two radio networks.
-struct LocationArea {
-    int lac = 0;
-    int rac = 0;
-    bool operator==(const LocationArea&) const = default;
-};
-
 /// A GSM 900 cell (3GPP TS 45.005).
 struct GsmCell {
     Arfcn arfcn;  ///< of the BCCH carrier: 935 MHz and 200 kHz a channel
     Bsic bsic;
     int cellId;
-    LocationArea area;
+    Area area;
 };
 
 /// A UMTS cell on the network's only carrier.
@@ -30,12 +23,12 @@ struct UmtsCell {
     bool built;  ///< the outer sites have none
     Psc scramblingCode;
     int cellId;  ///< the radio network controller's number in the upper 12 of 28 bits
-    LocationArea area;
+    Area area;
 };
 
 /// The network of a GSM and UMTS operator: GSM on every site of the town, UMTS in its middle.
 struct Network {
-    static constexpr double kGsmMHz = 947;     ///< about: what the propagation is reckoned with
+    static constexpr double kGsmMHz = 947;     ///< roughly: for the path loss
     static constexpr double kPower = 28;       ///< dBm: the antennas' gain less what houses and the car's roof take
     static constexpr double kUmtsGain = -7.3;  ///< dB that the higher carrier is received weaker
 

@@ -79,7 +79,7 @@ Value neighbors(const Status& status, const Network& network) {
 }
 
 Value registration(const Status& status) {
-    const bool first = status.registered == LocationArea{};
+    const bool first = status.registered == Area{};
     const bool registered = status.registration == Registration::Registered;
     const DictionaryRef entry = Dictionary::make({{"State", registered ? "Registered" : "Updating"}});
     if (status.registration == Registration::Searching) entry->set("State", "Searching");

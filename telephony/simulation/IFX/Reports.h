@@ -38,7 +38,7 @@ struct Status {
     std::vector<UmtsNeighbor> umts;    ///< the strongest first
 
     Registration registration = Registration::Searching;
-    LocationArea registered;  ///< the area registered in last
+    Area registered;  ///< the area registered in last
 
     Connection connection = Connection::Idle;
     double tx = 0;          ///< dBm; this and what follows when connected

@@ -9,8 +9,7 @@ namespace {
 // Thermal noise in a resource block of 180 kHz with the 9 dB noise figure that 3GPP TR 36.942 gives a phone.
 constexpr double kNoisePerBlock = -174 + 52.55 + 9;
 constexpr int kSubcarriers = 12;  // of a resource block
-// A cell is found above this SINR, dB, 2 dB better than TS 36.133, section 8.1.2.2 demands, and
-// lost a little below.
+// A cell is found above this SINR in dB, 2 dB more than TS 36.133, section 8.1.2.2, demands, and lost a little below.
 constexpr double kFound = -8;
 constexpr double kLost = -10;
 constexpr Time kIdentify = std::chrono::milliseconds(800);  // TS 36.133: from finding to measuring

@@ -138,7 +138,7 @@ void Modem::redirect() {
     if (!_elsewhere(isElsewhere && !_isOnCall && !_registersAt, _serving, _now)) return;
     _barredUntil = _now + kAfterRedirection;
     release();
-    _hasMeasured = false;  // what was measured is no idle phone's
+    _hasMeasured = false;  // what was measured is not what an idle phone reports
 }
 
 void Modem::measureIdle() {
@@ -211,7 +211,7 @@ void Modem::weighCandidates() {
         if (i == _serving || !_air.isMeasured(_now, i) || !isFit(i)) continue;
         if (_air.reading(i).filteredRsrp < reading().filteredRsrp - kCandidateRange) continue;
         const Cell& cell = _cells[i];
-        candidates.push_back({.priority = cell.priority, .channel = cell.carrier.downlink, .code = cell.pci});
+        candidates.push_back({cell.priority, Candidate::Lte{cell.carrier.downlink, cell.pci}});
     }
     if (_idle.rules & IdleState::SearchOther) {
         candidates.insert(candidates.end(), serving().others.begin(), serving().others.end());

@@ -14,18 +14,14 @@ constexpr int kPriority = 5;  // of both carriers: cells of either are ranked ag
 
 // What lies below LTE at the same site; CDMA belongs to a neighboring network and reaches some sites only.
 std::vector<Candidate> othersNear(int site, int sector) {
-    using enum Candidate::Kind;
+    const int number = 3 * site + sector;
     std::vector<Candidate> others = {
-        {.kind = Utran, .priority = 4, .channel = 10'713, .code = (5 * (3 * site + sector) + 7) % 512},
-        {.kind = Geran,
-         .priority = 2,
-         .channel = 512 + 9 * site + 3 * sector,
-         .code = 8 * (site % 8) + sector,
-         .band = 1},
+        {4, Candidate::Utran{Uarfcn(10'713), Psc((5 * number + 7) % (Psc::kMax + 1))}},
+        {2, Candidate::Geran{Arfcn(512 + 3 * number), Bsic(8 * (site % 8) + sector), 1}},
     };
     if (site % 2 != 0) return others;
-    others.push_back({.kind = Cdma1x, .priority = 1, .channel = 384, .code = 4 * (3 * site + sector), .band = 0});
-    others.push_back({.kind = Hrpd, .priority = 3, .channel = 425, .code = 4 * (3 * site + sector), .band = 1});
+    others.push_back({1, Candidate::OneX{{0, CdmaChannel(384), PnOffset(4 * number)}}});
+    others.push_back({3, Candidate::Hrpd{{1, CdmaChannel(425), PnOffset(4 * number)}}});
     return others;
 }
 

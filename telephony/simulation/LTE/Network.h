@@ -3,6 +3,7 @@
 #include <array>
 #include <cstdint>
 #include <optional>
+#include <variant>
 #include <vector>
 
 #include "telephony/simulation/RadioNumbers.h"
@@ -30,12 +31,29 @@ inline constexpr std::array kCarriers = {
 
 /// A cell that a phone may go to; of another technology the network names it in its system information.
 struct Candidate {
-    enum class Kind { Lte, Utran, Geran, Cdma1x, Hrpd };
-    Kind kind = Kind::Lte;
-    int priority = 0;  ///< of its carrier, 0 to 7, the higher the more wanted
-    int channel = 0;   ///< EARFCN, UARFCN, ARFCN or CDMA channel
-    int code = 0;      ///< physical cell identity, scrambling code, BSIC or pilot offset
-    int band = 0;      ///< of GERAN and CDMA
+    struct Lte {
+        Earfcn channel;
+        Pci pci;
+    };
+    struct Utran {
+        Uarfcn channel;
+        Psc scramblingCode;
+    };
+    struct Geran {
+        Arfcn channel;
+        Bsic bsic;
+        int band;
+    };
+    struct Cdma {
+        int bandClass;
+        CdmaChannel channel;
+        PnOffset pilot;
+    };
+    struct OneX : Cdma {};
+    struct Hrpd : Cdma {};
+
+    int priority;                                      ///< of its carrier, 0 to 7, the higher the more wanted
+    std::variant<Lte, Utran, Geran, OneX, Hrpd> cell;  ///< in the order in which records number them
 };
 
 /// One cell, and what its system information says.

@@ -36,32 +36,35 @@ void writeNeighbor(RecordWriter& record, std::size_t at, const Neighbor& cell) {
     const Reading& reading = cell.reading;
     const std::uint32_t timing = cell.frames | cell.samples << 11;
     // clang-format off
-    record.u32(at,      cell.pci                            // bits  0-8
-                        | halves(reading.rssi, 8) << 9             // bits  9-16
-                        | halves(reading.rsrp, 9) << 17)           // bits 17-25
-          .u32(at + 4,  halves(reading.filteredRsrp, 9)             // bits  0-8
-                        | quality(reading.rsrq) << 9               // bits  9-15
-                        | quality(reading.filteredRsrq) << 16       // bits 16-22
-                        | steps(cell.srxlev, -30, 1, 7) << 23)     // bits 23-29
+    record.u32(at,      cell.pci                                // bits  0-8
+                        | halves(reading.rssi, 8) << 9          // bits  9-16
+                        | halves(reading.rsrp, 9) << 17)        // bits 17-25
+          .u32(at + 4,  halves(reading.filteredRsrp, 9)         // bits  0-8
+                        | quality(reading.rsrq) << 9            // bits  9-15
+                        | quality(reading.filteredRsrq) << 16   // bits 16-22
+                        | steps(cell.srxlev, -30, 1, 7) << 23)  // bits 23-29
           .u16(at + 8,  cell.frequencyError)
           .u32(at + 12, timing)   // antenna 0: frames in bits 0-10, samples in bits 11-29
           .u32(at + 16, timing);  // antenna 1
     // clang-format on
 }
 
+void write(RecordWriter& record, std::size_t at, const Candidate::Lte& cell) {
+    record.u16(at + 4, cell.channel).u16(at + 6, cell.pci << 7);
+}
+void write(RecordWriter& record, std::size_t at, const Candidate::Utran& cell) {
+    record.u16(at + 4, cell.channel).u16(at + 6, cell.scramblingCode);
+}
+void write(RecordWriter& record, std::size_t at, const Candidate::Geran& cell) {
+    record.u16(at + 4, cell.channel).u8(at + 6, cell.band).u8(at + 7, cell.bsic);
+}
+void write(RecordWriter& record, std::size_t at, const Candidate::Cdma& cell) {
+    record.u8(at + 4, cell.bandClass).u16(at + 8, cell.channel).u16(at + 10, cell.pilot);
+}
+
 void writeCandidate(RecordWriter& record, std::size_t at, const Candidate& candidate) {
-    record.u16(at, candidate.priority).u16(at + 2, static_cast<std::uint64_t>(candidate.kind));
-    switch (candidate.kind) {
-        case Candidate::Kind::Lte: record.u16(at + 4, candidate.channel).u16(at + 6, candidate.code << 7); break;
-        case Candidate::Kind::Utran: record.u16(at + 4, candidate.channel).u16(at + 6, candidate.code); break;
-        case Candidate::Kind::Geran:
-            record.u16(at + 4, candidate.channel).u8(at + 6, candidate.band).u8(at + 7, candidate.code);
-            break;
-        case Candidate::Kind::Cdma1x:
-        case Candidate::Kind::Hrpd:
-            record.u8(at + 4, candidate.band).u16(at + 8, candidate.channel).u16(at + 10, candidate.code);
-            break;
-    }
+    record.u16(at, candidate.priority).u16(at + 2, candidate.cell.index());
+    std::visit([&](const auto& cell) { write(record, at, cell); }, candidate.cell);
 }
 
 }  // namespace
@@ -104,22 +107,22 @@ Bytes servingMeasurementRecord(Time time, const Cell& cell, const Reading& readi
     return RecordWriter(time, 0xB17F, 33)
         .u8 (13, kVersion)
         .u16(17, cell.carrier.downlink)
-        .u16(19, cell.pci                                     // bits  0-8
-                 | cell.priority << 9)                               // bits  9-12
-        .u32(21, quarters(reading.rsrp)                              // bits  0-8
-                 | quarters(reading.filteredRsrp) << 9                // bits  9-17
-                 | quality(reading.rsrq) << 18                       // bits 18-24
-                 | quality(reading.filteredRsrq) << 25)               // bits 25-31
-        .u32(25, halves(reading.rssi, 9)                             // bits  0-8
-                 | minimumLevel(cell.minimumLevel) << 9              // bits  9-14
-                 | maximumPower << 15                                // bits 15-21
-                 | steps(kStrongestPower, -30, 1, 6) << 22)          // bits 22-27
-        .u32(29, steps(idle.srxlev, -30, 1, 7)                       // bits  0-6
-                 | steps(idle.failedCycles, 0, 1, 6) << 7            // bits  7-12
-                 | threshold(cell.searchIntra) << 13                 // bits 13-18
-                 | threshold(cell.searchOther) << 19                 // bits 19-24
-                 | (idle.rulesChanged ? 1U : 0U) << 25               // bit  25
-                 | static_cast<std::uint32_t>(idle.rules) << 26)     // bits 26-29
+        .u16(19, cell.pci                                         // bits  0-8
+                 | cell.priority << 9)                            // bits  9-12
+        .u32(21, quarters(reading.rsrp)                           // bits  0-8
+                 | quarters(reading.filteredRsrp) << 9            // bits  9-17
+                 | quality(reading.rsrq) << 18                    // bits 18-24
+                 | quality(reading.filteredRsrq) << 25)           // bits 25-31
+        .u32(25, halves(reading.rssi, 9)                          // bits  0-8
+                 | minimumLevel(cell.minimumLevel) << 9           // bits  9-14
+                 | maximumPower << 15                             // bits 15-21
+                 | steps(kStrongestPower, -30, 1, 6) << 22)       // bits 22-27
+        .u32(29, steps(idle.srxlev, -30, 1, 7)                    // bits  0-6
+                 | steps(idle.failedCycles, 0, 1, 6) << 7         // bits  7-12
+                 | threshold(cell.searchIntra) << 13              // bits 13-18
+                 | threshold(cell.searchOther) << 19              // bits 19-24
+                 | (idle.rulesChanged ? 1U : 0U) << 25            // bit  25
+                 | static_cast<std::uint32_t>(idle.rules) << 26)  // bits 26-29
         .finish();
     // clang-format on
 }

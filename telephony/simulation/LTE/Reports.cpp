@@ -5,11 +5,6 @@
 #include "telephony/simulation/LTE/Modem.h"
 
 namespace kelvo::simulation::lte {
-namespace {
-
-constexpr std::size_t kMonitoredNeighbors = 2;
-
-}  // namespace
 
 std::vector<MonitoredCell> monitoredCells(const Modem& modem) {
     const Cell& serving = modem.serving();
@@ -22,7 +17,7 @@ std::vector<MonitoredCell> monitoredCells(const Modem& modem) {
                                          .pid = serving.pci,
                                          .uarfcn = serving.carrier.downlink,
                                          .bandInfo = serving.carrier.band}};
-    const std::size_t count = std::min(modem.neighbors().size(), kMonitoredNeighbors);
+    const std::size_t count = std::min(modem.neighbors().size(), MonitoredCell::kNeighbors);
     for (std::size_t i = 0; i < count; ++i) {
         cells.push_back({.technology = MonitoredCell::Technology::LTE,
                          .pid = modem.neighbors()[i].pci,

@@ -3,45 +3,25 @@
 #include "telephony/simulation/LTE/Records.h"
 
 namespace kelvo::simulation::lte {
-namespace {
 
 using namespace std::chrono_literals;
 
-constexpr int kRoutingArea = 1;
-
-}  // namespace
-
-Simulation::Simulation(std::uint64_t seed) : FamilySimulation(seed, 4s) {}
-
-void Simulation::step() {
-    _user.moveTo(now());
-    _air.moveTo(now());
-    _modem.step(now(), _user);
-    reportServingCell();
-    reportMeasurements();
-    reportExtended();
-}
+Simulation::Simulation(std::uint64_t seed, Generation generation)
+    : RegisteredSimulation(seed, 4s), _wording(wordingOf(generation)) {}
 
 void Simulation::reportServingCell() {
     const std::size_t cell = _modem.servingIndex();
-    if (_antennas.isDue(now(), cell)) emit(antennasRecord(now(), _modem.serving()));
-    if (_servingCell.isDue(now(), cell, 5s)) emit(servingCellRecord(now(), _modem.serving()));
+    if (_antennas.isDue(now(), cell)) emit(_wording.antennas(now(), _modem.serving()));
+    if (_servingCell.isDue(now(), cell, 5s)) emit(_wording.servingCell(now(), _modem.serving()));
 }
 
 void Simulation::reportMeasurements() {
     if (!_modem.hasMeasured()) return;
-    if (_modem.isConnected()) return emit(connectedMeasurementRecord(now(), _modem));
-    emit(servingMeasurementRecord(now(), _modem.serving(), _modem.reading(), _modem.idle()));
-    if (!_modem.neighbors().empty()) emit(neighborMeasurementRecord(now(), _modem));
+    if (_wording.everyModeMeasurement != nullptr) emit(_wording.everyModeMeasurement(now(), _modem));
+    if (_modem.isConnected()) return emit(_wording.connectedMeasurement(now(), _modem));
+    emit(_wording.servingMeasurement(now(), _modem.serving(), _modem.reading(), _modem.idle()));
+    if (!_modem.neighbors().empty()) emit(_wording.neighborMeasurement(now(), _modem));
     emit(candidatesRecord(now(), _modem));
-}
-
-void Simulation::reportExtended() {
-    const std::size_t cell = _modem.servingIndex();
-    if (_cells.isDue(now(), cell, 20s)) emit(cellInformationRecord(now(), monitoredCells(_modem)));
-    if (_contexts.isDue(now(), _modem.isOnCall(), 30s)) emit(pdpContextsRecord(now(), pdpContexts(_modem)));
-    const int area = _modem.registeredArea();
-    if (_sim.isDue(now(), area, 60s)) emit(simFilesRecord(now(), testNetworkSim(area, kRoutingArea)));
 }
 
 }  // namespace kelvo::simulation::lte

@@ -3,11 +3,6 @@
 #include "telephony/simulation/UTRAN/Modem.h"
 
 namespace kelvo::simulation::utran {
-namespace {
-
-constexpr std::size_t kMonitoredNeighbors = 2;
-
-}  // namespace
 
 std::vector<MonitoredCell> monitoredCells(const Modem& modem) {
     using enum MonitoredCell::Technology;
@@ -22,7 +17,7 @@ std::vector<MonitoredCell> monitoredCells(const Modem& modem) {
                                          .scn = serving.parameterId,
                                          .bandInfo = serving.band}};
     for (const Measurement& measured : modem.measurements()) {
-        if (cells.size() > kMonitoredNeighbors) break;
+        if (cells.size() > MonitoredCell::kNeighbors) break;
         const Cell& cell = modem.cells()[measured.cell];
         if (measured.cell == modem.servingIndex()) continue;
         cells.push_back({.technology = UTRAN2,

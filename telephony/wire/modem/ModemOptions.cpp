@@ -27,6 +27,12 @@ std::string checkPlace(const std::string& place) {
     return fmt::format("tcp:{} is no TCP port: there are 0 (any that is free) to 65535", number);
 }
 
+simulation::Generation generationOf(Technology technology, const std::string& year) {
+    const auto generation = simulation::generationOf(technology, year);
+    if (!generation) throw CLI::ValidationError("--generation", generation.error().reason);
+    return *generation;
+}
+
 std::string footer() {
     std::string text =
         "The modem prints where it is: the path of its pseudo-terminal (or the link to it), tcp:127.0.0.1:PORT or\n"
@@ -40,6 +46,7 @@ std::string footer() {
     text +=
         "\nExamples:\n"
         "  kelvo-modem --simulate lte --on /tmp/modem\n"
+        "  kelvo-modem --simulate lte --generation 2018 --on /tmp/modem\n"
         "  kelvo-modem --replay drive.pcap --on tcp:5555 --faults noise,flipped-bits --seed 7\n";
     return text;
 }
@@ -49,6 +56,7 @@ std::string footer() {
 ParsedModemOptions parseModemOptions(int argc, const char* const* argv) {
     ModemOptions options;
     std::string word;
+    std::string year;
     std::string faults;
     CLI::App app("Plays a modem, simulated or recorded, behind the diagnostic protocol of a real one.", "kelvo-modem");
     app.footer(footer());
@@ -62,6 +70,11 @@ ParsedModemOptions parseModemOptions(int argc, const char* const* argv) {
                      "(a file called *.frames)")
         ->type_name("FILE");
     source->require_option(1);
+    auto* generation = app.add_option("--generation", year,
+                                      "The year of the simulated modem: newer ones word an LTE or GSM/UMTS drive in\n"
+                                      "newer layouts; otherwise 2010")
+                           ->type_name("2010|2014|2018")
+                           ->needs(simulate);
     app.add_option("--on", options.on,
                    "A link to make to the pseudo-terminal, or a socket to listen on instead: tcp:PORT on this\n"
                    "machine, unix:PATH")
@@ -75,6 +88,8 @@ ParsedModemOptions parseModemOptions(int argc, const char* const* argv) {
     app.set_version_flag("--version", "kelvo-modem " KELVO_VERSION);
     try {
         app.parse(argc, argv);
+        if (simulate->count() > 0) options.simulate = *technologyBy(&TechnologyNames::word, std::string_view(word));
+        if (generation->count() > 0) options.generation = generationOf(options.simulate, year);
     } catch (const CLI::CallForHelp&) {
         fmt::print("{}", app.help());
         return {std::nullopt, 0};
@@ -85,7 +100,6 @@ ParsedModemOptions parseModemOptions(int argc, const char* const* argv) {
         fmt::print(stderr, "kelvo-modem: {}\n", error.what());
         return {std::nullopt, 1};
     }
-    if (simulate->count() > 0) options.simulate = *technologyBy(&TechnologyNames::word, std::string_view(word));
     options.faults = *Faults::parse(faults);
     return {options, 0};
 }

@@ -6,6 +6,7 @@
 #include <string>
 
 #include "platform/telephony/Technology.h"
+#include "telephony/simulation/Generation.h"
 #include "telephony/wire/modem/Faults.h"
 
 namespace kelvo::modem {
@@ -14,6 +15,7 @@ namespace kelvo::modem {
 struct ModemOptions {
     std::filesystem::path replay;  ///< a capture or a file of frames; empty: a simulation
     Technology simulate = Technology::LTE;
+    simulation::Generation generation = simulation::Generation::Of2010;
     std::string on;  ///< "tcp:PORT", "unix:PATH", or a link to the pseudo-terminal; empty: no link
     Faults faults;
     std::uint64_t seed = 1;

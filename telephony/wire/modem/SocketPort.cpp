@@ -60,7 +60,7 @@ std::size_t SocketPort::send(ByteView bytes) {
 TcpPort::TcpPort(std::uint16_t port) : _port(port) {
     QObject::connect(&_server, &QTcpServer::newConnection, &_server, [this] {
         while (auto* const socket = _server.nextPendingConnection()) {
-            socket->setParent(nullptr);  // the server closes before its last words have arrived
+            socket->setParent(nullptr);  // the server closes before what was sent last has arrived
             QObject::connect(socket, &QTcpSocket::disconnected, socket, &QIODevice::close);
             welcome(socket);
         }

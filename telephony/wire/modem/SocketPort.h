@@ -17,7 +17,7 @@ public:
     std::size_t send(ByteView bytes) override;
 
 protected:
-    /// Lets a reader in, or shows it the door while another is there.
+    /// Lets a reader in, or turns it away while another is there.
     void welcome(QIODevice* reader);
     virtual void close() = 0;
 

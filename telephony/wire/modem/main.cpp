@@ -31,8 +31,8 @@ int fail(const Failure& failure) {
 Result<std::unique_ptr<ModemRecords>> openRecords(const ModemOptions& options, std::uint64_t sim) {
     using Records = std::unique_ptr<ModemRecords>;
     if (options.replay.empty())
-        return Records(
-            std::make_unique<StreamRecords>(std::make_unique<SimulationStream>(options.simulate, options.seed + sim)));
+        return Records(std::make_unique<StreamRecords>(
+            std::make_unique<SimulationStream>(options.simulate, options.seed + sim, options.generation)));
     if (options.replay.extension() == ".frames") {
         auto frames = FramesRecords::open(options.replay);
         if (!frames) return frames.error();

@@ -9,6 +9,7 @@
 #include "LogGenerator/GSMUMTS/OSK_GSMClassIndex.h"
 #include "platform/system/DirectoryResources.h"
 #include "platform/system/Environment.h"
+#include "tests/support/CapturedOutput.h"
 #include "tests/support/CellArray.h"
 #include "tests/support/Record.h"
 #include "tests/support/RecordingLog.h"
@@ -110,16 +111,12 @@ TEST_F(OSK_GSM, SaysThatItIsCreatedAndDestructed) {
 }
 
 TEST_F(OSK_GSM, SaysOnStandardOutputThatItsSectionsGo) {
-    char* text = nullptr;
-    std::size_t size = 0;
-    std::FILE* output = open_memstream(&text, &size);
+    const test::CapturedOutput output;
     {
-        const Environment::Scope printing({.standardOutput = output});
+        const Environment::Scope printing({.standardOutput = output.file()});
         const OSK_GSMLogGenerator generator;
     }
-    std::fclose(output);
-    EXPECT_STREQ(text, "Deallocing OSK_GSMClassIndex\nDeallocing ClassIndex\n");
-    std::free(text);
+    EXPECT_EQ(output.text(), "Deallocing OSK_GSMClassIndex\nDeallocing ClassIndex\n");
 }
 
 TEST_F(OSK_GSM, AsksForTheCodesOfItsSectionsEachOnce) {

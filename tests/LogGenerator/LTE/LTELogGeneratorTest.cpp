@@ -9,8 +9,10 @@
 #include "LogGenerator/LTE/LTEClassIndex.h"
 #include "platform/system/DirectoryResources.h"
 #include "platform/system/Environment.h"
+#include "tests/support/CapturedOutput.h"
 #include "tests/support/Record.h"
 #include "tests/support/RecordingLog.h"
+#include "tests/support/TemplateScreens.h"
 
 namespace kelvo {
 namespace {
@@ -57,32 +59,15 @@ TEST_F(LTE, SaysThatItIsCreatedAndDestructed) {
 }
 
 TEST_F(LTE, SaysOnStandardOutputThatItsSectionsGo) {
-    char* text = nullptr;
-    std::size_t size = 0;
-    std::FILE* output = open_memstream(&text, &size);
+    const test::CapturedOutput output;
     {
-        const Environment::Scope printing({.standardOutput = output});
+        const Environment::Scope printing({.standardOutput = output.file()});
         const LTELogGenerator generator;
     }
-    std::fclose(output);
-    EXPECT_STREQ(text, "Deallocing LTEClassIndex\nDeallocing ClassIndex\n");
-    std::free(text);
+    EXPECT_EQ(output.text(), "Deallocing LTEClassIndex\nDeallocing ClassIndex\n");
 }
 
-class LTEScreens : public testing::Test {
-protected:
-    LTEScreens() { generator.getDisplayFromState(state); }
-
-    const DictionaryRef& screen(const char* name) { return (*state["Display"].dictionary())[name].dictionary(); }
-    const ArrayRef& rows(const char* name) { return (*state["Display"].dictionary())[name].array(); }
-    void feed(const Record& record) { generator.updateState(state, record.bytes()); }
-
-    DirectoryResources resources{KELVO_RESOURCE_DIR};
-    RecordingLog log;
-    Environment::Scope environment{{.log = &log, .resources = &resources}};
-    Dictionary state;
-    LTELogGenerator generator;
-};
+using LTEScreens = test::TemplateScreens<LTELogGenerator>;
 
 constexpr const char* kValueScreens[] = {
     "Serving Cell Info",     "Serving Cell Measurements", "Connected mode LTE Intra-frequency Measurement",

@@ -6,9 +6,11 @@
 
 #include "platform/system/DirectoryResources.h"
 #include "platform/system/Environment.h"
+#include "tests/support/CapturedOutput.h"
 #include "tests/support/CellArray.h"
 #include "tests/support/Record.h"
 #include "tests/support/RecordingLog.h"
+#include "tests/support/TemplateScreens.h"
 
 namespace kelvo {
 namespace {
@@ -79,16 +81,12 @@ TEST(UTRANLogGenerator, SaysWhatItBuilds) {
 
 TEST(UTRANLogGenerator, SaysOnStandardOutputThatItsSectionsGo) {
     const ListedResources resources({"UTRAN.plist"});
-    char* text = nullptr;
-    std::size_t size = 0;
-    std::FILE* output = open_memstream(&text, &size);
+    const test::CapturedOutput output;
     {
-        const Environment::Scope environment({.resources = &resources, .standardOutput = output});
+        const Environment::Scope environment({.resources = &resources, .standardOutput = output.file()});
         const UTRANLogGenerator generator;
     }
-    std::fclose(output);
-    EXPECT_STREQ(text, "Deallocing UTRANClassIndex\nDeallocing ClassIndex\n");
-    std::free(text);
+    EXPECT_EQ(output.text(), "Deallocing UTRANClassIndex\nDeallocing ClassIndex\n");
 }
 
 class HalfBuiltUTRANLogGenerator : public testing::TestWithParam<std::vector<std::string>> {
@@ -135,20 +133,7 @@ INSTANTIATE_TEST_SUITE_P(WithoutATemplate, HalfBuiltUTRANLogGenerator,
                          testing::Values(std::vector<std::string>(),
                                          std::vector<std::string>{"/utran/GSM.plist", "/utran/UTRA.plist"}));
 
-class UTRANScreens : public testing::Test {
-protected:
-    UTRANScreens() { generator.getDisplayFromState(state); }
-
-    const DictionaryRef& screen(const char* name) { return (*state["Display"].dictionary())[name].dictionary(); }
-    const ArrayRef& rows(const char* name) { return (*state["Display"].dictionary())[name].array(); }
-    void feed(const Record& record) { generator.updateState(state, record.bytes()); }
-
-    DirectoryResources resources{KELVO_RESOURCE_DIR};
-    RecordingLog log;
-    Environment::Scope environment{{.log = &log, .resources = &resources}};
-    Dictionary state;
-    UTRANLogGenerator generator;
-};
+using UTRANScreens = test::TemplateScreens<UTRANLogGenerator>;
 
 TEST_F(UTRANScreens, HaveAPlaceForEverySection) {
     for (const char* name : {"RRC Info", "Serving Cell Info", "SIM Info"}) EXPECT_TRUE(screen(name)) << name;

@@ -1,4 +1,4 @@
-// refused: throw "a key stands twice"
+// refused: throw "a key is used twice"
 #include "LogGenerator/LTE/LTECodes.h"
 #include "LogGenerator/ShowFields.h"
 

@@ -1,4 +1,4 @@
-// refused: throw "one conversion a format"
+// refused: throw "a format has one conversion"
 #include "LogGenerator/LTE/LTECodes.h"
 #include "LogGenerator/ShowFields.h"
 

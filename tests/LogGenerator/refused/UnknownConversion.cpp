@@ -1,4 +1,4 @@
-// refused: throw "a format that is not printed here"
+// refused: throw "this conversion is not supported"
 #include "LogGenerator/LTE/LTECodes.h"
 #include "LogGenerator/ShowFields.h"
 

@@ -1,4 +1,4 @@
-// refused: throw "zeros before a sign are not printed here"
+// refused: throw "leading zeros are supported for %x only"
 #include "LogGenerator/LTE/LTECodes.h"
 #include "LogGenerator/ShowFields.h"
 

@@ -2,8 +2,7 @@
 
 #include <gtest/gtest.h>
 
-#include <cstdlib>
-
+#include "tests/support/CapturedOutput.h"
 #include "tests/support/RecordingLog.h"
 
 namespace kelvo {
@@ -35,16 +34,12 @@ TEST(Environment, IsBackAsItWasAfterwards) {
 }
 
 TEST(Environment, PrintsLinesWhereItIsTold) {
-    char* text = nullptr;
-    std::size_t size = 0;
-    std::FILE* output = ::open_memstream(&text, &size);
+    const test::CapturedOutput output;
     {
-        const Environment::Scope environment({.standardOutput = output});
+        const Environment::Scope environment({.standardOutput = output.file()});
         printLine("Deallocing {} %s");
     }
-    std::fclose(output);
-    EXPECT_STREQ(text, "Deallocing {} %s\n");
-    std::free(text);
+    EXPECT_EQ(output.text(), "Deallocing {} %s\n");
 }
 
 }  // namespace

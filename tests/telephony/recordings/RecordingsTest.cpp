@@ -73,9 +73,9 @@ const Bytes kBlock = plainRecord(0xB0C1, kTicks + 1600, Bytes(9, 0x7E));
 
 TEST_F(Recordings, ReadFramesBehindGarbageAndAPartialFrame) {
     Bytes bytes = {0x7E, 1, 2, 3, 0xFF, 0x7E};
-    bytes += framed(recordBodyOf(kServing));
-    bytes += framed({0x60, 0, 0});  // events, texts and answers are no records
-    bytes += framed(recordBodyOf(kBlock));
+    bytes += plainFrame(recordBodyOf(kServing));
+    bytes += plainFrame({0x60, 0, 0});  // events, texts and answers are no records
+    bytes += plainFrame(recordBodyOf(kBlock));
     EXPECT_EQ(frames(bytes), "1:b0c2 1:b0c1");
     EXPECT_EQ(sizes, (std::vector<std::size_t>{38, 22}));
     EXPECT_EQ(times[1].value() - times[0].value(), std::chrono::seconds(2));
@@ -83,15 +83,15 @@ TEST_F(Recordings, ReadFramesBehindGarbageAndAPartialFrame) {
 }
 
 TEST_F(Recordings, SkipDamagedFramesAndCountThem) {
-    Bytes bytes = framed(recordBodyOf(kServing));
-    Bytes flipped = framed(recordBodyOf(kIdle));
+    Bytes bytes = plainFrame(recordBodyOf(kServing));
+    Bytes flipped = plainFrame(recordBodyOf(kIdle));
     flipped[20] ^= 4;
     bytes += flipped;
     Bytes lying = recordBodyOf(kIdle);
     lying[4] = 13;  // the second length
-    bytes += framed(lying);
-    bytes += framed({0x9E, 1, 2, 3, 4});
-    bytes += framed(recordBodyOf(kBlock));
+    bytes += plainFrame(lying);
+    bytes += plainFrame({0x9E, 1, 2, 3, 4});
+    bytes += plainFrame(recordBodyOf(kBlock));
     EXPECT_EQ(frames(bytes), "1:b0c2 1:b0c1");
     EXPECT_EQ(damage.damagedFrames, 2U);
     EXPECT_EQ(damage.encryptedRecords, 1U);
@@ -100,21 +100,21 @@ TEST_F(Recordings, SkipDamagedFramesAndCountThem) {
 TEST_F(Recordings, TellTheSubscriptionOfAWrappedRecord) {
     Bytes wrapped = {0x98, 1, 0, 0, 2, 0, 0, 0};
     wrapped += recordBodyOf(kIdle);
-    Bytes bytes = framed(recordBodyOf(kServing));
-    bytes += framed(wrapped);
+    Bytes bytes = plainFrame(recordBodyOf(kServing));
+    bytes += plainFrame(wrapped);
     EXPECT_EQ(frames(bytes), "1:b0c2 1:b17f");
     EXPECT_EQ(subscriptions, (std::vector<std::optional<std::int32_t>>{std::nullopt, 2}));
     EXPECT_EQ(sizes[1], 33U);
 }
 
 TEST_F(Recordings, KnowNoTimeOfAClockThatIsNotSet) {
-    EXPECT_EQ(frames(framed(recordBodyOf(plainRecord(0xB0C2, 800 * 60, Bytes(25))))), "1:b0c2");
+    EXPECT_EQ(frames(plainFrame(recordBodyOf(plainRecord(0xB0C2, 800 * 60, Bytes(25))))), "1:b0c2");
     EXPECT_EQ(times[0], std::nullopt);
 }
 
 TEST_F(Recordings, ReadWhatIsPacked) {
     Bytes bytes;
-    for (int i = 0; i < 5000; ++i) bytes += framed(recordBodyOf(kServing));
+    for (int i = 0; i < 5000; ++i) bytes += plainFrame(recordBodyOf(kServing));
     EXPECT_EQ(read<FramesRecording>(packed(bytes)).size(), 5000U * 7 - 1);
     EXPECT_FALSE(damage.isCut);
 
@@ -177,8 +177,8 @@ TEST_F(Recordings, ReadALongDlfFile) {
 
 TEST_F(Recordings, AreToldByTheirContent) {
     Bytes frames(1000, 0x55);
-    frames += framed(recordBodyOf(kServing));  // the garbage's, and so no frame
-    frames += framed(recordBodyOf(kServing));
+    frames += plainFrame(recordBodyOf(kServing));  // the garbage's, and so no frame
+    frames += plainFrame(recordBodyOf(kServing));
     EXPECT_EQ(recognizeRecording(frames), RecordingKind::Frames);
     EXPECT_EQ(recognizeRecording(kServing), RecordingKind::Dlf);
     EXPECT_EQ(recognizeRecording(Bytes{0xD4, 0xC3, 0xB2, 0xA1, 2, 0, 4, 0}), RecordingKind::Capture);
@@ -199,7 +199,7 @@ TEST_F(Recordings, AreNotSeenInNoise) {
 }
 
 TEST_F(Recordings, AreNamedWhereACaptureWasExpected) {
-    const std::string path = file(framed(recordBodyOf(kServing)));
+    const std::string path = file(plainFrame(recordBodyOf(kServing)));
     EXPECT_EQ(whyNoCapture(path, "no capture"),
               path + " is a stream of diagnostic frames; kelvoctl import makes a capture of it");
     EXPECT_EQ(whyNoCapture(file(kServing), "no capture").substr(directory.path().string().size()),

@@ -3,7 +3,7 @@
 #include <cstdint>
 #include <string>
 
-#include "platform/values/Bytes.h"
+#include "tests/telephony/wire/PlainFrame.h"
 
 /// Bytes of recordings, made without the code that reads them.
 namespace kelvo::test {
@@ -24,32 +24,6 @@ inline Bytes plainRecord(std::uint16_t code, std::uint64_t ticks, const Bytes& p
 
 /// 2023-12-06 04:04:26: 43 years, 11 months after 1980-01-06.
 inline constexpr std::uint64_t kTicks = std::uint64_t{1385870666} * 800;
-
-inline std::uint16_t plainChecksum(const Bytes& bytes) {
-    unsigned crc = 0xFFFF;
-    for (const std::uint8_t byte : bytes) {
-        crc ^= byte;
-        for (int i = 0; i < 8; ++i) crc = (crc & 1) != 0 ? crc >> 1 ^ 0x8408 : crc >> 1;
-    }
-    return static_cast<std::uint16_t>(crc ^ 0xFFFF);
-}
-
-inline Bytes framed(Bytes body) {
-    const std::uint16_t crc = plainChecksum(body);
-    body.push_back(static_cast<std::uint8_t>(crc));
-    body.push_back(static_cast<std::uint8_t>(crc >> 8));
-    Bytes frame;
-    for (const std::uint8_t byte : body) {
-        if (byte == 0x7D || byte == 0x7E) {
-            frame.push_back(0x7D);
-            frame.push_back(byte ^ 0x20);
-        } else {
-            frame.push_back(byte);
-        }
-    }
-    frame.push_back(0x7E);
-    return frame;
-}
 
 /// The body of a frame with a record.
 inline Bytes recordBodyOf(const Bytes& record) {

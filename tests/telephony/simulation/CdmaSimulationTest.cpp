@@ -19,23 +19,11 @@ namespace {
 
 std::uint32_t codeOf(const Bytes& message) { return message.at(5) | message.at(6) << 8U; }
 
-std::vector<Bytes> minuteOf(std::uint64_t seed) {
-    cdma::Simulation modem(seed);
-    std::vector<Bytes> messages;
-    for (auto message = modem.next(); message.time < 1min; message = modem.next()) messages.push_back(message.bytes);
-    return messages;
-}
-
 bool holds(const std::vector<PilotReading>& active, int pn) {
     return std::ranges::find(active, pn, &PilotReading::pn) != active.end();
 }
 
 }  // namespace
-
-TEST(CdmaSimulation, GivesTheSameBytesForTheSameSeed) {
-    EXPECT_EQ(minuteOf(1), minuteOf(1));
-    EXPECT_NE(minuteOf(1), minuteOf(2));
-}
 
 TEST(CdmaSimulation, SendsEveryRecordAskedForAtItsRate) {
     cdma::Simulation modem(1);

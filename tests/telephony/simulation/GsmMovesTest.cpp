@@ -94,8 +94,8 @@ private:
 /// to a cell that was listed together with the one that is left. Counted are all, and those to a cell that has risen
 /// against it since.
 ///
-/// At least 8, so that a share of them means something. Three of four must have risen and
-/// not all: half a dB of each reading is noise, and levels are listed as whole dB.
+/// At least 8, so that a share of them means something. Three of four must have risen, not all: half a dB of each
+/// reading is noise, and levels are listed as whole dB.
 void expectRisingMovesWithinUmts(bool isConnected, std::uint64_t drives) {
     int all = 0;
     int risen = 0;

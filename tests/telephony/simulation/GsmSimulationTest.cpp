@@ -44,12 +44,6 @@ void watch(gsm::Simulation& modem, Time until, Look look) {
 
 }  // namespace
 
-TEST(GsmSimulation, WritesTheSameLogForTheSameSeed) {
-    const Bytes log = write(5, 60s).log;
-    EXPECT_EQ(write(5, 60s).log, log);
-    EXPECT_NE(write(6, 60s).log, log);
-}
-
 TEST(GsmSimulation, ReportsEveryRecordKindAtItsRate) {
     struct Range {
         std::uint32_t code;

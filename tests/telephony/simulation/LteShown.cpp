@@ -24,20 +24,10 @@ void LteShown::compare(std::uint32_t code) {
     }
 }
 
-void LteShown::equals(const std::string& key, const std::string& text) {
-    EXPECT_EQ(at(key), text) << _section << "/" << key;
-}
-
-void LteShown::reads(const std::string& key, double truth, double step, const std::string& unit) {
-    const std::string path = _section + "/" + key;
-    EXPECT_NEAR(_played.number(path), truth, step / 2 + 0.00501) << path;  // two decimals are shown
-    EXPECT_TRUE(_played.text(path).ends_with(unit)) << path << ": " << _played.text(path);
-}
-
 void LteShown::servingCell() {
     const Cell& cell = _modem.serving();
     const bool isWide = cell.carrier.downlink == 1300;
-    _section = "Serving Cell Info";
+    open("Serving Cell Info");
     equals("Physical Cell ID", cell.pci);
     equals("Cell Identity", cell.identity);
     equals("Tracking Area Code", cell.trackingArea);
@@ -51,7 +41,7 @@ void LteShown::servingCell() {
 
 void LteShown::connectedMeasurement() {
     EXPECT_TRUE(_modem.isConnected());
-    _section = "Connected mode LTE Intra-frequency Measurement";
+    open("Connected mode LTE Intra-frequency Measurement");
     equals("E-ARFCN", _modem.serving().carrier.downlink);
     equals("Serving Physical Cell ID", _modem.serving().pci);
     equals("Subframe Number", _modem.subframe());
@@ -61,14 +51,14 @@ void LteShown::connectedMeasurement() {
     ASSERT_EQ(_played.rows("Measured Neighbor Cells"), _modem.neighbors().size());
     for (std::size_t i = 0; i < _modem.neighbors().size(); ++i) {
         const Neighbor& cell = _modem.neighbors()[i];
-        _section = "Measured Neighbor Cells/" + std::to_string(i);
+        open("Measured Neighbor Cells/" + std::to_string(i));
         equals("Physical Cell ID", cell.pci);
         reads("Filtered RSRP", cell.reading.filteredRsrp, 0.25, " dBm");
         reads("Filtered RSRQ", cell.reading.filteredRsrq, 0.125, " dB");
     }
     ASSERT_EQ(_played.rows("Detected Cells"), _modem.detected().size());
     for (std::size_t i = 0; i < _modem.detected().size(); ++i) {
-        _section = "Detected Cells/" + std::to_string(i);
+        open("Detected Cells/" + std::to_string(i));
         equals("Physical Cell ID", _modem.detected()[i]);
     }
 }
@@ -81,7 +71,7 @@ void LteShown::servingMeasurement() {
     const auto thresholdText = [](const std::optional<int>& dB, const char* unit) {
         return dB ? std::to_string(*dB) + unit : "Not Present";
     };
-    _section = "Serving Cell Measurements";
+    open("Serving Cell Measurements");
     equals("Version", 1);
     equals("E-ARFCN", cell.carrier.downlink);
     equals("Physical Cell ID", cell.pci);
@@ -103,14 +93,14 @@ void LteShown::servingMeasurement() {
 }
 
 void LteShown::neighborMeasurement() {
-    _section = "Neighbor Measurements";
+    open("Neighbor Measurements");
     equals("Version", 1);
     equals("E-ARFCN", _modem.neighborsCarrier().downlink);
     equals("Qrxlevmin", std::to_string(_modem.neighborsMinimumLevel()) + " dBm");
     ASSERT_EQ(_played.rows("Neighbor Cells List"), _modem.neighbors().size());
     for (std::size_t i = 0; i < _modem.neighbors().size(); ++i) {
         const Neighbor& cell = _modem.neighbors()[i];
-        _section = "Neighbor Cells List/" + std::to_string(i);
+        open("Neighbor Cells List/" + std::to_string(i));
         equals("Physical Cell ID", cell.pci);
         reads("Measured RSSI", cell.reading.rssi, 0.5, " dBm");
         reads("Measured RSRP", cell.reading.rsrp, 0.5, " dBm");
@@ -127,7 +117,7 @@ void LteShown::neighborMeasurement() {
 }
 
 void LteShown::candidates() {
-    _section = "Reselection Candidates";
+    open("Reselection Candidates");
     equals("Version", 1);
     equals("Serving EARFCN", _modem.serving().carrier.downlink);
     equals("Serving Cell ID", _modem.serving().pci);
@@ -137,33 +127,49 @@ void LteShown::candidates() {
 }
 
 void LteShown::candidate(const Candidate& candidate) {
-    _section = "Reselection Candidates List/0";
+    open("Reselection Candidates List/0");
     equals("Candidate Priority", candidate.priority);
-    switch (candidate.kind) {
-        case Candidate::Kind::Lte:
-            equals("Candidate RAT Type", "LTE");
-            equals("E ARFCN", candidate.channel);
-            return equals("Cell ID", candidate.code);
-        case Candidate::Kind::Utran:
-            equals("Candidate RAT Type", "UTRAN");
-            equals("U ARFCN", candidate.channel);
-            return equals("PSC", candidate.code);
-        case Candidate::Kind::Geran:
-            equals("Candidate RAT Type", "GERAN");
-            equals("ARFCN", candidate.channel);
-            equals("Band", candidate.band);
-            return equals("BSIC ID", candidate.code);
-        case Candidate::Kind::Cdma1x: equals("Candidate RAT Type", "CDMA1XRTT"); break;
-        case Candidate::Kind::Hrpd: equals("Candidate RAT Type", "CDMAHRPD"); break;
-    }
-    equals("Band", candidate.band);
-    equals("Channel", candidate.channel);
-    equals("Pilot", candidate.code);
+    std::visit([this](const auto& cell) { candidateCell(cell); }, candidate.cell);
+}
+
+void LteShown::candidateCell(const Candidate::Lte& cell) {
+    equals("Candidate RAT Type", "LTE");
+    equals("E ARFCN", cell.channel);
+    equals("Cell ID", cell.pci);
+}
+
+void LteShown::candidateCell(const Candidate::Utran& cell) {
+    equals("Candidate RAT Type", "UTRAN");
+    equals("U ARFCN", cell.channel);
+    equals("PSC", cell.scramblingCode);
+}
+
+void LteShown::candidateCell(const Candidate::Geran& cell) {
+    equals("Candidate RAT Type", "GERAN");
+    equals("ARFCN", cell.channel);
+    equals("Band", cell.band);
+    equals("BSIC ID", cell.bsic);
+}
+
+void LteShown::candidateCell(const Candidate::OneX& cell) {
+    equals("Candidate RAT Type", "CDMA1XRTT");
+    candidatePilot(cell);
+}
+
+void LteShown::candidateCell(const Candidate::Hrpd& cell) {
+    equals("Candidate RAT Type", "CDMAHRPD");
+    candidatePilot(cell);
+}
+
+void LteShown::candidatePilot(const Candidate::Cdma& cell) {
+    equals("Band", cell.bandClass);
+    equals("Channel", cell.channel);
+    equals("Pilot", cell.pilot);
 }
 
 void LteShown::monitoredCell() {
     const Cell& cell = _modem.serving();
-    _section = "Serving Cell Info";
+    open("Serving Cell Info");
     equals("Tracking Area Code", cell.trackingArea);
     equals("Cell Identity", cell.identity);
     equals("Physical Cell ID", cell.pci);
@@ -175,7 +181,7 @@ void LteShown::contexts() {
     // A call has a bearer of its own beside those for the internet and for signalling.
     ASSERT_EQ(_played.rows("PDP Context Info"), _modem.isOnCall() ? 3U : 2U);
     for (std::size_t i = 0; i < _played.rows("PDP Context Info"); ++i) {
-        _section = "PDP Context Info/" + std::to_string(i);
+        open("PDP Context Info/" + std::to_string(i));
         equals("Context ID", std::to_string(5 + i));
         equals("APN", i == 0 ? "internet" : "ims");
         equals("State", "Active");

@@ -9,6 +9,8 @@
 
 #include "tests/telephony/simulation/LteShown.h"
 #include "tests/telephony/simulation/Played.h"
+#include "tests/telephony/simulation/Sightings.h"
+#include "tests/telephony/simulation/Standing.h"
 
 using namespace kelvo;
 using namespace kelvo::simulation;
@@ -17,15 +19,6 @@ using namespace kelvo::test;
 using namespace std::chrono_literals;
 
 namespace {
-
-Bytes drive(std::uint64_t seed, Time until) {
-    lte::Simulation modem(seed);
-    Bytes all;
-    for (auto message = modem.next(); message.time < until; message = modem.next()) {
-        all.insert(all.end(), message.bytes.begin(), message.bytes.end());
-    }
-    return all;
-}
 
 /// The lines of level 3, which tell of something wrong.
 std::vector<std::string> errors(const Played& played) {
@@ -36,14 +29,7 @@ std::vector<std::string> errors(const Played& played) {
     return texts;
 }
 
-bool between(double value, double low, double high) { return value >= low && value <= high; }
-
 }  // namespace
-
-TEST(LteSimulation, GivesTheSameBytesForTheSameSeed) {
-    EXPECT_EQ(drive(5, 60s), drive(5, 60s));
-    EXPECT_NE(drive(5, 60s), drive(6, 60s));
-}
 
 TEST(LteSimulation, ShowsTheWorldItPlays) {
     lte::Simulation modem(1);
@@ -111,9 +97,6 @@ TEST(LteSimulation, HasALivelyFirstThreeMinutesInLittleSpace) {
     std::set<std::string> seen;
     Reported<std::size_t> serving;
     int cells = -1;  // the first is no change
-    std::size_t bytes = 0;
-    lte::Simulation twin(1);
-    for (auto message = twin.next(); message.time < 3min; message = twin.next()) bytes += message.bytes.size() + 16;
     while (played.time() < 3min) {
         played.next();
         cells += serving.isDue(played.time(), modem.modem().servingIndex());
@@ -129,33 +112,21 @@ TEST(LteSimulation, HasALivelyFirstThreeMinutesInLittleSpace) {
                              "GERAN", "CDMA1XRTT", "CDMAHRPD", "1041", "1042"}) {
         EXPECT_TRUE(seen.contains(text)) << text;
     }
-    EXPECT_LT(bytes, 180U * 1024) << "a capture's bytes, packet headers included";
+    EXPECT_LT(captureBytes<lte::Simulation>(1, 3min), 180U * 1024);
 }
 
 TEST(LteSimulation, GoesOnlyToCellsThatItHasShownBeforeAndThatCameCloser) {
     lte::Simulation modem(2);
     Played played(modem);
-    struct Sighting {
-        Time time;
-        double above;  // dB, of the serving cell
-    };
-    std::map<int, std::vector<Sighting>> sightings;
-    int changes = 0;
-    int rising = 0;
+    Sightings sightings;
     Time changed = 0s;
     int serving = modem.modem().serving().pci;
     while (played.time() < 10min) {
         const auto code = played.next();
         if (modem.modem().serving().pci != serving) {
             serving = modem.modem().serving().pci;
-            const auto& history = sightings[serving];
-            ASSERT_FALSE(history.empty()) << serving;
-            EXPECT_LE(played.time() - history.back().time, 1s);
-            EXPECT_GT(history.back().above, 1);  // hysteresis, less what the last sample took
-            rising += history.back().above > history.front().above ? 1 : 0;
-            ++changes;
+            ASSERT_NO_FATAL_FAILURE(sightings.goTo(serving, played.time()));
             changed = played.time();
-            sightings.clear();
         }
         if (code != 0xB179 && code != 0xB180) continue;
         const bool isConnected = code == 0xB179;
@@ -167,11 +138,11 @@ TEST(LteSimulation, GoesOnlyToCellsThatItHasShownBeforeAndThatCameCloser) {
         for (std::size_t i = 0; i < played.rows(list.substr(0, list.size() - 1)); ++i) {
             const std::string row = list + std::to_string(i);
             const int cell = static_cast<int>(played.number(row + "/Physical Cell ID"));
-            sightings[cell].push_back({played.time(), played.number(row + level) - own});
+            sightings.see(cell, played.time(), played.number(row + level) - own);
         }
     }
-    EXPECT_GE(changes, 15);
-    EXPECT_GE(rising, changes * 3 / 4) << changes;
+    EXPECT_GE(sightings.changes(), 15);
+    EXPECT_GE(sightings.risen(), sightings.changes() * 3 / 4) << sightings.changes();
     EXPECT_GT(changed, 9min);  // to the end
 }
 
@@ -271,25 +242,10 @@ TEST(LteSimulation, ReadsQualityAsLevelOverEverythingHeard) {
 TEST(LteSimulation, KeepsTheLevelWhileThePhoneStands) {
     lte::Simulation modem(1);
     const Modem& world = modem.modem();
-    Time since = 0s;
-    double driven = -1;
-    double level = 0;
-    int steady = 0;
-    Reported<std::size_t> serving;
-    for (auto message = modem.next(); message.time < 10min; message = modem.next()) {
-        const bool hasMoved = serving.isDue(message.time, world.servingIndex());
-        if (modem.air().drive().driven() != driven || hasMoved) {
-            since = message.time;
-            driven = modem.air().drive().driven();
-            level = modem.air().drive().received(world.servingIndex());
-            continue;
-        }
-        EXPECT_EQ(modem.air().drive().received(world.servingIndex()), level);
-        if (message.time - since < 4s) continue;  // the average still remembers the road
+    const int steady = checkStanding(modem, 4s, [&](double level) {  // until then the average still remembers the road
         EXPECT_NEAR(world.reading().filteredRsrp, level - 10 * std::log10(12 * world.serving().carrier.resourceBlocks),
                     3);
-        ++steady;
-    }
+    });
     EXPECT_GT(steady, 100);
 }
 
@@ -302,12 +258,10 @@ TEST(LteNetwork, NamesEveryCellByItself) {
         pcis.insert(cell.pci);
         identities.insert(cell.identity);
         for (const Candidate& other : cell.others) {
-            const bool isUtran = other.kind == Candidate::Kind::Utran;
-            const bool isGeran = other.kind == Candidate::Kind::Geran;
-            // Scrambling codes and pilot offsets go up to 511, base station colours to 63.
-            EXPECT_TRUE(between(other.code, 0, isGeran ? 63 : 511)) << other.code;
-            EXPECT_TRUE(!isUtran || between(other.channel, 10'562, 10'838));  // band I
-            EXPECT_TRUE(!isGeran || between(other.channel, 512, 885));        // DCS 1800
+            const auto* utran = std::get_if<Candidate::Utran>(&other.cell);
+            const auto* geran = std::get_if<Candidate::Geran>(&other.cell);
+            EXPECT_TRUE(!utran || between(utran->channel, 10'562, 10'838));  // band I
+            EXPECT_TRUE(!geran || between(geran->channel, 512, 885));        // DCS 1800
         }
     }
     EXPECT_EQ(pcis.size(), network.cells.size());

@@ -36,6 +36,17 @@ inline std::set<std::uint32_t> codesAskedFor(Technology technology) {
     return codes;
 }
 
+/// How many bytes the messages of a new drive until then take up in a capture, each with 16 bytes before it.
+template <class Simulation>
+std::size_t captureBytes(std::uint64_t seed, simulation::Time until) {
+    Simulation modem(seed);
+    std::size_t bytes = 0;
+    for (auto message = modem.next(); message.time < until; message = modem.next()) bytes += message.bytes.size() + 16;
+    return bytes;
+}
+
+inline bool between(double value, double low, double high) { return value >= low && value <= high; }
+
 /// A simulated modem's log, played message by message into the generator of its family; what the application would
 /// show of it can be read at each moment.
 class Played {

@@ -36,12 +36,8 @@ void UtranShown::compare(std::uint32_t code) {
     }
 }
 
-void UtranShown::equals(const std::string& key, const std::string& text) {
-    EXPECT_EQ(at(key), text) << _section << "/" << key;
-}
-
 void UtranShown::rrcState() {
-    _section = "RRC Info";
+    open("RRC Info");
     switch (_modem.rrcState()) {
         case RrcState::Disconnected: return equals("State", "Disconnected");
         case RrcState::Connecting: return equals("State", "Connecting");
@@ -54,7 +50,7 @@ void UtranShown::rrcState() {
 
 void UtranShown::servingCell() {
     const Cell& cell = _modem.serving();
-    _section = "Serving Cell Info";
+    open("Serving Cell Info");
     equals("Cell Access Restrictions", cell.barredClasses);
     equals("Cell ID", cell.identity);
     equals("Downlink UARFCN", cell.uarfcn);
@@ -68,7 +64,7 @@ void UtranShown::cells() {
     for (std::size_t i = 0; i < _modem.measurements().size(); ++i) {
         const auto& measured = _modem.measurements()[i];
         const Cell& cell = _modem.cells()[measured.cell];
-        _section = "Neighbor Cell List/" + std::to_string(i);
+        open("Neighbor Cell List/" + std::to_string(i));
         equals("UARFCN", cell.uarfcn);
         equals("Cell ID", cell.parameterId);
         const double level = 256 * number("Filter RSCP");  // -115 dBm and up in steps of 1 dB
@@ -87,7 +83,7 @@ void UtranShown::channels() {
     const auto& channels = _modem.transportChannels();
     ASSERT_EQ(_played.rows("TRCH BLER"), channels.size());
     for (std::size_t i = 0; i < channels.size(); ++i) {
-        _section = "TRCH BLER/" + std::to_string(i);
+        open("TRCH BLER/" + std::to_string(i));
         equals("TRCH ID", channels[i].id);
         const double level = number("TRCH BLER Measurement");
         if (channels[i].blockErrors == 0) {
@@ -100,10 +96,10 @@ void UtranShown::channels() {
     const auto& composites = _modem.composites();
     ASSERT_EQ(_played.rows("CCTRCH SIR"), composites.size());
     for (std::size_t i = 0; i < composites.size(); ++i) {
-        _section = "CCTRCH SIR/" + std::to_string(i);
+        open("CCTRCH SIR/" + std::to_string(i));
         equals("CCTRCH ID", composites[i].id);
         equals("TSNUM", composites[i].timeslots);
-        ASSERT_EQ(_played.rows(_section + "/SIR"), 6U);
+        ASSERT_EQ(rows("SIR"), 6U);
         for (std::size_t slot = 0; slot < 6; ++slot) {
             const auto& sir = composites[i].sir[slot];
             const double level = number("SIR/" + std::to_string(slot));  // -11 dB and up in steps of 0.5 dB
@@ -114,7 +110,7 @@ void UtranShown::channels() {
 
 void UtranShown::monitoredCell() {
     const Cell& cell = _modem.serving();
-    _section = "Serving Cell Info";
+    open("Serving Cell Info");
     equals("Local Area Code", cell.locationArea);
     equals("Cell ID", cell.identity);
     equals("Freq Band Indicator", cell.uarfcn > 10'000 ? "1" : "6");  // above 2000 MHz: band a
@@ -126,7 +122,7 @@ void UtranShown::monitoredCell() {
 void UtranShown::contexts() {
     ASSERT_EQ(_played.rows("PDP Context Info"), _modem.contexts().size());
     for (std::size_t i = 0; i < _modem.contexts().size(); ++i) {
-        _section = "PDP Context Info/" + std::to_string(i);
+        open("PDP Context Info/" + std::to_string(i));
         equals("Context ID", i == 0 ? "5" : "6");
         equals("APN", i == 0 ? "internet" : "mms");
         equals("PDP Type", "IPv4");

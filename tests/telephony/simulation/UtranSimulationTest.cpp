@@ -5,6 +5,8 @@
 #include <map>
 #include <set>
 
+#include "tests/telephony/simulation/Sightings.h"
+#include "tests/telephony/simulation/Standing.h"
 #include "tests/telephony/simulation/UtranShown.h"
 
 using namespace kelvo;
@@ -12,26 +14,6 @@ using namespace kelvo::simulation;
 using namespace kelvo::simulation::utran;
 using namespace kelvo::test;
 using namespace std::chrono_literals;
-
-namespace {
-
-Bytes drive(std::uint64_t seed, Time until) {
-    utran::Simulation modem(seed);
-    Bytes all;
-    for (auto message = modem.next(); message.time < until; message = modem.next()) {
-        all.insert(all.end(), message.bytes.begin(), message.bytes.end());
-    }
-    return all;
-}
-
-bool between(double value, double low, double high) { return value >= low && value <= high; }
-
-}  // namespace
-
-TEST(UtranSimulation, GivesTheSameBytesForTheSameSeed) {
-    EXPECT_EQ(drive(5, 60s), drive(5, 60s));
-    EXPECT_NE(drive(5, 60s), drive(6, 60s));
-}
 
 TEST(UtranSimulation, ShowsTheWorldItPlays) {
     utran::Simulation modem(1);
@@ -106,31 +88,19 @@ TEST(UtranSimulation, HasALivelyFirstThreeMinutesInLittleSpace) {
           "Emergency Calls Only", "ASET", "MSET", "DSET", "TRUE", "FALSE", "2101", "2102"}) {
         EXPECT_TRUE(seen.contains(text)) << text;
     }
-    EXPECT_LT(drive(1, 3min).size(), 180U * 1024);
+    EXPECT_LT(captureBytes<utran::Simulation>(1, 3min), 180U * 1024);
 }
 
 TEST(UtranSimulation, GoesOnlyToCellsThatItHasShownBeforeAndThatCameCloser) {
     utran::Simulation modem(2);
     Played played(modem);
-    struct Sighting {
-        Time time;
-        double above;  // dB, of the serving cell
-    };
-    std::map<int, std::vector<Sighting>> sightings;
-    int changes = 0;
-    int rising = 0;
+    Sightings sightings;
     int serving = modem.modem().serving().parameterId;
     while (played.time() < 10min) {
         const auto code = played.next();
         if (modem.modem().serving().parameterId != serving) {
             serving = modem.modem().serving().parameterId;
-            const auto& history = sightings[serving];
-            ASSERT_FALSE(history.empty()) << serving;
-            EXPECT_LE(played.time() - history.back().time, 1s);
-            EXPECT_GT(history.back().above, 1);  // hysteresis, less a step
-            rising += history.back().above > history.front().above ? 1 : 0;
-            ++changes;
-            sightings.clear();
+            ASSERT_NO_FATAL_FAILURE(sightings.goTo(serving, played.time()));
         }
         if (code != 0xD00A) continue;
         EXPECT_EQ(played.number("Neighbor Cell List/0/Cell ID"), serving);
@@ -138,11 +108,11 @@ TEST(UtranSimulation, GoesOnlyToCellsThatItHasShownBeforeAndThatCameCloser) {
         for (std::size_t i = 1; i < played.rows("Neighbor Cell List"); ++i) {
             const std::string row = "Neighbor Cell List/" + std::to_string(i);
             const int cell = static_cast<int>(played.number(row + "/Cell ID"));
-            sightings[cell].push_back({played.time(), 256 * played.number(row + "/Filter RSCP") - own});
+            sightings.see(cell, played.time(), 256 * played.number(row + "/Filter RSCP") - own);
         }
     }
-    EXPECT_GE(changes, 12);
-    EXPECT_GE(rising, changes * 3 / 4) << changes;
+    EXPECT_GE(sightings.changes(), 12);
+    EXPECT_GE(sightings.risen(), sightings.changes() * 3 / 4) << sightings.changes();
 }
 
 TEST(UtranSimulation, MayOnlyCallForHelpUntilItIsRegistered) {
@@ -206,23 +176,8 @@ TEST(UtranSimulation, HasMoreBlockErrorsWhereInterferenceIsStronger) {
 TEST(UtranSimulation, KeepsTheLevelWhileThePhoneStands) {
     utran::Simulation modem(1);
     const Modem& world = modem.modem();
-    Time since = 0s;
-    double driven = -1;
-    double level = 0;
-    int steady = 0;
-    Reported<std::size_t> serving;
-    for (auto message = modem.next(); message.time < 10min; message = modem.next()) {
-        const bool hasMoved = serving.isDue(message.time, world.servingIndex());
-        if (modem.air().drive().driven() != driven || hasMoved) {
-            since = message.time;
-            driven = modem.air().drive().driven();
-            level = modem.air().drive().received(world.servingIndex());
-            continue;
-        }
-        EXPECT_EQ(modem.air().drive().received(world.servingIndex()), level);
-        if (message.time - since < 6s) continue;  // the filter still remembers the road
+    const int steady = checkStanding(modem, 6s, [&](double level) {  // until then the filter still remembers the road
         EXPECT_NEAR(world.measurements()[0].rscp, level, 5);
-        ++steady;
-    }
+    });
     EXPECT_GT(steady, 100);
 }

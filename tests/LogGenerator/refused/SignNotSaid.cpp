@@ -1,4 +1,4 @@
-// refused: throw "32 bits need a word on their sign"
+// refused: throw "32 bits must say whether they are signed"
 #include "LogGenerator/LTE/LTECodes.h"
 #include "LogGenerator/ShowFields.h"
 

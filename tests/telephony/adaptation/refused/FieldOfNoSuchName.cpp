@@ -1,0 +1,8 @@
+// refused: throw "a field of the fixed layout is not given, or given twice"
+#include "telephony/adaptation/LayoutWords.h"
+
+using namespace kelvo;
+using namespace kelvo::adaptation;
+
+constexpr auto kFixed = fixedLayout(4, {{"PCI", 0, u16}, {"RSRP", 2, u16, steps(1, 4, -140)}});
+constexpr auto kNewer = newerLayout(kFixed, 4, {{"PCI", 0, u16}, {"RSRQ", 2, i16, steps(1, 16, -30)}});

@@ -1,0 +1,7 @@
+// refused: throw "a field lies past the end"
+#include "telephony/adaptation/LayoutWords.h"
+
+using namespace kelvo;
+using namespace kelvo::adaptation;
+
+constexpr auto kFixed = fixedLayout(3, {{"PCI", 0, u16}, {"RSRP", 2, u16, steps(1, 4, -140)}});

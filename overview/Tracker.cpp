@@ -12,21 +12,30 @@ using Kind = Event::Kind;
 
 bool isCellChange(Kind kind) { return kind == Kind::CellFound || kind == Kind::Handover || kind == Kind::Reselection; }
 
-/// Whether `below` has earned the place of `above`.
-bool overtakes(const TrackedCell& below, const TrackedCell& above) {
-    if (!below.heard.level) return false;
-    return !above.heard.level || below.heard.level->figure.number > above.heard.level->figure.number + Tracker::kSteady;
+/// Whether `cell` must not stand below `above`.
+bool overtakes(const TrackedCell& cell, const TrackedCell& above) {
+    const auto& level = cell.heard.level;
+    if (!level) return false;
+    const double margin = level->figure.unit.empty() ? 0 : Tracker::kSteady;
+    return !above.heard.level || level->figure.number > above.heard.level->figure.number + margin;
 }
 
-/// Bubbles: a cell moves past those that it overtakes and past no others.
+/// Each cell moves up to the first that it overtakes. Those above are in order already, so none that it passes is much
+/// stronger than it.
 void order(std::vector<TrackedCell>& cells) {
-    for (bool moved = true; std::exchange(moved, false);) {
-        for (std::size_t i = 1; i < cells.size(); ++i) {
-            if (!overtakes(cells[i], cells[i - 1])) continue;
-            std::swap(cells[i], cells[i - 1]);
-            moved = true;
-        }
+    for (auto cell = cells.begin(); cell != cells.end(); ++cell) {
+        const auto place =
+            std::find_if(cells.begin(), cell, [&](const auto& above) { return overtakes(*cell, above); });
+        std::rotate(place, cell, cell + 1);
     }
+}
+
+/// Whether one of the two is the other without its code: "ARFCN 23" and "ARFCN 23, BSIC 42". What a modem measures
+/// before it has read the code is that cell, as far as anybody can tell.
+bool isSameCell(const std::string& one, const std::string& other) {
+    const std::string& shorter = one.size() < other.size() ? one : other;
+    const std::string& longer = one.size() < other.size() ? other : one;
+    return one == other || (shorter.find(',') == shorter.npos && longer.starts_with(shorter + ","));
 }
 
 }  // namespace
@@ -62,16 +71,18 @@ void Tracker::note(Observation seen, Time now) {
 
 void Tracker::noteCells(Time now) {
     for (const HeardCell& heard : _seen.cells) {
-        const auto known =
-            std::ranges::find(_cells, heard.identity, [](const auto& cell) { return cell.heard.identity; });
+        const auto known = std::ranges::find_if(
+            _cells, [&](const TrackedCell& cell) { return isSameCell(cell.heard.identity, heard.identity); });
         if (known == _cells.end()) {
             _cells.push_back({heard, now, false});
         } else if (heard.record > known->heard.record) {
+            const std::string identity = std::max(known->heard.identity, heard.identity);  // that with its code
             *known = {heard, now, false};
+            known->heard.identity = identity;
         }
     }
     std::erase_if(_cells, [&](const TrackedCell& cell) {
-        return cell.heard.identity == _seen.cell || now - cell.lastHeard > kHeardFor + kLostFor;
+        return isSameCell(cell.heard.identity, _seen.cell) || now - cell.lastHeard > kHeardFor + kLostFor;
     });
     for (TrackedCell& cell : _cells) cell.isLost = now - cell.lastHeard > kHeardFor;
     order(_cells);
@@ -80,14 +91,15 @@ void Tracker::noteCells(Time now) {
 void Tracker::noteServing(const Observation& before, Time now) {
     if (_seen.cell.empty() || _seen.cell == before.cell) return;
     const bool isFirst = before.cell.empty();
-    const bool stays = before.isDedicated && _seen.isDedicated;
+    const bool isFresh = _levelTime && now - *_levelTime <= kHeardFor;
+    const bool stays = isFresh && before.isDedicated && _seen.isDedicated;
     happened({.time = now,
               .kind = isFirst ? Kind::CellFound
                       : stays ? Kind::Handover
                               : Kind::Reselection,
               .from = before.cell,
               .to = _seen.cell,
-              .levelBefore = isFirst ? std::string() : _level,
+              .levelBefore = isFirst || !isFresh ? std::string() : _level,
               .levelAfter = {},
               .record = _seen.cellRecord});
     _awaitsLevel = true;
@@ -107,8 +119,10 @@ void Tracker::noteLevel(Time now) {
 
 void Tracker::noteStates(const Observation& before, Time now) {
     noteChange(Kind::Access, before.access, _seen.access, now);
-    noteChange(Kind::Band, before.band, _seen.band, now);
-    noteChange(Kind::State, before.state, _seen.state, now);
+    if (before.access == _seen.access) {  // bands and states of two radios do not compare
+        noteChange(Kind::Band, before.band, _seen.band, now);
+        noteChange(Kind::State, before.state, _seen.state, now);
+    }
     noteChange(Kind::Area, before.area, _seen.area, now);
     noteChange(Kind::Registration, before.registrationState, _seen.registrationState, now);
     if (_seen.reject != before.reject && !_seen.reject.empty()) {
@@ -136,6 +150,10 @@ void Tracker::noteContexts(const Observation& before, Time now) {
 }
 
 void Tracker::noteService(const Observation& before, Time now) {
+    if (!std::exchange(_isBegun, true)) {
+        if (_seen.isWithoutService) _lostSince = now;
+        return;
+    }
     if (_seen.isWithoutService == before.isWithoutService) return;
     Event event{.time = now, .kind = Kind::ServiceLost, .from = {}, .to = {}, .levelBefore = {}, .levelAfter = {}};
     if (_seen.isWithoutService) {

@@ -63,6 +63,7 @@ private:
     std::uint64_t _levelRecord = 0;
     std::string _level;              // of the serving cell, as it was last
     bool _awaitsLevel = false;       // the last change of cell has no level after it yet
+    bool _isBegun = false;           // something has been noted
     std::optional<Time> _lostSince;  // service
 };
 

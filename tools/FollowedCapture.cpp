@@ -18,8 +18,9 @@ FollowedCapture followCapture(const std::string& path, CaptureReader& reader, Te
     generator->limitRawLog(0);
     const DictionaryRef state = Dictionary::make();
     RecordLedger ledger;
-    FollowedCapture followed{.tracker = overview::Tracker({.events = std::numeric_limits<std::size_t>::max(),
-                                                           .span = overview::Time::duration::max()})};
+    FollowedCapture followed;
+    followed.tracker =
+        overview::Tracker({.events = std::numeric_limits<std::size_t>::max(), .span = overview::Time::duration::max()});
     for (;;) {
         const auto next = reader.next();
         if (!next) followed.breakOff = next.error();
@@ -31,7 +32,7 @@ FollowedCapture followCapture(const std::string& path, CaptureReader& reader, Te
             const RecordLedger::Counted counted(ledger, {}, packet.time.time_since_epoch());
             generator->updateState(*state, packet.bytes);
         });
-        followed.tracker.note(observe(technology, (*state)["Display"]), followed.end);
+        followed.tracker.note(overview::observe(technology, (*state)["Display"]), followed.end);
     }
     if (followed.breakOff && followed.messages == 0) throw CommandFailure(*followed.breakOff);
     return followed;

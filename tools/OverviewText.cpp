@@ -47,7 +47,10 @@ std::vector<Line> linesOf(const std::vector<Fact>& facts) {
 }
 
 std::string ageText(Time then, Time now) {
-    return fmt::format("{} s ago", std::chrono::duration_cast<std::chrono::seconds>(now - then).count());
+    const auto seconds = std::chrono::duration_cast<std::chrono::seconds>(now - then).count();
+    if (seconds < 120) return fmt::format("{} s ago", seconds);
+    if (seconds < 7200) return fmt::format("{} min ago", seconds / 60);
+    return seconds < 172800 ? fmt::format("{} h ago", seconds / 3600) : fmt::format("{} days ago", seconds / 86400);
 }
 
 std::string serving(const Tracker& tracker, Time now) {
@@ -73,7 +76,8 @@ std::string textOf(const std::optional<Measure>& measure) { return measure ? pri
 /// How much more a cell has than the serving one; levels of different kinds do not compare.
 std::string difference(const std::optional<Measure>& level, const std::optional<Measure>& serving) {
     if (!level || !serving || level->name != serving->name) return "";
-    return fmt::format("{:+.2f} dB", level->figure.number - serving->figure.number);
+    return fmt::format("{:+.2f}{}", level->figure.number - serving->figure.number,
+                       level->figure.unit.empty() ? "" : " dB");
 }
 
 std::string cellsAround(const Tracker& tracker, Time now) {
@@ -83,6 +87,7 @@ std::string cellsAround(const Tracker& tracker, Time now) {
         lines.push_back({printable(cell.heard.identity), textOf(cell.heard.level), textOf(cell.heard.quality),
                          difference(cell.heard.level, tracker.latest().level), ageText(cell.lastHeard, now), mark});
     }
+    if (!lines.empty()) lines.insert(lines.begin(), {"Cell", "Level", "Quality", "To serving", "Heard", ""});
     return group("Cells around", lines);
 }
 

@@ -60,7 +60,7 @@ TEST(LteObservation, ABroadcastTellsTheCellsPartsAndItsBand) {
     EXPECT_EQ(seen.cell, "EARFCN 1300, PCI 256");
     EXPECT_EQ(seen.state, "");
     EXPECT_EQ(seen.area, "TAC 1042");
-    const std::vector<Fact> facts = {{"Cell identity", "27439618 (eNB 107185, sector 2)"},
+    const std::vector<Fact> facts = {{"Cell identity", "27439618 (eNB 107186, sector 2)"},
                                      {"Band", "3 (1815.0 MHz down, 1720.0 MHz up)"},
                                      {"Bandwidth", "20 MHz down, 10 MHz up"}};
     EXPECT_EQ(seen.serving, facts);

@@ -129,6 +129,64 @@ TEST(Tracker, RowsDoNotJumpAtADecibel) {
     EXPECT_EQ(identities(tracker), (std::vector<std::string>{"M", "N"}));
 }
 
+TEST(Tracker, NoRowStandsBelowOneThatIsMuchWeaker) {
+    Tracker tracker;
+    Observation seen = servedBy("A", 1);
+    seen.cells = {heard("K", -94, 1), heard("L", -93, 1), heard("M", -92, 1), heard("N", -90, 1)};
+    tracker.note(seen, kStart);
+    EXPECT_EQ(identities(tracker), (std::vector<std::string>{"N", "K", "L", "M"}));
+}
+
+TEST(Tracker, ACellMeasuredBeforeItsCodeIsReadIsThatCell) {
+    Tracker tracker;
+    Observation seen = servedBy("ARFCN 21, BSIC 44", 1);
+    seen.cells = {heard("ARFCN 23, BSIC 42", -80, 1), heard("ARFCN 2", -70, 1)};
+    tracker.note(seen, kStart);
+    seen.cells = {heard("ARFCN 23", -81, 2), heard("ARFCN 2, BSIC 7", -71, 2), heard("ARFCN 21", -60, 2)};
+    tracker.note(seen, kStart + 1s);
+    EXPECT_EQ(identities(tracker), (std::vector<std::string>{"ARFCN 2, BSIC 7", "ARFCN 23, BSIC 42"}));
+    EXPECT_DOUBLE_EQ(tracker.cells()[1].heard.level->figure.number, -81);
+}
+
+TEST(Tracker, ALevelOfLongAgoSaysNothingOfAChangeOfCell) {
+    Tracker tracker;
+    Observation seen = servedBy("A", 1);
+    seen.isDedicated = true;
+    tracker.note(seen, kStart);
+    Observation later = seen;
+    later.cell = "B";
+    later.cellRecord = 2;
+    tracker.note(later, kStart + 31s);
+    EXPECT_EQ(tracker.events().back().kind, Kind::Reselection);
+    EXPECT_EQ(tracker.events().back().levelBefore, "");
+}
+
+TEST(Tracker, AnotherRadioIsOneEventAndNotThree) {
+    Tracker tracker;
+    Observation seen = servedBy("A", 1);
+    seen.band = "3";
+    seen.state = "idle";
+    tracker.note(seen, kStart);
+    Observation later = servedBy("B", 2);
+    later.access = "UMTS";
+    later.band = "I";
+    later.state = "CELL_DCH";
+    tracker.note(later, kStart + 1s);
+    ASSERT_EQ(tracker.events().size(), 3u);
+    EXPECT_EQ(tracker.events()[1].kind, Kind::Reselection);
+    EXPECT_EQ(tracker.events()[2].kind, Kind::Access);
+}
+
+TEST(Tracker, APhoneThatNeverHadServiceHasNotLostIt) {
+    Tracker tracker;
+    Observation seen;
+    seen.isWithoutService = true;
+    tracker.note(seen, kStart);
+    EXPECT_TRUE(tracker.events().empty());
+    tracker.note(Observation(), kStart + 2s);
+    EXPECT_EQ(tracker.events().back().to, "after 2.0 s");
+}
+
 TEST(Tracker, TheServingCellIsNoneOfThoseAround) {
     Tracker tracker;
     Observation seen = servedBy("A", 1);

@@ -25,6 +25,7 @@ struct Raw {
     }
     constexpr Raw bit(int at) const { return bits(at, at); }
     constexpr Raw bigEndian() const { return {bytes, isSigned, true, lowBit, width}; }
+    constexpr int bitWidth() const { return width; }
     /// Where the number stands when its bytes begin at offset `at`.
     constexpr Place placeAt(std::size_t at) const { return {at, bytes, lowBit, width, isBigEndian}; }
 };

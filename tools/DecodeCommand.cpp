@@ -8,6 +8,7 @@
 #include <utility>
 
 #include "LogGenerator/Factory.h"
+#include "LogGenerator/RecordLedger.h"
 #include "model/Snapshot.h"
 #include "platform/host/Capture.h"
 #include "platform/system/Environment.h"
@@ -22,6 +23,7 @@
 #include "tools/NumberOption.h"
 #include "tools/OverviewJson.h"
 #include "tools/OverviewText.h"
+#include "tools/ProvenanceJson.h"
 #include "tools/StandardOutput.h"
 #include "tools/TechnologyOption.h"
 
@@ -37,6 +39,7 @@ struct Options {
     bool log = false;
     bool json = false;
     bool overview = false;
+    bool provenance = false;
     bool force = false;
 };
 
@@ -72,6 +75,8 @@ struct Decoded {
     std::size_t messages = 0;
     std::size_t understood = 0;  ///< of them: records of the family
     Value display;
+    RecordLedger records;
+    std::chrono::nanoseconds end{0};  ///< the last message's time
     std::optional<Failure> breakOff;  ///< where the capture can be read no further, and why
 };
 
@@ -87,8 +92,9 @@ Decoded decodeAll(const Options& options, CaptureReader& reader, LogGenerator& g
         } else {
             ++decoded.messages;
             decoded.understood += codes.include((*packet)->bytes) ? 1 : 0;
+            decoded.end = (*packet)->time.time_since_epoch();
             orTell(options.file, decoded.messages, [&] {
-                generator.updateState(state, (*packet)->bytes);
+                update(generator, state, decoded.records, (*packet)->bytes, decoded.end);
                 if (options.refreshEvery && decoded.messages % *options.refreshEvery == 0) {
                     generator.generateLogUsingState(state);
                 }
@@ -160,7 +166,10 @@ void decode(const Options& options) {
 
     if (options.json) {
         nlohmann::ordered_json json = {
-            {"technology", names.name}, {"messages", decoded.messages}, {"display", jsonFrom(decoded.display)}};
+            {"technology", names.name},
+            {"messages", decoded.messages},
+            {"display", options.provenance ? jsonWithProvenance(decoded.display, decoded.records, decoded.end)
+                                           : jsonFrom(decoded.display)}};
         if (options.log) json["log"] = log.json();
         writeToStandardOutput(printedJson(json));
     } else {
@@ -188,8 +197,12 @@ void addDecodeCommand(CLI::App& app) {
         .add_flag("--overview", options->overview,
                   "Shows what the values mean together instead: the serving cell, the cells around, what happened")
         ->excludes("--save", "--log", "--refresh-every");
-    command.add_flag("--json", options->json,
-                     "Prints one JSON object: technology, messages, display and, with --log, log");
+    CLI::Option* json = command.add_flag("--json", options->json,
+                                         "Prints one JSON object: technology, messages, display and, with --log, log");
+    command
+        .add_flag("--provenance", options->provenance,
+                  "Tells of every value its number and unit, the record that wrote it last, and its age")
+        ->needs(json);
     command.footer(
         "Of a capture that breaks off, the good part is shown; then one line tells where it ends, and the status is "
         "1.\n"
@@ -198,6 +211,7 @@ void addDecodeCommand(CLI::App& app) {
         "  kelvoctl decode drive.pcap\n"
         "  kelvoctl decode --json drive.pcap | jq .display\n"
         "  kelvoctl decode --overview drive.pcap\n"
+        "  kelvoctl decode --json --provenance drive.pcap | jq '.display.\"Serving Cell Measurements\"'\n"
         "  kelvoctl decode --log drive.pcap | grep '^\\[3\\]'\n"
         "  kelvoctl decode --refresh-every 50 --save drive.kelvo drive.pcap\n");
     command.callback([options] { decode(*options); });

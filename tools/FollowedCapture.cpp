@@ -3,7 +3,6 @@
 #include <limits>
 
 #include "LogGenerator/Factory.h"
-#include "LogGenerator/RecordLedger.h"
 #include "platform/system/Environment.h"
 #include "platform/values/Dictionary.h"
 #include "tools/CapturePackets.h"
@@ -17,7 +16,7 @@ FollowedCapture followCapture(const std::string& path, CaptureReader& reader, Te
     const auto generator = generatorFromTechnology(namesOf(technology).identifier);
     generator->limitRawLog(0);
     const DictionaryRef state = Dictionary::make();
-    RecordLedger ledger;
+    RecordLedger records;
     FollowedCapture followed;
     followed.tracker =
         overview::Tracker({.events = std::numeric_limits<std::size_t>::max(), .span = overview::Time::duration::max()});
@@ -28,10 +27,8 @@ FollowedCapture followCapture(const std::string& path, CaptureReader& reader, Te
         const CapturePacket& packet = **next;
         ++followed.messages;
         followed.end = std::chrono::floor<std::chrono::microseconds>(packet.time);
-        orTell(path, followed.messages, [&] {
-            const RecordLedger::Counted counted(ledger, {}, packet.time.time_since_epoch());
-            generator->updateState(*state, packet.bytes);
-        });
+        orTell(path, followed.messages,
+               [&] { update(*generator, *state, records, packet.bytes, packet.time.time_since_epoch()); });
         followed.tracker.note(overview::observe(technology, (*state)["Display"]), followed.end);
     }
     if (followed.breakOff && followed.messages == 0) throw CommandFailure(*followed.breakOff);

@@ -11,6 +11,7 @@
 #include "tools/DisplayText.h"
 #include "tools/DoctorCommand.h"
 #include "tools/EventsCommand.h"
+#include "tools/ExplainCommand.h"
 #include "tools/ImportCommand.h"
 #include "tools/SnapshotCommand.h"
 #include "tools/StartCommandCommand.h"
@@ -50,6 +51,7 @@ int main(int argc, char** argv) {
     kelvo::addImportCommand(app);
     kelvo::addStartCommandCommand(app);
     kelvo::addDoctorCommand(app);
+    kelvo::addExplainCommand(app);
     try {
         app.parse(argc, argv);
         return 0;

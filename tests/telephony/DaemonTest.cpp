@@ -200,16 +200,28 @@ TEST_F(DaemonTest, TellsItsStatusToWhoeverAsks) {
 TEST_F(DaemonTest, SaysInOneLineWhatIsWrongWithItsCommandLine) {
     const QString capture = QString::fromStdString(_capture);
     const QString missing = QString::fromStdString(_temporary.path() / "missing");
-    for (const QStringList& arguments :
-         {QStringList{}, QStringList{"--replay"}, QStringList{"--replay", missing},
-          QStringList{"--replay", capture, "--speed", "0"}, QStringList{"--replay", capture, "--speed", "-1"},
-          QStringList{"--replay", capture, "--speed", "fast"}, QStringList{"--replay", capture, "--speed", "inf"},
-          QStringList{"--replay", capture, "more"}, QStringList{"--simulate", "nmt"},
-          QStringList{"--simulate", "lte", "--replay", capture}, QStringList{"--replay", capture, "--seed", "1"},
-          QStringList{"--simulate", "lte", "--loop"}, QStringList{"--simulate", "lte", "--seed", "-1"},
-          QStringList{"--simulate", "lte", "--record", "/nowhere/at.all"}, QStringList{"--status"},
-          QStringList{"--status", "--record", "x"}, QStringList{"--status", "--simulate", "lte"},
-          QStringList{"--simulate", "lte", "--force"}, QStringList{"--replay", "/proc/self/mem"}}) {
+    for (const QStringList& arguments : {QStringList{},
+                                         QStringList{"--replay"},
+                                         QStringList{"--replay", missing},
+                                         QStringList{"--replay", capture, "--speed", "0"},
+                                         QStringList{"--replay", capture, "--speed", "-1"},
+                                         QStringList{"--replay", capture, "--speed", "fast"},
+                                         QStringList{"--replay", capture, "--speed", "inf"},
+                                         QStringList{"--replay", capture, "more"},
+                                         QStringList{"--simulate", "nmt"},
+                                         QStringList{"--simulate", "lte", "--replay", capture},
+                                         QStringList{"--replay", capture, "--seed", "1"},
+                                         QStringList{"--simulate", "lte", "--loop"},
+                                         QStringList{"--simulate", "lte", "--seed", "-1"},
+                                         QStringList{"--simulate", "lte", "--record", "/nowhere/at.all"},
+                                         QStringList{"--status"},
+                                         QStringList{"--status", "--record", "x"},
+                                         QStringList{"--status", "--simulate", "lte"},
+                                         QStringList{"--simulate", "lte", "--generation", "2012"},
+                                         QStringList{"--replay", capture, "--generation", "2014"},
+                                         QStringList{"--simulate", "ifx", "--generation", "2010"},
+                                         QStringList{"--simulate", "lte", "--force"},
+                                         QStringList{"--replay", "/proc/self/mem"}}) {
         const auto [status, error] = run(arguments);
         EXPECT_EQ(status, 1);
         EXPECT_EQ(std::count(error.begin(), error.end(), '\n'), 1) << error;
@@ -230,6 +242,14 @@ TEST_F(DaemonTest, SaysPlainlyWhatIsWrongWithASeed) {
     }
 }
 
+TEST_F(DaemonTest, SaysPlainlyWhichModemsHaveGenerations) {
+    EXPECT_EQ(run({"--simulate", "lte", "--generation", "2012"}).second,
+              "kelvo-telephonyd: --generation: 2012 is none of 2010, 2014, 2018\n");
+    EXPECT_EQ(run({"--simulate", "cdma", "--generation", "2014"}).second,
+              "kelvo-telephonyd: --generation: CDMA records have one layout, whatever the year: only lte and gsm have "
+              "generations\n");
+}
+
 TEST_F(DaemonTest, TellsItsVersion) {
     const auto [status, error] = run({"--version"});
     EXPECT_EQ(status, 0);
@@ -241,7 +261,7 @@ TEST_F(DaemonTest, HelpsOnStandardOutput) {
     const auto [status, error] = run({"--help"});
     EXPECT_EQ(status, 0);
     EXPECT_EQ(error, "");
-    for (const char* word :
-         {"--replay", "--loop", "--speed", "--simulate", "--seed", "--record", "--force", "--status", "--version"})
+    for (const char* word : {"--replay", "--loop", "--speed", "--simulate", "--seed", "--generation", "--record",
+                             "--force", "--status", "--version"})
         EXPECT_NE(_output.find(word), std::string::npos);
 }

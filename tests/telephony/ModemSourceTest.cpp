@@ -358,6 +358,26 @@ TEST_F(ModemSourceTest, TurnsNewerLayoutsBeforeAnybodyGetsThem) {
     EXPECT_EQ((*source->portStatus())["Adapted"], Value(1));
 }
 
+// So that replaying shows what was shown, and a recording has nothing left to turn.
+TEST_F(ModemSourceTest, RecordsWhatItHasTurned) {
+    const test::TemporaryDirectory directory;
+    const auto path = directory.path() / "recorded.pcap";
+    auto file = OutputFile::create(path);
+    ASSERT_TRUE(file);
+    source->recordTo(Recording(std::move(file).value()));
+    stream({0xB0C1});
+    answer();
+    const Bytes payload{2, 73, 0, 0x21, 0x07, 0, 0, 0xFC, 0x03, 2, 50};
+    say(joined({{0x10, 0, 23, 0, 23, 0, 0xC1, 0xB0}, Bytes(8), payload}));
+    auto capture = CaptureReader::open(path);
+    ASSERT_TRUE(capture);
+    const auto recorded = *capture->next();
+    ASSERT_TRUE(recorded);
+    const Bytes fixed{1, 73, 0, 0x21, 0x07, 0xFC, 0x03, 2, 50};
+    EXPECT_EQ(Bytes(recorded->bytes.begin(), recorded->bytes.end()), joined({{1, 21, 0, 0xC1, 0xB0}, Bytes(8), fixed}));
+    EXPECT_EQ(adaptation::RecordAdapter().adapt(recorded->bytes).outcome, adaptation::Adapted::Outcome::Passed);
+}
+
 TEST_F(ModemSourceTest, RefusesLayoutsThatItDoesNotKnowAndNamesThemOnce) {
     stream({0xB0C1});
     answer();

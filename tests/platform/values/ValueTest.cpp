@@ -170,6 +170,24 @@ TEST(Value, PrintsAReadingWhenItIsReadAndOnce) {
     EXPECT_EQ(*value.string(), "10/2 dB");
 }
 
+#if defined(__GLIBCXX__) && defined(__x86_64__)
+// 40 bytes of what is shown, and eight for the record that wrote it.
+static_assert(sizeof(Value) == 40 + 8 && sizeof(Reading) == 24 && sizeof(Place) == 8);
+#endif
+
+TEST(Value, KeepsTheNumberOfTheRecordWhoeverCopiesIt) {
+    Value text = "a text";
+    EXPECT_EQ(text.record(), 0U);
+    text.setRecord(4711);
+    const Value row = Dictionary::make({{"key", text}});
+    EXPECT_EQ((*row.copy().dictionary())["key"].record(), 4711U);
+    EXPECT_EQ(text, Value("a text"));  // whoever wrote it
+    text.text() = "another";
+    EXPECT_EQ(text.record(), 4711U);
+    text = "a new value";
+    EXPECT_EQ(text.record(), 0U);
+}
+
 TEST(Value, KeepsTheNumberOfAReadingBesideItsText) {
     static const HalfDecibels quantity;
     Value value;

@@ -1,3 +1,5 @@
+#include <fstream>
+
 #include "tests/tools/KelvoctlTest.h"
 
 namespace kelvo {
@@ -48,7 +50,7 @@ TEST_F(EventsCommand, AsJsonLinesAndAsCommaSeparatedValues) {
 }
 
 TEST_F(EventsCommand, OfNoCaptureItSaysWhatItIs) {
-    writeFile(path("text"), "no capture at all");
+    std::ofstream(path("text")) << "no capture at all";
     EXPECT_EQ(kelvoctl({"events", path("text")}).status, 1);
     expectFailure(kelvoctl({"events", path("missing")}), path("missing") + ": No such file or directory");
 }

@@ -10,8 +10,8 @@
 namespace kelvo::check {
 
 constexpr void field(Raw raw, const Shown& shown) {
-    if (raw.lowBit + raw.bitWidth() > raw.bytes * 8) throw "the bits lie beyond the number";
-    if (raw.bitWidth() == 32 && !raw.isSigned && shown.saysNoSign()) throw "32 bits must say whether they are signed";
+    if (raw.lowBit + raw.width > raw.bytes * 8) throw "the bits lie beyond the number";
+    if (raw.width == 32 && !raw.isSigned && shown.saysNoSign()) throw "32 bits must say whether they are signed";
 }
 
 /// `size` is that of the record or entry in which the fields lie.

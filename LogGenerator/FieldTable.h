@@ -18,11 +18,16 @@ namespace kelvo {
 struct Field {
     std::uint16_t at;
     Raw raw;
+    Place place;  ///< the same, as readings carry it
     Key key;
     Shown shown;
 
     constexpr Field(int offset, Raw how, Key displayKey, Shown text)
-        : at(static_cast<std::uint16_t>(offset)), raw(how), key(displayKey), shown(text) {
+        : at(static_cast<std::uint16_t>(offset)),
+          raw(how),
+          place(how.placeAt(static_cast<std::size_t>(offset))),
+          key(displayKey),
+          shown(text) {
         check::field(how, text);
     }
 };

@@ -29,6 +29,8 @@ public:
     /// From now on at most so many bytes of raw records are kept between two rebuilds of the display; what comes beyond
     /// is decoded all the same, and more than that kept already is forgotten. Without a limit everything is kept.
     virtual void limitRawLog(std::size_t /*bytes*/) {}
+    /// Whether messages are log packets, with a code and a time in each; else they are trees.
+    virtual bool takesPackets() const { return true; }
     /// The contents of a snapshot file.
     virtual ArrayRef getSaveContentsFromState(Dictionary& state) = 0;
 

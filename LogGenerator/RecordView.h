@@ -6,6 +6,7 @@
 
 #include "LogGenerator/ArrayOutOfBoundsException.h"
 #include "platform/values/Bytes.h"
+#include "platform/values/Reading.h"
 
 namespace kelvo {
 
@@ -15,7 +16,7 @@ struct Raw {
     bool isSigned = false;
     bool isBigEndian = false;
     std::uint8_t lowBit = 0;
-    std::uint8_t width = 0;  ///< in bits; 0 stands for all of them
+    std::uint8_t width = static_cast<std::uint8_t>(bytes * 8);  ///< in bits
 
     /// Bits `low` to `high`, both included; bit 0 is the lowest of the (little-endian) number.
     constexpr Raw bits(int low, int high) const {
@@ -24,7 +25,9 @@ struct Raw {
     }
     constexpr Raw bit(int at) const { return bits(at, at); }
     constexpr Raw bigEndian() const { return {bytes, isSigned, true, lowBit, width}; }
-    constexpr int bitWidth() const { return width != 0 ? width : bytes * 8; }
+    constexpr int bitWidth() const { return width; }
+    /// Where the number stands when its bytes begin at offset `at`.
+    constexpr Place placeAt(std::size_t at) const { return {at, bytes, lowBit, width, isBigEndian}; }
 };
 
 inline constexpr Raw u8{1};
@@ -46,7 +49,7 @@ public:
     std::int64_t read(std::size_t at, Raw raw) const {
         std::uint32_t word = wordAt(at);
         if (raw.isBigEndian) word = swapped(word) >> (32 - 8 * raw.bytes);
-        const int unused = 32 - raw.bitWidth();
+        const int unused = 32 - raw.width;
         word = word >> raw.lowBit << unused;  // the number's bits alone, at the upper end
         return raw.isSigned ? std::int64_t{static_cast<std::int32_t>(word) >> unused} : std::int64_t{word >> unused};
     }

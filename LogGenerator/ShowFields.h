@@ -3,18 +3,32 @@
 #include <span>
 
 #include "LogGenerator/FieldTable.h"
+#include "LogGenerator/RecordBeingShown.h"
 #include "platform/values/Array.h"
 #include "platform/values/Dictionary.h"
 
 /// Writing readings to the display. A record leaves raw numbers there, each with the table line that prints it when the
-/// display is read: tables are static data.
+/// display is read: tables are static data. Everything that is written here bears the number of the record that is
+/// being shown; sections write nothing to the display in any other way.
 namespace kelvo {
 
-/// Makes `value` a reading of `quantity`.
-inline void showValue(Value& value, std::int64_t raw, const Quantity& quantity) {
-    value.set({.raw = raw, .quantity = &quantity});
+/// Makes `value` a reading of `quantity`, at `place` in its record when one field holds it.
+inline void showValue(Value& value, std::int64_t raw, const Quantity& quantity, Place place = {},
+                      std::uint64_t record = RecordBeingShown::number()) {
+    value.set({.raw = raw, .quantity = &quantity, .place = place}, record);
 }
-void showValue(Value& value, std::int64_t raw, const Quantity&& quantity) = delete;
+void showValue(Value& value, std::int64_t raw, const Quantity&& quantity, Place place = {},
+               std::uint64_t record = 0) = delete;
+
+/// Makes `value` a text.
+inline void showText(Value& value, std::string_view text) {
+    value.text().assign(text);
+    value.setRecord(RecordBeingShown::number());
+}
+
+/// Makes `value` what a record delivers ready-made. The arrays and dictionaries in `delivered` become the display's
+/// own.
+void showDelivered(Value& value, const Value& delivered);
 
 /// Makes `value` a number that a decoder has worked out.
 void showReal(Value& value, double number, const ShownReal& quantity);

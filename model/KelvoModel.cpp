@@ -208,7 +208,10 @@ void KelvoModel::rebuildNodes() {
     if (!_logGenerator) return;
     const Value display = _logGenerator->generateLogUsingState(*_state);  // which takes a snapshot
     _nodes = KelvoModelNode::makeTreeFromObject(display, _nodesByPath);
+    _trends.note(display, trendTime());
 }
+
+Trends::Time KelvoModel::trendTime() const { return std::chrono::duration_cast<Trends::Time>(_services.queue.now()); }
 
 NodeRef KelvoModel::nodeAtPath(const std::string& path) {
     if (!_nodes) rebuildNodes();
@@ -216,10 +219,22 @@ NodeRef KelvoModel::nodeAtPath(const std::string& path) {
 }
 
 void KelvoModel::updateWithData(ByteView data) {
-    if (_logGenerator) _logGenerator->updateState(*_state, data);
+    const std::chrono::nanoseconds now = _services.queue.now();
+    if (_logGenerator) {
+        if (_records.isFull()) _records.forgetAllBut((*_state)["Display"]);
+        const ByteView packet = _logGenerator->takesPackets() ? RecordLedger::packetOf(data) : ByteView();
+        const RecordLedger::Counted counted(_records, packet, now);
+        _logGenerator->updateState(*_state, data);
+    }
     _updated = true;
     _receiving = true;
-    _silentSince = _services.queue.now();
+    _silentSince = now;
+}
+
+std::optional<Provenance> KelvoModel::provenance(const KelvoModelNode& node) const {
+    auto provenance = provenanceOf(node.record(), _records, _services.queue.now());
+    if (provenance && node.reading() != nullptr) provenance->place = node.reading()->place;
+    return provenance;
 }
 
 ArrayRef KelvoModel::getSaveContents() {

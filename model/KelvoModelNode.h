@@ -1,10 +1,13 @@
 #pragma once
 
+#include <cstdint>
 #include <memory>
+#include <optional>
 #include <string>
 #include <string_view>
 #include <vector>
 
+#include "model/DisplayPath.h"
 #include "platform/encodings/PropertyList.h"
 #include "platform/values/Value.h"
 
@@ -43,6 +46,14 @@ public:
     virtual const Children* childNodes() const { return nullptr; }
     /// The value shown; null for an inner node.
     virtual const std::string* value() const { return nullptr; }
+    /// What the record reported whose text the value is; null when no record's number stands behind it.
+    virtual const Reading* reading() const { return nullptr; }
+    /// The number of the record that wrote the value last; 0 when none has. `KelvoModel::provenance` knows more of it.
+    virtual std::uint64_t record() const { return 0; }
+    /// The value's number in its unit; none for texts.
+    std::optional<Measurement> measurement() const {
+        return reading() != nullptr ? reading()->quantity->measure(reading()->raw) : std::nullopt;
+    }
 
     /// Builds the tree of a display object: root "Kelvo" at "/". Every node is found in `nodesByPath`, which forgets
     /// other trees, under its path; of two nodes with one path the later is found, and a parent is later than its
@@ -56,9 +67,5 @@ public:
 private:
     std::string _name;
 };
-
-/// `parent` extended by `name` as a path component: "/" and "A" give "/A", "/A" and "B" give "/A/B". No separator is
-/// doubled where the two meet, and an empty name leaves the path as it is.
-std::string pathByAppending(std::string_view parent, std::string_view name);
 
 }  // namespace kelvo

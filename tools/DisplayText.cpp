@@ -20,7 +20,7 @@ std::string leafLine(std::string line, std::string_view value, std::size_t nameC
     return line.append("  ").append(printable(value));
 }
 
-void appendChildren(std::vector<std::string>& lines, const KelvoModelNode::Children& children, std::size_t indent) {
+void appendChildren(std::vector<DisplayLine>& lines, const KelvoModelNode::Children& children, std::size_t indent) {
     std::size_t nameColumns = 0;
     std::vector<std::string> names;
     names.reserve(children.size());
@@ -32,9 +32,9 @@ void appendChildren(std::vector<std::string>& lines, const KelvoModelNode::Child
     for (std::size_t i = 0; i < children.size(); ++i) {
         const KelvoModelNode& child = *children[i];
         if (child.value() != nullptr) {
-            lines.push_back(leafLine(std::move(names[i]), *child.value(), nameColumns));
+            lines.push_back({leafLine(std::move(names[i]), *child.value(), nameColumns), &child});
         } else {
-            lines.push_back(std::move(names[i]));
+            lines.push_back({std::move(names[i]), &child});
             appendChildren(lines, *child.childNodes(), indent + 2);
         }
     }
@@ -42,9 +42,9 @@ void appendChildren(std::vector<std::string>& lines, const KelvoModelNode::Child
 
 }  // namespace
 
-std::vector<std::string> displayLines(const KelvoModelNode& root) {
-    if (root.value() != nullptr) return {leafLine(printable(root.displayName()), *root.value(), 0)};
-    std::vector<std::string> lines;
+std::vector<DisplayLine> displayLines(const KelvoModelNode& root) {
+    if (root.value() != nullptr) return {{leafLine(printable(root.displayName()), *root.value(), 0), &root}};
+    std::vector<DisplayLine> lines;
     appendChildren(lines, *root.childNodes(), 0);
     return lines;
 }
@@ -52,9 +52,8 @@ std::vector<std::string> displayLines(const KelvoModelNode& root) {
 std::string displayText(const Value& display) {
     NodesByPath nodesByPath;
     std::string text;
-    for (const std::string& line : displayLines(*KelvoModelNode::makeTreeFromObject(display, nodesByPath))) {
-        text.append(line).append("\n");
-    }
+    const NodeRef root = KelvoModelNode::makeTreeFromObject(display, nodesByPath);
+    for (const DisplayLine& line : displayLines(*root)) text.append(line.text).append("\n");
     return text;
 }
 

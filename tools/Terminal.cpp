@@ -17,6 +17,15 @@ namespace {
 constexpr std::string_view kEnter = "\x1b[?1049h\x1b[?25l\x1b[?7l\x1b[2J";
 constexpr std::string_view kLeave = "\x1b[?7h\x1b[?25h\x1b[?1049l";
 
+std::string looking(Terminal::Look look, std::string text) {
+    switch (look) {
+        case Terminal::Look::Plain: return text;
+        case Terminal::Look::Faint: return "\x1b[2m" + text + "\x1b[0m";
+        case Terminal::Look::Reverse: return "\x1b[7m" + text + "\x1b[0m";
+    }
+    return text;
+}
+
 }  // namespace
 
 Terminal::Terminal(int input, int output) : _input(input), _output(output) { enter(); }
@@ -53,13 +62,12 @@ void Terminal::forget() {
     _shown.clear();
 }
 
-void Terminal::draw(const std::vector<std::string>& rows, std::size_t firstHighlighted) {
+void Terminal::draw(const std::vector<Row>& rows) {
     const std::size_t columns = size().columns;
     std::string out;
     std::vector<std::string> now;
     for (std::size_t i = 0; i < std::max(rows.size(), _shown.size()); ++i) {
-        std::string row = i < rows.size() ? clipped(rows[i], 0, columns) : std::string();
-        if (i >= firstHighlighted && i < rows.size()) row = "\x1b[7m" + row + "\x1b[0m";
+        std::string row = i < rows.size() ? looking(rows[i].look, clipped(rows[i].text, 0, columns)) : std::string();
         // Erased first: after a full row the cursor stands on its last character.
         if (i >= _shown.size() || _shown[i] != row) out += fmt::format("\x1b[{};1H\x1b[K{}", i + 1, row);
         if (i < rows.size()) now.push_back(std::move(row));

@@ -32,9 +32,13 @@ public:
     Size size() const;
     /// Forgets what stands on the screen, after a change of its size: the next draw writes every row.
     void forget();
-    /// Shows one row a line from the top, those from `firstHighlighted` (an index) on in reverse video. Rows are
-    /// clipped at the screen's edge; only rows that changed are written.
-    void draw(const std::vector<std::string>& rows, std::size_t firstHighlighted);
+    enum class Look { Plain, Faint, Reverse };
+    struct Row {
+        std::string text;
+        Look look = Look::Plain;  ///< a terminal that knows no faint letters draws plain ones
+    };
+    /// Shows one row a line from the top. Rows are clipped at the screen's edge; only rows that changed are written.
+    void draw(const std::vector<Row>& rows);
 
 private:
     void write(std::string_view text) const;

@@ -42,33 +42,59 @@ public:
                   .portName = fmt::format("{}.watch.{}", KelvoModel::kLogChannelPortName, getpid()),
                   .connectionChanged = [this] { updateStatus(); }}) {
         queue.post([this] { _model.restartMonitor(); });
+        _ageTimer = queue.repeat(kAgesEvery, [this] { updateStatus(); });
         updateStatus();
     }
 
 private:
     void update() {
         if (!_model.isConnected()) return updateStatus();
-        const NodeRef root = _model.topLevelNodes();
+        _root = _model.topLevelNodes();
         const std::tm now = clock().local(clock().now());
         std::array<char, 64> text{};
         std::strftime(text.data(), text.size(), "Updated %Y-%m-%d at %H:%M:%S", &now);
         _updateMessage = text.data();
-        _view.showDisplay(root ? displayLines(*root) : std::vector<std::string>(), status());
+        _lines = _root ? displayLines(*_root) : std::vector<DisplayLine>();
+        std::vector<std::string> texts;
+        for (const DisplayLine& line : _lines) texts.push_back(line.text);
+        _view.setNotes(notes());
+        _view.showDisplay(std::move(texts), status());
     }
 
     void updateStatus() {
         if (_log != nullptr) _log->setConnected(_model.isConnected());
+        _view.setNotes(notes());
         _view.showStatus(status());
+    }
+
+    std::vector<WatchNote> notes() const {
+        std::vector<WatchNote> notes;
+        for (const DisplayLine& line : _lines) {
+            const auto provenance = _model.provenance(*line.node);
+            notes.push_back(provenance ? noteOf(*provenance) : WatchNote());
+        }
+        return notes;
+    }
+    static WatchNote noteOf(const Provenance& provenance) {
+        const std::string code = provenance.code ? fmt::format("0x{:04x} ", *provenance.code) : "";
+        const auto seconds = std::chrono::floor<std::chrono::seconds>(provenance.age);
+        return {fmt::format("{}#{}, {} s", code, provenance.record, seconds.count()), provenance.age >= kOld};
     }
 
     WatchStatus status() const {
         return {statusText(_model.isConnected(), _updateMessage), connectionText(_model.connection())};
     }
 
+    static constexpr auto kAgesEvery = std::chrono::seconds(2);
+    static constexpr auto kOld = std::chrono::seconds(30);
+
     WatchView& _view;
+    NodeRef _root;                                       // which the lines show
+    std::vector<DisplayLine> _lines;                     // of the last update
     RetryLog* const _log;                                // none: there is no log
     std::string _updateMessage = statusText(false, {});  // until the first update
     KelvoModel _model;
+    std::unique_ptr<RepeatingTimer> _ageTimer;  // values age while nothing comes
 };
 
 /// Qt complains on standard error about a locale that is not UTF-8, which a bare shell on a router board has.
@@ -162,7 +188,8 @@ void addWatchCommand(CLI::App& app) {
     command.footer(
         "On a terminal: arrows, PageUp, PageDown, Home and End scroll, q quits. What does not fit ends with \"…\"; "
         "Left\n"
-        "and Right lead to it.\n"
+        "and Right lead to it. p shows which record wrote each value last (its code, its number, how long ago), and\n"
+        "hides it. A value that no record has written for 30 seconds is drawn faint.\n"
         "Elsewhere, and with TERM=dumb, every refresh is printed under its status line; the log goes to standard "
         "error\n"
         "when that is no terminal.\n\n"

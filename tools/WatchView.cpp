@@ -13,7 +13,8 @@ namespace kelvo {
 namespace {
 
 constexpr std::size_t kStatusRows = 2;
-constexpr std::string_view kKeys = "arrows, q quits";
+constexpr std::size_t kWidestBesideNotes = 60;  // one long value does not push all notes away
+constexpr std::string_view kKeys = "p records, q quits";
 
 std::string oneLine(const WatchStatus& status) {
     return status.remark.empty() ? status.text : status.text + "  " + status.remark;
@@ -77,6 +78,7 @@ void TerminalWatchView::press(TerminalKey key) {
         case TerminalKey::PageDown: _top += page; break;
         case TerminalKey::Home: _top = 0; break;
         case TerminalKey::End: _top = _lines.size(); break;
+        case TerminalKey::Provenance: _showsNotes = !_showsNotes; break;
         case TerminalKey::Quit: return;
     }
     draw();
@@ -87,22 +89,40 @@ void TerminalWatchView::redraw() {
     draw();
 }
 
+/// The lines, and with the notes these in a column of their own.
+std::vector<std::string> TerminalWatchView::shownLines() const {
+    std::vector<std::string> lines = _lines;
+    if (!_showsNotes) return lines;
+    std::size_t widest = 0;
+    for (const std::string& line : lines) widest = std::max(widest, std::min(columnsOf(line), kWidestBesideNotes));
+    for (std::size_t i = 0; i < std::min(lines.size(), _notes.size()); ++i) {
+        if (_notes[i].text.empty()) continue;
+        const std::size_t columns = columnsOf(lines[i]);
+        lines[i].append(widest - std::min(widest, columns), ' ').append("  ").append(_notes[i].text);
+    }
+    return lines;
+}
+
 void TerminalWatchView::draw() {
+    const std::vector<std::string> lines = shownLines();
     const std::size_t columns = _terminal.size().columns;
     const std::size_t page = pageRows();
     std::size_t widest = 0;
-    for (const std::string& line : _lines) widest = std::max(widest, columnsOf(line));
-    _top = std::min(_top, _lines.size() - std::min(_lines.size(), page));
+    for (const std::string& line : lines) widest = std::max(widest, columnsOf(line));
+    _top = std::min(_top, lines.size() - std::min(lines.size(), page));
     _left = std::min(_left, widest - std::min(widest, columns));
 
-    const std::size_t count = std::min(page, _lines.size() - _top);
-    std::vector<std::string> rows;
-    for (std::size_t i = 0; i < count; ++i) rows.push_back(clipped(_lines[_top + i], _left, columns));
+    const std::size_t count = std::min(page, lines.size() - _top);
+    std::vector<Terminal::Row> rows;
+    for (std::size_t i = _top; i < _top + count; ++i) {
+        const bool isOld = i < _notes.size() && _notes[i].isOld;
+        rows.push_back({clipped(lines[i], _left, columns), isOld ? Terminal::Look::Faint : Terminal::Look::Plain});
+    }
     rows.resize(page);
-    rows.push_back(statusRow(_status, columns));
-    rows.push_back(
-        placeRow(count > 0 ? fmt::format("{}-{} of {}", _top + 1, _top + count, _lines.size()) : "", columns));
-    _terminal.draw(rows, page);
+    rows.push_back({statusRow(_status, columns), Terminal::Look::Reverse});
+    const std::string place = count > 0 ? fmt::format("{}-{} of {}", _top + 1, _top + count, lines.size()) : "";
+    rows.push_back({placeRow(place, columns), Terminal::Look::Reverse});
+    _terminal.draw(rows);
 }
 
 }  // namespace kelvo

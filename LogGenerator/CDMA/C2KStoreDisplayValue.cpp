@@ -24,13 +24,18 @@ void atEachPlace(Key lookupKey, const DictionaryRef& lookup, Store store) {
 }  // namespace
 
 void C2KStoreDisplayValue(Key lookupKey, const Value& value, const DictionaryRef& lookup) {
-    atEachPlace(lookupKey, lookup, [&](Value& place) { place = value; });
+    atEachPlace(lookupKey, lookup, [&, record = RecordBeingShown::number()](Value& place) {
+        place = value;
+        place.setRecord(record);
+    });
 }
 
 void C2KStoreFields(RecordView record, std::size_t base, std::span<const Field> fields, const DictionaryRef& lookup) {
+    const std::uint64_t number = RecordBeingShown::number();
     for (const Field& field : fields) {
         const std::int64_t raw = record.read(base + field.at, field.raw);
-        atEachPlace(field.key, lookup, [&](Value& place) { showValue(place, raw, field.shown); });
+        atEachPlace(field.key, lookup,
+                    [&](Value& value) { showValue(value, raw, field.shown, field.place.from(base), number); });
     }
 }
 

@@ -1,6 +1,7 @@
 #include "LogGenerator/GSMUMTS/ServingPLMN.h"
 
 #include <algorithm>
+#include <array>
 
 #include "LogGenerator/GSMUMTS/RegistrationRecord.h"
 #include "LogGenerator/GSMUMTS/ServingPLMNRecord.h"
@@ -45,8 +46,11 @@ void ServingPLMN::showServing(ByteView data) {
         const auto value = record.read(at, u8.bits(lowBit, lowBit + 3));
         return value < 10 ? static_cast<char>('0' + value) : ' ';
     };
-    values()->slot("Mobile Country Code").text() = {digit(15, 0), digit(15, 4), digit(16, 0)};
-    values()->slot("Mobile Network Code").text() = {digit(17, 0), digit(17, 4), digit(16, 4)};
+    const auto showDigits = [&](Key key, std::array<char, 3> digits) {
+        showText(values()->slot(key), {digits.data(), digits.size()});
+    };
+    showDigits("Mobile Country Code", {digit(15, 0), digit(15, 4), digit(16, 0)});
+    showDigits("Mobile Network Code", {digit(17, 0), digit(17, 4), digit(16, 4)});
     showFields(*values(), record, 0, ServingPLMNRecord::kAreas.fields);
 }
 

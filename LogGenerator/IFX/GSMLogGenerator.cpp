@@ -1,6 +1,7 @@
 #include "LogGenerator/IFX/GSMLogGenerator.h"
 
 #include "LogGenerator/AssertionFailure.h"
+#include "LogGenerator/ShowFields.h"
 #include "platform/encodings/PropertyList.h"
 #include "platform/telephony/LogChannelProtocol.h"
 
@@ -46,7 +47,8 @@ Value GSMLogGenerator::processObject(const Value& object) {
 void GSMLogGenerator::updateState(Dictionary& state, ByteView data) {
     const Result<Value> tree = readPropertyList(data);
     if (!tree) throw AssertionFailure("updateState:withData:", kSource, 90, "Could not deserialize the object");
-    const Value display = processObject(*tree);
+    Value display;
+    showDelivered(display, processObject(*tree));
     state.set("DisplayState", *tree);
     state.set("Display", display);
     state.set("ExtraInfo", Dictionary::make());

@@ -23,6 +23,7 @@ public:
     void updateState(Dictionary& state, ByteView data) override;
     Value generateLogUsingState(Dictionary& state) override;
     DictionaryRef getStartCommand() override;
+    bool takesPackets() const override { return false; }
     /// The history's snapshots alone: these modems send no raw records.
     ArrayRef getSaveContentsFromState(Dictionary& state) override;
 };

@@ -8,7 +8,8 @@ namespace kelvo {
 void PDPContextList::updateWithData(ByteView data, LogCode logCode) {
     logLine(Level::Warning, "PDPContextList");
     if (logCode != code::kPDPContexts) return reportUnknown(logCode);
-    const Value contexts = payloadPropertyList(data);
+    Value contexts;
+    showDelivered(contexts, payloadPropertyList(data));
     if (contexts.array()) replaceArray(list(), {contexts.array()->begin(), contexts.array()->end()});
 }
 

@@ -44,7 +44,7 @@ void SimInfo::updateWithData(ByteView data, LogCode logCode) {
     }
     if (!files.dictionary() || !values()) return;
     for (const SimFile& file : kFiles) {
-        if (const Value* value = files.dictionary()->find(file.key)) values()->set(file.label, *value);
+        if (const Value* value = files.dictionary()->find(file.key)) showDelivered(values()->slot(file.label), *value);
     }
 }
 

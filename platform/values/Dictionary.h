@@ -47,6 +47,11 @@ public:
     }
     /// Sets the value under `key`; a key that is there keeps its place, another is appended.
     void set(Key key, Value value) { slot(key) = std::move(value); }
+    /// Calls `visit` with every value, in order, for writing.
+    template <class Visit>
+    void forEachValue(Visit visit) {
+        for (Entry& entry : _entries) visit(entry.value);
+    }
     /// Removes `key` and keeps the order of the others; false when it was not there.
     bool remove(Key key);
     void reserve(std::size_t entries);
@@ -61,7 +66,7 @@ private:
     static constexpr std::size_t kScanLimit = 64;  ///< up to here comparing hashes in a row beats any index
 
     bool isAt(std::size_t index, Key key) const {
-        return _hashes[index] == key.hash() && _entries[index].key == key.text();
+        return _hashes[index] == key.hash() && isSameText(_entries[index].key, key.text());
     }
     std::size_t indexOf(Key key) const;
     std::size_t indexOfIndexed(Key key) const;

@@ -1,10 +1,30 @@
 #pragma once
 
+#include <cstddef>
 #include <cstdint>
+#include <cstring>
 #include <string>
 #include <string_view>
 
 namespace kelvo {
+
+/// Whether two texts are the same. Keys are short: comparing them eight bytes at a time costs a record half of what a
+/// call of the library's comparison would.
+inline bool isSameText(std::string_view a, std::string_view b) {
+    const auto wordOf = [](std::string_view text, std::size_t at) {
+        std::uint64_t word = 0;
+        std::memcpy(&word, text.data() + at, sizeof word);
+        return word;
+    };
+    constexpr std::size_t kWord = sizeof(std::uint64_t);
+    if (a.size() != b.size()) return false;
+    if (a.size() < kWord) return a == b;
+    for (std::size_t at = 0; at + kWord < a.size(); at += kWord) {
+        if (wordOf(a, at) != wordOf(b, at)) return false;
+    }
+    const std::size_t last = a.size() - kWord;
+    return wordOf(a, last) == wordOf(b, last);
+}
 
 /// A dictionary key together with its hash, borrowed for the call. A key made from a literal in a constant expression
 /// costs nothing at run time, so a table of keys is looked up without touching their characters' hashes again.

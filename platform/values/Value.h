@@ -46,6 +46,8 @@ using Date = std::chrono::sys_time<std::chrono::milliseconds>;
 /// A string may be a Reading: the raw number of a record stands beside its text. A display changes far more often than
 /// it is read, so the first look at such a string prints it, which makes reading a value a matter for the thread that
 /// owns it.
+///
+/// A value knows the number of the record that wrote it last. Copies keep it; what is saved holds the texts alone.
 class Value {
 public:
     enum class Kind { None, String, Number, Boolean, Data, Date, Array, Dictionary };
@@ -88,6 +90,11 @@ public:
         return dictionary != nullptr ? *dictionary : kNoDictionary;
     }
 
+    /// The number of the record that wrote the value last; 0 for a value that none has written.
+    std::uint64_t record() const { return _record; }
+    /// Says who has written the value. A text that is written anew through `text()` keeps the number before.
+    void setRecord(std::uint64_t number) { _record = number; }
+
     /// What a record reported here last; null for a value that no record's number stands behind.
     const Reading* reading() const {
         const auto* shown = std::get_if<ShownReading>(&_content);
@@ -100,8 +107,9 @@ public:
     /// keeps its storage, so that writing a text of similar length does not allocate.
     std::string& text();
 
-    /// Makes the value a string, whatever it was: the text of a reading.
-    void set(const Reading& reading) {
+    /// Makes the value a string, whatever it was: the text of a reading of the record with the number `record`.
+    void set(const Reading& reading, std::uint64_t record = 0) {
+        _record = record;
         if (auto* shown = std::get_if<ShownReading>(&_content)) {
             shown->set(reading);
         } else {
@@ -112,7 +120,8 @@ public:
     /// A deep copy: new arrays and dictionaries all the way down. Data is immutable and stays shared.
     Value copy() const;
 
-    /// Deep comparison; dictionaries compare as sets of entries, without their order.
+    /// Deep comparison of what is shown, whoever wrote it; dictionaries compare as sets of entries, without their
+    /// order.
     friend bool operator==(const Value& a, const Value& b);
 
 private:
@@ -152,6 +161,7 @@ private:
     std::variant<std::monostate, std::string, kelvo::Number, bool, std::shared_ptr<const Bytes>, kelvo::Date, ArrayRef,
                  DictionaryRef, ShownReading>
         _content;
+    std::uint64_t _record = 0;
 };
 
 /// The kind's name for messages: "string", "dictionary", …

@@ -28,12 +28,12 @@ inline void store(std::uint8_t* at, int bytes, std::uint32_t word) {
     }
 }
 
-constexpr std::uint32_t mask(const Raw& raw) { return ~std::uint32_t{0} >> (32 - raw.bitWidth()); }
+constexpr std::uint32_t mask(const Raw& raw) { return ~std::uint32_t{0} >> (32 - raw.width); }
 
 inline std::int64_t readBits(const std::uint8_t* at, const Raw& raw) {
     const std::uint32_t bits = load(at, raw.bytes) >> raw.lowBit & mask(raw);
     if (!raw.isSigned) return bits;
-    const std::int64_t sign = std::int64_t{1} << (raw.bitWidth() - 1);
+    const std::int64_t sign = std::int64_t{1} << (raw.width - 1);
     return (std::int64_t{bits} ^ sign) - sign;
 }
 
@@ -55,7 +55,7 @@ inline std::int64_t turned(const Move& move, std::int64_t raw) {
 
 /// Replaces the bits of one field.
 inline void writeBits(std::uint8_t* at, Raw raw, std::uint32_t value) {
-    if (raw.width == 0) return detail::store(at, raw.bytes, value);
+    if (raw.width == 8 * raw.bytes) return detail::store(at, raw.bytes, value);
     const std::uint32_t field = detail::mask(raw) << raw.lowBit;
     detail::store(at, raw.bytes, (detail::load(at, raw.bytes) & ~field) | (value << raw.lowBit & field));
 }

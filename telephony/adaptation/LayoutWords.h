@@ -38,7 +38,7 @@ struct FixedField {
         : name(fieldName), at(static_cast<std::uint16_t>(offset)), raw(how), steps(worth) {}
 
     constexpr int firstBit() const { return 8 * at + raw.lowBit; }
-    constexpr int lastBit() const { return firstBit() + raw.bitWidth() - 1; }
+    constexpr int lastBit() const { return firstBit() + raw.width - 1; }
 };
 
 /// What happens to a raw value on its way.
@@ -89,7 +89,7 @@ struct Move {
     std::int64_t factor = 1;
     std::int64_t summand = 0;  ///< of a constant: its value
 
-    constexpr std::int64_t greatest() const { return (std::int64_t{1} << toRaw.bitWidth()) - 1; }
+    constexpr std::int64_t greatest() const { return (std::int64_t{1} << toRaw.width) - 1; }
 };
 
 template <std::size_t N>

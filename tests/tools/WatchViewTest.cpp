@@ -128,16 +128,16 @@ TEST_F(View, ScrollsAsideToWhatDoesNotFit) {
     EXPECT_EQ(written(), "\x1b[1;1H\x1b[KAddress  2001:db8:0…\x1b[2;1H\x1b[K  Cell  00000102");
 }
 
-TEST_F(View, KeepsPlaceAndKeysInSightFrom34ColumnsOn) {
-    const winsize size{5, 34, 0, 0};
+TEST_F(View, KeepsPlaceAndKeysInSightFrom37ColumnsOn) {
+    const winsize size{5, 37, 0, 0};
     ioctl(_program.get(), TIOCSWINSZ, &size);
     TerminalWatchView view(*terminal);
     view.showDisplay(std::vector<std::string>(1450, "a"), {"Updated 2026-11-22 at 06:00:00", ""});
-    EXPECT_NE(written().find("\x1b[4;1H\x1b[K\x1b[7m Updated 2026-11-22 at 06:00:00   \x1b[0m"
-                             "\x1b[5;1H\x1b[K\x1b[7m 1-3 of 1450       arrows, q quits\x1b[0m"),
+    EXPECT_NE(written().find("\x1b[4;1H\x1b[K\x1b[7m Updated 2026-11-22 at 06:00:00      \x1b[0m"
+                             "\x1b[5;1H\x1b[K\x1b[7m 1-3 of 1450       p records, q quits\x1b[0m"),
               std::string::npos);
     view.press(TerminalKey::End);
-    EXPECT_NE(written().find("\x1b[7m 1448-1450 of 1450 arrows, q quits\x1b[0m"), std::string::npos);
+    EXPECT_NE(written().find("\x1b[7m 1448-1450 of 1450 p records, q quits\x1b[0m"), std::string::npos);
 }
 
 TEST_F(View, DropsTheKeysBeforeThePlaceInFewerColumns) {

@@ -170,10 +170,28 @@ TEST(Value, PrintsAReadingWhenItIsReadAndOnce) {
     EXPECT_EQ(*value.string(), "10/2 dB");
 }
 
+#if defined(__GLIBCXX__) && defined(__x86_64__)
+// 40 bytes of what is shown, and eight for the record that wrote it.
+static_assert(sizeof(Value) == 40 + 8 && sizeof(Reading) == 24 && sizeof(Place) == 8);
+#endif
+
+TEST(Value, KeepsTheNumberOfTheRecordWhoeverCopiesIt) {
+    Value text = "a text";
+    EXPECT_EQ(text.record(), 0U);
+    text.setRecord(4711);
+    const Value row = Dictionary::make({{"key", text}});
+    EXPECT_EQ((*row.copy().dictionary())["key"].record(), 4711U);
+    EXPECT_EQ(text, Value("a text"));  // whoever wrote it
+    text.text() = "another";
+    EXPECT_EQ(text.record(), 4711U);
+    text = "a new value";
+    EXPECT_EQ(text.record(), 0U);
+}
+
 TEST(Value, KeepsTheNumberOfAReadingBesideItsText) {
     static const HalfDecibels quantity;
     Value value;
-    value.set({.raw = -3, .quantity = &quantity, .record = 0xFFFFFFFFFFFFFFFF});
+    value.set({.raw = -3, .quantity = &quantity, .place = Place(21, 4, 9, 9, false)}, 0xFFFFFFFFFFFFFFFF);
     for (const char* when : {"before it is printed", "afterwards"}) {
         SCOPED_TRACE(when);
         ASSERT_TRUE(value.measurement());
@@ -182,14 +200,17 @@ TEST(Value, KeepsTheNumberOfAReadingBesideItsText) {
         ASSERT_NE(value.reading(), nullptr);
         EXPECT_EQ(value.reading()->raw, -3);
         EXPECT_EQ(value.reading()->quantity, &quantity);
-        EXPECT_EQ(value.reading()->record, 0xFFFFFFFFFFFFFFFF);
+        EXPECT_EQ(value.reading()->place.at(), 21U);
+        EXPECT_EQ(value.reading()->place.lowBit(), 9);
+        EXPECT_EQ(value.record(), 0xFFFFFFFFFFFFFFFF);
         EXPECT_EQ(value, Value("-3/2 dB"));
     }
     EXPECT_EQ(value.copy().measurement()->number, -1.5);
     value.set({.raw = 99, .quantity = &quantity});
     EXPECT_FALSE(value.measurement());
     EXPECT_EQ(value.reading()->raw, 99);
-    EXPECT_EQ(value.reading()->record, 0U);
+    EXPECT_FALSE(value.reading()->place);
+    EXPECT_EQ(value.record(), 0U);
 }
 
 TEST(Value, HasNoReadingWhenNoRecordStandsBehindIt) {

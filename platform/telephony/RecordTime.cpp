@@ -1,8 +1,9 @@
-#include "telephony/wire/Timestamp.h"
+#include "platform/telephony/RecordTime.h"
 
 #include <algorithm>
 
-namespace kelvo::wire {
+namespace kelvo {
+
 namespace {
 
 using std::chrono::nanoseconds;
@@ -36,4 +37,4 @@ std::uint64_t timestampOf(SystemTime time) {
     return static_cast<std::uint64_t>(since / kTick) << 16 | chips;
 }
 
-}  // namespace kelvo::wire
+}  // namespace kelvo

@@ -1,0 +1,10 @@
+#pragma once
+
+#include <CLI/CLI.hpp>
+
+namespace kelvo {
+
+/// `kelvoctl explain KEY`: what a value on the screens means, and the standard it comes from.
+void addExplainCommand(CLI::App& app);
+
+}  // namespace kelvo

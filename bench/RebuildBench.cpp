@@ -6,6 +6,7 @@
 #include "LogGenerator/Factory.h"
 #include "bench/Families.h"
 #include "model/KelvoModelNode.h"
+#include "model/Trends.h"
 #include "platform/system/DirectoryResources.h"
 #include "platform/system/Environment.h"
 
@@ -38,12 +39,36 @@ void rebuild(benchmark::State& state, std::string_view technology, const std::ve
     state.counters["nodes"] = static_cast<double>(countOf(*tree));
 }
 
+/// What the trends take of a refresh, when a record has written every value since the one before.
+void noteTrends(benchmark::State& state, std::string_view technology, const std::vector<Bytes>& messages) {
+    const DirectoryResources resources(KELVO_RESOURCE_DIR);
+    const Environment::Scope environment({.resources = &resources});
+    const auto generator = generatorFromTechnology(technology);
+    Dictionary kept;
+    Trends trends;
+    Trends::Time now{0};
+    for (auto _ : state) {
+        state.PauseTiming();
+        for (const Bytes& message : messages) generator->updateState(kept, message);
+        const Value display = generator->generateLogUsingState(kept);
+        NodesByPath nodes;
+        KelvoModelNode::makeTreeFromObject(display, nodes);  // which prints the texts
+        now += std::chrono::seconds(2);
+        state.ResumeTiming();
+        trends.note(display, now);
+    }
+    state.counters["bytes"] = static_cast<double>(trends.bytes());
+}
+
 void addAll() {
     const auto add = [](const std::string& name, std::string_view technology, const std::vector<Bytes>& messages) {
         const auto run = [=](benchmark::State& state) { rebuild(state, technology, messages); };
         benchmark::RegisterBenchmark(name.c_str(), run)->Unit(benchmark::kMicrosecond);
     };
     add("GSM/UMTS, every list filled", bench::gsmFamily().technology, bench::fullestGSMScreen());
+    benchmark::RegisterBenchmark("trends of GSM/UMTS, every list filled", [](benchmark::State& state) {
+        noteTrends(state, bench::gsmFamily().technology, bench::fullestGSMScreen());
+    })->Unit(benchmark::kMicrosecond);
     for (const auto& family : {bench::gsmFamily(), bench::lteFamily(), bench::cdmaFamily(), bench::utranFamily()}) {
         add(family.name, family.technology, family.traffic.front().messages);
     }

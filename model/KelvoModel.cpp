@@ -208,7 +208,10 @@ void KelvoModel::rebuildNodes() {
     if (!_logGenerator) return;
     const Value display = _logGenerator->generateLogUsingState(*_state);  // which takes a snapshot
     _nodes = KelvoModelNode::makeTreeFromObject(display, _nodesByPath);
+    _trends.note(display, trendTime());
 }
+
+Trends::Time KelvoModel::trendTime() const { return std::chrono::duration_cast<Trends::Time>(_services.queue.now()); }
 
 NodeRef KelvoModel::nodeAtPath(const std::string& path) {
     if (!_nodes) rebuildNodes();

@@ -9,6 +9,7 @@
 #include "model/Connection.h"
 #include "model/KelvoModelNode.h"
 #include "model/Provenance.h"
+#include "model/Trends.h"
 #include "platform/encodings/PropertyList.h"
 #include "platform/system/Lifetime.h"
 #include "platform/system/MainQueue.h"
@@ -64,6 +65,11 @@ public:
     NodeRef topLevelNodes();
     /// The node at `path`, of a tree built as for `topLevelNodes`; none when the tree has no such node.
     NodeRef nodeAtPath(const std::string& path);
+    /// As `nodeAtPath`, of the tree that is there; none while the next one is not built yet.
+    NodeRef shownNodeAtPath(const std::string& path) const { return _nodesByPath.find(path); }
+    /// How the values have gone; each rebuild of the tree is one refresh of them. Their time is that of the main queue.
+    const Trends& trends() const { return _trends; }
+    Trends::Time trendTime() const;
     /// Where a node's value comes from; none when no record has written it, or another has written in its place since
     /// the tree was built. Ages go on while no records come and when the connection is lost.
     std::optional<Provenance> provenance(const KelvoModelNode& node) const;
@@ -102,6 +108,7 @@ private:
     std::unique_ptr<LogGenerator> _logGenerator;
     NodeRef _nodes;
     NodesByPath _nodesByPath;  // built with _nodes and empty without
+    Trends _trends;
     std::unique_ptr<LocalPort> _recvPort;
     std::unique_ptr<RemotePort> _sendPort;
     std::unique_ptr<RepeatingTimer> _displayUpdateTimer;  // its presence means that the monitor runs

@@ -4,26 +4,13 @@
 #include <optional>
 
 #include "LogGenerator/ArrayLock.h"
+#include "model/DisplayPath.h"
 #include "model/KelvoModelLeafNode.h"
 #include "model/KelvoModelTreeNode.h"
 
 namespace kelvo {
 
 namespace {
-
-void appendToPath(std::string& path, std::string_view name) {
-    name.remove_prefix(std::min(name.find_first_not_of('/'), name.size()));
-    if (name.empty()) return;
-    if (!path.ends_with('/')) path += '/';
-    path += name;
-}
-
-/// "02;RSCP" is shown as "RSCP" and ordered by its prefix; a key with no or with several ";" is its own name.
-std::string_view nameOfSortedKey(std::string_view key) {
-    const std::size_t separator = key.find(';');
-    const bool twoParts = separator != key.npos && key.find(';', separator + 1) == key.npos;
-    return twoParts ? key.substr(separator + 1) : key;
-}
 
 /// One walk over a display object.
 class TreeBuilder {
@@ -102,12 +89,6 @@ NodeRef NodesByPath::find(std::string_view path) const {
 NodeRef KelvoModelNode::makeTreeFromObject(const Value& object, NodesByPath& nodesByPath) {
     nodesByPath._root = TreeBuilder().build("Kelvo", object);
     return nodesByPath._root;
-}
-
-std::string pathByAppending(std::string_view parent, std::string_view name) {
-    std::string path(parent);
-    appendToPath(path, name);
-    return path;
 }
 
 }  // namespace kelvo

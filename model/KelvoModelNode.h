@@ -7,6 +7,7 @@
 #include <string_view>
 #include <vector>
 
+#include "model/DisplayPath.h"
 #include "platform/encodings/PropertyList.h"
 #include "platform/values/Value.h"
 
@@ -66,9 +67,5 @@ public:
 private:
     std::string _name;
 };
-
-/// `parent` extended by `name` as a path component: "/" and "A" give "/A", "/A" and "B" give "/A/B". No separator is
-/// doubled where the two meet, and an empty name leaves the path as it is.
-std::string pathByAppending(std::string_view parent, std::string_view name);
 
 }  // namespace kelvo

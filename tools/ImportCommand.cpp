@@ -129,7 +129,7 @@ struct Written {
     std::uint64_t records = 0;
     std::uint64_t turned = 0;
     std::uint64_t refused = 0;
-    std::uint64_t ofOthers = 0;  ///< another family's, another SIM's, outside the times
+    std::uint64_t ofOthers = 0;  ///< no code of Kelvo's, another family's, another SIM's, outside the times
 };
 
 Written writeCapture(const Options& options, const RecordSurvey& survey, Technology technology, CaptureWriter& writer) {
@@ -149,7 +149,8 @@ Written writeCapture(const Options& options, const RecordSurvey& survey, Technol
         adapted.packet = message;
         if (!next->isTree) adapted = adapter.adapt(stripPrefix(message));
         const bool refused = adapted.outcome == Adapted::Outcome::Refused;
-        if (!asked || (!refused && !codes.include(adapted.packet))) {
+        const bool ours = refused ? adapted.refusal != adaptation::Refusal::NotOurs : codes.include(adapted.packet);
+        if (!asked || !ours) {
             ++written.ofOthers;
             continue;
         }

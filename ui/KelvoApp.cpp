@@ -7,6 +7,8 @@
 
 namespace kelvo {
 
+using namespace std::chrono_literals;
+
 KelvoApp::KelvoApp(Services services) : _services(std::move(services)) {}
 
 KelvoApp::~KelvoApp() = default;
@@ -28,6 +30,7 @@ void KelvoApp::applicationDidFinishLaunching() {
     _navController->setDelegate(this);
     _window->setRootScreen(*this);
     _navController->viewWillAppear();
+    _agingTimer = _services.queue.repeat(2s, _lifetime.whileAlive([this] { letValuesAge(); }));
     _window->makeKeyAndVisible();
     _services.queue.post(_lifetime.whileAlive([this] {
         if (_model) _model->restartMonitor();
@@ -48,6 +51,7 @@ void KelvoApp::updateStatusForViewController(KelvoPaneController& pane) {
 void KelvoApp::updateViewControllerFromModel() {
     if (!_model) return;  // a refresh that was on its way when the program ended
     reloadPanes();
+    if (_details) _details->reload();
     if (_model->isConnected()) setUpdateMessage(_dateFormatter->stringFromDate(clock().now()));
     updateStatusForViewController(_navController->topViewController());
 }
@@ -71,7 +75,7 @@ void KelvoApp::reloadPanes() {
 void KelvoApp::willShowViewController(KelvoPaneController& pane, bool) { updateStatusForViewController(pane); }
 
 void KelvoApp::showSaveView() {
-    if (_saveViewController || !_model) return;
+    if (_saveViewController || _details || !_model) return;
     _saveViewController = std::make_unique<KelvoSaveViewController>(
         _model->getSaveContents(),
         KelvoSaveViewController::Services{_services.queue, *this, _services.worker, _services.snapshotDirectory});
@@ -84,13 +88,41 @@ void KelvoApp::closeSaveView() {
     Q_EMIT saveViewDismissed();
 }
 
-void KelvoApp::didRemoveSaveView(KelvoSaveViewController* screen) {
-    const auto at = std::find_if(_leavingSaveViews.begin(), _leavingSaveViews.end(),
-                                 [&](const auto& each) { return each.get() == screen; });
-    if (at == _leavingSaveViews.end()) return;
+void KelvoApp::didRemoveSaveView(KelvoSaveViewController* screen) { release(_leavingSaveViews, screen); }
+
+template <class Screen>
+void KelvoApp::release(std::vector<std::unique_ptr<Screen>>& leaving, Screen* screen) {
+    const auto at = std::ranges::find_if(leaving, [&](const auto& each) { return each.get() == screen; });
+    if (at == leaving.end()) return;
     at->release()->deleteLater();  // its view may still be unwinding
-    _leavingSaveViews.erase(at);
+    leaving.erase(at);
 }
+
+void KelvoApp::showDetails(const std::string& path, int row) {
+    if (_details || _saveViewController || !_model) return;
+    _details = std::make_unique<DetailsController>(*_model, path, row, *this);
+    Q_EMIT detailsPresented(_details.get());
+}
+
+std::optional<std::chrono::milliseconds> KelvoApp::ageOf(const KelvoModelNode& node) const {
+    const auto provenance = _model ? _model->provenance(node) : std::nullopt;
+    if (!provenance) return std::nullopt;
+    return std::chrono::duration_cast<std::chrono::milliseconds>(provenance->age);
+}
+
+// Values grow older whether or not records come, and when the connection is lost.
+void KelvoApp::letValuesAge() {
+    _navController->topViewController().updateAges();
+    if (_details) _details->reload();
+}
+
+void KelvoApp::closeDetails() {
+    if (!_details) return;
+    _leavingDetails.push_back(std::move(_details));
+    Q_EMIT detailsDismissed();
+}
+
+void KelvoApp::didRemoveDetails(DetailsController* details) { release(_leavingDetails, details); }
 
 void KelvoApp::showAlert(const QString& title, const QString& message, const QString& button) {
     _alertTitle = title;
@@ -120,6 +152,8 @@ void KelvoApp::applicationWillTerminate() {
     setUpdateMessage({});
     _dateFormatter.reset();
     closeSaveView();
+    closeDetails();
+    _agingTimer.reset();
     if (_window) _window->orderOut();
     _window.reset();
     _model.reset();

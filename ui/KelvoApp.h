@@ -12,6 +12,7 @@
 #include "platform/system/Lifetime.h"
 #include "platform/system/Preferences.h"
 #include "ui/DateFormatter.h"
+#include "ui/DetailsController.h"
 #include "ui/KelvoSaveViewController.h"
 #include "ui/NavigationStack.h"
 #include "ui/ScreenHost.h"
@@ -75,6 +76,13 @@ public:
     /// The screen no longer draws a save screen that was closed.
     Q_INVOKABLE void didRemoveSaveView(kelvo::KelvoSaveViewController* screen);
 
+    std::optional<std::chrono::milliseconds> ageOf(const KelvoModelNode& node) const override;
+    void showDetails(const std::string& path, int row) override;
+    void closeDetails() override;
+    /// The screen no longer draws details that were closed.
+    Q_INVOKABLE void didRemoveDetails(kelvo::DetailsController* details);
+    DetailsController* details() const { return _details.get(); }
+
     void showAlert(const QString& title, const QString& message, const QString& button) override;
     Q_INVOKABLE void alertButtonPressed();
     bool isAlertShown() const { return _alertShown; }
@@ -85,12 +93,17 @@ public:
 Q_SIGNALS:
     void saveViewPresented(kelvo::KelvoSaveViewController* screen);
     void saveViewDismissed();
+    void detailsPresented(kelvo::DetailsController* details);
+    void detailsDismissed();
     void alertChanged();
 
 private:
+    template <class Screen>
+    static void release(std::vector<std::unique_ptr<Screen>>& leaving, Screen* screen);
     void getSaveButtonPref();
     void reloadPanes();
     void _setGSMRSSI(bool shown);
+    void letValuesAge();
 
     const Services _services;
     std::unique_ptr<KelvoModel> _model;
@@ -100,10 +113,13 @@ private:
     std::unique_ptr<NavigationStack> _navController;
     std::unique_ptr<KelvoSaveViewController> _saveViewController;
     std::vector<std::unique_ptr<KelvoSaveViewController>> _leavingSaveViews;  // still drawn sliding away
+    std::unique_ptr<DetailsController> _details;
+    std::vector<std::unique_ptr<DetailsController>> _leavingDetails;
     bool _alertShown = false;
     QString _alertTitle;
     QString _alertMessage;
     QString _alertButton;
+    std::unique_ptr<RepeatingTimer> _agingTimer;
     bool _terminated = false;
     std::unique_ptr<Window> _window;  // behind the rest, so that nothing it draws goes before it
     const Lifetime _lifetime;         // tasks on the queue outlive the application

@@ -18,6 +18,13 @@ void KelvoCell::setValue(const QString& value) {
     show();
 }
 
+void KelvoCell::setAge(const QString& age) {
+    if (_age == age) return;
+    _age = age;
+    Q_EMIT ageChanged();
+    Q_EMIT accessibleNameChanged();
+}
+
 void KelvoCell::setOpens(bool opens) {
     if (_opens == opens) return;
     _opens = opens;
@@ -46,13 +53,15 @@ void KelvoCell::show() {
         setLayout();
     }
     Q_EMIT laidOut();
+    Q_EMIT accessibleNameChanged();
 }
 
 QString KelvoCell::shownValue() const { return _kind == Kind::Value && !_opens ? _value : QString(); }
 
 QString KelvoCell::accessibleName() const {
     const QString value = shownValue();
-    return value.isEmpty() ? _key : _key + QStringLiteral(", ") + value;
+    const QString name = value.isEmpty() ? _key : _key + QStringLiteral(", ") + value;
+    return value.isEmpty() || _age.isEmpty() ? name : name + QStringLiteral(", ") + _age;
 }
 
 void KelvoCell::placeKey() {

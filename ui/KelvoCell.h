@@ -21,9 +21,10 @@ class KelvoCell : public QQuickItem {
     QML_ELEMENT
     Q_PROPERTY(QString key READ key WRITE setKey NOTIFY keyChanged REQUIRED)
     Q_PROPERTY(QString value READ value WRITE setValue NOTIFY valueChanged REQUIRED)
+    Q_PROPERTY(QString age READ age WRITE setAge NOTIFY ageChanged)
     Q_PROPERTY(bool opens READ opens WRITE setOpens NOTIFY opensChanged REQUIRED)
     Q_PROPERTY(QString shownValue READ shownValue NOTIFY laidOut)
-    Q_PROPERTY(QString accessibleName READ accessibleName NOTIFY laidOut)
+    Q_PROPERTY(QString accessibleName READ accessibleName NOTIFY accessibleNameChanged)
     Q_PROPERTY(QRectF keyFrame READ keyFrame NOTIFY laidOut)
     Q_PROPERTY(QRectF valueFrame READ valueFrame NOTIFY laidOut)
     Q_PROPERTY(QRectF viewFrame READ viewFrame NOTIFY laidOut)
@@ -40,7 +41,9 @@ public:
     // The child to show.
     const QString& key() const { return _key; }
     const QString& value() const { return _value; }
-    bool opens() const { return _opens; }  ///< the child has children: a disclosure indicator, no value
+    bool opens() const { return _opens; }        ///< the child has children: a disclosure indicator, no value
+    const QString& age() const { return _age; }  ///< "40 seconds old"; empty while the value is not old
+    void setAge(const QString& age);
     void setKey(const QString& key);
     void setValue(const QString& value);
     void setOpens(bool opens);
@@ -51,7 +54,7 @@ public:
     // What is drawn, and where.
     Kind kind() const { return _kind; }
     QString shownValue() const;
-    QString accessibleName() const;  ///< key and shown value, for a screen reader
+    QString accessibleName() const;  ///< key, shown value and its age, for a screen reader
     const QRectF& keyFrame() const { return _keyFrame; }
     const QRectF& valueFrame() const { return _valueFrame; }
     const QRectF& viewFrame() const { return _viewFrame; }              ///< empty in a key row
@@ -63,6 +66,8 @@ Q_SIGNALS:
     void keyChanged();
     void valueChanged();
     void opensChanged();
+    void ageChanged();
+    void accessibleNameChanged();
     void contentAreaChanged();
     void laidOut();
 
@@ -76,6 +81,7 @@ private:
     Kind _kind = Kind::Unsettled;
     QString _key;
     QString _value;
+    QString _age;
     bool _opens = false;
     QRectF _contentArea;
     QRectF _keyFrame;

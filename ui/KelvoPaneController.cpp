@@ -3,6 +3,7 @@
 #include <algorithm>
 #include <utility>
 
+#include "model/TrendWords.h"
 #include "ui/NavigationStack.h"
 #include "ui/ScreenHost.h"
 
@@ -115,10 +116,29 @@ void KelvoPaneController::updateValues(const std::vector<Row>& rows) {
         anyFresh = anyFresh || changed;
     }
     ++_reloads;
+    updateAges();
     if (!anyFresh) return;
     _host.queue().postAfter(kFreshTime, _lifetime.whileAlive([this, reload = _reloads] {
         if (_reloads == reload) letFreshRowsAge();
     }));
+}
+
+QString KelvoPaneController::ageOf(std::size_t row) const {
+    const KelvoModelNode::Children* children = _nodes ? _nodes->childNodes() : nullptr;
+    if (children == nullptr || row >= children->size() || _rows[row].opens) return {};
+    const auto age = _host.ageOf(*(*children)[row]);
+    constexpr std::chrono::seconds kSteps{10};  // in which it is told, so that nobody hears of every refresh
+    return age && *age >= kOldFrom ? QString::fromStdString(ageText(*age - *age % kSteps)) : QString();
+}
+
+void KelvoPaneController::updateAges() {
+    for (std::size_t at = 0; at < _rows.size(); ++at) {
+        QString age = ageOf(at);
+        if (_rows[at].age == age) continue;
+        _rows[at].age = std::move(age);
+        const QModelIndex row = index(static_cast<int>(at));
+        Q_EMIT dataChanged(row, row, {AgeRole});
+    }
 }
 
 void KelvoPaneController::letFreshRowsAge() {
@@ -164,6 +184,7 @@ void KelvoPaneController::viewWillAppear() {
     if (_navigationController != nullptr) _navigationController->setToolbarHidden(false);
     createToolbarItems();
     selectRow(-1);
+    updateAges();
 }
 
 void KelvoPaneController::viewWillDisappear() { Q_EMIT resignFirstResponder(); }
@@ -184,6 +205,15 @@ void KelvoPaneController::didSelectRow(int row) {
     pane->setStatus(_status, _isLoading);
     pane->setConnection(_connection);
     if (_navigationController != nullptr) _navigationController->pushViewController(std::move(pane), true);
+}
+
+void KelvoPaneController::showDetails(int row) {
+    const bool shown = _navigationController == nullptr || &_navigationController->topViewController() == this;
+    if (!shown || row < 0 || row >= rowCount()) return;
+    const NodeRef child = (*_nodes->childNodes())[static_cast<std::size_t>(row)];
+    const bool isOfList = child->displayName() == std::to_string(row);  // so entries are called
+    if (child->childNodes() != nullptr && !isOfList) return;
+    _host.showDetails(pathByAppending(_keyPath, child->displayName()), row);
 }
 
 QString KelvoPaneController::emptyText() const {
@@ -210,12 +240,13 @@ QVariant KelvoPaneController::data(const QModelIndex& index, int role) const {
         case ValueRole: return row.value;
         case OpensRole: return row.opens;
         case FreshRole: return row.fresh;
+        case AgeRole: return row.age;
         default: return {};
     }
 }
 
 QHash<int, QByteArray> KelvoPaneController::roleNames() const {
-    return {{KeyRole, "key"}, {ValueRole, "value"}, {OpensRole, "opens"}, {FreshRole, "fresh"}};
+    return {{KeyRole, "key"}, {ValueRole, "value"}, {OpensRole, "opens"}, {FreshRole, "fresh"}, {AgeRole, "age"}};
 }
 
 }  // namespace kelvo

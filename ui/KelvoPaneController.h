@@ -40,7 +40,11 @@ class KelvoPaneController : public QAbstractListModel {
     Q_PROPERTY(bool loading READ isLoading NOTIFY toolbarChanged)
     Q_PROPERTY(bool offersSave READ offersSave NOTIFY toolbarChanged)
 public:
-    enum Role { KeyRole = Qt::UserRole + 1, ValueRole, OpensRole, FreshRole };  // in QML: key, value, opens, fresh
+    /// In QML: key, value, opens, fresh, age.
+    enum Role { KeyRole = Qt::UserRole + 1, ValueRole, OpensRole, FreshRole, AgeRole };
+
+    /// A value that no record has written for so long is told to be old.
+    static constexpr std::chrono::seconds kOldFrom{30};
 
     /// How long a row whose value changed in a reload stays fresh, so that the eye finds it.
     static constexpr std::chrono::milliseconds kFreshTime{900};
@@ -62,6 +66,8 @@ public:
     void setStatus(const QString& status, bool isLoading);
     /// What `emptyText` and `note` tell of.
     void setConnection(const Connection& connection);
+    /// Values may have become old since they were shown.
+    void updateAges();
     void viewWillAppear();
     void viewWillDisappear();
 
@@ -73,6 +79,8 @@ public:
 
     /// Pushes the pane of a child that has children; a leaf only loses its highlight.
     Q_INVOKABLE void didSelectRow(int row);
+    /// Presents the details of a value, and those of an entry of a list. Other children that have children have none.
+    Q_INVOKABLE void showDetails(int row);
     Q_INVOKABLE void saveButtonPressed();
 
     int rowCount(const QModelIndex& parent = {}) const override;
@@ -94,6 +102,7 @@ private:
         QString value;
         bool opens;
         bool fresh = false;
+        QString age = {};  ///< "40 seconds old"; empty for a value that is not old
         bool isSameChild(const Row& other) const { return key == other.key && opens == other.opens; }
     };
     static std::vector<Row> rowsOf(const NodeRef& node);
@@ -110,6 +119,8 @@ private:
     /// Tells that a row has changed in the roles `changed`, and in its freshness when that does.
     void setFresh(std::size_t row, bool fresh, QList<int> changed);
     void letFreshRowsAge();
+    /// The age to tell of a row; empty when there is none.
+    QString ageOf(std::size_t row) const;
     void selectRow(int row);
 
     NodeRef _nodes;

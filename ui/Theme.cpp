@@ -37,6 +37,7 @@ QColor Theme::pressed() const { return choose(0xffe3ebea, 0xff243030); }
 QColor Theme::hairline() const { return choose(0xffdde2e4, 0xff2b3236); }
 QColor Theme::text() const { return choose(0xff14191c, 0xffedf1f2); }
 QColor Theme::secondaryText() const { return choose(0xff56626a, 0xffa4b0b7); }
+QColor Theme::oldText() const { return choose(0xff6c757b, 0xff7d888f); }
 QColor Theme::accent() const { return choose(0xff00736a, 0xff55cfc0); }
 QColor Theme::shade() const { return choose(0x66101416, 0x99000000); }
 

@@ -22,6 +22,7 @@ class Theme : public QObject {
     Q_PROPERTY(QColor hairline READ hairline NOTIFY changed)
     Q_PROPERTY(QColor text READ text NOTIFY changed)
     Q_PROPERTY(QColor secondaryText READ secondaryText NOTIFY changed)
+    Q_PROPERTY(QColor oldText READ oldText NOTIFY changed)
     Q_PROPERTY(QColor accent READ accent NOTIFY changed)
     Q_PROPERTY(QColor shade READ shade NOTIFY changed)
 public:
@@ -39,6 +40,7 @@ public:
     QColor hairline() const;       ///< the lines between things
     QColor text() const;           ///< keys and titles
     QColor secondaryText() const;  ///< values, status and hints
+    QColor oldText() const;        ///< values that no record has written for long
     QColor accent() const;         ///< what can be tapped, and where the keyboard is
     QColor shade() const;          ///< over what a modal screen covers
 

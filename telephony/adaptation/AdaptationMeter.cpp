@@ -47,6 +47,7 @@ std::vector<AdaptationMeter::Refused> AdaptationMeter::refusals() const {
 
 std::vector<std::string> AdaptationMeter::lines() const {
     std::vector<std::string> lines;
+    if (_passed != 0 && _turned + _refused != 0) lines.push_back(fmt::format("{} passed as they are", _passed));
     if (_turned != 0) lines.push_back(fmt::format("{} turned from newer layouts", _turned));
     if (derived() != 0) lines.push_back(fmt::format("{} of them 0xB17F derived from 0xB193", derived()));
     if (_neutral != 0) {

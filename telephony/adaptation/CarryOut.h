@@ -55,7 +55,7 @@ inline std::int64_t turned(const Move& move, std::int64_t raw) {
 
 /// Replaces the bits of one field.
 inline void writeBits(std::uint8_t* at, Raw raw, std::uint32_t value) {
-    if (raw.width == 0) return detail::store(at, raw.bytes, value);
+    if (raw.width == 8 * raw.bytes) return detail::store(at, raw.bytes, value);
     const std::uint32_t field = detail::mask(raw) << raw.lowBit;
     detail::store(at, raw.bytes, (detail::load(at, raw.bytes) & ~field) | (value << raw.lowBit & field));
 }

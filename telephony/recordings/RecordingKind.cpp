@@ -81,7 +81,7 @@ Result<RecordingKind> recognizeRecording(const std::string& path) {
 std::string whyNoCapture(const std::string& path, const std::string& reason) {
     const auto kind = recognizeRecording(path);
     if (!kind || *kind == RecordingKind::Unknown || *kind == RecordingKind::Capture) return reason;
-    return path + " is " + std::string(nameOf(*kind)) + "; kelvoctl import makes a capture of it";
+    return path + ": this is " + std::string(nameOf(*kind)) + "; kelvoctl import makes a capture of it";
 }
 
 }  // namespace kelvo

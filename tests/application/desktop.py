@@ -180,9 +180,12 @@ class Window:
         self._eyes = None
         self._scale = int(desktop.environment["QT_SCALE_FACTOR"])
         self._id = wait_for(self._find, "the window")
-        self._tool("windowsize", "--sync", self._id, size[0] * self._scale, size[1] * self._scale)
+        self.resize(*size)
         self._tool("windowmove", self._id, 0, 0)
         self._tool("windowfocus", "--sync", self._id)
+
+    def resize(self, width, height):
+        self._tool("windowsize", "--sync", self._id, width * self._scale, height * self._scale)
 
     def _find(self):
         found = subprocess.run(["xdotool", "search", "--onlyvisible", "--name", "^Kelvo$"], capture_output=True,

@@ -9,9 +9,9 @@ namespace {
 using test::contentsOf;
 using test::expectFailure;
 using test::Finished;
-using test::framed;
 using test::KelvoctlTest;
 using test::kTicks;
+using test::plainFrame;
 using test::plainRecord;
 using test::recordBodyOf;
 using test::operator+=;
@@ -61,7 +61,7 @@ TEST_F(ImportCommand, TurnsAStreamOfFramesIntoACapture) {
     const Finished done = kelvoctl({"import", in, "-o", out()});
     EXPECT_EQ(done.status, 0) << done.errors;
     EXPECT_EQ(done.errors, "");
-    EXPECT_EQ(done.output, "2 LTE records written to " + out() + ": 1 passed, 1 adapted; 1 refused, 0 of others\n");
+    EXPECT_EQ(done.output, "2 LTE records written to " + out() + ": 1 passed, 1 adapted; 0 refused, 1 of others\n");
     EXPECT_EQ(packetsOf(out()), "0:b0c2 1:b0c2");
 }
 
@@ -121,9 +121,16 @@ TEST_F(ImportCommand, TakesTheTimesAskedFor) {
         "1 LTE records written to " + out() + ": 1 passed, 0 adapted; 0 refused, 2 of others\n");
     EXPECT_EQ(kelvoctl({"import", in, "-o", path("day.pcap"), "--from", "2023-12-06", "--to", "2023-12-07"}).status, 0);
     EXPECT_EQ(packetsOf(path("day.pcap")), "0:b0c2 1:b0c2 2:b0c2");
-    const Finished wrong = kelvoctl({"import", in, "-o", path("x"), "--from", "yesterday"});
-    EXPECT_EQ(wrong.status, 1);
-    EXPECT_NE(wrong.errors.find("yesterday is not a time such as 2014-08-29T20:51:07Z"), std::string::npos);
+    // As the list tells them: the first record is as late as 26 s, not later.
+    EXPECT_EQ(kelvoctl({"import", in, "-o", path("late.pcap"), "--from", "2023-12-06T04:04:26.001Z"}).status, 0);
+    EXPECT_EQ(packetsOf(path("late.pcap")), "0:b0c2 1:b0c2");
+    EXPECT_EQ(kelvoctl({"import", in, "-o", path("all.pcap"), "--from", "0001-01-01", "--to", "9999-12-31"}).status, 0);
+    for (const char* text : {"yesterday", "2023-12-06T04:04:26.Z", "2023-12-06T04:04:26.1", "2023-12-06T04:04:26x1Z"}) {
+        const Finished wrong = kelvoctl({"import", in, "-o", path("x"), "--from", text});
+        EXPECT_EQ(wrong.status, 1);
+        EXPECT_NE(wrong.errors.find(std::string(text) + " is not a time such as 2014-08-29T20:51:07Z"),
+                  std::string::npos);
+    }
 }
 
 TEST_F(ImportCommand, TakesOneSim) {
@@ -211,10 +218,29 @@ TEST_F(ImportCommand, ListsEveryCodeVersionAndLength) {
     EXPECT_NE(text.output.find("LTE screens in part: Serving Cell Info\n"), std::string::npos) << text.output;
 }
 
+TEST_F(ImportCommand, ListsNoMoreThanTenThousandKinds) {
+    Bytes records;  // as in a DLF file, each a kind of its own: 0x5000, 0x5001 and so on
+    for (int i = 0; i < 10'050; ++i) {
+        Bytes record = plainRecord(0, kTicks, {});
+        record[2] = static_cast<std::uint8_t>(i);
+        record[3] = static_cast<std::uint8_t>(0x50 + (i >> 8));
+        records += record;
+    }
+    records += plainRecord(0xB0C2, kTicks, kNewServingCell);
+    const std::string in = directory.write("kinds", records);
+    const std::string listed = kelvoctl({"import", "--list", in}).output;
+    EXPECT_NE(listed.find("\n51 records of further kinds\n\nLTE screens in part: Serving Cell Info\n"),
+              std::string::npos);
+    EXPECT_EQ(std::ranges::count(listed.substr(0, listed.find("51 records")), '\n'), 10'001);  // and the heading
+    // Too short are the twelve GSM codes, their twins of two SIMs, 0x51FC and 0x5BFC, 0x7130 to 0x7132, 0x7135, 0x7150.
+    EXPECT_EQ(kelvoctl({"import", in, "-o", out()}).output,
+              "1 LTE records written to " + out() + ": 0 passed, 1 adapted; 31 refused, 10019 of others\n");
+}
+
 TEST_F(ImportCommand, IsNamedWhereACaptureWasExpected) {
     const std::string in = frames("drive", {plainRecord(0xB0C2, kTicks, kNewServingCell)});
     expectFailure(kelvoctl({"decode", in}),
-                  in + " is a stream of diagnostic frames; kelvoctl import makes a capture of it");
+                  in + ": this is a stream of diagnostic frames; kelvoctl import makes a capture of it");
 }
 
 }  // namespace

@@ -5,6 +5,7 @@
 #include <string>
 
 #include "platform/encodings/PropertyList.h"
+#include "platform/system/DirectoryResources.h"
 #include "platform/system/Environment.h"
 #include "platform/telephony/TelephonyConstants.h"
 #include "tests/support/FakePorts.h"
@@ -45,7 +46,8 @@ public:
     TemporaryDirectory directory;
     RecordingLog log;
     ManualClock clock{1299230102};  // 2011-03-04 09:15:02 UTC
-    Environment::Scope environment{{.log = &log, .clock = &clock}};
+    DirectoryResources resources{KELVO_RESOURCE_DIR};
+    Environment::Scope environment{{.log = &log, .clock = &clock, .resources = &resources}};
     ManualQueue queue;
     FakePorts ports;
     FakeTelephony telephony;

@@ -12,6 +12,9 @@ public:
     bool allowSaveButton() const override { return savingAllowed; }
     void showSaveView() override { ++saveViewsShown; }
     void closeSaveView() override { ++saveViewsClosed; }
+    std::optional<std::chrono::milliseconds> ageOf(const KelvoModelNode&) const override { return age; }
+    void showDetails(const std::string& path, int) override { detailsShown.push_back(path); }
+    void closeDetails() override { ++detailsClosed; }
     void showAlert(const QString& title, const QString& message, const QString& button) override {
         alerts.append(title + QLatin1Char('|') + message + QLatin1Char('|') + button);
     }
@@ -20,6 +23,9 @@ public:
     bool savingAllowed = false;
     int saveViewsShown = 0;
     int saveViewsClosed = 0;
+    std::vector<std::string> detailsShown;
+    int detailsClosed = 0;
+    std::optional<std::chrono::milliseconds> age;  // of every value
     QStringList alerts;
 };
 

@@ -49,9 +49,12 @@ void Scene::settle() {
     const bool settled = QTest::qWaitFor([this] {
         const QQuickItem* stack = itemOfType("QQuickStackView");
         const QQuickItem* sheet = itemOfType("SaveSheet");
-        const bool sliding =
-            stack->property("busy").toBool() || (sheet != nullptr && sheet->property("moving").toBool());
-        return !sliding && (sheet != nullptr) == (_app->saveViewController() != nullptr);
+        const QQuickItem* details = itemOfType("DetailsSheet");
+        const bool sliding = stack->property("busy").toBool() ||
+                             (sheet != nullptr && sheet->property("moving").toBool()) ||
+                             (details != nullptr && details->property("moving").toBool());
+        return !sliding && (sheet != nullptr) == (_app->saveViewController() != nullptr) &&
+               (details != nullptr) == (_app->details() != nullptr);
     });
     EXPECT_TRUE(settled) << "something never stops moving";
     _view->grabWindow();

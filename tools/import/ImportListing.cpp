@@ -53,6 +53,7 @@ std::string listingText(const RecordSurvey& survey) {
                             versionText(row.kind), row.kind.bytes, row.records, timeText(row.first), timeText(row.last),
                             name.empty() ? "-" : name, fateText(row));
     }
+    if (survey.ofFurtherKinds() != 0) text += fmt::format("{} records of further kinds\n", survey.ofFurtherKinds());
     text += "\n";
     for (const FillableScreens& screens : screensOf(survey)) {
         if (screens.filled.empty() && screens.partly.empty()) continue;
@@ -89,7 +90,7 @@ nlohmann::ordered_json listingJson(const RecordSurvey& survey) {
     for (const FillableScreens& family : screensOf(survey)) {
         screens[std::string(namesOf(family.technology).name)] = {{"filled", family.filled}, {"partly", family.partly}};
     }
-    return {{"records", records}, {"screens", screens}};
+    return {{"records", records}, {"ofFurtherKinds", survey.ofFurtherKinds()}, {"screens", screens}};
 }
 
 }  // namespace kelvo

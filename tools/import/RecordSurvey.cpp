@@ -10,6 +10,12 @@ namespace kelvo {
 
 using adaptation::Adapted;
 
+namespace {
+
+constexpr std::size_t kMostKinds = 10'000;
+
+}  // namespace
+
 RecordSurvey::RecordSurvey() {
     Environment silent = Environment::current();
     silent.log = nullptr;  // generators tell of themselves
@@ -31,26 +37,42 @@ void RecordSurvey::add(const RecordedMessage& message, bool isTree) {
     }
     const Adapted adapted = _adapter.adapt(stripPrefix(message.message));
     _meter.count(adapted);
-    const Key key{adapted.kind, adapted.outcome,
-                  adapted.outcome == Adapted::Outcome::Refused ? adapted.refusal : adaptation::Refusal{}};
-    if (_latest == nullptr || _latest->first != key) {
-        const auto [row, isNew] = _rows.try_emplace(key);
-        _latest = &*row;
-        if (isNew) {
-            row->second = {.kind = adapted.kind, .outcome = adapted.outcome, .refusal = std::get<2>(key)};
-            if (adapted.outcome != Adapted::Outcome::Refused) {
-                row->second.technology = technologyOf(adapted.packet);
-                const LogCode code = logCode(adapted.packet.data());
-                const auto place = std::ranges::lower_bound(_shown, code);
-                if (place == _shown.end() || *place != code) _shown.insert(place, code);
-            }
-        }
+    _latest = rowOf(adapted);
+    if (_latest == nullptr) {
+        ++_ofFurtherKinds;
+        if (adapted.outcome == Adapted::Outcome::Refused) return;
+        noteShown(adapted.packet);
+        const auto technology = technologyOf(adapted.packet);
+        if (technology) ++_recordsOf[static_cast<std::size_t>(*technology)];
+        return;
     }
     Row& row = _latest->second;
     ++row.records;
     if (message.time && (!row.first || *message.time < *row.first)) row.first = message.time;
     if (message.time && (!row.last || *message.time > *row.last)) row.last = message.time;
     if (row.technology) ++_recordsOf[static_cast<std::size_t>(*row.technology)];
+}
+
+/// The row of a record's kind; none when there are too many.
+std::pair<const RecordSurvey::Key, RecordSurvey::Row>* RecordSurvey::rowOf(const Adapted& adapted) {
+    const bool isRefused = adapted.outcome == Adapted::Outcome::Refused;
+    const Key key{adapted.kind, adapted.outcome, isRefused ? adapted.refusal : adaptation::Refusal{}};
+    if (_latest != nullptr && _latest->first == key) return _latest;
+    if (const auto known = _rows.find(key); known != _rows.end()) return &*known;
+    if (_rows.size() >= kMostKinds) return nullptr;
+    const auto made =
+        _rows.emplace(key, Row{.kind = adapted.kind, .outcome = adapted.outcome, .refusal = std::get<2>(key)});
+    if (!isRefused) {
+        made.first->second.technology = technologyOf(adapted.packet);
+        noteShown(adapted.packet);
+    }
+    return &*made.first;
+}
+
+void RecordSurvey::noteShown(ByteView packet) {
+    const LogCode code = logCode(packet.data());
+    const auto place = std::ranges::lower_bound(_shown, code);
+    if (place == _shown.end() || *place != code) _shown.insert(place, code);
 }
 
 std::optional<Technology> RecordSurvey::technologyOf(ByteView packet) const {

@@ -31,8 +31,10 @@ public:
     /// Looks at one message, by itself or as a cell monitor's tree.
     void add(const RecordedMessage& message, bool isTree);
 
-    /// By code, version and length.
+    /// By code, version and length, of the first 10,000 kinds: a file may be made of nothing but kinds.
     std::vector<Row> rows() const;
+    /// Records of kinds beyond these.
+    std::uint64_t ofFurtherKinds() const { return _ofFurtherKinds; }
     std::uint64_t records() const { return _records; }
     const adaptation::AdaptationMeter& meter() const { return _meter; }
     /// The earliest time of a record; none when no clock was set.
@@ -48,6 +50,8 @@ private:
     using Key = std::tuple<adaptation::RecordKind, adaptation::Adapted::Outcome, adaptation::Refusal>;
 
     std::optional<Technology> technologyOf(ByteView packet) const;
+    std::pair<const Key, Row>* rowOf(const adaptation::Adapted& adapted);
+    void noteShown(ByteView packet);
 
     std::array<std::optional<FamilyCodes>, kTechnologies.size()> _families;  // none for the one without codes
     adaptation::RecordAdapter _adapter;
@@ -57,6 +61,7 @@ private:
     std::vector<LogCode> _shown;                   // sorted: the codes that come out
     std::array<std::uint64_t, kTechnologies.size()> _recordsOf{};
     std::uint64_t _records = 0;
+    std::uint64_t _ofFurtherKinds = 0;
     std::optional<wire::SystemTime> _first;
     std::optional<std::int32_t> _subscription;
 };

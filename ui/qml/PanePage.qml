@@ -12,6 +12,12 @@ FocusScope {
 
     Component.onDestruction: navigation.didRemoveView(pane)
 
+    /// Where a row is, in the page's coordinates; empty for one that is not seen.
+    function frameOf(row: int): rect {
+        const item = list.itemAtIndex(row);
+        return item ? item.mapToItem(page, Qt.rect(0, 0, item.width, item.height)) : Qt.rect(list.x, list.y, list.width, 0);
+    }
+
     Rectangle {
         anchors.fill: parent
         color: Theme.background
@@ -44,8 +50,16 @@ FocusScope {
         Accessible.role: Accessible.List
         Accessible.name: page.pane.title
 
-        Keys.onReturnPressed: page.pane.didSelectRow(currentIndex)
-        Keys.onEnterPressed: page.pane.didSelectRow(currentIndex)
+        function open(event: KeyEvent) {
+            if (event.modifiers & Qt.ControlModifier)
+                page.pane.showDetails(currentIndex);
+            else
+                page.pane.didSelectRow(currentIndex);
+        }
+
+        Keys.onReturnPressed: event => open(event)
+        Keys.onEnterPressed: event => open(event)
+        Keys.onMenuPressed: page.pane.showDetails(currentIndex)
         Keys.onSpacePressed: page.pane.didSelectRow(currentIndex)
         Keys.onPressed: event => {
             const page = Math.max(1, Math.floor(height / 50) - 1);

@@ -7,6 +7,7 @@ KelvoCell {
 
     required property int index
     required property bool fresh
+    required age
     required property KelvoPaneController pane
     readonly property bool marked: ListView.isCurrentItem && ListView.view.activeFocus
     readonly property real valueWidth: valueFrame.width
@@ -96,7 +97,7 @@ KelvoCell {
                 x: row.valueFrame.x
                 y: row.valueFrame.y
                 text: row.shownValue
-                color: Theme.secondaryText
+                color: row.age === "" ? Theme.secondaryText : Theme.oldText
                 font.pixelSize: 15
             }
 
@@ -163,7 +164,15 @@ KelvoCell {
 
     TapHandler {
         id: tap
+        objectName: "tap"
         onPressedChanged: if (pressed) row.touched()
         onTapped: row.pane.didSelectRow(row.index)
+        onLongPressed: if (!row.opens) row.pane.showDetails(row.index)
+    }
+
+    TapHandler {
+        acceptedDevices: PointerDevice.Mouse | PointerDevice.TouchPad | PointerDevice.Stylus
+        acceptedButtons: Qt.RightButton
+        onTapped: row.pane.showDetails(row.index)
     }
 }

@@ -9,6 +9,7 @@ FocusScope {
 
     required property KelvoApp application
     property SaveSheet sheet: null
+    property DetailsSheet details: null
 
     focus: true
 
@@ -17,6 +18,8 @@ FocusScope {
             alert.forceActiveFocus();
         else if (sheet)
             sheet.forceActiveFocus();
+        else if (details)
+            details.forceActiveFocus();
         else
             stack.forceActiveFocus();
     }
@@ -31,7 +34,7 @@ FocusScope {
 
         anchors.fill: parent
         focus: true
-        enabled: !screen.sheet && !alert.shown
+        enabled: !screen.sheet && !screen.details && !alert.shown
 
         pushEnter: Slide { property: "x"; from: stack.width; to: 0 }
         pushExit: Slide { property: "x"; from: 0; to: -stack.width / 3 }
@@ -92,6 +95,14 @@ FocusScope {
         }
     }
 
+    Component {
+        id: detailsSheet
+        DetailsSheet {
+            application: screen.application
+            anchors.fill: parent
+        }
+    }
+
     AlertBox {
         id: alert
         anchors.fill: parent
@@ -121,6 +132,16 @@ FocusScope {
         function onSaveViewDismissed() {
             screen.sheet.leave();
             screen.sheet = null;
+            screen.giveFocus();
+        }
+        function onDetailsPresented(presented: DetailsController) {
+            const page = stack.currentItem as PanePage;
+            screen.details = detailsSheet.createObject(screen, { "details": presented, "rowFrame": page.frameOf(presented.row) }) as DetailsSheet;
+            screen.giveFocus();
+        }
+        function onDetailsDismissed() {
+            screen.details.leave();
+            screen.details = null;
             screen.giveFocus();
         }
     }

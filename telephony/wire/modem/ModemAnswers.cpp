@@ -10,10 +10,10 @@ using wire::Operation;
 using wire::Refusal;
 
 // clang-format off
-// What a phone of 2012 has, of each equipment: 1 is 1x, EV-DO and general, 4 UMTS, 5 GSM, 7 mobility management, 11 LTE,
-// 13 TD-SCDMA.
+// What a phone has, of each equipment: 1 is 1x, EV-DO and general, 4 UMTS, 5 GSM (of two SIMs from 0xA00 on), 7 mobility
+// management, 11 LTE, 13 TD-SCDMA.
 constexpr wire::Ranges kRanges{
-    0, 0xA02, 0, 0, 0x910, 0x420, 0, 0x4FF, 0, 0, 0x38A, 0x201, 0, 0x1FF, 0, 0};
+    0, 0xA02, 0, 0, 0x910, 0xE20, 0, 0x4FF, 0, 0, 0x38A, 0x201, 0, 0x1FF, 0, 0};
 // Each ends before the last record of its equipment that Kelvo shows: 0x134f, 0x4221, 0x51f6 to 0x51ff, 0x7150, 0xb180
 // and 0xb186, 0xd0e2.
 constexpr wire::Ranges kSmallerRanges{

@@ -185,13 +185,13 @@ TEST(LteLayoutProperties, OfIdleNeighbors) {
 
 // 0xB193 with part 25 alone; its body starts at 8, and B counts from there. The cell is not known otherwise, so that
 // Srxlev is the level above -140 dBm.
+constexpr std::size_t B = 8;
 struct Cell {
     std::size_t pci;
     Bits rsrp, filteredRsrp, rsrq, filteredRsrq, rssi;
 };
 Layout everyMode(std::uint32_t version, std::size_t body, const Cell& cell) {
-    const std::size_t B = 8;
-    const auto in = [B](Bits bits) { return Bits{B + bits.at, bits.low, bits.high}; };
+    const auto in = [](Bits bits) { return Bits{B + bits.at, bits.low, bits.high}; };
     return {
         "0xB193 part 25 version " + std::to_string(version),
         Technology::LTE,

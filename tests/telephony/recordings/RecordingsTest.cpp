@@ -201,9 +201,9 @@ TEST_F(Recordings, AreNotSeenInNoise) {
 TEST_F(Recordings, AreNamedWhereACaptureWasExpected) {
     const std::string path = file(plainFrame(recordBodyOf(kServing)));
     EXPECT_EQ(whyNoCapture(path, "no capture"),
-              path + " is a stream of diagnostic frames; kelvoctl import makes a capture of it");
+              path + ": this is a stream of diagnostic frames; kelvoctl import makes a capture of it");
     EXPECT_EQ(whyNoCapture(file(kServing), "no capture").substr(directory.path().string().size()),
-              "/1 is a DLF file; kelvoctl import makes a capture of it");
+              "/1: this is a DLF file; kelvoctl import makes a capture of it");
     EXPECT_EQ(whyNoCapture(file({1, 2, 3}), "no capture"), "no capture");
 }
 

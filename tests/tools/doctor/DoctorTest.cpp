@@ -140,7 +140,7 @@ TEST_F(DoctorTest, EndsWithTheOneThingThatIsInTheWay) {
     EXPECT_EQ(next(), "run \"kelvoctl doctor --port /dev/ttyUSB0 --probe\", which asks it what it can show");
     holders["/dev/ttyUSB0"].known = {{77, "minicom"}};
     EXPECT_EQ(next(), "end minicom (process 77), which has /dev/ttyUSB0 open");
-    holders["/dev/ttyUSB0"].known = {{78, "kelvo-telephony"}};
+    holders["/dev/ttyUSB0"].known = {{78, "kelvo-telephonyd"}};
     EXPECT_EQ(next(), "run kelvo: its telephony service has /dev/ttyUSB0 already");
     access["/dev/ttyUSB0"].mayOpen = false;
     EXPECT_EQ(next(), "add yourself to the group dialout: run \"sudo usermod -aG dialout ada\", and log in again");

@@ -20,16 +20,19 @@ class LoopTest : public testing::Test, public wire::Session::Owner {
 protected:
     using Time = std::chrono::nanoseconds;
     using Packets = std::vector<Bytes>;
+    using Generation = simulation::Generation;
 
     /// A client that wants everything joins a modem of these faults.
-    void join(Technology technology, modem::Faults faults, std::uint64_t seed = 1) {
+    void join(Technology technology, modem::Faults faults, std::uint64_t seed = 1,
+              Generation generation = Generation::Of2010) {
         _session = std::make_unique<wire::Session>(
             *this, [this] { return _now; }, wire::Session::Options{.technology = technology, .subscription = {}});
         wire::RecordCodes all;
         all.set();
         _session->want(all);
         const auto drive = [&](std::uint64_t sim) {
-            return std::make_unique<modem::StreamRecords>(std::make_unique<SimulationStream>(technology, seed + sim));
+            return std::make_unique<modem::StreamRecords>(
+                std::make_unique<SimulationStream>(technology, seed + sim, generation));
         };
         _modem = std::make_unique<modem::PlayedModem>(drive(0), faults.has(modem::Fault::TwoSims) ? drive(1) : nullptr,
                                                       faults, seed);
@@ -76,8 +79,9 @@ protected:
     }
 
     /// The modem's packets of a drive, straight from the simulation.
-    static Packets straight(Technology technology, std::uint64_t seed, std::size_t count) {
-        SimulationStream stream(technology, seed);
+    static Packets straight(Technology technology, std::uint64_t seed, std::size_t count,
+                            Generation generation = Generation::Of2010) {
+        SimulationStream stream(technology, seed, generation);
         Packets packets;
         while (packets.size() < count) {
             const ByteView message = stream.next()->bytes;

@@ -38,6 +38,18 @@ TEST_F(LoopTest, RecordsComeAsTheyAreOfEachFamilyAndSeveralSeeds) {
     }
 }
 
+// A modem of 2018 has two SIMs, whose codes lie beyond those of one.
+TEST_F(LoopTest, RecordsOfNewerModemsComeAsTheyAre) {
+    for (const Technology technology : {Technology::LTE, Technology::GSM}) {
+        for (const Generation generation : {Generation::Of2014, Generation::Of2018}) {
+            join(technology, {}, 1, generation);
+            playUntil(400);
+            taken.resize(400);
+            EXPECT_EQ(taken, straight(technology, 1, 400, generation)) << namesOf(technology).name;
+        }
+    }
+}
+
 TEST_F(LoopTest, RecordsComeAsTheyAreUnderFaultsThatLoseNone) {
     for (const Technology technology : kFamilies) {
         const Packets all = straight(technology, 3, 2000);

@@ -1,0 +1,120 @@
+#include "ui/DetailsController.h"
+
+#include <QClipboard>
+#include <QDateTime>
+#include <QGuiApplication>
+#include <algorithm>
+
+#include "model/LevelGrades.h"
+#include "model/TrendWords.h"
+#include "ui/RecordDump.h"
+#include "ui/ScreenHost.h"
+#include "ui/TrendCandidates.h"
+
+namespace kelvo {
+namespace {
+
+QString shown(std::string_view text) { return QString::fromUtf8(text.data(), static_cast<qsizetype>(text.size())); }
+
+QString modemTimeText(SystemTime time) {
+    const auto milliseconds = std::chrono::duration_cast<std::chrono::milliseconds>(time.time_since_epoch());
+    return QDateTime::fromMSecsSinceEpoch(milliseconds.count(), Qt::UTC)
+        .toString(QStringLiteral("'Modem time' yyyy-MM-dd HH:mm:ss.zzz 'UTC'"));
+}
+
+}  // namespace
+
+DetailsController::DetailsController(const KelvoModel& model, const std::string& path, int row, ScreenHost& host)
+    : _model(model), _host(host), _row(row) {
+    const NodeRef node = model.shownNodeAtPath(path);
+    _name = model.trends().nameAt(node ? leafOf(*node, path) : path);
+    _title = shown(keyOfTrend(_name));
+    _place = shown(placeOfTrend(_name));
+    reload();
+}
+
+std::string DetailsController::leafOf(const KelvoModelNode& node, const std::string& path) const {
+    if (node.childNodes() == nullptr) return path;
+    std::string best = path;
+    int bestRank = 0;
+    for (const NodeRef& child : *node.childNodes()) {
+        const std::string leaf = pathByAppending(path, child->displayName());
+        const std::string name = _model.trends().nameAt(leaf);
+        const Trend trend = _model.trends().trend(name);
+        const int rank = !gradesOf(name, trend.unit).empty() ? 3 : !trend.unit.empty() ? 2 : 1;
+        if (child->childNodes() != nullptr || rank <= bestRank) continue;
+        best = leaf;
+        bestRank = rank;
+    }
+    return best;
+}
+
+void DetailsController::reload() {
+    const Trends& trends = _model.trends();
+    const NodeRef node = _model.shownNodeAtPath(trends.pathOf(_name));
+    if (node && node->value() != nullptr) {
+        _valueText = QString::fromStdString(*node->value());
+        readProvenance(*node);
+    }
+    _trend = trends.trend(_name);
+    _comparison = _comparisonName.empty() ? Trend() : trends.trend(_comparisonName);
+    _servingCells = trends.servingCells();
+    _now = _model.trendTime();
+    readChanges();
+    Q_EMIT changed();
+}
+
+void DetailsController::readProvenance(const KelvoModelNode& node) {
+    const auto from = _model.provenance(node);
+    if (!from) return;  // what was known of the record is still true but for its age
+    _written = QStringLiteral("%1 ago, by record %2")
+                   .arg(QString::fromStdString(agoText(std::chrono::duration_cast<Trend::Time>(from->age))))
+                   .arg(from->record);
+    _record = QString::fromStdString(describe(*from));
+    _modemTime = from->modemTime ? modemTimeText(*from->modemTime) : QString();
+    _dump = recordDump(from->bytes, from->place);
+    _dumpWords = placeText(from->bytes, from->place);
+}
+
+void DetailsController::readChanges() {
+    _changes.clear();
+    if (hasTrend()) return;
+    const std::vector<TrendChange> changes = _model.trends().changes(_name);
+    for (auto change = changes.rbegin(); change != changes.rend(); ++change) {
+        _changes.append(
+            QStringLiteral("%1, since %2")
+                .arg(QString::fromStdString(change->text), QString::fromStdString(agoText(_now - change->at))));
+    }
+}
+
+void DetailsController::findCandidates() {
+    _candidates = trendCandidates(_model.trends(), _name);
+    _candidateTitles.clear();
+    _candidatePlaces.clear();
+    for (const std::string& candidate : _candidates) {
+        _candidateTitles.append(shown(keyOfTrend(candidate)));
+        _candidatePlaces.append(shown(placeOfTrend(candidate)));
+    }
+    Q_EMIT candidatesChanged();
+}
+
+void DetailsController::compareWith(int candidate) {
+    if (candidate < 0 || candidate >= _candidateTitles.size()) return;
+    _comparisonName = _candidates[static_cast<std::size_t>(candidate)];
+    _comparedWith = QStringLiteral("%1, %2").arg(_candidateTitles[candidate], _candidatePlaces[candidate]);
+    Q_EMIT comparisonChanged();
+    reload();
+}
+
+void DetailsController::stopComparing() {
+    _comparisonName.clear();
+    _comparedWith.clear();
+    Q_EMIT comparisonChanged();
+    reload();
+}
+
+void DetailsController::copyValue() { QGuiApplication::clipboard()->setText(_valueText); }
+
+void DetailsController::close() { _host.closeDetails(); }
+
+}  // namespace kelvo

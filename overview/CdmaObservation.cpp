@@ -1,5 +1,6 @@
 #include <algorithm>
 
+#include "model/DisplayPath.h"
 #include "overview/Families.h"
 
 /// CDMA2000: the cell is the reference pilot of the 1x active set; EV-DO stands beside it.
@@ -31,7 +32,7 @@ void observePilots(Observation& seen, const Screens& oneX) {
     for (const auto& entry : *set.dictionary()) {
         if (entry.key == "_sorted") continue;
         HeardCell heard;
-        heard.identity = identity(seen.channel, named("PN", std::string(shownName(entry.key))));
+        heard.identity = identity(seen.channel, named("PN", std::string(nameOfSortedKey(entry.key))));
         heard.mark = "active";
         heard.record = entry.value.record();
         auto figure = figureOf(entry.value);

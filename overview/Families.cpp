@@ -33,7 +33,7 @@ void add(std::vector<Fact>& facts, std::string_view name, std::string text) {
 
 std::optional<Measure> measure(std::string_view name, std::optional<Figure> figure, std::optional<Graded> graded) {
     if (!figure) return std::nullopt;
-    std::string grade(graded ? gradeOf(*graded, figure->number) : std::string_view());
+    std::string grade(graded ? gradeOf(gradesOf(*graded), figure->number) : std::string_view());
     return Measure{std::string(name), *std::move(figure), std::move(grade)};
 }
 

@@ -2,8 +2,8 @@
 
 #include <fmt/format.h>
 
+#include "model/LevelGrades.h"
 #include "overview/Bands.h"
-#include "overview/Grades.h"
 #include "overview/Observation.h"
 #include "platform/values/Array.h"
 #include "platform/values/Dictionary.h"

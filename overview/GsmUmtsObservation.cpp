@@ -21,7 +21,7 @@ std::optional<Measure> rxLevel(std::optional<Figure> figure) {
         figure->number = dbm;
         figure->unit = "dBm";
     }
-    return measure("RxLev", std::move(figure), Graded::RxLevel);
+    return measure("RxLev", std::move(figure), Graded::RxLev);
 }
 
 void observeGsm(Observation& seen, const Screens& screens) {
@@ -53,7 +53,7 @@ void observeUmts(Observation& seen, const Screens& screens) {
         const Screens best(active.front());
         seen.cell = identity(seen.channel, named("PSC", best.text("Scrambling Code")));
         seen.cellRecord = best.record("Scrambling Code");
-        seen.level = measure("RSCP", best.figure("RSCP"), Graded::Rscp);
+        seen.level = measure("RSCP", best.figure("RSCP"));
         seen.quality = measure("Ec/Io", best.figure("Energy Per Chip"), Graded::EcIo);
     }
     if (const auto id = cell.whole("Cell ID")) {
@@ -81,7 +81,7 @@ void addUmtsCell(Observation& seen, const Value& row, std::string channel, std::
     HeardCell heard;
     heard.identity = identity(channel, named("PSC", cell.text("Scrambling Code")));
     heard.mark = mark;
-    heard.level = measure("RSCP", cell.figure("RSCP"), Graded::Rscp);
+    heard.level = measure("RSCP", cell.figure("RSCP"));
     heard.quality = measure("Ec/Io", cell.figure("Energy Per Chip"), Graded::EcIo);
     heard.record = cell.record("Scrambling Code");
     if (!heard.identity.empty()) seen.cells.push_back(std::move(heard));

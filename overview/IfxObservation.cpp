@@ -23,8 +23,8 @@ void addCell(Observation& seen, const Value& row, bool isUmts) {
         const std::string code = isUmts ? named("PSC", cell.text("SCN")) : named("BSIC", cell.text("BSIC"));
         heard.identity = code.empty() ? channel : channel.empty() ? code : identity(channel, code);
         heard.record = cell.record("");
-        heard.level = isUmts ? measure("RSCP", cell.figure("RSCP"), Graded::Rscp)
-                             : measure("RSSI", cell.figure("RSSI"), Graded::RxLevel);
+        heard.level =
+            isUmts ? measure("RSCP", cell.figure("RSCP")) : measure("RSSI", cell.figure("RSSI"), Graded::RxLev);
         heard.quality = measure("Ec/N0", cell.figure("ECN0"), Graded::EcIo);
     }
     if (!heard.identity.empty()) seen.cells.push_back(std::move(heard));
@@ -54,8 +54,8 @@ Observation observeIfx(const Value& display) {
     auto bands = !number ? std::vector<BandChannel>() : isUmts ? utraFddBands(*number) : gsmBands(*number);
     if (bands.size() == 1 && !seen.band.empty()) bands.front().band = std::exchange(seen.band, {});
     addBand(seen, bands);
-    seen.level = isUmts ? measure("RSCP", serving.figure("RSCP"), Graded::Rscp)
-                        : measure("RSSI", serving.figure("RSSI"), Graded::RxLevel);
+    seen.level =
+        isUmts ? measure("RSCP", serving.figure("RSCP")) : measure("RSSI", serving.figure("RSSI"), Graded::RxLev);
     seen.quality = measure("Ec/N0", serving.figure("ECN0"), Graded::EcIo);
 
     for (const Value& row : rowsOf(screens.at("Neighbours/GSM"))) addCell(seen, row, false);

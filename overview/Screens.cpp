@@ -3,6 +3,7 @@
 #include <algorithm>
 #include <charconv>
 
+#include "model/DisplayPath.h"
 #include "platform/values/Array.h"
 #include "platform/values/Dictionary.h"
 
@@ -16,7 +17,7 @@ const Value& childOf(const Value& value, std::string_view name) {
     if (!dictionary) return kNone;
     if (const Value* child = dictionary->find(name)) return *child;
     const auto found = std::find_if(dictionary->begin(), dictionary->end(),
-                                    [&](const auto& entry) { return shownName(entry.key) == name; });
+                                    [&](const auto& entry) { return nameOfSortedKey(entry.key) == name; });
     return found != dictionary->end() ? found->value : kNone;
 }
 
@@ -34,11 +35,6 @@ std::optional<Figure> parsed(const std::string& text) {
 }
 
 }  // namespace
-
-std::string_view shownName(std::string_view key) {
-    const std::size_t separator = key.find(';');
-    return separator == key.npos ? key : key.substr(separator + 1);
-}
 
 std::optional<Figure> figureOf(const Value& value) {
     if (value.record() == 0 || value.string() == nullptr) return std::nullopt;

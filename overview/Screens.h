@@ -40,7 +40,5 @@ private:
 
 /// As `Screens::figure`, of a value in hand.
 std::optional<Figure> figureOf(const Value& value);
-/// "02;RSCP" is a screen's "RSCP".
-std::string_view shownName(std::string_view key);
 
 }  // namespace kelvo::overview

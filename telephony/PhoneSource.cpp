@@ -29,7 +29,11 @@ void PhoneSource::measureOnly(std::function<bool()> when, phone::LastIdle lastId
 
 std::string PhoneSource::state() const { return _service->trouble(); }
 
-DictionaryRef PhoneSource::phoneStatus() const { return kelvo::phoneStatus(*_service); }
+DictionaryRef PhoneSource::phoneStatus() const {
+    auto status = kelvo::phoneStatus(*_service);
+    if (_derived > 0) status->set("Derived", _derived);
+    return status;
+}
 
 void PhoneSource::feed() {
     if (_fed && _now() - *_fed < kLook) return;
@@ -77,7 +81,7 @@ void PhoneSource::write(const phone::Content& content) {
     _written[content.code] = {content.payload, _now()};
     const CaptureTime time(clock().now().time_since_epoch());
     const Bytes record = phone::recordOf(content, wire::timestampOf(wire::SystemTime(time)));
-    hand(*_sink, {time, record});
+    if (hand(*_sink, {time, record}) && content.code < kExtendedLogCodes) ++_derived;
 }
 
 void PhoneSource::repeatLater() {

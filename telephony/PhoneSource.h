@@ -58,6 +58,7 @@ private:
     std::optional<Technology> _family;  // stays while the modem does: a phone out of reach keeps its screens
     std::string _modem;                 // whose family it is
     std::map<LogCode, Written> _written;
+    std::int64_t _derived = 0;        // records of levels that clients took
     std::optional<nanoseconds> _fed;  // when everything was written anew for one who came
     bool _repeating = false;          // the next look at the clock is on the queue
     Lifetime _lifetime;

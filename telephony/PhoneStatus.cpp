@@ -70,6 +70,10 @@ std::string phoneStatusText(const Dictionary& phone) {
         if (const Number* count = phone[key].number())
             text += fmt::format("  {:<26}{}\n", label, counted(static_cast<std::size_t>(count->integer()), one));
     }
+    if (const Number* derived = phone["Derived"].number()) {
+        text += fmt::format("  {:<26}{} (0xb17f of the levels: priority, limits, thresholds and rules are not told)\n",
+                            "Derived", derived->integer());
+    }
     const ArrayRef& lacks = phone["Lacks"].array();
     if (!lacks) return text;
     for (const Value& line : *lacks) {

@@ -208,16 +208,18 @@ void ModemManager::measure(bool wanted) {
 
 void ModemManager::look(std::function<void()> done) {
     if (_modem.isEmpty()) return done();
-    askCells([this, done = std::move(done)] { askLocation(done); });
+    askCells([this, done = std::move(done)] {
+        askLocation([this, done] {
+            note();
+            done();
+        });
+    });
 }
 
 void ModemManager::poll() {
     if (!_measuring || _modem.isEmpty()) return;
     if (!std::exchange(_asking, true)) {
-        look(_lifetime.whileAlive([this] {
-            _asking = false;
-            note();
-        }));
+        look([this] { _asking = false; });
     }
     if (std::exchange(_polling, true)) return;
     _queue.postAfter(kPollPause, _lifetime.whileAlive([this] {

@@ -27,7 +27,7 @@ public:
     /// Every modem that there is, the first first.
     std::vector<phone::PhoneState> modems() const;
     /// Asks once for the cells of the modem that is followed, as measuring does, but for nothing that would change the
-    /// daemon; `done` is called with the answers.
+    /// daemon; `done` is called when it has answered, and the news follow on the queue.
     void look(std::function<void()> done);
     /// Everything that was asked so far has been answered.
     bool isSettled() const { return _loading == 0; }

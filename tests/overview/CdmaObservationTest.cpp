@@ -42,7 +42,7 @@ TEST(CdmaObservation, TheCellIsTheReferencePilot) {
     EXPECT_DOUBLE_EQ(seen.level->figure.number, -74.6);
     EXPECT_EQ(seen.quality->figure.text, "-9.58 dB");
     EXPECT_DOUBLE_EQ(seen.quality->figure.number, -9.58);
-    EXPECT_EQ(seen.quality->grade, "fair");
+    EXPECT_EQ(seen.quality->grade, "good");
     EXPECT_EQ(seen.area, "SID 4110, NID 2");
     const std::vector<Fact> facts = {
         {"Band", "BC 0 (878.5 MHz down, 833.5 MHz up)"}, {"Base station", "50"}, {"EV-DO", "Idle, session Open"}};

@@ -62,9 +62,9 @@ TEST(GsmUmtsObservation, OnUmtsTheCellIsTheFirstOfTheActiveSet) {
     EXPECT_EQ(seen.cellRecord, 8u);
     EXPECT_EQ(seen.level->name, "RSCP");
     EXPECT_DOUBLE_EQ(seen.level->figure.number, -99);
-    EXPECT_EQ(seen.level->grade, "weak");
+    EXPECT_EQ(seen.level->grade, "");
     EXPECT_EQ(seen.quality->name, "Ec/Io");
-    EXPECT_EQ(seen.quality->grade, "fair");
+    EXPECT_EQ(seen.quality->grade, "good");
     const std::vector<Fact> facts = {{"Cell identity", "6553791 (RNC 100, cell 191)"},
                                      {"Band", "I (2112.4 MHz down, 1922.4 MHz up)"},
                                      {"Transmit power", "5.33 dBm"}};

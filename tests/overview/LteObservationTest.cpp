@@ -35,8 +35,8 @@ TEST(LteObservation, TheStateIsThatOfTheNewestMeasurement) {
     EXPECT_EQ(seen.level->figure.text, "-109.50 dBm");
     EXPECT_DOUBLE_EQ(seen.level->figure.number, -109.5);
     EXPECT_EQ(seen.level->figure.unit, "dBm");
-    EXPECT_EQ(seen.level->grade, "weak");
-    EXPECT_EQ(seen.quality->grade, "good");
+    EXPECT_EQ(seen.level->grade, "poor");
+    EXPECT_EQ(seen.quality->grade, "excellent");
     EXPECT_EQ(seen.band, "17");
 
     const Observation later = observe(Technology::LTE, group({{kIdle, idle(5)}, {kConnected, connected(6)}}));
@@ -44,7 +44,7 @@ TEST(LteObservation, TheStateIsThatOfTheNewestMeasurement) {
     EXPECT_TRUE(later.isDedicated);
     EXPECT_EQ(later.cell, "EARFCN 1300, PCI 84");
     EXPECT_EQ(later.level->grade, "good");
-    EXPECT_EQ(later.quality->grade, "fair");
+    EXPECT_EQ(later.quality->grade, "good");
 }
 
 TEST(LteObservation, ABroadcastTellsTheCellsPartsAndItsBand) {

@@ -155,6 +155,22 @@ TEST_F(PhoneSourceTest, TellsItsStatusWithIdentitiesShortened) {
     EXPECT_EQ(phoneStatusText(*phoneStatus(test::FakePhone())), "\nModemManager\n");
 }
 
+TEST_F(PhoneSourceTest, CountsTheRecordsThatItDerivesOfLevels) {
+    know(test::ltePhone());
+    EXPECT_EQ(phoneStatusText(*source.phoneStatus()).find("Derived"), std::string::npos);
+    stream();
+    phone.state.lte.rsrp = -101;
+    phone.change();
+    sink.wantsAny = false;
+    phone.state.lte.rsrp = -102;
+    phone.change();
+    EXPECT_NE(
+        phoneStatusText(*source.phoneStatus())
+            .find("  Derived                   2 (0xb17f of the levels: priority, limits, thresholds and rules are "
+                  "not told)\n"),
+        std::string::npos);
+}
+
 TEST_F(PhoneSourceTest, SaysWhatIsWrong) {
     phone.whatIsWrong = "ModemManager does not run";
     EXPECT_EQ(source.state(), "ModemManager does not run");

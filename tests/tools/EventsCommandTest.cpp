@@ -63,8 +63,8 @@ TEST_F(EventsCommand, TheOverviewShowsTheCellsThatWereHeard) {
     EXPECT_EQ(done.output,
               "LTE, connected\n"
               "  Cell           EARFCN 5780, PCI 185\n"
-              "  RSRP           -109.50 dBm, weak, 3 s ago\n"
-              "  RSRQ           -10.00 dB, good\n"
+              "  RSRP           -109.50 dBm, poor, 3 s ago\n"
+              "  RSRQ           -10.00 dB, excellent\n"
               "  Area           TAC 4566\n"
               "  Cell identity  77 (eNB 0, sector 77)\n"
               "  Band           17 (739.0 MHz down, 709.0 MHz up)\n"

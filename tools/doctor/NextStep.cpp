@@ -63,6 +63,8 @@ const PortFindings& chosen(const Findings& findings) {
 }  // namespace
 
 std::string nextStep(const Findings& findings) {
+    if (findings.ports.empty() && findings.phone && !findings.phone->modems.empty())
+        return fmt::format("run \"{} --modemmanager\", and then kelvo", kService);
     if (findings.ports.empty())
         return "plug a modem in and run this again, or name its port: run \"kelvoctl doctor --port "
                "PATH|tcp:HOST:PORT|unix:PATH\"";

@@ -186,6 +186,16 @@ TEST_F(ModemManagerTest, TellsTheCellsAndLevelsOfLte) {
     EXPECT_FALSE(mock->asked.contains("GetLocation"));  // a cell serves
 }
 
+TEST_F(ModemManagerTest, LooksOnceWithoutChangingTheDaemon) {
+    mock->cells = {kServingLte};
+    followModem();
+    bool looked = false;
+    manager->look([&] { looked = true; });
+    ASSERT_TRUE(until([&] { return looked && phone().cells->front().pid == 301; }));
+    EXPECT_TRUE(mock->rates.isEmpty());
+    EXPECT_EQ(mock->asked.count("GetCellInfo"), 1);
+}
+
 TEST_F(ModemManagerTest, PutsTheLevelsOfGsmAndUmtsIntoTheCellThatServes) {
     mock->addModem(0);
     mock->modems[0][test::kModemInterface]["AccessTechnologies"] = 1U << 4;

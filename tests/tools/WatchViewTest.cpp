@@ -90,9 +90,9 @@ TEST_F(View, WritesOnlyTheRowsThatChanged) {
 
 TEST_F(View, AnnouncesWhatItCutsOff) {
     written();
-    terminal->draw({"ääääääääääääääääääääXY"}, 1);
+    terminal->draw({Terminal::Row{"ääääääääääääääääääääXY"}});
     EXPECT_EQ(written(), "\x1b[1;1H\x1b[Käääääääääääääääääää…");
-    terminal->draw({"äääääääääääääääääääZ"}, 1);
+    terminal->draw({Terminal::Row{"äääääääääääääääääääZ"}});
     EXPECT_EQ(written(), "\x1b[1;1H\x1b[KäääääääääääääääääääZ");
 }
 

@@ -120,6 +120,8 @@ void KelvoModel::chooseGenerator(const Value& answer) {
     const std::string* identifier = technology->string();
     _logGenerator = identifier != nullptr ? generatorFromTechnology(*identifier) : nullptr;
     if (_logGenerator) _logGenerator->limitRawLog(kRawLogLimit);
+    if (_logGenerator && !_technology)
+        _technology = technologyBy(&TechnologyNames::identifier, std::string_view(*identifier));
     logLine(Level::Error, "Got log generated: %p", addressOf(_logGenerator));
 }
 

@@ -14,6 +14,7 @@
 #include "platform/system/Lifetime.h"
 #include "platform/system/MainQueue.h"
 #include "platform/system/MessagePorts.h"
+#include "platform/telephony/Technology.h"
 #include "platform/telephony/Telephony.h"
 
 namespace kelvo {
@@ -67,6 +68,8 @@ public:
     NodeRef nodeAtPath(const std::string& path);
     /// As `nodeAtPath`, of the tree that is there; none while the next one is not built yet.
     NodeRef shownNodeAtPath(const std::string& path) const { return _nodesByPath.find(path); }
+    /// The family whose screens these are: the first that was spoken; none before.
+    std::optional<Technology> technology() const { return _technology; }
     /// How the values have gone; each rebuild of the tree is one refresh of them. Their time is that of the main queue.
     const Trends& trends() const { return _trends; }
     Trends::Time trendTime() const;
@@ -106,6 +109,7 @@ private:
     RecordLedger _records;                                           // likewise: the display's values outlive them
     std::vector<std::unique_ptr<LogGenerator>> _replacedGenerators;  // none is released before the model goes
     std::unique_ptr<LogGenerator> _logGenerator;
+    std::optional<Technology> _technology;
     NodeRef _nodes;
     NodesByPath _nodesByPath;  // built with _nodes and empty without
     Trends _trends;

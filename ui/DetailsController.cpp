@@ -5,6 +5,7 @@
 #include <QGuiApplication>
 #include <algorithm>
 
+#include "glossary/Glossary.h"
 #include "model/LevelGrades.h"
 #include "model/TrendWords.h"
 #include "ui/RecordDump.h"
@@ -27,7 +28,9 @@ QString modemTimeText(SystemTime time) {
 DetailsController::DetailsController(const KelvoModel& model, const std::string& path, int row, ScreenHost& host)
     : _model(model), _host(host), _row(row) {
     const NodeRef node = model.shownNodeAtPath(path);
-    _name = model.trends().nameAt(node ? leafOf(*node, path) : path);
+    const std::string leaf = node ? leafOf(*node, path) : path;
+    _name = model.trends().nameAt(leaf);
+    readMeaning(leaf);
     _title = shown(keyOfTrend(_name));
     _place = shown(placeOfTrend(_name));
     reload();
@@ -64,6 +67,14 @@ void DetailsController::reload() {
     Q_EMIT changed();
 }
 
+void DetailsController::readMeaning(const std::string& path) {
+    const auto technology = _model.technology();
+    const Meaning* meaning = technology ? meaningAt(*technology, path) : nullptr;
+    if (meaning == nullptr) return;
+    _meaning = shown(meaning->sentence);
+    _standard = shown(standardOf(*meaning));
+}
+
 void DetailsController::readProvenance(const KelvoModelNode& node) {
     const auto from = _model.provenance(node);
     if (!from) return;  // what was known of the record is still true but for its age
@@ -72,6 +83,9 @@ void DetailsController::readProvenance(const KelvoModelNode& node) {
                    .arg(from->record);
     _record = QString::fromStdString(describe(*from));
     _modemTime = from->modemTime ? modemTimeText(*from->modemTime) : QString();
+    // The bytes are there until the next record of their kind; what was shown of them stays true for this one.
+    if (from->record == _recordNumber && from->bytes.empty()) return;
+    _recordNumber = from->record;
     _dump = recordDump(from->bytes, from->place);
     _dumpWords = placeText(from->bytes, from->place);
 }

@@ -25,6 +25,9 @@ class DetailsController : public QObject {
     Q_PROPERTY(QString place READ place CONSTANT)
     Q_PROPERTY(int row READ row CONSTANT)
     Q_PROPERTY(QString valueText READ valueText NOTIFY changed)
+    Q_PROPERTY(bool valueIsLong READ valueIsLong NOTIFY changed)
+    Q_PROPERTY(QString meaning READ meaning CONSTANT)
+    Q_PROPERTY(QString standard READ standard CONSTANT)
     Q_PROPERTY(QString written READ written NOTIFY changed)
     Q_PROPERTY(QString record READ record NOTIFY changed)
     Q_PROPERTY(QString modemTime READ modemTime NOTIFY changed)
@@ -44,6 +47,10 @@ public:
     const QString& place() const { return _place; }  ///< the screens that lead to it, and what its row is about
     int row() const { return _row; }
     const QString& valueText() const { return _valueText; }
+    bool valueIsLong() const { return _valueText.size() > 16; }  ///< for the largest type on a phone
+    // What it means, in a sentence, and the standard that says so; empty for what nobody has explained.
+    const QString& meaning() const { return _meaning; }
+    const QString& standard() const { return _standard; }
     // Where the value comes from; each is empty when that is not known.
     const QString& written() const { return _written; }      ///< "4 seconds ago, by record 4711"
     const QString& record() const { return _record; }        ///< the record's kind: "0xb17f  LTE serving cell, idle"
@@ -83,6 +90,7 @@ Q_SIGNALS:
 private:
     /// The path of the leaf that stands for the node at `path`: itself, or the main level of a list's row.
     std::string leafOf(const KelvoModelNode& node, const std::string& path) const;
+    void readMeaning(const std::string& path);
     void readChanges();
     void readProvenance(const KelvoModelNode& node);
 
@@ -93,9 +101,12 @@ private:
     QString _title;
     QString _place;
     QString _valueText;
+    QString _meaning;
+    QString _standard;
     QString _written;
     QString _record;
     QString _modemTime;
+    std::uint64_t _recordNumber = 0;  // of the dump
     QString _dump;
     QString _dumpWords;
     Trend _trend;

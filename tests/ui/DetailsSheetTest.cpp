@@ -85,6 +85,13 @@ TEST_F(DetailsSheet, StaysAwayFromATapAndFromRowsThatOpen) {
     EXPECT_EQ(depth(), 2U);
 }
 
+TEST_F(DetailsSheet, SaysWhatTheValueMeans) {
+    startLte();
+    openDetails();
+    EXPECT_TRUE(textOf("meaning").endsWith(text(".")));
+    EXPECT_TRUE(textOf("standard").startsWith(text("3GPP TS 36.")));
+}
+
 TEST_F(DetailsSheet, FollowsTheValue) {
     startLte();
     openDetails();
@@ -200,14 +207,14 @@ TEST_F(DetailsSheet, StandsBelowOnAPhoneAndBesideTheRowInAWideWindow) {
     EXPECT_EQ(panel->width(), 412);
     EXPECT_EQ(panel->mapToScene({0, panel->height()}).y(), 915);
 
-    startLte({1000, 900});
+    startLte({1000, 1300});
     openSection();
     askAt(2);
     panel = named("detailsPanel");
     const QQuickItem* row = scene->row(text("Serving Filtered RSRP"));
     EXPECT_EQ(panel->width(), 440);
     EXPECT_GE(panel->mapToScene({0, 0}).y(), row->mapToScene({0, row->height() / 2}).y());
-    EXPECT_LE(panel->mapToScene({0, panel->height()}).y(), 900);
+    EXPECT_LE(panel->mapToScene({0, panel->height()}).y(), 1300);
 }
 
 TEST_F(DetailsSheet, FitsTheSmallestWindow) {

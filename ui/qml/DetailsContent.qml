@@ -36,7 +36,23 @@ Column {
         text: content.details.valueText
         wrapMode: Text.WrapAtWordBoundaryOrAnywhere
         color: Theme.text
-        font.pixelSize: text.length > 16 ? 20 : 32
+        font.pixelSize: content.details.valueIsLong ? 20 : 32
+    }
+
+    Column {
+        width: content.width - 2 * content.padding
+        spacing: 2
+
+        Line {
+            objectName: "meaning"
+            text: content.details.meaning
+            color: Theme.text
+        }
+        Line {
+            objectName: "standard"
+            text: content.details.standard
+            font.pixelSize: 13
+        }
     }
 
     Column {

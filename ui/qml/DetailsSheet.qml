@@ -79,7 +79,7 @@ FocusScope {
         y: place + (sheet.wide ? 0 : slide * height)
         opacity: sheet.wide ? 1 - slide : 1
         width: sheet.wide ? 440 : Math.min(sheet.width, 640)
-        height: Math.min(bar.height + content.implicitHeight + 24, sheet.height - 24)
+        height: Math.min(bar.height + content.implicitHeight + 4, sheet.height - 24)
         radius: 14
         color: Theme.row
         border { width: 1; color: Theme.hairline }

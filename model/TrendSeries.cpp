@@ -135,7 +135,7 @@ std::vector<TrendSeries::Sample> TrendSeries::samples() const {
 }
 
 std::size_t TrendSeries::bytes() const {
-    return sizeof *this + _steps.capacity() + _quantities.capacity() * sizeof(const Quantity*);
+    return sizeof *this + _steps.capacity() + _quantities.capacity() * sizeof(void*);
 }
 
 }  // namespace kelvo

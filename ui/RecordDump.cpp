@@ -1,5 +1,6 @@
 #include "ui/RecordDump.h"
 
+#include <QStringList>
 #include <algorithm>
 #include <cstdint>
 

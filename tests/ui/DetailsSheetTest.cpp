@@ -217,6 +217,17 @@ TEST_F(DetailsSheet, StandsBelowOnAPhoneAndBesideTheRowInAWideWindow) {
     EXPECT_LE(panel->mapToScene({0, panel->height()}).y(), 1300);
 }
 
+TEST_F(DetailsSheet, StaysInAWindowThatBecomesWide) {
+    startLte();
+    openDetails();
+    scene->view().resize(900, 640);
+    scene->settle();
+    const QQuickItem* panel = named("detailsPanel");
+    EXPECT_EQ(panel->width(), 440);
+    EXPECT_GE(panel->mapToScene({0, 0}).x(), 12);
+    EXPECT_LE(panel->mapToScene({440, 0}).x(), 900);
+}
+
 TEST_F(DetailsSheet, FitsTheSmallestWindow) {
     startLte({240, 240});
     openDetails();

@@ -75,7 +75,7 @@ FocusScope {
         readonly property real place: !sheet.wide ? sheet.height - height : below + height <= sheet.height - 12 ? below : above >= 12 ? above : (sheet.height - height) / 2
         property real slide: 1
 
-        x: sheet.wide ? Math.min(sheet.rowFrame.x + sheet.rowFrame.width, sheet.width - 12) - width : (sheet.width - width) / 2
+        x: sheet.wide ? Math.max(12, Math.min(sheet.rowFrame.x + sheet.rowFrame.width, sheet.width - 12) - width) : (sheet.width - width) / 2
         y: place + (sheet.wide ? 0 : slide * height)
         opacity: sheet.wide ? 1 - slide : 1
         width: sheet.wide ? 440 : Math.min(sheet.width, 640)

@@ -12,6 +12,11 @@ FocusScope {
     property DetailsSheet details: null
 
     focus: true
+    onWidthChanged: {
+        const page = stack.currentItem as PanePage;
+        if (details && page)
+            details.rowFrame = page.frameOf(details.details.row);
+    }
 
     function giveFocus() {
         if (alert.shown)

@@ -1,11 +1,15 @@
 #pragma once
 
+#include <algorithm>
+#include <array>
 #include <chrono>
 #include <cstdint>
-#include <optional>
+#include <cstring>
+#include <memory>
+#include <span>
 #include <vector>
 
-#include "LogGenerator/LogCode.h"
+#include "LogGenerator/Framing.h"
 #include "LogGenerator/RecordBeingShown.h"
 #include "platform/telephony/RecordTime.h"
 #include "platform/values/Bytes.h"
@@ -57,7 +61,10 @@ public:
     };
 
     /// The packet of a message that bears one; else empty.
-    static ByteView packetOf(ByteView message);
+    static ByteView packetOf(ByteView message) {
+        const ByteView packet = message.size() >= kMinimumMessageSize ? stripPrefix(message) : ByteView();
+        return packet.size() >= kMinimumMessageSize ? packet : ByteView();
+    }
 
     /// How many messages have been counted: the number of the last one.
     std::uint64_t count() const { return _count; }
@@ -69,7 +76,7 @@ public:
     StreamTime streamTime(Arrival now) const;
 
     /// No more than a few records fit: it is time for `forgetAllBut`. Without it the oldest are forgotten.
-    bool isFull() const { return _entries.size() >= kCapacity; }
+    bool isFull() const { return _size == kCapacity; }
     /// Forgets every record that no value of `display` comes from.
     void forgetAllBut(const Value& display);
 
@@ -80,17 +87,66 @@ private:
         Bytes bytes;
     };
 
+    static constexpr std::size_t kTimestampAt = 5;
+
+    std::span<const Entry> entries() const { return {_entries.get(), _size}; }
     std::uint64_t append(ByteView packet, Arrival arrival);
     StreamTime advance(std::uint64_t timestamp, Arrival arrival);
+    StreamTime leap(StreamTime own, Arrival arrival);
     void keepBytes(ByteView packet);
+    Kept& keptOf(LogCode code);
+    Kept& lookForKept(LogCode code);
     void forgetOldest();
 
     std::uint64_t _count = 0;
-    StreamTime _now{0};           // the stream's time of the last one
-    Arrival _arrived{0};          // and when it came
-    StreamTime _clockOffset{0};   // from a record's own time to the stream's
-    std::vector<Entry> _entries;  // by number
-    std::vector<Kept> _kept;      // one a code
+    StreamTime _now{0};          // the stream's time of the last one
+    Arrival _arrived{0};         // and when it came
+    StreamTime _clockOffset{0};  // from a record's own time to the stream's
+    std::size_t _size = 0;
+    std::unique_ptr<Entry[]> _entries = std::make_unique_for_overwrite<Entry[]>(kCapacity);  // by number
+    std::vector<Kept> _kept;                                                                 // one a code
+    std::array<std::uint8_t, 64> _guess{};  // where the code with these lower bits was found last
 };
+
+// Every record passes here: what it costs is counted in instructions.
+
+inline std::uint64_t RecordLedger::append(ByteView packet, Arrival arrival) {
+    if (isFull()) forgetOldest();
+    const bool isPacket = !packet.empty();
+    std::uint64_t timestamp = 0;
+    if (isPacket) std::memcpy(&timestamp, packet.data() + kTimestampAt, sizeof timestamp);
+    _now = advance(timestamp, arrival);
+    _arrived = arrival;
+    _entries[_size++] = {.number = ++_count,
+                         .timestamp = timestamp,
+                         .arrival = arrival,
+                         .stream = _now,
+                         .code = isPacket ? logCode(packet.data()) : 0};
+    return _count;
+}
+
+inline RecordLedger::StreamTime RecordLedger::advance(std::uint64_t timestamp, Arrival arrival) {
+    constexpr StreamTime kTick{1250};
+    constexpr StreamTime kDisorder = std::chrono::seconds(2);   // records of several senders come a little out of order
+    constexpr StreamTime kLongestGap = std::chrono::hours(24);  // beyond it a clock was set
+    if (timestamp == 0) return streamTime(arrival);
+    const StreamTime own = static_cast<std::int64_t>(timestamp >> 16) * kTick;
+    const StreamTime step = own + _clockOffset - _now;
+    if (step < -kDisorder || step > kLongestGap) return leap(own, arrival);
+    return _now + std::max(step, StreamTime());
+}
+
+inline void RecordLedger::keepBytes(ByteView packet) {
+    if (packet.empty()) return;
+    Kept& kept = keptOf(_entries[_size - 1].code);
+    kept.number = _count;
+    if (kept.bytes.size() != packet.size()) kept.bytes.resize(packet.size());
+    std::memcpy(kept.bytes.data(), packet.data(), packet.size());
+}
+
+inline RecordLedger::Kept& RecordLedger::keptOf(LogCode code) {
+    const std::uint8_t guess = _guess[code % 64];
+    return guess < _kept.size() && _kept[guess].code == code ? _kept[guess] : lookForKept(code);
+}
 
 }  // namespace kelvo

@@ -54,11 +54,13 @@ void showFields(Dictionary::Rewrite& row, RecordView record, std::size_t base, s
 }
 
 void showValues(const ArrayRef& values, RecordView record, const RecordEntries& entries, Raw raw, const Shown& shown) {
+    const std::uint64_t number = RecordBeingShown::number();
+    const Place place = raw.placeAt(0);
     const ArrayLock::Held held;
     values->resize(entries.count());
     for (std::size_t i = 0; i < entries.count(); ++i) {
         const std::size_t at = entries.offsetOf(i);
-        showValue((*values)[i], record.read(at, raw), shown, raw.placeAt(at));
+        showValue((*values)[i], record.read(at, raw), shown, place.from(at), number);
     }
 }
 

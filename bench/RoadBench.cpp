@@ -48,7 +48,7 @@ public:
     LteSource(MainQueue& queue, const Run& run)
         : _queue(queue), _run(run), _messages(bench::lteFamily().traffic.front().messages) {}
 
-    Technology technology() const override { return Technology::LTE; }
+    std::optional<Technology> technology() const override { return Technology::LTE; }
     std::string description() const override { return "the LTE mix of the benchmarks"; }
     void start(RecordSink& sink) override {
         _sink = &sink;

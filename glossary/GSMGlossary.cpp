@@ -51,7 +51,7 @@ constexpr Meaning kMeanings[] = {
 
     // Active Set, UMTS Set
     { "", "Scrambling Code",
-      "The primary scrambling code, 0 to 511, that tells the cell from its neighbours on the same frequency.",
+      "The primary scrambling code, 0 to 511, that tells the cell from its neighbors on the same frequency.",
       "3GPP TS 25.213, 5.2" },
     { "", "RSCP",
       "Received signal code power: the level of the cell's pilot.",
@@ -60,16 +60,16 @@ constexpr Meaning kMeanings[] = {
       "The energy of the cell's pilot over all that is received in the band, Ec/N0.",
       "3GPP TS 25.215, 5.1.5" },
     { "UMTS Set", "Downlink Frequency",
-      "The downlink carrier frequency of the neighbour as a channel number, UARFCN.",
+      "The downlink carrier frequency of the neighbor as a channel number, UARFCN.",
       "3GPP TS 25.101, 5.4.3" },
     { "UMTS Set", "UARFCN",
-      "The downlink carrier frequency of the neighbour as a channel number, told by the phone's own services.",
+      "The downlink carrier frequency of the neighbor as a channel number, told by the phone's own services.",
       "3GPP TS 25.101, 5.4.3" },
     { "UMTS Set", "Ranking Value",
       "The criterion R by which cells are ranked for reselection: the best cell is the one to camp on.",
       "3GPP TS 25.304, 5.2.6.1.4" },
     { "", "Rank Cell RSCP",
-      "The level by which the neighbour is ranked.",
+      "The level by which the neighbor is ranked.",
       "3GPP TS 25.304, 5.2.6.1.4" },
 
     // UMTS RR Info

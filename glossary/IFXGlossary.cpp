@@ -29,7 +29,7 @@ constexpr Meaning kMeanings[] = {
       "The downlink carrier frequency of a UMTS cell as a channel number.",
       "3GPP TS 25.101, 5.4.3" },
     { "", "SCN",
-      "The primary scrambling code, 0 to 511, that tells a UMTS cell from its neighbours on the same frequency.",
+      "The primary scrambling code, 0 to 511, that tells a UMTS cell from its neighbors on the same frequency.",
       "3GPP TS 25.213, 5.2" },
     { "", "RSCP",
       "Received signal code power: the level of a UMTS cell's pilot.",
@@ -52,7 +52,7 @@ constexpr Meaning kMeanings[] = {
 
     // Neighbours
     { "Neighbours", "GSM",
-      "The GSM neighbours; one that is known by its carrier frequency alone shows it in place of a screen.",
+      "The GSM neighbors; one that is known by its carrier frequency alone shows it in place of a screen.",
       "3GPP TS 45.005, 2" },
 
     // Registration

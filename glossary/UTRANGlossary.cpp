@@ -22,7 +22,7 @@ constexpr Meaning kMeanings[] = {
       "The registration area of the radio network in which a connected phone is paged.",
       "3GPP TS 25.331, 10.3.2.6" },
     { "", "Cell Scrambling Code",
-      "The number of the code that tells the cell from its neighbours on the same frequency, its cell parameter.",
+      "The number of the code that tells the cell from its neighbors on the same frequency, its cell parameter.",
       "3GPP TS 25.223" },
     { "", "Downlink UARFCN",
       "The carrier frequency on which the cell transmits, as a channel number.",
@@ -42,19 +42,19 @@ constexpr Meaning kMeanings[] = {
 
     // Neighbor Cell List
     { "", "UARFCN",
-      "The carrier frequency of the neighbour as a channel number.",
+      "The carrier frequency of the neighbor as a channel number.",
       "3GPP TS 25.102, 5.4.3" },
     { "Neighbor Cell List", "Cell ID",
-      "The neighbour's cell parameter, 0 to 127, which tells it from others on the same frequency.",
+      "The neighbor's cell parameter, 0 to 127, which tells it from others on the same frequency.",
       "3GPP TS 25.223" },
     { "", "Filter RSCP",
-      "Received signal code power of the neighbour after the modem's filter, as a fraction in steps of 1/256 and not in dBm.",
+      "Received signal code power of the neighbor after the modem's filter, as a fraction in steps of 1/256 and not in dBm.",
       "3GPP TS 25.225, 5.1" },
     { "", "Status",
-      "The set of cells that the neighbour belongs to: active, monitored or detected.",
+      "The set of cells that the neighbor belongs to: active, monitored or detected.",
       "3GPP TS 25.331" },
     { "", "inJDCS",
-      "Whether the receiver takes the neighbour into account when it detects all cells jointly.",
+      "Whether the receiver takes the neighbor into account when it detects all cells jointly.",
       "" },
 
     // TRCH BLER

@@ -33,6 +33,16 @@ bool isNumber(std::string_view text) {
 
 }  // namespace
 
+std::span<const LevelGrade> gradesOf(Graded what) {
+    switch (what) {
+        case Graded::Rsrp: return kRsrp;
+        case Graded::Rsrq: return kRsrq;
+        case Graded::EcIo: return kEcIo;
+        case Graded::RxLev: break;
+    }
+    return kRxLev;
+}
+
 std::span<const LevelGrade> gradesOf(std::string_view trendName, std::string_view unit) {
     std::string_view path = trendName;
     const std::string_view key = takeLast(path);

@@ -12,8 +12,18 @@ struct LevelGrade {
     double floor = -std::numeric_limits<double>::infinity();
 };
 
-/// The grades, best first, that are widely accepted for the level whose trend has that name and unit (RSRP, RSRQ, Ec/Io
-/// and RxLev); none for every other value.
+/// What is graded.
+enum class Graded {
+    Rsrp,   ///< dBm
+    Rsrq,   ///< dB
+    EcIo,   ///< dB
+    RxLev,  ///< dBm
+};
+
+/// The grades, best first, that are widely accepted; no standard sets them.
+std::span<const LevelGrade> gradesOf(Graded what);
+
+/// The same for the level whose trend has that name and unit; none for every other value.
 std::span<const LevelGrade> gradesOf(std::string_view trendName, std::string_view unit);
 
 /// The grade of `number`; empty without grades.

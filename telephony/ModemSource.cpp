@@ -98,7 +98,11 @@ void ModemSource::lineClosed(const std::string& reason) {
     dropLine();
     if (_ending) return finish();
     if (!isNeeded()) return release();
-    tell((talked ? "the modem has gone: " : "it cannot be opened: ") + reason);
+    if (talked) {
+        tell("the modem has gone: " + reason);
+    } else if (_trouble.empty() || reason != kNobodyIsThere) {
+        tell("it cannot be opened: " + reason);
+    }
     retry();
 }
 
@@ -148,6 +152,7 @@ void ModemSource::settle() {
         if (!std::exchange(_trouble, {}).empty()) logLine(Level::Notice, "%s: the modem is back", _line->name());
     }
     if (!isNeeded()) _session.end();
+    _line->mayGather(_session.state() == State::Running && !_session.isAsking());
     if (_session.state() == State::Closed) return hangUp();
     arm();
 }

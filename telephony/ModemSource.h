@@ -26,6 +26,11 @@ public:
     /// Writes what the port gives to `file` as well, as it comes.
     void recordFramesTo(OutputFile file) { _frames = std::move(file); }
 
+    /// What the port last sent of an LTE cell (0xB17F); null when there is none. Good until its next record.
+    const adaptation::IdleCells::Payload* lastIdle(std::uint32_t earfcn, std::uint16_t pci) {
+        return _adapter.lastIdle(earfcn, pci);
+    }
+
     std::optional<Technology> technology() const override { return _session.technology(); }
     void findTechnology() override;
     std::string description() const override { return _lines->description(); }

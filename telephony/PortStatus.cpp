@@ -30,7 +30,7 @@ DictionaryRef portStatus(const wire::Session& session, const adaptation::Adaptat
                                   {"BuildId", session.buildId()},
                                   {"Losing", session.isLosing()},
                                   {"EncryptsRecords", session.isEncrypted()}});
-    if (const auto camped = session.technology()) port->set("CampedOn", namesOf(*camped).name);
+    if (const auto camped = session.campedOn()) port->set("CampedOn", namesOf(*camped).name);
     if (const auto subscription = session.subscription()) port->set("Subscription", std::int64_t{*subscription});
     for (const PortCounter& counter : kPortCounters)
         port->set(counter.key, static_cast<std::int64_t>(counter.of(session.counts())));

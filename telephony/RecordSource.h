@@ -50,6 +50,8 @@ public:
     virtual std::string state() const { return {}; }
     /// What a modem's port has said, given and lost; none: this is no port.
     virtual DictionaryRef portStatus() const { return nullptr; }
+    /// What the phone's own services know, without identities; none: they are not asked.
+    virtual DictionaryRef phoneStatus() const { return nullptr; }
 
     /// Gives records to `sink`, which outlives the source's work, from now on. Called once, when the first client
     /// streams.

@@ -3,6 +3,7 @@
 #include <cstdint>
 #include <filesystem>
 #include <optional>
+#include <string>
 
 #include "telephony/PacedSource.h"
 #include "telephony/line/PortAddress.h"
@@ -22,7 +23,8 @@ struct ServiceOptions {
     std::uint64_t seed = 1;
     simulation::Generation generation = simulation::Generation::Of2010;
     PacedSource::Speed speed = 1.0;
-    std::optional<PortAddress> port;  ///< none: a capture or a simulation
+    std::optional<PortAddress> port;          ///< none: a capture or a simulation
+    std::optional<std::string> modemManager;  ///< which of its modems, empty: the first; none: it is not asked
     wire::Session::Options session;
     SerialLine::Options line;
     std::filesystem::path recordFrames;  ///< empty: the port's bytes are not recorded

@@ -5,6 +5,7 @@
 #include <nlohmann/json.hpp>
 
 #include "LogGenerator/CodeNames.h"
+#include "telephony/PhoneStatus.h"
 #include "telephony/PortStatus.h"
 
 namespace kelvo {
@@ -75,10 +76,11 @@ Result<std::string> statusText(const Value& answer) {
     if (!codes || !clients) return Failure{"the answer is no status"};
     const std::string state = status["State"] ? fmt::format("State       {}\n", textOf(status, "State")) : "";
     const DictionaryRef& port = status["Port"].dictionary();
-    return fmt::format("Source      {}\n{}Technology  {}\nRecords     {}\n\n  {:<46}{:>11}{:>14}\n{}\nClients\n{}{}",
+    const DictionaryRef& phone = status["Phone"].dictionary();
+    return fmt::format("Source      {}\n{}Technology  {}\nRecords     {}\n\n  {:<46}{:>11}{:>14}\n{}\nClients\n{}{}{}",
                        textOf(status, "Source"), state, textOf(status, "Technology"), integerOf(status, "Records"),
                        "Log code", "per second", "in all", linesOf(codes, codeLine), linesOf(clients, clientLine),
-                       port ? portStatusText(*port) : "");
+                       port ? portStatusText(*port) : "", phone ? phoneStatusText(*phone) : "");
 }
 
 }  // namespace kelvo

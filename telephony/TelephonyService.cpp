@@ -83,6 +83,7 @@ Bytes TelephonyService::status() const {
                                           {"Clients", clients}});
     if (auto state = _source.state(); !state.empty()) answer->set("State", std::move(state));
     if (auto port = _source.portStatus()) answer->set("Port", std::move(port));
+    if (auto phone = _source.phoneStatus()) answer->set("Phone", std::move(phone));
     return encodeAnswer(answer);
 }
 

@@ -3,6 +3,7 @@
 #include <unistd.h>
 
 #include <QCoreApplication>
+#include <QDBusConnection>
 #include <chrono>
 #include <utility>
 
@@ -16,12 +17,14 @@
 #include "platform/telephony/TelephonyProtocol.h"
 #include "telephony/AdaptedStream.h"
 #include "telephony/CaptureStream.h"
+#include "telephony/CompletedSource.h"
 #include "telephony/ModemSource.h"
 #include "telephony/ServiceOptions.h"
 #include "telephony/SimulationStream.h"
 #include "telephony/StatusText.h"
 #include "telephony/TelephonyService.h"
 #include "telephony/line/HostModemLines.h"
+#include "telephony/modemmanager/ModemManager.h"
 
 namespace {
 
@@ -46,7 +49,17 @@ Result<std::unique_ptr<RecordStream>> openStream(const ServiceOptions& options) 
     return std::unique_ptr<RecordStream>(std::move(capture).value());
 }
 
-Result<std::unique_ptr<RecordSource>> openPort(const ServiceOptions& options, MainQueue& queue) {
+constexpr uid_t kRoot = 0;
+
+std::unique_ptr<PhoneSource> openPhone(const std::string& modem, MainQueue& queue) {
+    const auto systemBus = [] {
+        return QDBusConnection::connectToBus(QDBusConnection::SystemBus, "kelvo-modemmanager");
+    };
+    auto manager = std::make_unique<modemmanager::ModemManager>(systemBus, kRoot, modem, queue);
+    return std::make_unique<PhoneSource>(std::move(manager), queue, steadyNow);
+}
+
+Result<std::unique_ptr<ModemSource>> openPort(const ServiceOptions& options, MainQueue& queue) {
     auto lines = std::make_unique<HostModemLines>(*options.port, options.line);
     auto source = std::make_unique<ModemSource>(std::move(lines), options.session, queue, steadyNow);
     if (!options.recordFrames.empty()) {
@@ -54,11 +67,32 @@ Result<std::unique_ptr<RecordSource>> openPort(const ServiceOptions& options, Ma
         if (!file) return file.error();
         source->recordFramesTo(std::move(file).value());
     }
-    return std::unique_ptr<RecordSource>(std::move(source));
+    return source;
+}
+
+// The path of the port's node; empty: it is looked for; none: it has none.
+std::optional<std::string> nodeOf(const PortAddress& port) {
+    if (const auto* node = std::get_if<PortAddress::Node>(&port.place)) return node->path;
+    return std::holds_alternative<PortAddress::Automatic>(port.place) ? std::optional<std::string>("") : std::nullopt;
+}
+
+std::unique_ptr<RecordSource> complete(std::unique_ptr<ModemSource> port, const ServiceOptions& options,
+                                       MainQueue& queue) {
+    const auto lastIdle = [&port = *port](std::uint32_t earfcn, std::uint16_t pci) {
+        return port.lastIdle(earfcn, pci);
+    };
+    return std::make_unique<CompletedSource>(std::move(port), openPhone(*options.modemManager, queue),
+                                             nodeOf(*options.port), lastIdle);
 }
 
 Result<std::unique_ptr<RecordSource>> openSource(const ServiceOptions& options, MainQueue& queue) {
-    if (options.port) return openPort(options, queue);
+    if (options.port) {
+        auto port = openPort(options, queue);
+        if (!port) return port.error();
+        if (options.modemManager) return complete(std::move(port).value(), options, queue);
+        return std::unique_ptr<RecordSource>(std::move(port).value());
+    }
+    if (options.modemManager) return std::unique_ptr<RecordSource>(openPhone(*options.modemManager, queue));
     auto stream = openStream(options);
     if (!stream) return stream.error();
     return std::unique_ptr<RecordSource>(

@@ -14,12 +14,15 @@
 #include "platform/system/Environment.h"
 #include "platform/system/OutputFile.h"
 #include "telephony/recordings/RecordingKind.h"
+#include "tools/CapturePackets.h"
 #include "tools/Command.h"
-#include "tools/CommandFailure.h"
 #include "tools/DisplayJson.h"
 #include "tools/DisplayText.h"
 #include "tools/FamilyCodes.h"
+#include "tools/FollowedCapture.h"
 #include "tools/NumberOption.h"
+#include "tools/OverviewJson.h"
+#include "tools/OverviewText.h"
 #include "tools/ProvenanceJson.h"
 #include "tools/StandardOutput.h"
 #include "tools/TechnologyOption.h"
@@ -35,6 +38,7 @@ struct Options {
     std::optional<std::string> save;
     bool log = false;
     bool json = false;
+    bool overview = false;
     bool provenance = false;
     bool force = false;
 };
@@ -76,30 +80,6 @@ struct Decoded {
     std::optional<Failure> breakOff;  ///< where the capture can be read no further, and why
 };
 
-Technology technologyOf(const Options& options, const CaptureReader& reader) {
-    const auto technology = options.technology ? options.technology : reader.technology();
-    if (technology) return *technology;
-    throw CommandFailure(options.file + " has a link type that names no technology; --technology names one");
-}
-
-/// What ends the program elsewhere ends the command here, with the packet that did it.
-template <class Work>
-void orTell(const Options& options, std::size_t packet, Work work) {
-    try {
-        work();
-    } catch (...) {
-        throw CommandFailure(
-            fmt::format("packet {} of {} ends the program: {}", packet, options.file, currentExceptionText()));
-    }
-}
-
-void update(Decoded& decoded, LogGenerator& generator, Dictionary& state, ByteView message) {
-    if (decoded.records.isFull()) decoded.records.forgetAllBut(state["Display"]);
-    const ByteView packet = generator.takesPackets() ? RecordLedger::packetOf(message) : ByteView();
-    const RecordLedger::Counted counted(decoded.records, packet, decoded.end);
-    generator.updateState(state, message);
-}
-
 Decoded decodeAll(const Options& options, CaptureReader& reader, LogGenerator& generator, Dictionary& state) {
     const FamilyCodes codes(*generator.getStartCommand());
     Decoded decoded;
@@ -113,8 +93,8 @@ Decoded decodeAll(const Options& options, CaptureReader& reader, LogGenerator& g
             ++decoded.messages;
             decoded.understood += codes.include((*packet)->bytes) ? 1 : 0;
             decoded.end = (*packet)->time.time_since_epoch();
-            orTell(options, decoded.messages, [&] {
-                update(decoded, generator, state, (*packet)->bytes);
+            orTell(options.file, decoded.messages, [&] {
+                update(generator, state, decoded.records, (*packet)->bytes, decoded.end);
                 if (options.refreshEvery && decoded.messages % *options.refreshEvery == 0) {
                     generator.generateLogUsingState(state);
                 }
@@ -122,7 +102,7 @@ Decoded decodeAll(const Options& options, CaptureReader& reader, LogGenerator& g
         }
     }
     if (decoded.breakOff && decoded.messages == 0) throw CommandFailure(*decoded.breakOff);
-    orTell(options, decoded.messages, [&] { decoded.display = generator.generateLogUsingState(state); });
+    orTell(options.file, decoded.messages, [&] { decoded.display = generator.generateLogUsingState(state); });
     if (decoded.messages != 0 && !decoded.display) {
         throw CommandFailure("the display's template cannot be loaded; the installation is not complete");
     }
@@ -155,11 +135,21 @@ void warnOfOtherFamily(const Options& options, const Decoded& decoded, const Cap
     fmt::print(stderr, "kelvoctl: {}: {}\n", printable(options.file), line);
 }
 
+/// Followed record by record: the cells around and what happened are more than the last values.
+void showOverview(const Options& options, CaptureReader& reader, Technology technology) {
+    const FollowedCapture followed = followCapture(options.file, reader, technology);
+    writeToStandardOutput(options.json ? printedJson(overviewJson(followed.tracker, followed.end))
+                                       : overviewText(followed.tracker, followed.end));
+    if (followed.breakOff) throw CommandFailure(*followed.breakOff);
+}
+
 void decode(const Options& options) {
     auto opened = CaptureReader::open(options.file);
     if (!opened) throw CommandFailure(whyNoCapture(options.file, opened.error().reason));
     CaptureReader& reader = *opened;
-    const TechnologyNames& names = namesOf(technologyOf(options, reader));
+    const Technology technology = technologyOf(options.file, options.technology, reader);
+    if (options.overview) return showOverview(options, reader, technology);
+    const TechnologyNames& names = namesOf(technology);
     std::optional<OutputFile> output;
     if (options.save) output = orFail(OutputFile::create(*options.save, {options.force, {options.file}}));
 
@@ -203,6 +193,10 @@ void addDecodeCommand(CLI::App& app) {
             ->type_name("OUT.kelvo");
     command.add_flag("--force", options->force, "Replaces a file that is there already")->needs(save);
     command.add_flag("--log", options->log, "Shows the system log's lines as well, before the display");
+    command
+        .add_flag("--overview", options->overview,
+                  "Shows what the values mean together instead: the serving cell, the cells around, what happened")
+        ->excludes("--save", "--log", "--refresh-every");
     CLI::Option* json = command.add_flag("--json", options->json,
                                          "Prints one JSON object: technology, messages, display and, with --log, log");
     command
@@ -216,6 +210,7 @@ void addDecodeCommand(CLI::App& app) {
         "Examples:\n"
         "  kelvoctl decode drive.pcap\n"
         "  kelvoctl decode --json drive.pcap | jq .display\n"
+        "  kelvoctl decode --overview drive.pcap\n"
         "  kelvoctl decode --json --provenance drive.pcap | jq '.display.\"Serving Cell Measurements\"'\n"
         "  kelvoctl decode --log drive.pcap | grep '^\\[3\\]'\n"
         "  kelvoctl decode --refresh-every 50 --save drive.kelvo drive.pcap\n");

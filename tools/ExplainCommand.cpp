@@ -6,9 +6,11 @@
 #include <memory>
 #include <numeric>
 #include <string>
+#include <utility>
 #include <vector>
 
 #include "glossary/Glossary.h"
+#include "tools/Command.h"
 #include "tools/CommandFailure.h"
 #include "tools/StandardOutput.h"
 
@@ -132,7 +134,7 @@ void explainAll() {
 }  // namespace
 
 void addExplainCommand(CLI::App& app) {
-    CLI::App& command = *app.add_subcommand("explain", "Tells what a value on the screens means");
+    CLI::App& command = addCommand(app, "explain", "Tells what a value on the screens means");
     const auto options = std::make_shared<Options>();
     CLI::Option* key = command.add_option("KEY", options->key, "A value's name, as the screens write it");
     command.add_flag("--all", options->all, "Tells of every value, as a page in Markdown")->excludes(key);

@@ -13,10 +13,17 @@ namespace {
 
 using Json = nlohmann::ordered_json;
 
+/// Whole numbers without a point.
+Json jsonOf(double number) {
+    constexpr double kExact = 9007199254740992;  // up to here every whole number is a double
+    const bool isWhole = std::floor(number) == number && std::abs(number) <= kExact;
+    return isWhole ? Json(static_cast<std::int64_t>(number)) : Json(number);
+}
+
 Json textWithProvenance(const Value& text, const RecordLedger& records, std::chrono::nanoseconds now) {
     Json json = {{"text", *text.string()}};
     if (const auto measurement = text.measurement()) {
-        json["number"] = measurement->number;
+        json["number"] = jsonOf(measurement->number);
         if (!measurement->unit.empty()) json["unit"] = measurement->unit;
     }
     if (const auto provenance = provenanceOf(text.record(), records, now)) {

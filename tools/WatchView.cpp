@@ -14,7 +14,7 @@ namespace {
 
 constexpr std::size_t kStatusRows = 2;
 constexpr std::size_t kWidestBesideNotes = 60;  // one long value does not push all notes away
-constexpr std::string_view kKeys = "p records, q quits";
+constexpr std::string_view kKeys = "p ages, q quits";
 
 std::string oneLine(const WatchStatus& status) {
     return status.remark.empty() ? status.text : status.text + "  " + status.remark;

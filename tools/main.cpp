@@ -10,6 +10,7 @@
 #include "tools/DecodeCommand.h"
 #include "tools/DisplayText.h"
 #include "tools/DoctorCommand.h"
+#include "tools/EventsCommand.h"
 #include "tools/ExplainCommand.h"
 #include "tools/ImportCommand.h"
 #include "tools/SnapshotCommand.h"
@@ -45,6 +46,7 @@ int main(int argc, char** argv) {
     app.footer("\"kelvoctl COMMAND --help\" tells more about a command.");
     kelvo::addDecodeCommand(app);
     kelvo::addWatchCommand(app);
+    kelvo::addEventsCommand(app);
     kelvo::addSnapshotCommand(app);
     kelvo::addImportCommand(app);
     kelvo::addStartCommandCommand(app);

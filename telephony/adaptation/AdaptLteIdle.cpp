@@ -1,5 +1,6 @@
 #include <algorithm>
 
+#include "telephony/adaptation/DerivedIdle.h"
 #include "telephony/adaptation/LteLayouts.h"
 #include "telephony/adaptation/RecordAdapter.h"
 
@@ -14,25 +15,8 @@ constexpr std::int64_t kChannelSaidElsewhere = 65535;
 
 constexpr FixedField kPci = kIdle.field("PCI");
 constexpr FixedField kEarfcn = kIdle.field("EARFCN");
-constexpr FixedField kMeasuredRsrp = kIdle.field("measured RSRP");
-constexpr FixedField kSrxlev = kIdle.field("Srxlev");
-
-/// What a 0xB193 record does not say and the last 0xB17F of its cell does.
-constexpr auto kRemembered = std::to_array<FixedField>({
-    kIdle.field("layer priority"),
-    kIdle.field("Qrxlevmin"),
-    kIdle.field("P_Max"),
-    kIdle.field("maximum power"),
-    kIdle.field("DRX cycles"),
-    kIdle.field("S intra"),
-    kIdle.field("S non intra"),
-    kIdle.field("rules updated"),
-    kIdle.field("rules"),
-});
 
 std::int64_t read(const FixedField& field, RecordView payload) { return payload.read(field.at, field.raw); }
-
-std::int64_t roundedQuarters(std::int64_t quarters) { return (quarters + 2) >> 2; }  // ties up
 
 }  // namespace
 
@@ -143,15 +127,7 @@ std::optional<Refusal> RecordAdapter::deriveIdle(ByteView cell, const Turning& l
     const RecordView now(ByteView(made, kIdle.size));
     const IdleCells::Payload* last = _idleCells.recall(earfcn, static_cast<std::uint16_t>(read(kPci, now)));
     _result.derivation = last != nullptr ? Adapted::Derivation::Completed : Adapted::Derivation::Neutral;
-    if (last != nullptr) {
-        const RecordView then{ByteView(*last)};
-        for (const FixedField& field : kRemembered) {
-            writeBits(made + field.at, field.raw, static_cast<std::uint32_t>(read(field, then)));
-        }
-        const std::int64_t moved = roundedQuarters(read(kMeasuredRsrp, now) - read(kMeasuredRsrp, then));
-        writeBits(made + kSrxlev.at, kSrxlev.raw,
-                  static_cast<std::uint32_t>(std::clamp<std::int64_t>(read(kSrxlev, then) + moved, 0, 127)));
-    }
+    if (last != nullptr) completeIdle(made, *last);
     return turned(kIdle.size, kIdleCode);
 }
 

@@ -40,6 +40,11 @@ public:
     /// Takes a packet from its log type byte on, without a prefix, as long as its length says. Borrowed for the call.
     Adapted adapt(ByteView packet);
 
+    /// The payload of the last real 0xB17F of a cell; null when there is none. Good until the next record.
+    const IdleCells::Payload* lastIdle(std::uint32_t earfcn, std::uint16_t pci) {
+        return _idleCells.recall(earfcn, pci);
+    }
+
 private:
     std::optional<Refusal> adaptMasterInformation(ByteView payload);
     std::optional<Refusal> adaptServingCell(ByteView payload);

@@ -7,6 +7,9 @@
 
 namespace kelvo {
 
+/// Why a line cannot be opened whose far end is not there: no news of a modem that has gone.
+inline constexpr const char* kNobodyIsThere = "nobody is there";
+
 /// A way to a modem's diagnostic port. Opened once; whoever wants to open it again makes another. Main queue only.
 class ModemLine {
 public:
@@ -29,6 +32,9 @@ public:
     virtual void open() = 0;
     /// Sends one frame; it goes at the modem's pace.
     virtual void send(ByteView frame) = 0;
+    /// Whether what comes may gather for some milliseconds before it is given, since nobody waits for an answer; not at
+    /// first.
+    virtual void mayGather(bool) {}
     /// The listener hears nothing of it any more. The port itself is closed with the line.
     virtual void mute() = 0;
 };

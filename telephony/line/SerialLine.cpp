@@ -11,7 +11,7 @@ constexpr qint64 kReadBuffer = 1 << 20;
 }  // namespace
 
 SerialLine::SerialLine(std::string path, Options options, Listener& listener)
-    : _path(std::move(path)), _options(options), _listener(listener), _port(new QSerialPort) {
+    : _path(std::move(path)), _options(options), _listener(listener), _port(new QSerialPort), _rest(*_port) {
     _port->setPortName(QString::fromStdString(_path));
     _port->setBaudRate(QSerialPort::Baud115200);
     _port->setReadBufferSize(kReadBuffer);
@@ -20,8 +20,9 @@ SerialLine::SerialLine(std::string path, Options options, Listener& listener)
         // What a pseudo-terminal has not (control lines) is no reason to give it up.
         if (error == QSerialPort::NoError || error == QSerialPort::UnsupportedOperationError || !_port->isOpen())
             return;
-        // The system's own words for a node that has gone are those of whatever was tried last.
-        const bool gone = error == QSerialPort::ResourceError;
+        // The system's own words for a node that has gone are those of whatever was tried last: an end is no error to
+        // it.
+        const bool gone = error == QSerialPort::ResourceError || error == QSerialPort::ReadError;
         const std::string reason = gone ? "it hung up" : _port->errorString().toStdString();
         HostEventLoop::call([&] { close(reason); });
     });
@@ -51,9 +52,11 @@ void SerialLine::mute() {
 }
 
 void SerialLine::read() {
+    std::size_t given = 0;
     for (int i = 0; i < kReadsPerTurn && !_muted; ++i) {
         const qint64 size = _port->read(reinterpret_cast<char*>(_buffer.data()), static_cast<qint64>(_buffer.size()));
-        if (size <= 0) return;
+        if (size <= 0) return _rest.after(given);
+        given += static_cast<std::size_t>(size);
         _listener.lineGave(std::span(_buffer).first(static_cast<std::size_t>(size)));
     }
     if (_muted) return;

@@ -5,6 +5,7 @@
 
 #include "platform/system/Lifetime.h"
 #include "telephony/line/ModemLine.h"
+#include "telephony/line/ReadRest.h"
 
 namespace kelvo {
 
@@ -21,6 +22,7 @@ public:
     std::string name() const override { return _path; }
     void open() override;
     void send(ByteView frame) override;
+    void mayGather(bool may) override { _rest.setAllowed(may); }
     void mute() override;
 
 private:
@@ -31,6 +33,7 @@ private:
     const Options _options;
     Listener& _listener;
     QSerialPort* const _port;  // outlives this object by the rest of its own signal
+    ReadRest _rest;
     bool _muted = false;
     std::array<std::uint8_t, 65'536> _buffer;
     const Lifetime _lifetime;

@@ -15,6 +15,24 @@ constexpr int kReadsPerTurn = 16;
 constexpr qint64 kReadBuffer = 1 << 20;
 constexpr int kConnectLimitMs = 5'000;
 
+std::string reasonOf(const QTcpSocket& socket) {
+    switch (socket.error()) {
+        case QAbstractSocket::RemoteHostClosedError: return "it hung up";
+        case QAbstractSocket::ConnectionRefusedError: return kNobodyIsThere;
+        default: return socket.errorString().toStdString();
+    }
+}
+
+std::string reasonOf(const QLocalSocket& socket) {
+    switch (socket.error()) {
+        case QLocalSocket::PeerClosedError: return "it hung up";
+        case QLocalSocket::ServerNotFoundError:
+        case QLocalSocket::ConnectionRefusedError: return kNobodyIsThere;
+        case QLocalSocket::SocketAccessError: return "Permission denied";
+        default: return socket.errorString().toStdString();
+    }
+}
+
 }  // namespace
 
 std::unique_ptr<ModemLine> SocketLine::toTcp(std::string host, std::uint16_t port, Listener& listener) {
@@ -33,7 +51,7 @@ std::unique_ptr<ModemLine> SocketLine::toUnix(std::string path, Listener& listen
 
 template <class Socket>
 SocketLine::SocketLine(Socket* socket, std::string name, Listener& listener)
-    : _name(std::move(name)), _listener(listener), _socket(socket) {
+    : _name(std::move(name)), _listener(listener), _socket(socket), _rest(*socket) {
     socket->setReadBufferSize(kReadBuffer);
     auto* const limit = new QTimer(socket);
     limit->setSingleShot(true);
@@ -47,7 +65,7 @@ SocketLine::SocketLine(Socket* socket, std::string name, Listener& listener)
     QObject::connect(socket, &QIODevice::readyRead, socket, [=, this] { heard([this] { read(); }); });
     QObject::connect(socket, &Socket::disconnected, socket, [=, this] { heard([this] { close("it hung up"); }); });
     QObject::connect(socket, &Socket::errorOccurred, socket,
-                     [=, this] { heard([=, this] { close(socket->errorString().toStdString()); }); });
+                     [=, this] { heard([=, this] { close(reasonOf(*socket)); }); });
     limit->start(kConnectLimitMs);
 }
 
@@ -67,9 +85,11 @@ void SocketLine::mute() {
 }
 
 void SocketLine::read() {
+    std::size_t given = 0;
     for (int i = 0; i < kReadsPerTurn && !_muted && _socket->isOpen(); ++i) {
         const qint64 size = _socket->read(reinterpret_cast<char*>(_buffer.data()), static_cast<qint64>(_buffer.size()));
-        if (size <= 0) return;
+        if (size <= 0) return _rest.after(given);
+        given += static_cast<std::size_t>(size);
         _listener.lineGave(std::span(_buffer).first(static_cast<std::size_t>(size)));
     }
     if (_muted || !_socket->isOpen()) return;

@@ -7,6 +7,7 @@
 
 #include "platform/system/Lifetime.h"
 #include "telephony/line/ModemLine.h"
+#include "telephony/line/ReadRest.h"
 
 namespace kelvo {
 
@@ -21,6 +22,7 @@ public:
     std::string name() const override { return _name; }
     void open() override { _connect(); }
     void send(ByteView frame) override;
+    void mayGather(bool may) override { _rest.setAllowed(may); }
     void mute() override;
 
 private:
@@ -33,6 +35,7 @@ private:
     Listener& _listener;
     QIODevice* const _socket;  // outlives this object by the rest of its own signal
     std::function<void()> _connect;
+    ReadRest _rest;
     bool _muted = false;
     std::array<std::uint8_t, 65'536> _buffer;
     const Lifetime _lifetime;

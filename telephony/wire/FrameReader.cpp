@@ -64,6 +64,11 @@ void FrameReader::reset() {
     _first = true;
 }
 
+void FrameReader::rewind(const Counts& counts) {
+    reset();
+    _counts = counts;
+}
+
 void FrameReader::keep(MutableBytes beginning) {
     if (_skipping) return;
     if (_kept.size() + beginning.size() > kLongestContent) {

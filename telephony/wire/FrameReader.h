@@ -41,6 +41,8 @@ public:
 
     /// The stream has ended, and another begins. The counts go on.
     void reset();
+    /// Likewise, but what has been read of it counts for nothing: the counts are `counts` again.
+    void rewind(const Counts& counts);
 
 private:
     void keep(MutableBytes beginning);

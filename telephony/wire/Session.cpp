@@ -63,13 +63,15 @@ void Session::begin(std::string name) {
     _requester.reset();
     _masks.begin({});
     ++_counts.sessions;
+    _before = _counts;
     silence(State::Silencing);
 }
 
 void Session::receive(MutableBytes bytes) {
     if (_state == State::Closed || bytes.empty()) return;
     _lastHeard = _now();
-    if (_state == State::Silencing) return;  // an earlier reader's
+    if (_state == State::Silencing) return;          // an earlier reader's
+    if (_state == State::Ending && _before) return;  // no modem's
     while (const auto body = _reader.next(bytes)) handle(*body);
     _counts.frames = _reader.counts();
     proceed();
@@ -118,6 +120,7 @@ void Session::lose() {
     _camped.pause();
     _reader.reset();
     _counts.frames = _reader.counts();
+    if (_before) disown();
     settleLoss();
     if (const auto line = _loss.finish(_counts)) tell(Level::Warning, *line);
 }
@@ -142,6 +145,11 @@ void Session::silence(State state) {
 void Session::identify() {
     _reader.reset();  // the rest of a frame of which nothing was read
     ask(Bytes(kVersionRequest.begin(), kVersionRequest.end()), State::Identifying, kVersionPatience);
+}
+
+void Session::disown() {
+    _counts = *_before;
+    _reader.rewind(_counts.frames);
 }
 
 void Session::ask(const Bytes& request, State state, Requester::Patience patience) {
@@ -236,6 +244,7 @@ void Session::handleAnswer(ByteView body) {
 void Session::answered(ByteView body) {
     switch (_state) {
         case State::Identifying:
+            _before.reset();
             _target = printable(body.subspan(kTargetNameAt, kTargetNameSize));
             return ask(Bytes(kBuildIdRequest.begin(), kBuildIdRequest.end()), State::Naming, kBuildIdPatience);
         case State::Naming:
@@ -254,6 +263,7 @@ void Session::answered(ByteView body) {
 void Session::refused(std::string_view why) {
     switch (_state) {
         case State::Identifying:
+            _before.reset();
             tell(Level::Warning, fmt::format("the modem refuses to tell its version: {}", why));
             return ask(Bytes(kBuildIdRequest.begin(), kBuildIdRequest.end()), State::Naming, kBuildIdPatience);
         case State::Naming: return ask(rangesRequest(), State::Ranging, kPatience);
@@ -318,6 +328,7 @@ void Session::settleTechnology() {
 }
 
 void Session::settleLoss() {
+    if (_before) return;
     if (const auto line = _loss.update(_counts, _now())) tell(Level::Warning, *line);
 }
 

@@ -73,12 +73,17 @@ public:
     void forgetTechnology();
 
     State state() const { return _state; }
+    /// Whether an answer is waited for.
+    bool isAsking() const { return _requester.isWaiting(); }
     /// Why the session ended by itself; empty when it did not.
     const std::string& failure() const { return _failure; }
     /// None: not known yet.
     std::optional<Technology> technology() const;
+    /// What the phone is camped on now; none: not known yet, or nobody listens, since the options name the technology.
+    std::optional<Technology> campedOn() const { return _camped.known(); }
     std::optional<std::int32_t> subscription() const { return _subscription.chosen(); }
-    const PortCounts& counts() const { return _counts; }
+    /// Whatever a port gives that no modem has answered at counts for nothing.
+    const PortCounts& counts() const { return _before ? *_before : _counts; }
     bool isLosing() const { return _loss.isLosing(); }
     bool isEncrypted() const { return _encrypted; }
     const std::string& target() const { return _target; }    ///< what the modem calls itself; may be empty
@@ -88,6 +93,7 @@ private:
     void sendFrame(ByteView body);
     void silence(State state);
     void identify();
+    void disown();
     void empty(std::uint32_t equipment);
     void run();
     void askNext();
@@ -122,12 +128,13 @@ private:
     CampedTechnology _camped;
     LossMeter _loss;
     PortCounts _counts;
-    RecordCodes _wanted;          // by clients
-    nanoseconds _stateBegan{0};   // of Silencing and Ending
-    nanoseconds _lastHeard{0};    // likewise
-    std::uint32_t _emptying = 0;  // the equipment
-    bool _toldShort = false;      // of the request in wait
-    bool _asked = false;          // the modem has been asked for records since the port was opened
+    std::optional<PortCounts> _before;  // the counts when an opening began that no modem has answered yet
+    RecordCodes _wanted;                // by clients
+    nanoseconds _stateBegan{0};         // of Silencing and Ending
+    nanoseconds _lastHeard{0};          // likewise
+    std::uint32_t _emptying = 0;        // the equipment
+    bool _toldShort = false;            // of the request in wait
+    bool _asked = false;                // the modem has been asked for records since the port was opened
     bool _encrypted = false;
     std::string _target;
     std::string _buildId;

@@ -44,11 +44,11 @@ public:
     /// A record of every code, filled with one byte: lists have entries then.
     void showEveryCode() {
         const DictionaryRef command = _generator->getStartCommand();
-        for (const std::uint8_t fill : {0x01, 0x02, 0x41}) {
+        for (const int fill : {0x01, 0x02, 0x41}) {
             const ArrayRef codes = (*command)[kPLSetOskraLogCodes].array();
             for (const Value& code : *codes) {
                 Bytes bytes = Record(static_cast<LogCode>(code.number()->integer()), 2000).bytes();
-                std::fill(bytes.begin() + 13, bytes.end(), fill);
+                std::fill(bytes.begin() + 13, bytes.end(), static_cast<std::uint8_t>(fill));
                 show(bytes);
             }
         }
@@ -56,8 +56,8 @@ public:
 
     /// A capture, looked at as the application does, every few records; and every value that a record wrote bears it.
     void showCapture() {
-        auto capture = CaptureReader::open(std::string(KELVO_RESOURCE_DIR) + "/" +
-                                           std::string(namesOf(_technology).word) + ".pcap");
+        auto capture =
+            CaptureReader::open(std::string(KELVO_CAPTURES) + "/" + std::string(namesOf(_technology).word) + ".pcap");
         ASSERT_TRUE(capture) << capture.error().reason;
         for (int count = 1;; ++count) {
             const auto packet = capture->next();
@@ -133,31 +133,27 @@ void showPhoneServices(Screens& screens) {
     screens.show(test::payload(0xFF0002, Array::make({context})).bytes());
 }
 
-/// Trees as the simulated cell monitor sends them, in the states that its capture need not reach.
+/// Trees as the simulated cell monitor sends them, in the states that its capture need not reach. Arrays lose their
+/// first element, dictionaries of one entry give way to it.
 void showCellMonitor(Screens& screens) {
-    const Value gsm = Dictionary::make({{"Technology", "GSM"},
-                                        {"BandInfo", "GSM 900"},
-                                        {"ARFCN", "1"},
-                                        {"BSIC", "1"},
-                                        {"RSSI", "-70 dBm"},
-                                        {"C1", "20"}});
-    const auto dictionary = [](std::string_view key, Value value) {
-        return Dictionary::make({{key, std::move(value)}});
+    const auto tree = [](std::string_view part, Value content) {
+        return Dictionary::make({{part, std::move(content)}, {"Neighbours", Dictionary::make()}});
     };
-    screens.show(*writeXmlPropertyList(Dictionary::make(
-        {{"Serving", dictionary("Cell", gsm)},
-         {"Neighbours", Dictionary::make({{"GSM", Array::make({"dropped", dictionary("ARFCN", "7"), gsm})}})},
-         {"Registration", dictionary("State", "Searching")},
-         {"Connection", dictionary("State", "Idle")}})));
-    screens.show(*writeXmlPropertyList(Dictionary::make(
-        {{"Connection", Dictionary::make({{"State", "Packet transfer"}, {"Throughput", "100 kbit/s"}})},
-         {"Registration", Dictionary::make({{"State", "Registered"}, {"MCC", "001"}})}})));
+    const auto alone = [](std::string_view key, Value value) { return Dictionary::make({{key, std::move(value)}}); };
+    screens.show(*writeXmlPropertyList(
+        tree("Serving", alone("Cell", Dictionary::make({{"Technology", "GSM"}, {"ARFCN", "1"}, {"C1", "20"}})))));
+    screens.show(*writeXmlPropertyList(
+        Dictionary::make({{"Neighbours", Dictionary::make({{"GSM", Array::make({"dropped", alone("ARFCN", "7")})},
+                                                           {"UMTS", Array::make({"dropped"})}})},
+                          {"Registration", alone("State", "Searching")},
+                          {"Connection", alone("State", "Idle")}})));
+    screens.show(*writeXmlPropertyList(
+        tree("Connection", Dictionary::make({{"State", "Packet transfer"}, {"Throughput", "100 kbit/s"}}))));
 }
 
 class Glossary : public testing::TestWithParam<Technology> {
 protected:
-    Screens shown() {
-        Screens screens(GetParam());
+    void SetUp() override {
         if (GetParam() == Technology::IFX) {
             showCellMonitor(screens);
         } else {
@@ -166,7 +162,6 @@ protected:
             screens.showEveryCode();
         }
         screens.showCapture();
-        return screens;
     }
 
     static std::string placeOf(const Meaning& meaning) {
@@ -175,6 +170,7 @@ protected:
 
     DirectoryResources resources{KELVO_RESOURCE_DIR};
     Environment::Scope environment{{.resources = &resources}};
+    Screens screens{GetParam()};
 };
 
 INSTANTIATE_TEST_SUITE_P(Families, Glossary,
@@ -184,7 +180,6 @@ INSTANTIATE_TEST_SUITE_P(Families, Glossary,
 
 TEST_P(Glossary, TellsWhatEveryShownValueMeansAndNothingElse) {
     std::set<std::string> used;
-    const Screens screens = shown();
     for (const std::string& path : screens.paths()) {
         const Meaning* meaning = meaningAt(GetParam(), path);
         EXPECT_NE(meaning, nullptr) << path << " is missing";
@@ -196,7 +191,7 @@ TEST_P(Glossary, TellsWhatEveryShownValueMeansAndNothingElse) {
 }
 
 TEST_P(Glossary, EveryValueThatARecordHasWrittenBearsItsNumber) {
-    EXPECT_EQ(shown().unmarked(), std::set<std::string>());
+    EXPECT_EQ(screens.unmarked(), std::set<std::string>());
 }
 
 TEST_P(Glossary, IsWrittenInWholeSentences) {

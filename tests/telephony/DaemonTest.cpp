@@ -1,91 +1,28 @@
-#include <gtest/gtest.h>
 #include <signal.h>
 
-#include <QProcess>
-#include <QProcessEnvironment>
 #include <algorithm>
 
-#include "platform/encodings/PropertyList.h"
-#include "platform/host/HostMessagePorts.h"
-#include "platform/host/HostTelephonyClient.h"
 #include "tests/support/CaptureFile.h"
-#include "tests/support/EventLoop.h"
-#include "tests/support/TemporaryDirectory.h"
+#include "tests/telephony/DaemonFixture.h"
 
 using namespace kelvo;
 using namespace std::chrono_literals;
 using test::runUntil;
+using Client = test::DaemonClient;
 
 namespace {
 
-// A client that has a log channel, and reads what comes.
-struct Client {
-    Client(HostMessagePorts& ports, PLServerConnection& connection) {
-        local = ports
-                    .createLocal("client",
-                                 [this](std::int32_t, ByteView data) {
-                                     records.emplace_back(textOf(data));
-                                     return Bytes{};
-                                 })
-                    .port;
-        local->schedule();
-        remote = ports.openRemote(PLServerConnectionNetworkMonitorCreateLogChannel(connection, "client").portName);
-    }
-    void stream() const {
-        const auto start = writeXmlPropertyList(Dictionary::make({{"SetState", "Streaming"}}));
-        ASSERT_TRUE(remote->request(0, *start, 1s, std::nullopt));
-    }
-
-    std::vector<std::string> records;
-    std::unique_ptr<LocalPort> local;
-    std::unique_ptr<RemotePort> remote;
-};
-
-class DaemonTest : public testing::Test {
+class DaemonTest : public test::DaemonFixture {
 protected:
     void SetUp() override {
         CaptureWriter writer = test::captureAt(_capture, Technology::IFX);
         for (int i = 0; i < 3; ++i)
             ASSERT_TRUE(writer.append(CaptureTime(std::chrono::hours(i)), bytesOf("tree " + std::to_string(i))));
     }
-    static void prepare(QProcess& process, const std::filesystem::path& runtime) {
-        QProcessEnvironment environment = QProcessEnvironment::systemEnvironment();
-        environment.insert("XDG_RUNTIME_DIR", QString::fromStdString(runtime));
-        process.setProcessEnvironment(environment);
-        process.setProgram(KELVO_TELEPHONYD);
-    }
+    using DaemonFixture::startDaemon;
     void startDaemon() { startDaemon({"--replay", QString::fromStdString(_capture), "--speed", "max"}); }
-    void startDaemon(const QStringList& arguments) {
-        prepare(_daemon, _temporary.path());
-        _daemon.setArguments(arguments);
-        _daemon.start();
-        ASSERT_TRUE(runUntil([&] { return (_connection = _client.createServerConnection({})) != nullptr; }));
-    }
-    void stopDaemon() {
-        _daemon.terminate();
-        ASSERT_TRUE(_daemon.waitForFinished(10'000));
-        EXPECT_EQ(_daemon.exitStatus(), QProcess::NormalExit);
-        EXPECT_EQ(_daemon.exitCode(), 0);
-    }
-    // Exit status and what stood on standard error.
-    std::pair<int, std::string> run(const QStringList& arguments) {
-        QProcess process;
-        prepare(process, _temporary.path());
-        process.setArguments(arguments);
-        process.start();
-        if (!process.waitForFinished(10'000)) return {-1, "still running"};
-        _output = process.readAllStandardOutput().toStdString();
-        return {process.exitCode(), process.readAllStandardError().toStdString()};
-    }
 
-    test::TemporaryDirectory _temporary;
     std::filesystem::path _capture = _temporary.path() / "ifx.pcap";
-    std::filesystem::path _directory = _temporary.path() / "kelvo/ports";
-    HostMessagePorts _ports{_directory};
-    HostTelephonyClient _client{_ports};
-    std::unique_ptr<PLServerConnection> _connection;
-    QProcess _daemon;
-    std::string _output;
 };
 
 }  // namespace
@@ -229,6 +166,85 @@ TEST_F(DaemonTest, SaysInOneLineWhatIsWrongWithItsCommandLine) {
     }
 }
 
+TEST_F(DaemonTest, SaysPlainlyWhatIsWrongAboutAPort) {
+    const auto notHere = [](const std::string& host) {
+        return "--port: " + host +
+               " is not this machine; whoever is in between could make the screens up (--allow-remote permits it)";
+    };
+    const std::pair<QStringList, std::string> wrong[] = {
+        {{"--port"}, "--port: 1 required auto|PATH|tcp:HOST:PORT|unix:PATH missing"},
+        {{"--port", ""}, "--port: there is no port without a name"},
+        {{"--port", "unix:"}, "--port: unix: lacks its path"},
+        {{"--port", "tcp:"}, "--port: tcp: is not tcp:HOST:PORT"},
+        {{"--port", "tcp:localhost"}, "--port: tcp:localhost is not tcp:HOST:PORT"},
+        {{"--port", "tcp:localhost:0"}, "--port: tcp:localhost:0 is not tcp:HOST:PORT"},
+        {{"--port", "tcp:localhost:65536"}, "--port: tcp:localhost:65536 is not tcp:HOST:PORT"},
+        {{"--port", "tcp:192.0.2.1:5"}, notHere("192.0.2.1")},
+        {{"--port", "tcp:phone.example:5"}, notHere("phone.example")},
+        {{"--port", "x", "--technology", "ifx"}, "--technology: ifx is not to be had at a port"},
+        {{"--port", "x", "--technology", "nmt"}, "--technology: nmt is none of gsm, cdma, lte, utran, auto"},
+        {{"--port", "x", "--subscription", "0"}, "--subscription: 0 is no number from 1 to 255"},
+        {{"--port", "x", "--subscription", "256"}, "--subscription: 256 is no number from 1 to 255"},
+        {{"--port", "x", "--subscription", "-1"}, "--subscription: -1 is no number from 1 to 255"},
+        {{"--port", "x", "--subscription", "one"}, "--subscription: one is no number from 1 to 255"},
+        {{"--port", "x", "--record", "f", "--record-frames", "f"}, "--record: its file is that of --record-frames"},
+        {{"--port", "x", "--record-frames", "/nowhere/f"}, "/nowhere/f cannot be written: No such file or directory"},
+        {{"--port", "x", "--speed", "2"}, "--speed excludes --port"},
+        {{"--port", "x", "--loop"}, "--loop requires --replay"},
+        {{"--port", "x", "--seed", "1"}, "--seed requires --simulate"},
+        {{"--port", "x", "--json"}, "--json requires --status"},
+        {{"--port", "x", "--force"}, "--force requires --record or --record-frames"},
+        {{"--port", "x", "--simulate", "lte"}, "--simulate excludes --port"},
+        {{"--port", "x", "--replay", "y"}, "--replay excludes --port"},
+        {{"--port", "x", "--status"}, "--status excludes --port"},
+        {{"--simulate", "lte", "--technology", "lte"}, "--technology requires --port"},
+        {{"--simulate", "lte", "--subscription", "1"}, "--subscription requires --port"},
+        {{"--simulate", "lte", "--record-frames", "f"}, "--record-frames requires --port"},
+        {{"--simulate", "lte", "--allow-remote"}, "--allow-remote requires --port"},
+        {{"--simulate", "lte", "--no-dtr-rts"}, "--no-dtr-rts requires --port"},
+        {{"--status", "--json"}, "no telephony service is running"},
+    };
+    for (const auto& [arguments, reason] : wrong) {
+        const auto [status, error] = run(arguments);
+        EXPECT_EQ(status, 1);
+        EXPECT_EQ(error, "kelvo-telephonyd: " + reason + "\n");
+        EXPECT_EQ(_output, "");
+    }
+}
+
+TEST_F(DaemonTest, TakesEveryOptionOfAPortAndWaitsForOneThatIsNotThere) {
+    const QString port = QString::fromStdString(_temporary.file("modem"));
+    const std::string recorded = _temporary.file("recorded.pcap");
+    const std::string frames = _temporary.write("recorded.frames", bytesOf("earlier"));
+    startDaemon({"--port", port, "--technology", "lte", "--subscription", "2", "--allow-remote", "--no-dtr-rts",
+                 "--record", QString::fromStdString(recorded), "--record-frames", QString::fromStdString(frames),
+                 "--force"});
+    Client client(_ports, *_connection);
+    ASSERT_TRUE(client.remote);
+    client.stream({0xB0C2});
+    ASSERT_TRUE(runUntil([&] {
+        run({"--status"});
+        return _output.find("State       it cannot be opened: No such file or directory\n") != std::string::npos;
+    })) << _output;
+    EXPECT_EQ(_output.rfind("Source      the modem at " + port.toStdString() + "\n", 0), 0U);
+    EXPECT_NE(_output.find("\n  State                     closed\n"), std::string::npos) << _output;
+    EXPECT_NE(_output.find("\n  SIM                       2\n"), std::string::npos) << _output;
+    EXPECT_EQ(run({"--status", "--json"}), (std::pair<int, std::string>(0, "")));
+    for (const char* part : {R"("Source": "the modem at )", R"("Technology": "LTE")", R"("Subscription": 2)",
+                             R"("BadChecksums": 0)", R"("State": "closed")"})
+        EXPECT_NE(_output.find(part), std::string::npos) << part << " in " << _output;
+    stopDaemon();
+    EXPECT_FALSE(std::filesystem::exists(recorded));  // there was nothing to record
+    EXPECT_EQ(test::contentsOf(frames), "earlier");
+}
+
+TEST_F(DaemonTest, SaysThatATechnologyIsNotKnownWhileNobodyHasListened) {
+    startDaemon({"--port", "auto"});
+    run({"--status"});
+    EXPECT_EQ(_output.rfind("Source      the modem that is plugged in\nTechnology  not known yet\n", 0), 0U) << _output;
+    stopDaemon();
+}
+
 TEST_F(DaemonTest, SaysPlainlyWhatIsWrongWithASeed) {
     const std::pair<const char*, const char*> wrong[] = {
         {"-1", "-1 is not a whole number from 0"},
@@ -262,6 +278,7 @@ TEST_F(DaemonTest, HelpsOnStandardOutput) {
     EXPECT_EQ(status, 0);
     EXPECT_EQ(error, "");
     for (const char* word : {"--replay", "--loop", "--speed", "--simulate", "--seed", "--generation", "--record",
-                             "--force", "--status", "--version"})
+                             "--force", "--status", "--version", "--port", "--technology", "--subscription",
+                             "--record-frames", "--allow-remote", "--no-dtr-rts", "--json"})
         EXPECT_NE(_output.find(word), std::string::npos);
 }

@@ -1,123 +1,12 @@
-#include "telephony/ModemSource.h"
-
-#include <gtest/gtest.h>
-
-#include "tests/support/ManualClock.h"
-#include "tests/support/ManualQueue.h"
-#include "tests/support/RecordingLog.h"
 #include "tests/support/TemporaryDirectory.h"
-#include "tests/telephony/wire/SessionFixture.h"
+#include "tests/telephony/ModemSourceFixture.h"
 
 namespace kelvo {
-namespace {
 
 using namespace std::chrono_literals;
 using test::joined;
+using test::ModemSourceTest;
 using test::plainBody;
-using test::plainFrame;
-
-/// What a test has of the line that is open.
-struct FakeLine final : ModemLine {
-    FakeLine(Listener& itsListener, std::shared_ptr<int> alive) : listener(itsListener), count(std::move(alive)) {
-        ++*count;
-    }
-    ~FakeLine() override { --*count; }
-    std::string name() const override { return "line"; }
-    void open() override { opened = true; }
-    void send(ByteView frame) override { sent.emplace_back(frame.begin(), frame.end()); }
-    void mute() override { muted = true; }
-
-    Listener& listener;
-    std::shared_ptr<int> count;  // a line may outlive its lines
-    std::vector<Bytes> sent;
-    bool opened = false;
-    bool muted = false;
-};
-
-/// Lines that the test answers for.
-struct FakeLines final : ModemLines {
-    std::string description() const override { return "the modem at line"; }
-    Result<std::unique_ptr<ModemLine>> next(ModemLine::Listener& listener, bool again) override {
-        ++tries;
-        lastAgain = again;
-        if (!isThere) return Failure{"No such file or directory"};
-        auto made = std::make_unique<FakeLine>(listener, alive);
-        line = made.get();
-        return std::unique_ptr<ModemLine>(std::move(made));
-    }
-    void watch(std::function<void()> changed) override { watching = std::move(changed); }
-
-    bool isThere = true;
-    bool lastAgain = false;
-    int tries = 0;
-    std::shared_ptr<int> alive = std::make_shared<int>(0);
-    FakeLine* line = nullptr;
-    std::function<void()> watching;
-};
-
-class ModemSourceTest : public testing::Test, public RecordSink {
-protected:
-    ModemSourceTest() { make({.technology = Technology::LTE, .subscription = {}}); }
-    void make(wire::Session::Options options) {
-        auto owned = std::make_unique<FakeLines>();
-        lines = owned.get();
-        source =
-            std::make_unique<ModemSource>(std::move(owned), options, queue, [this] { return queue.now() + 1000s; });
-        source->start(*this);
-    }
-    bool take(ByteView record) override {
-        taken.emplace_back(record.begin(), record.end());
-        return true;
-    }
-    bool isHungry() const override { return true; }
-
-    void stream(std::initializer_list<std::size_t> codes) {
-        ClientsWishes wishes{.streaming = true, .ordinary = {}};
-        for (const std::size_t code : codes) wishes.ordinary.set(code);
-        source->clientsWant(wishes);
-    }
-    void leave() { source->clientsWant({}); }
-    void say(const Bytes& body) {
-        Bytes frame = plainFrame(body);
-        lines->line->listener.lineGave(frame);
-    }
-    // Answers everything that a modem is asked until it is asked for nothing more.
-    void answer() {
-        lines->line->listener.lineOpened();
-        queue.advance(200ms);
-        answerRequests();
-    }
-    void answerRequests() {
-        while (!lines->line->sent.empty()) answerOne();
-    }
-    void answerOne() {
-        FakeLine& line = *lines->line;
-        const Bytes asked = plainBody(line.sent.back());
-        line.sent.clear();
-        if (asked[0] == 0x00) say(test::kVersionAnswer);
-        if (asked[0] == 0x7C) say(test::kBuildIdAnswer);
-        if (asked[0] == 0x73 && asked[4] == 1) say(test::rangesAnswer());
-        if (asked[0] == 0x73 && asked[4] == 3) say(maskAnswer(asked));
-    }
-    static Bytes maskAnswer(const Bytes& asked) {
-        return joined({Bytes(asked.begin(), asked.begin() + 8), Bytes(4), Bytes(asked.begin() + 8, asked.end())});
-    }
-    std::vector<std::string> texts() const {
-        std::vector<std::string> all;
-        for (const auto& line : log.lines()) all.push_back(line.second);
-        return all;
-    }
-
-    test::ManualQueue queue;
-    test::RecordingLog log;
-    test::ManualClock clock{1'700'000'000};
-    Environment::Scope scope{Environment{.log = &log, .clock = &clock}};
-    FakeLines* lines = nullptr;
-    std::unique_ptr<ModemSource> source;
-    std::vector<Bytes> taken;
-};
-
-}  // namespace
 
 TEST_F(ModemSourceTest, OpensThePortForTheFirstClientOnly) {
     queue.advance(100s);
@@ -132,6 +21,22 @@ TEST_F(ModemSourceTest, OpensThePortForTheFirstClientOnly) {
     EXPECT_EQ(lines->tries, 1);
     say(test::recordOf(0x51F4, 7));
     EXPECT_EQ(taken, std::vector<Bytes>{test::packetOf(0x51F4, 7)});
+}
+
+TEST_F(ModemSourceTest, LetsRecordsGatherAtThePortWhileNobodyWaitsForAnAnswer) {
+    stream({0x51F4});
+    lines->line->listener.lineOpened();
+    EXPECT_FALSE(lines->line->gathers);
+    queue.advance(200ms);
+    EXPECT_FALSE(lines->line->gathers);
+    answerRequests();
+    EXPECT_TRUE(lines->line->gathers);
+    stream({0x51F4, 0x51FF});  // a mask is asked for
+    EXPECT_FALSE(lines->line->gathers);
+    answerRequests();
+    EXPECT_TRUE(lines->line->gathers);
+    source->end([] {});
+    EXPECT_FALSE(lines->line->gathers);
 }
 
 TEST_F(ModemSourceTest, ReleasesThePortSixSecondsAfterTheLastClientHasLeft) {
@@ -223,6 +128,19 @@ TEST_F(ModemSourceTest, GoesOnByItselfWhenAModemThatHasGoneIsBack) {
     EXPECT_EQ(texts().back(), "line: the modem is back");
 }
 
+TEST_F(ModemSourceTest, TellsAModemThatHasGoneOnceAndWhatIsNewAboutIt) {
+    stream({0x51F4});
+    answer();
+    lines->line->listener.lineClosed("it hung up");
+    queue.advance(100ms);
+    lines->line->listener.lineClosed("nobody is there");
+    queue.advance(200ms);
+    EXPECT_EQ(source->state(), "the modem has gone: it hung up");
+    EXPECT_EQ(texts(), std::vector<std::string>{"the modem at line: the modem has gone: it hung up; trying again"});
+    lines->line->listener.lineClosed("Permission denied");
+    EXPECT_EQ(source->state(), "it cannot be opened: Permission denied");
+}
+
 TEST_F(ModemSourceTest, LeaksNothingWhenItIsUnpluggedAHundredTimes) {
     stream({0x51F4});
     for (int i = 0; i < 100; ++i) {
@@ -287,6 +205,7 @@ TEST_F(ModemSourceTest, FindsTheTechnologyOutBeforeAnybodyStreams) {
     say(test::recordOf(0x5134));
     queue.advance(500ms);
     EXPECT_EQ(source->technology(), Technology::GSM);
+    EXPECT_EQ((*source->portStatus())["CampedOn"], Value("GSM"));
     EXPECT_TRUE(taken.empty() || taken.size() == 1);
     queue.advance(10s);  // nobody came
     EXPECT_EQ(*lines->alive, 0);
@@ -415,7 +334,7 @@ TEST_F(ModemSourceTest, TellsItsPortsStatus) {
     EXPECT_EQ((*port)["State"], Value("running"));
     EXPECT_EQ((*port)["Target"], Value("TARGET9"));
     EXPECT_EQ((*port)["BuildId"], Value("B-7"));
-    EXPECT_EQ((*port)["CampedOn"], Value("LTE"));
+    EXPECT_EQ((*port)["CampedOn"], Value());  // the command line said so: nobody listens
     EXPECT_EQ((*port)["Losing"], Value(true));
     EXPECT_EQ((*port)["Records"], Value(1));
     EXPECT_EQ((*port)["Delivered"], Value(1));

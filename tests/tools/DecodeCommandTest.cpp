@@ -56,6 +56,31 @@ TEST_F(DecodeCommand, JsonHasThreeKeysAndTheLogOnlyWhenAsked) {
     EXPECT_EQ(std::count(logged["log"].begin(), logged["log"].end(), wanted), 2);
 }
 
+TEST_F(DecodeCommand, TellsTheRecordBehindEachValueWhenAsked) {
+    // 179 / 4 - 140 is -95.25; records a second apart, without a time of their own.
+    const Bytes measured = test::Record(0xB17F, 33).u32(21, 179).u32(29, 32 << 13).bytes();
+    const std::string file = capture(Technology::LTE, {servingCell(301), measured, servingCell(302), servingCell(303)});
+    const auto display = json({"decode", "--json", "--provenance", file})["display"];
+    EXPECT_EQ(display["Serving Cell Measurements"]["Measured RSRP"].dump(),
+              R"({"text":"-95.25 dBm","number":-95.25,"unit":"dBm","code":"0xb17f","record":2,"age":2.0})");
+    EXPECT_EQ(display["Serving Cell Measurements"]["S Intra Search"].dump(),
+              R"({"text":"Not Present","code":"0xb17f","record":2,"age":2.0})");
+    EXPECT_EQ(display["Serving Cell Info"]["Physical Cell ID"].dump(),
+              R"({"text":"303","number":303,"code":"0xb0c2","record":4,"age":0.0})");
+    EXPECT_EQ(display["Serving Cell Info"]["Num Tx Antennas"].dump(), R"({"text":"–"})");
+    EXPECT_EQ(display["Measured Neighbor Cells"].dump(), "[]");
+}
+
+TEST_F(DecodeCommand, LeavesTheMarksOfAnOrderAloneAndWantsJsonForProvenance) {
+    const std::string file = capture(Technology::CDMA, {test::Record(0x1183, 50).bytes()});
+    const auto display = json({"decode", "--json", "--provenance", file})["display"];
+    EXPECT_EQ(display["_sorted"], "_sorted");
+    EXPECT_EQ(display["2;EV-DO"]["08;Rx1 AGC"]["record"], 1);
+    const Finished done = kelvoctl({"decode", "--provenance", file});
+    EXPECT_EQ(done.status, 1);
+    EXPECT_NE(done.errors.find("--json"), std::string::npos) << done.errors;
+}
+
 TEST_F(DecodeCommand, TextHasTheLogBeforeTheTree) {
     const Finished done = kelvoctl({"decode", "--log", capture(Technology::LTE, {servingCell(301)})});
     const std::size_t line = done.output.find("[4] LTE Serving Cell Info\n");

@@ -90,9 +90,9 @@ TEST_F(View, WritesOnlyTheRowsThatChanged) {
 
 TEST_F(View, AnnouncesWhatItCutsOff) {
     written();
-    terminal->draw({"ääääääääääääääääääääXY"}, 1);
+    terminal->draw({Terminal::Row{"ääääääääääääääääääääXY"}});
     EXPECT_EQ(written(), "\x1b[1;1H\x1b[Käääääääääääääääääää…");
-    terminal->draw({"äääääääääääääääääääZ"}, 1);
+    terminal->draw({Terminal::Row{"äääääääääääääääääääZ"}});
     EXPECT_EQ(written(), "\x1b[1;1H\x1b[KäääääääääääääääääääZ");
 }
 
@@ -128,16 +128,37 @@ TEST_F(View, ScrollsAsideToWhatDoesNotFit) {
     EXPECT_EQ(written(), "\x1b[1;1H\x1b[KAddress  2001:db8:0…\x1b[2;1H\x1b[K  Cell  00000102");
 }
 
-TEST_F(View, KeepsPlaceAndKeysInSightFrom37ColumnsOn) {
-    const winsize size{5, 37, 0, 0};
+TEST_F(View, DrawsWhatIsOldFaintAndAKeyShowsTheRecords) {
+    const winsize size{5, 40, 0, 0};
+    ioctl(_program.get(), TIOCSWINSZ, &size);
+    TerminalWatchView view(*terminal);
+    view.setNotes({{}, {"0xb17f #4711, 3 s", false}, {"0xb0c2 #12, 40 s", true}});
+    view.showDisplay({"Cell", "  Srxlev  12", "  PCI  7"}, {"s", ""});
+    EXPECT_NE(written().find("\x1b[1;1H\x1b[KCell\x1b[2;1H\x1b[K  Srxlev  12\x1b[3;1H\x1b[K\x1b[2m  PCI  7\x1b[0m"),
+              std::string::npos);
+    view.press(TerminalKey::Provenance);
+    EXPECT_EQ(written(),
+              "\x1b[2;1H\x1b[K  Srxlev  12  0xb17f #4711, 3 s"
+              "\x1b[3;1H\x1b[K\x1b[2m  PCI  7      0xb0c2 #12, 40 s\x1b[0m");
+    view.setNotes({{}, {"0xb17f #4711, 30 s", true}, {"0xb0c2 #13, 0 s", false}});
+    view.showStatus({"s", ""});
+    EXPECT_EQ(written(),
+              "\x1b[2;1H\x1b[K\x1b[2m  Srxlev  12  0xb17f #4711, 30 s\x1b[0m"
+              "\x1b[3;1H\x1b[K  PCI  7      0xb0c2 #13, 0 s");
+    view.press(TerminalKey::Provenance);
+    EXPECT_EQ(written(), "\x1b[2;1H\x1b[K\x1b[2m  Srxlev  12\x1b[0m\x1b[3;1H\x1b[K  PCI  7");
+}
+
+TEST_F(View, KeepsPlaceAndKeysInSightFrom34ColumnsOn) {
+    const winsize size{5, 34, 0, 0};
     ioctl(_program.get(), TIOCSWINSZ, &size);
     TerminalWatchView view(*terminal);
     view.showDisplay(std::vector<std::string>(1450, "a"), {"Updated 2026-11-22 at 06:00:00", ""});
-    EXPECT_NE(written().find("\x1b[4;1H\x1b[K\x1b[7m Updated 2026-11-22 at 06:00:00      \x1b[0m"
-                             "\x1b[5;1H\x1b[K\x1b[7m 1-3 of 1450       p records, q quits\x1b[0m"),
+    EXPECT_NE(written().find("\x1b[4;1H\x1b[K\x1b[7m Updated 2026-11-22 at 06:00:00   \x1b[0m"
+                             "\x1b[5;1H\x1b[K\x1b[7m 1-3 of 1450       p ages, q quits\x1b[0m"),
               std::string::npos);
     view.press(TerminalKey::End);
-    EXPECT_NE(written().find("\x1b[7m 1448-1450 of 1450 p records, q quits\x1b[0m"), std::string::npos);
+    EXPECT_NE(written().find("\x1b[7m 1448-1450 of 1450 p ages, q quits\x1b[0m"), std::string::npos);
 }
 
 TEST_F(View, DropsTheKeysBeforeThePlaceInFewerColumns) {

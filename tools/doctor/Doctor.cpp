@@ -37,6 +37,7 @@ Findings examine(const DoctorInputs& inputs, const std::optional<std::string>& p
     Findings findings;
     findings.user = inputs.user;
     findings.modemManagerRuns = inputs.modemManagerRuns();
+    if (findings.modemManagerRuns) findings.phone = inputs.phone();
     const bool named = place && *place != "auto";
     if (named && isNetworkPlace(*place)) {
         findings.ports.push_back(look(inputs, {.path = *place, .usb = {}, .driver = {}}, probe));

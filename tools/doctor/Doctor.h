@@ -14,6 +14,7 @@ struct DoctorInputs {
     std::function<PortAccess(const std::string& path)> access;
     std::function<PortHolders(const std::string& path)> holders;
     std::function<bool()> modemManagerRuns;
+    std::function<PhoneFindings()> phone;  ///< asked only when ModemManager runs
     std::function<ModemProbe(const std::string& place)> probe;
     std::string user;
 };

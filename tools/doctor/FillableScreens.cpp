@@ -30,12 +30,15 @@ constexpr CdmaRecord kCdmaRecords[] = {
 };
 // clang-format on
 
-void sortIn(std::string screen, std::span<const LogCode> codes, const Has& has, FillableScreens& screens) {
+enum class Counting { Modem, Everything };
+
+void sortIn(std::string screen, std::span<const LogCode> codes, const Has& has, Counting counting,
+            FillableScreens& screens) {
     if (codes.empty()) return;  // a screen that no record fills
     std::size_t modems = 0;
     std::size_t had = 0;
     for (const LogCode code : codes) {
-        if (code >= kExtendedLogCodes) continue;
+        if (counting == Counting::Modem && code >= kExtendedLogCodes) continue;
         ++modems;
         if (has(code)) ++had;
     }
@@ -46,25 +49,31 @@ void sortIn(std::string screen, std::span<const LogCode> codes, const Has& has, 
     list.push_back(std::move(screen));
 }
 
-FillableScreens of(Technology technology, const ClassIndex& index, const Has& has) {
+FillableScreens of(Technology technology, const ClassIndex& index, const Has& has, Counting counting) {
     FillableScreens screens{technology, {}, {}, {}, {}};
     for (const std::string_view name : index.getAllNames())
-        sortIn(std::string(name), index.getClass(name)->getLogCodeArray(), has, screens);
+        sortIn(std::string(name), index.getClass(name)->getLogCodeArray(), has, counting, screens);
     return screens;
 }
 
 FillableScreens ofCdma(const Has& has) {
     FillableScreens screens{Technology::CDMA, {}, {}, {}, {}};
-    for (const CdmaRecord& record : kCdmaRecords) sortIn(record.shows, {&record.code, 1}, has, screens);
+    for (const CdmaRecord& record : kCdmaRecords)
+        sortIn(record.shows, {&record.code, 1}, has, Counting::Modem, screens);
     return screens;
+}
+
+std::vector<FillableScreens> ofAll(const Has& has, Counting counting) {
+    return {of(Technology::GSM, OSK_GSMClassIndex(), has, counting), ofCdma(has),
+            of(Technology::LTE, LTEClassIndex(), has, counting),
+            of(Technology::UTRAN, UTRANClassIndex(), has, counting)};
 }
 
 }  // namespace
 
-std::vector<FillableScreens> fillableScreens(const Has& has) {
-    return {of(Technology::GSM, OSK_GSMClassIndex(), has), ofCdma(has), of(Technology::LTE, LTEClassIndex(), has),
-            of(Technology::UTRAN, UTRANClassIndex(), has)};
-}
+std::vector<FillableScreens> fillableScreens(const Has& has) { return ofAll(has, Counting::Modem); }
+
+std::vector<FillableScreens> screensWithServices(const Has& has) { return ofAll(has, Counting::Everything); }
 
 std::vector<FillableScreens> fillableScreens(const wire::Ranges& ranges) {
     return fillableScreens([&](LogCode code) { return (code & 0xFFF) < ranges[code >> 12]; });

@@ -21,6 +21,8 @@ struct FillableScreens {
 
 /// The families whose records come by a diagnostic port, by which codes there are.
 std::vector<FillableScreens> fillableScreens(const std::function<bool(LogCode)>& has);
+/// The same, those of the phone's own services among the codes.
+std::vector<FillableScreens> screensWithServices(const std::function<bool(LogCode)>& has);
 /// The same by what a modem can send.
 std::vector<FillableScreens> fillableScreens(const wire::Ranges& ranges);
 

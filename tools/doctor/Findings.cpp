@@ -162,13 +162,17 @@ std::string findingsText(const Findings& findings) {
     std::string text;
     for (const PortFindings& port : findings.ports) text += portText(findings, port);
     if (findings.ports.empty()) text = "There is no serial port that a modem may be behind.\n\n";
+    if (findings.phone) text += phoneFindingsText(*findings.phone);
     return text + "Next: " + printable(nextStep(findings)) + "\n";
 }
 
 Json findingsJson(const Findings& findings) {
     Json ports = Json::array();
     for (const PortFindings& port : findings.ports) ports.push_back(portJson(port));
-    return {{"ports", std::move(ports)}, {"modemManagerRuns", findings.modemManagerRuns}, {"next", nextStep(findings)}};
+    Json json{{"ports", std::move(ports)}, {"modemManagerRuns", findings.modemManagerRuns}};
+    if (findings.phone) json["modemManager"] = phoneFindingsJson(*findings.phone);
+    json["next"] = nextStep(findings);
+    return json;
 }
 
 }  // namespace kelvo

@@ -7,6 +7,7 @@
 
 #include "telephony/wire/CandidateNode.h"
 #include "tools/doctor/ModemProbe.h"
+#include "tools/doctor/PhoneFindings.h"
 #include "tools/doctor/PortAccess.h"
 #include "tools/doctor/PortHolders.h"
 
@@ -25,6 +26,7 @@ struct PortFindings {
 struct Findings {
     std::vector<PortFindings> ports;  ///< the likeliest first
     bool modemManagerRuns = false;
+    std::optional<PhoneFindings> phone;  ///< none: ModemManager does not run
     std::string user;
 };
 

@@ -63,6 +63,8 @@ const PortFindings& chosen(const Findings& findings) {
 }  // namespace
 
 std::string nextStep(const Findings& findings) {
+    if (findings.ports.empty() && findings.phone && !findings.phone->modems.empty())
+        return fmt::format("run \"{} --modemmanager\", and then kelvo", kService);
     if (findings.ports.empty())
         return "plug a modem in and run this again, or name its port: run \"kelvoctl doctor --port "
                "PATH|tcp:HOST:PORT|unix:PATH\"";
@@ -73,8 +75,7 @@ std::string nextStep(const Findings& findings) {
     if (!port.isNetwork && !port.access.exists) return fmt::format("plug the modem in: {} is not there", path);
     if (!port.isNetwork && !port.access.mayOpen) return letIn(findings, port);
     if (const auto* holder = holderOtherThanManager(port)) {
-        if (holder->name.starts_with("kelvo-telephony"))  // the system keeps 15 letters of it
-            return fmt::format("run kelvo: its telephony service has {} already", path);
+        if (holder->name == kService) return fmt::format("run kelvo: its telephony service has {} already", path);
         return fmt::format("end {} (process {}), which has {} open", holder->name, holder->process, path);
     }
     if (managerIsInTheWay(findings, port)) return installRule(port.node);

@@ -21,10 +21,14 @@ std::optional<int> processNumber(const fs::path& directory) {
     return number;
 }
 
+// The system keeps 15 letters of a name; what the program was started as has the rest.
 std::string programName(const fs::path& process) {
     std::string name;
     std::getline(std::ifstream(process / "comm"), name);
-    return name;
+    std::string command;
+    std::getline(std::ifstream(process / "cmdline"), command, '\0');
+    const std::string whole = fs::path(command).filename().string();
+    return whole.starts_with(name) ? whole : name;
 }
 
 bool hasOpen(const fs::path& process, const fs::path& port, std::error_code& error) {

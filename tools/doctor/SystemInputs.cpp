@@ -7,6 +7,7 @@
 #include <QDBusConnectionInterface>
 
 #include "telephony/wire/CandidateFinder.h"
+#include "tools/doctor/AskPhone.h"
 #include "tools/doctor/ProbePlace.h"
 
 namespace kelvo {
@@ -29,6 +30,7 @@ DoctorInputs systemInputs() {
             .access = [](const std::string& path) { return accessTo(path); },
             .holders = [](const std::string& path) { return holdersOf(path, "/proc"); },
             .modemManagerRuns = modemManagerRuns,
+            .phone = askPhone,
             .probe = probePlace,
             .user = userName()};
 }

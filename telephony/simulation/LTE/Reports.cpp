@@ -17,7 +17,7 @@ std::vector<MonitoredCell> monitoredCells(const Modem& modem) {
                                          .pid = serving.pci,
                                          .uarfcn = serving.carrier.downlink,
                                          .bandInfo = serving.carrier.band}};
-    const std::size_t count = std::min(modem.neighbors().size(), MonitoredCell::kNeighbors);
+    const std::size_t count = std::min(modem.neighbors().size(), kMonitoredNeighbors);
     for (std::size_t i = 0; i < count; ++i) {
         cells.push_back({.technology = MonitoredCell::Technology::LTE,
                          .pid = modem.neighbors()[i].pci,

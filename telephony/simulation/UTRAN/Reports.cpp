@@ -17,7 +17,7 @@ std::vector<MonitoredCell> monitoredCells(const Modem& modem) {
                                          .scn = serving.parameterId,
                                          .bandInfo = serving.band}};
     for (const Measurement& measured : modem.measurements()) {
-        if (cells.size() > MonitoredCell::kNeighbors) break;
+        if (cells.size() > kMonitoredNeighbors) break;
         const Cell& cell = modem.cells()[measured.cell];
         if (measured.cell == modem.servingIndex()) continue;
         cells.push_back({.technology = UTRAN2,

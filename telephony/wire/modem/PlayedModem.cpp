@@ -22,7 +22,8 @@ constexpr Time kSlowRanges = 5200ms;  // a reader asks again after five seconds
 constexpr std::size_t kMostWaiting = 4096;
 constexpr std::size_t kFloodWaiting = 300;  // more than the gauge can tell
 constexpr std::size_t kRecordsPerTurn = 4096;
-constexpr std::size_t kRequestKey = 12;  // command, operation, equipment
+constexpr std::size_t kFloodUnwanted = 64;  // a turn: each takes time to simulate, and the reader is to be heard
+constexpr std::size_t kRequestKey = 12;     // command, operation, equipment
 constexpr std::size_t kTimestampAt = 4;
 
 std::uint16_t codeOf(ByteView record) { return wire::u16At(record, 2); }
@@ -138,11 +139,14 @@ std::optional<std::size_t> PlayedModem::nextSim() const {
 void PlayedModem::gather(Time now) {
     if (!_began) return;
     const bool floods = _faults.has(Fault::Flood) && _answers.masks().wantAny() && now >= *_began;
-    for (std::size_t i = 0; i < kRecordsPerTurn; ++i) {
+    std::size_t unwanted = 0;
+    for (std::size_t i = 0; i < kRecordsPerTurn && (!floods || unwanted < kFloodUnwanted); ++i) {
         const auto sim = nextSim();
         if (!sim) return;
         if (floods ? _waiting.size() >= kFloodWaiting : *_began + _sims[*sim].next->at > now) return;
+        const std::size_t waiting = _waiting.size();
         take(*sim);
+        if (_waiting.size() == waiting) ++unwanted;
     }
 }
 

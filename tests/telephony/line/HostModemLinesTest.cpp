@@ -1,8 +1,6 @@
 #include "telephony/line/HostModemLines.h"
 
-#include <fcntl.h>
 #include <gtest/gtest.h>
-#include <stdlib.h>
 #include <termios.h>
 #include <unistd.h>
 
@@ -12,13 +10,14 @@
 #include <QTcpSocket>
 #include <fstream>
 
-#include "platform/host/UniqueFd.h"
 #include "tests/support/EventLoop.h"
+#include "tests/support/PseudoTerminal.h"
 #include "tests/support/TemporaryDirectory.h"
 
 namespace kelvo {
 namespace {
 
+using test::PseudoTerminal;
 using test::runUntil;
 
 struct Heard final : ModemLine::Listener {
@@ -35,23 +34,6 @@ Result<std::unique_ptr<ModemLine>> lineTo(const std::string& address, Heard& hea
     HostModemLines lines(*PortAddress::parse(address, false), {});
     return lines.next(heard, false);
 }
-
-/// The modem's end of a pseudo-terminal.
-struct PseudoTerminal {
-    PseudoTerminal() : modem(::posix_openpt(O_RDWR | O_NOCTTY | O_NONBLOCK)) {
-        EXPECT_EQ(::grantpt(modem.get()), 0);
-        EXPECT_EQ(::unlockpt(modem.get()), 0);
-        path = ::ptsname(modem.get());
-    }
-    Bytes read() const {
-        Bytes bytes(1000);
-        const ssize_t size = ::read(modem.get(), bytes.data(), bytes.size());
-        bytes.resize(static_cast<std::size_t>(std::max<ssize_t>(size, 0)));
-        return bytes;
-    }
-    UniqueFd modem;
-    std::string path;
-};
 
 const Bytes kFrame{0x00, 0x0D, 0x0A, 0x11, 0x13, 0x03, 0x04, 0x7F, 0xFF, 0x7E};  // what a terminal would interpret
 
@@ -77,6 +59,28 @@ TEST(SerialLine, CarriesEveryByteBothWays) {
     ASSERT_TRUE(runUntil([&] { return heard.given.size() >= kFrame.size(); }));
     EXPECT_EQ(heard.given, kFrame);
     EXPECT_TRUE(heard.closed.empty());
+}
+
+TEST(SerialLine, GivesAllThatGathersAndAtOnceWhatIsWaitedFor) {
+    PseudoTerminal terminal;
+    Heard heard;
+    auto line = lineTo(terminal.path, heard);
+    (*line)->open();
+    for (const bool gathers : {true, false, true}) {
+        (*line)->mayGather(gathers);
+        heard.given.clear();
+        Bytes sent;
+        for (int piece = 0; piece < 20; ++piece) {
+            ASSERT_TRUE(terminal.write(kFrame));
+            sent.insert(sent.end(), kFrame.begin(), kFrame.end());
+            test::settle();
+        }
+        ASSERT_TRUE(runUntil([&] { return heard.given.size() >= sent.size(); }));
+        EXPECT_EQ(heard.given, sent);
+    }
+    ASSERT_TRUE(terminal.write(kFrame));  // into a rest, and the modem goes
+    terminal.modem.reset();
+    ASSERT_TRUE(runUntil([&] { return !heard.closed.empty(); }));
 }
 
 TEST(SerialLine, TellsOnceThatTheModemHasGone) {
@@ -158,7 +162,27 @@ TEST(SocketLine, SaysWhyNobodyIsThere) {
         (*line)->open();
         ASSERT_TRUE(runUntil([&] { return !heard.closed.empty(); })) << address;
         EXPECT_EQ(heard.opened, 0);
-        EXPECT_EQ(heard.closed.size(), 1U);
+        EXPECT_EQ(heard.closed, std::vector<std::string>{"nobody is there"});
+    }
+}
+
+TEST(SocketLine, SaysInOneWayThatItWasHungUp) {
+    const test::TemporaryDirectory directory;
+    const std::string path = directory.path() / "router";
+    QLocalServer local;
+    ASSERT_TRUE(local.listen(QString::fromStdString(path)));
+    QTcpServer tcp;
+    ASSERT_TRUE(tcp.listen(QHostAddress::LocalHost));
+    for (const std::string& address : {"unix:" + path, "tcp:127.0.0.1:" + std::to_string(tcp.serverPort())}) {
+        Heard heard;
+        auto line = lineTo(address, heard);
+        (*line)->open();
+        ASSERT_TRUE(runUntil(
+            [&] { return heard.opened == 1 && (local.hasPendingConnections() || tcp.hasPendingConnections()); }));
+        if (QLocalSocket* modem = local.nextPendingConnection()) modem->disconnectFromServer();
+        if (QTcpSocket* modem = tcp.nextPendingConnection()) modem->disconnectFromHost();
+        ASSERT_TRUE(runUntil([&] { return !heard.closed.empty(); }));
+        EXPECT_EQ(heard.closed, std::vector<std::string>{"it hung up"});
     }
 }
 

@@ -35,6 +35,7 @@ protected:
                         .access = [this](const std::string& path) { return access[path]; },
                         .holders = [this](const std::string& path) { return holders[path]; },
                         .modemManagerRuns = [this] { return managerRuns; },
+                        .phone = [this] { return phone; },
                         .probe =
                             [this](const std::string& path) {
                                 probed.push_back(path);
@@ -51,6 +52,7 @@ protected:
     std::map<std::string, ModemProbe> probes;
     std::vector<std::string> probed;
     bool managerRuns = false;
+    PhoneFindings phone;
 };
 
 TEST_F(DoctorTest, SaysWhatToDoWhereThereIsNothing) {
@@ -74,6 +76,55 @@ TEST_F(DoctorTest, TellsEverythingOfAPort) {
               "\n"
               "Next: run \"kelvoctl doctor --port /dev/ttyUSB2 --udev-rule | sudo tee "
               "/etc/udev/rules.d/78-kelvo-modem.rules\", and plug the modem in again\n");
+}
+
+TEST_F(DoctorTest, TellsWhatModemManagerKnowsAndWhichScreensThatFills) {
+    managerRuns = true;
+    phone::PhoneState modem;
+    modem.modem = "0";
+    modem.model = "Maker Model";
+    modem.equipment = "860000000000012";
+    modem.condition = "registered";
+    modem.access = "LTE";
+    modem.network = "Test Network";
+    modem.registration = "home";
+    modem.family = Technology::LTE;
+    modem.ports = {{.name = "ttyUSB1"}, {.name = "cdc-wdm0"}};
+    modem.sim.iccid = "8900101000000123456";
+    modem.cells = {
+        {.technology = phone::MonitoredCell::Technology::LTE, .isServing = true, .pid = 301, .uarfcn = 1300}};
+    modem.contexts.emplace();
+    phone.modems = {modem, {.modem = "1", .model = "Other", .condition = "disabled"}};
+    phone.lacks = {"signal values: it says no"};
+    EXPECT_EQ(findingsText(look()),
+              "There is no serial port that a modem may be behind.\n"
+              "\n"
+              "ModemManager's modem 0: Maker Model\n"
+              "  it is          registered, on LTE\n"
+              "  network        Test Network, home\n"
+              "  has the ports  ttyUSB1, cdc-wdm0\n"
+              "  knows          SIM …3456, cells: 1, data contexts: 0\n"
+              "  lacks          signal values: it says no\n"
+              "  LTE screens    PDP Context Info, SIM Info, Serving Cell Measurements; in part Serving Cell Info\n"
+              "ModemManager's modem 1: Other\n"
+              "  it is          disabled\n"
+              "\n"
+              "Next: run \"kelvo-telephonyd --modemmanager\", and then kelvo\n");
+    phone.modems[0].cells->front().pid.reset();  // no way to say whose levels they are
+    EXPECT_NE(findingsText(look()).find("  LTE screens    PDP Context Info, SIM Info; in part Serving Cell Info\n"),
+              std::string::npos);
+    const auto json = findingsJson(look())["modemManager"];
+    EXPECT_EQ(json["modems"][0]["sim"], "…3456");
+    EXPECT_EQ(json["modems"][0]["screens"]["technology"], "LTE");
+    EXPECT_EQ(json.dump().find("8600"), std::string::npos);
+}
+
+TEST_F(DoctorTest, SaysWhyModemManagerKnowsNothing) {
+    managerRuns = true;
+    phone.trouble = "ModemManager has no modem";
+    EXPECT_NE(findingsText(look()).find(
+                  "\nModemManager\n  trouble        ModemManager has no modem\n\nNext: plug a modem in"),
+              std::string::npos);
 }
 
 TEST_F(DoctorTest, TellsWhatAModemAnswersAndWhichScreensItFills) {
@@ -140,7 +191,7 @@ TEST_F(DoctorTest, EndsWithTheOneThingThatIsInTheWay) {
     EXPECT_EQ(next(), "run \"kelvoctl doctor --port /dev/ttyUSB0 --probe\", which asks it what it can show");
     holders["/dev/ttyUSB0"].known = {{77, "minicom"}};
     EXPECT_EQ(next(), "end minicom (process 77), which has /dev/ttyUSB0 open");
-    holders["/dev/ttyUSB0"].known = {{78, "kelvo-telephony"}};
+    holders["/dev/ttyUSB0"].known = {{78, "kelvo-telephonyd"}};
     EXPECT_EQ(next(), "run kelvo: its telephony service has /dev/ttyUSB0 already");
     access["/dev/ttyUSB0"].mayOpen = false;
     EXPECT_EQ(next(), "add yourself to the group dialout: run \"sudo usermod -aG dialout ada\", and log in again");

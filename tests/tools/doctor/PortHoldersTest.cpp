@@ -41,6 +41,17 @@ TEST_F(PortHoldersTest, AreTheProcessesThatHaveThePortOpen) {
     EXPECT_FALSE(holders.someHidden);
 }
 
+TEST_F(PortHoldersTest, HaveTheirWholeNames) {
+    add("33", "kelvo-telephony", {port});
+    std::ofstream(_directory.path() / "proc/33/cmdline") << "/usr/bin/kelvo-telephonyd" << '\0' << "--port" << '\0';
+    add("34", "renamed", {port});
+    std::ofstream(_directory.path() / "proc/34/cmdline") << "/usr/bin/python3" << '\0';
+    const PortHolders holders = look();
+    ASSERT_EQ(holders.known.size(), 2U);
+    EXPECT_EQ(holders.known[0].name, "kelvo-telephonyd");
+    EXPECT_EQ(holders.known[1].name, "renamed");
+}
+
 TEST_F(PortHoldersTest, OfALinkAreThoseOfWhatItLeadsTo) {
     const fs::path link = _directory.path() / "modem";
     fs::create_symlink(port, link);

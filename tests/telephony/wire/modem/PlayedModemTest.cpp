@@ -28,10 +28,11 @@ TEST_F(PlayedModemTest, TellsItsBuildIdFromTheTwelfthByteOn) {
 TEST_F(PlayedModemTest, TellsHowManyItemsItHasOfEachEquipment) {
     play({});
     write({0x73, 0x00, 0x00, 0x00, 0x01, 0x00, 0x00, 0x00, 0x61, 0x9D, 0x7E});
-    EXPECT_EQ(read(), plainFrame({0x73, 0, 0, 0, 1, 0,   0,    0, 0,    0, 0, 0,  // good
-                                  0,    0, 0, 0, 2, 0xA, 0,    0, 0,    0, 0, 0, 0, 0, 0, 0, 0x10, 9, 0,    0, 0x20, 4,
-                                  0,    0, 0, 0, 0, 0,   0xFF, 4, 0,    0, 0, 0, 0, 0, 0, 0, 0,    0, 0x8A, 3, 0,    0,
-                                  1,    2, 0, 0, 0, 0,   0,    0, 0xFF, 1, 0, 0, 0, 0, 0, 0, 0,    0, 0,    0}));
+    EXPECT_EQ(read(),
+              plainFrame({0x73, 0, 0, 0, 1, 0,   0,    0, 0,    0, 0, 0,  // good
+                          0,    0, 0, 0, 2, 0xA, 0,    0, 0,    0, 0, 0, 0, 0, 0, 0, 0x10, 9, 0,    0, 0x20, 0x0E,
+                          0,    0, 0, 0, 0, 0,   0xFF, 4, 0,    0, 0, 0, 0, 0, 0, 0, 0,    0, 0x8A, 3, 0,    0,
+                          1,    2, 0, 0, 0, 0,   0,    0, 0xFF, 1, 0, 0, 0, 0, 0, 0, 0,    0, 0,    0}));
 }
 
 TEST_F(PlayedModemTest, AnswersWhoeverSilencesIt) {

@@ -1,0 +1,271 @@
+#include "overview/Tracker.h"
+
+#include <gtest/gtest.h>
+
+namespace kelvo::overview {
+namespace {
+
+using namespace std::chrono_literals;
+using Kind = Event::Kind;
+
+constexpr Time kStart{std::chrono::sys_days(std::chrono::year(2026) / 11 / 22)};
+
+Measure rsrp(const char* text, double number, std::uint64_t record) {
+    return {"RSRP", {text, number, "dBm", record}, ""};
+}
+
+Observation servedBy(const char* cell, std::uint64_t record, const char* level = "-90.00 dBm") {
+    Observation seen;
+    seen.access = "LTE";
+    seen.cell = cell;
+    seen.cellRecord = record;
+    seen.level = rsrp(level, -90, record);
+    return seen;
+}
+
+HeardCell heard(const char* identity, double level, std::uint64_t record) {
+    HeardCell cell;
+    cell.identity = identity;
+    cell.level = rsrp("", level, record);
+    cell.record = record;
+    return cell;
+}
+
+std::vector<std::string> identities(const Tracker& tracker) {
+    std::vector<std::string> all;
+    for (const TrackedCell& cell : tracker.cells()) all.push_back(cell.heard.identity);
+    return all;
+}
+
+TEST(Tracker, AChangeOfCellOutOfAConnectionIsAReselection) {
+    Tracker tracker;
+    tracker.note(servedBy("A", 1), kStart);
+    tracker.note(servedBy("A", 2, "-101.00 dBm"), kStart + 2s);
+    tracker.note(servedBy("B", 3, "-88.00 dBm"), kStart + 4s);
+    ASSERT_EQ(tracker.events().size(), 2u);
+    EXPECT_EQ(tracker.events()[0].kind, Kind::CellFound);
+    EXPECT_EQ(tracker.events()[0].to, "A");
+    EXPECT_EQ(tracker.events()[0].levelBefore, "");
+    const Event& change = tracker.events()[1];
+    EXPECT_EQ(change.kind, Kind::Reselection);
+    EXPECT_EQ(change.time, kStart + 4s);
+    EXPECT_EQ(change.from, "A");
+    EXPECT_EQ(change.to, "B");
+    EXPECT_EQ(change.levelBefore, "-101.00 dBm");
+    EXPECT_EQ(change.levelAfter, "-88.00 dBm");
+    EXPECT_EQ(change.record, 3u);
+}
+
+TEST(Tracker, AChangeOfCellWithinAConnectionIsAHandover) {
+    Tracker tracker;
+    for (const auto& [cell, record] : {std::pair("A", 1), std::pair("B", 2)}) {
+        Observation seen = servedBy(cell, static_cast<std::uint64_t>(record));
+        seen.isDedicated = true;
+        tracker.note(seen, kStart);
+    }
+    EXPECT_EQ(tracker.events().back().kind, Kind::Handover);
+}
+
+TEST(Tracker, ALevelThatIsOlderThanTheChangeIsTheOldCells) {
+    Tracker tracker;
+    tracker.note(servedBy("A", 1, "-95.00 dBm"), kStart);
+    Observation seen = servedBy("B", 3, "-95.00 dBm");
+    seen.level->figure.record = 2;
+    tracker.note(seen, kStart + 1s);
+    EXPECT_EQ(tracker.events().back().levelAfter, "");
+    tracker.note(servedBy("B", 4, "-80.00 dBm"), kStart + 2s);
+    EXPECT_EQ(tracker.events().back().levelAfter, "-80.00 dBm");
+    tracker.note(servedBy("B", 5, "-70.00 dBm"), kStart + 3s);
+    EXPECT_EQ(tracker.events().back().levelAfter, "-80.00 dBm");
+}
+
+TEST(Tracker, ACellStaysThirtySecondsAndIsMarkedTenMore) {
+    Tracker tracker;
+    Observation seen = servedBy("A", 1);
+    seen.cells = {heard("N", -100, 1)};
+    tracker.note(seen, kStart);
+    tracker.note(seen, kStart + 30s);  // the list stands there unchanged: nobody has heard the cell again
+    ASSERT_EQ(tracker.cells().size(), 1u);
+    EXPECT_FALSE(tracker.cells()[0].isLost);
+    EXPECT_EQ(tracker.cells()[0].lastHeard, kStart);
+    tracker.note(servedBy("A", 2), kStart + 31s);
+    ASSERT_EQ(tracker.cells().size(), 1u);
+    EXPECT_TRUE(tracker.cells()[0].isLost);
+    tracker.note(servedBy("A", 3), kStart + 41s);
+    EXPECT_TRUE(tracker.cells().empty());
+}
+
+TEST(Tracker, ACellThatIsHeardAgainIsLostNoMore) {
+    Tracker tracker;
+    Observation seen = servedBy("A", 1);
+    seen.cells = {heard("N", -100, 1)};
+    tracker.note(seen, kStart);
+    seen.cells = {heard("N", -97, 2)};
+    tracker.note(seen, kStart + 35s);
+    EXPECT_FALSE(tracker.cells()[0].isLost);
+    EXPECT_DOUBLE_EQ(tracker.cells()[0].heard.level->figure.number, -97);
+}
+
+TEST(Tracker, CarriersDoNotOverwriteEachOther) {
+    Tracker tracker;
+    Observation seen = servedBy("A", 1);
+    seen.cells = {heard("EARFCN 1300, PCI 5", -100, 1)};
+    tracker.note(seen, kStart);
+    seen.cells = {heard("EARFCN 2850, PCI 5", -90, 2)};
+    tracker.note(seen, kStart + 1s);
+    EXPECT_EQ(identities(tracker), (std::vector<std::string>{"EARFCN 2850, PCI 5", "EARFCN 1300, PCI 5"}));
+}
+
+TEST(Tracker, RowsDoNotJumpAtADecibel) {
+    Tracker tracker;
+    Observation seen = servedBy("A", 1);
+    seen.cells = {heard("N", -90, 1), heard("M", -95, 1)};
+    tracker.note(seen, kStart);
+    seen.cells = {heard("N", -93, 2), heard("M", -91, 2)};  // two more, and not yet enough
+    tracker.note(seen, kStart + 1s);
+    EXPECT_EQ(identities(tracker), (std::vector<std::string>{"N", "M"}));
+    seen.cells = {heard("N", -93.5, 3), heard("M", -91, 3)};
+    tracker.note(seen, kStart + 2s);
+    EXPECT_EQ(identities(tracker), (std::vector<std::string>{"M", "N"}));
+}
+
+TEST(Tracker, NoRowStandsBelowOneThatIsMuchWeaker) {
+    Tracker tracker;
+    Observation seen = servedBy("A", 1);
+    seen.cells = {heard("K", -94, 1), heard("L", -93, 1), heard("M", -92, 1), heard("N", -90, 1)};
+    tracker.note(seen, kStart);
+    EXPECT_EQ(identities(tracker), (std::vector<std::string>{"N", "K", "L", "M"}));
+}
+
+TEST(Tracker, ACellMeasuredBeforeItsCodeIsReadIsThatCell) {
+    Tracker tracker;
+    Observation seen = servedBy("ARFCN 21, BSIC 44", 1);
+    seen.cells = {heard("ARFCN 23, BSIC 42", -80, 1), heard("ARFCN 2", -70, 1)};
+    tracker.note(seen, kStart);
+    seen.cells = {heard("ARFCN 23", -81, 2), heard("ARFCN 2, BSIC 7", -71, 2), heard("ARFCN 21", -60, 2)};
+    tracker.note(seen, kStart + 1s);
+    EXPECT_EQ(identities(tracker), (std::vector<std::string>{"ARFCN 2, BSIC 7", "ARFCN 23, BSIC 42"}));
+    EXPECT_DOUBLE_EQ(tracker.cells()[1].heard.level->figure.number, -81);
+}
+
+TEST(Tracker, ALevelOfLongAgoSaysNothingOfAChangeOfCell) {
+    Tracker tracker;
+    Observation seen = servedBy("A", 1);
+    seen.isDedicated = true;
+    tracker.note(seen, kStart);
+    Observation later = seen;
+    later.cell = "B";
+    later.cellRecord = 2;
+    tracker.note(later, kStart + 31s);
+    EXPECT_EQ(tracker.events().back().kind, Kind::Reselection);
+    EXPECT_EQ(tracker.events().back().levelBefore, "");
+}
+
+TEST(Tracker, AnotherRadioIsOneEventAndNotThree) {
+    Tracker tracker;
+    Observation seen = servedBy("A", 1);
+    seen.band = "3";
+    seen.state = "idle";
+    tracker.note(seen, kStart);
+    Observation later = servedBy("B", 2);
+    later.access = "UMTS";
+    later.band = "I";
+    later.state = "CELL_DCH";
+    tracker.note(later, kStart + 1s);
+    ASSERT_EQ(tracker.events().size(), 3u);
+    EXPECT_EQ(tracker.events()[1].kind, Kind::Reselection);
+    EXPECT_EQ(tracker.events()[2].kind, Kind::Access);
+}
+
+TEST(Tracker, APhoneThatNeverHadServiceHasNotLostIt) {
+    Tracker tracker;
+    Observation seen;
+    seen.isWithoutService = true;
+    tracker.note(seen, kStart);
+    EXPECT_TRUE(tracker.events().empty());
+    tracker.note(Observation(), kStart + 2s);
+    EXPECT_EQ(tracker.events().back().to, "after 2.0 s");
+}
+
+TEST(Tracker, TheServingCellIsNoneOfThoseAround) {
+    Tracker tracker;
+    Observation seen = servedBy("A", 1);
+    seen.cells = {heard("B", -80, 1), heard("A", -90, 1)};
+    tracker.note(seen, kStart);
+    EXPECT_EQ(identities(tracker), (std::vector<std::string>{"B"}));
+    Observation later = servedBy("B", 2);
+    later.cells = {heard("A", -91, 2)};
+    tracker.note(later, kStart + 1s);
+    EXPECT_EQ(identities(tracker), (std::vector<std::string>{"A"}));
+}
+
+TEST(Tracker, StatesAreToldWhenTheyChangeAndNotWhenTheyAppear) {
+    Tracker tracker;
+    Observation seen = servedBy("A", 1);
+    tracker.note(seen, kStart);
+    seen.state = "idle";
+    seen.area = "TAC 1";
+    seen.registrationState = "GMM_REGISTERED";
+    tracker.note(seen, kStart + 1s);
+    EXPECT_EQ(tracker.events().size(), 1u);
+    seen.state = "connected";
+    seen.area = "TAC 2";
+    seen.registrationState = "GMM_DEREGISTERED";
+    seen.reject = "LOCATION_AREA_NOT_ALLOWED";
+    tracker.note(seen, kStart + 2s);
+    ASSERT_EQ(tracker.events().size(), 5u);
+    EXPECT_EQ(tracker.events()[1].kind, Kind::State);
+    EXPECT_EQ(tracker.events()[2].kind, Kind::Area);
+    EXPECT_EQ(tracker.events()[2].from, "TAC 1");
+    EXPECT_EQ(tracker.events()[2].to, "TAC 2");
+    EXPECT_EQ(tracker.events()[3].kind, Kind::Registration);
+    EXPECT_EQ(tracker.events()[4].kind, Kind::Reject);
+    EXPECT_EQ(tracker.events()[4].to, "LOCATION_AREA_NOT_ALLOWED");
+}
+
+TEST(Tracker, ContextsComeAndGo) {
+    Tracker tracker;
+    Observation seen = servedBy("A", 1);
+    seen.contexts = {{"internet (5)", "Active", true}, {"ims (6)", "Inactive", false}};
+    tracker.note(seen, kStart);
+    seen.contexts = {{"internet (5)", "Inactive", false}, {"ims (6)", "Active", true}};
+    tracker.note(seen, kStart + 1s);
+    ASSERT_EQ(tracker.events().size(), 4u);
+    EXPECT_EQ(tracker.events()[1].kind, Kind::ContextUp);
+    EXPECT_EQ(tracker.events()[1].to, "internet (5)");
+    EXPECT_EQ(tracker.events()[2].kind, Kind::ContextDown);
+    EXPECT_EQ(tracker.events()[2].from, "internet (5)");
+    EXPECT_EQ(tracker.events()[3].kind, Kind::ContextUp);
+    EXPECT_EQ(tracker.events()[3].to, "ims (6)");
+}
+
+TEST(Tracker, LossOfServiceHasALength) {
+    Tracker tracker;
+    Observation seen = servedBy("A", 1);
+    tracker.note(seen, kStart);
+    seen.isWithoutService = true;
+    tracker.note(seen, kStart + 1s);
+    seen.isWithoutService = false;
+    tracker.note(seen, kStart + 13500ms);
+    ASSERT_EQ(tracker.events().size(), 3u);
+    EXPECT_EQ(tracker.events()[1].kind, Kind::ServiceLost);
+    EXPECT_EQ(tracker.events()[2].kind, Kind::ServiceBack);
+    EXPECT_EQ(tracker.events()[2].to, "after 12.5 s");
+}
+
+TEST(Tracker, EventsAreKeptForADayAndNoMoreThanTwoThousand) {
+    Tracker tracker;
+    for (std::uint64_t i = 0; i < 2500; ++i) tracker.note(servedBy(i % 2 == 0 ? "A" : "B", i + 1), kStart);
+    EXPECT_EQ(tracker.events().size(), 2000u);
+    EXPECT_EQ(tracker.events().front().record, 501u);
+    tracker.note(servedBy("C", 3000), kStart + 24h + 1s);
+    EXPECT_EQ(tracker.events().size(), 1u);
+
+    Tracker patient({.events = 3000, .span = 48h});
+    for (std::uint64_t i = 0; i < 2500; ++i) patient.note(servedBy(i % 2 == 0 ? "A" : "B", i + 1), kStart);
+    patient.note(servedBy("C", 3000), kStart + 24h + 1s);
+    EXPECT_EQ(patient.events().size(), 2501u);
+}
+
+}  // namespace
+}  // namespace kelvo::overview

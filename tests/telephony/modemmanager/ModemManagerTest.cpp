@@ -275,7 +275,7 @@ TEST_F(ModemManagerTest, TakesTheFirstOfSeveralModemsOrTheOneThatIsNamed) {
         {"", "2"}, {"10", "10"}, {"/org/freedesktop/ModemManager1/Modem/10", "10"}, {"8600000000000010", "10"}};
     for (const auto& [wanted, index] : names) {
         follow(wanted);
-        EXPECT_TRUE(until([&] { return phone().modem == index; })) << wanted;
+        EXPECT_TRUE(until([this, expected = index] { return phone().modem == expected; })) << wanted;
         manager.reset();
     }
     follow("3");

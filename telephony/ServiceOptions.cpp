@@ -96,7 +96,8 @@ public:
 
 private:
     void addSources() {
-        auto* const source = _app.add_option_group("source", "Where the records come from: one of them, or --port and --modemmanager");
+        auto* const source =
+            _app.add_option_group("source", "Where the records come from: one of them, or --port and --modemmanager");
         _replay = source->add_option("--replay", _options.replay, "The capture to replay")->type_name("FILE");
         _simulate = source->add_option("--simulate", _simulated, "The modem to simulate")
                         ->type_name("ifx|gsm|cdma|lte|utran")

@@ -12,11 +12,6 @@
 namespace kelvo::test {
 namespace {
 
-QPointingDevice* touchScreen() {
-    static QPointingDevice* const kDevice = QTest::createTouchDevice();
-    return kDevice;
-}
-
 QQuickItem* findItem(QQuickItem* item, const std::function<bool(QQuickItem*)>& matches) {
     if (!item->isVisible()) return nullptr;
     const QList<QQuickItem*> children = item->childItems();
@@ -27,6 +22,11 @@ QQuickItem* findItem(QQuickItem* item, const std::function<bool(QQuickItem*)>& m
 }
 
 }  // namespace
+
+QPointingDevice* touchScreen() {
+    static QPointingDevice* const kDevice = QTest::createTouchDevice();
+    return kDevice;
+}
 
 Scene::Scene(bool savingPermitted, QSize size) {
     if (savingPermitted) permitSaving();

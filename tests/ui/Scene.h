@@ -1,6 +1,7 @@
 #pragma once
 
 #include <QPointF>
+#include <QPointingDevice>
 #include <QString>
 
 #include "tests/ui/AppWorld.h"
@@ -8,6 +9,9 @@
 #include "ui/QuickWindow.h"
 
 namespace kelvo::test {
+
+/// The one touch screen of all scenes: Qt keeps a device as long as it runs.
+QPointingDevice* touchScreen();
 
 /// The application with its real screen, drawn without a display. Starts launched, with its window `size` large.
 class Scene : public AppWorld {

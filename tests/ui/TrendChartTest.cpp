@@ -63,7 +63,7 @@ TEST_F(TrendChartTest, MovesUnderAFingerAndComesBack) {
 }
 
 TEST_F(TrendChartTest, ZoomsWithTwoFingers) {
-    auto touch = QTest::touchEvent(&scene->view(), QTest::createTouchDevice(), false);
+    auto touch = QTest::touchEvent(&scene->view(), test::touchScreen(), false);
     const QPoint left = at(0.4).toPoint();
     const QPoint right = at(0.6).toPoint();
     touch.press(0, left).press(1, right).commit();

@@ -42,6 +42,7 @@ std::string group(std::string_view title, const std::vector<Line>& lines) {
 
 std::vector<Line> linesOf(const std::vector<Fact>& facts) {
     std::vector<Line> lines;
+    lines.reserve(facts.size());
     for (const Fact& fact : facts) lines.push_back({printable(fact.name), printable(fact.text)});
     return lines;
 }
@@ -118,6 +119,7 @@ std::string eventText(const Event& event) {
 std::string overviewText(const Tracker& tracker, Time now) {
     const Observation& seen = tracker.latest();
     std::vector<Line> contexts;
+    contexts.reserve(seen.contexts.size());
     for (const Context& context : seen.contexts) contexts.push_back({printable(context.name), printable(context.text)});
     std::string text = serving(tracker, now);
     text += cellsAround(tracker, now);

@@ -52,7 +52,8 @@ TEST_F(EventsCommand, AsJsonLinesAndAsCommaSeparatedValues) {
 TEST_F(EventsCommand, OfNoCaptureItSaysWhatItIs) {
     std::ofstream(path("text")) << "no capture at all";
     EXPECT_EQ(kelvoctl({"events", path("text")}).status, 1);
-    expectFailure(kelvoctl({"events", path("missing")}), path("missing") + " cannot be opened: No such file or directory");
+    expectFailure(kelvoctl({"events", path("missing")}),
+                  path("missing") + " cannot be opened: No such file or directory");
 }
 
 TEST_F(EventsCommand, TheOverviewShowsTheCellsThatWereHeard) {

@@ -1,5 +1,7 @@
 #include "tools/OverviewJson.h"
 
+#include <algorithm>
+
 #include "tools/OverviewText.h"
 
 namespace kelvo {
@@ -26,7 +28,10 @@ Json jsonOf(const std::vector<Fact>& facts) {
     return json;
 }
 
-double seconds(Time::duration age) { return std::chrono::duration<double>(age).count(); }
+/// As in the text, nothing is younger than now.
+double seconds(Time::duration age) {
+    return std::chrono::duration<double>(std::max(age, Time::duration::zero())).count();
+}
 
 }  // namespace
 

@@ -47,8 +47,10 @@ std::vector<Line> linesOf(const std::vector<Fact>& facts) {
     return lines;
 }
 
+/// Of captures put together the times may go back; nothing is younger than now.
 std::string ageText(Time then, Time now) {
-    const auto seconds = std::chrono::duration_cast<std::chrono::seconds>(now - then).count();
+    const auto age = std::max(now - then, Time::duration::zero());
+    const auto seconds = std::chrono::duration_cast<std::chrono::seconds>(age).count();
     if (seconds < 120) return fmt::format("{} s ago", seconds);
     if (seconds < 7200) return fmt::format("{} min ago", seconds / 60);
     return seconds < 172800 ? fmt::format("{} h ago", seconds / 3600) : fmt::format("{} days ago", seconds / 86400);

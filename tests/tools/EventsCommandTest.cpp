@@ -88,5 +88,16 @@ TEST_F(EventsCommand, TheOverviewShowsTheCellsThatWereHeard) {
     EXPECT_EQ(shown["events"].size(), 1U);
 }
 
+TEST_F(EventsCommand, WhereTimesGoBackNothingIsYoungerThanNow) {
+    {
+        CaptureWriter writer = test::captureAt(path("back.pcap"), Technology::LTE);
+        ASSERT_TRUE(writer.append(CaptureTime(std::chrono::seconds(60)), connected(185, 122)));
+        ASSERT_TRUE(writer.append(CaptureTime(std::chrono::seconds(10)), servingCell(185)));
+    }
+    const Finished done = kelvoctl({"decode", "--overview", path("back.pcap")});
+    EXPECT_NE(done.output.find("RSRP           -109.50 dBm, poor, 0 s ago\n"), std::string::npos) << done.output;
+    EXPECT_EQ(json({"decode", "--overview", "--json", path("back.pcap")})["serving"]["age"], 0.0);
+}
+
 }  // namespace
 }  // namespace kelvo

@@ -3,13 +3,13 @@
 #include <fmt/printf.h>
 #include <gtest/gtest.h>
 
-#include <charconv>
 #include <memory>
 #include <set>
 
 #include "LogGenerator/Factory.h"
 #include "platform/system/DirectoryResources.h"
 #include "platform/system/Environment.h"
+#include "tests/support/ShownAt.h"
 
 namespace kelvo::test {
 namespace {
@@ -23,30 +23,11 @@ public:
 
     std::string text(const Bytes& packet, const std::string& path) {
         _generator->updateState(_state, packet);
-        const Value* here = _state.find("Display");
-        for (std::size_t at = 0; here != nullptr && at < path.size();) {
-            const std::size_t end = std::min(path.find('/', at), path.size());
-            here = below(*here, std::string_view(path).substr(at, end - at));
-            at = end + 1;
-        }
+        const Value* here = shownAt(_state["Display"], path);
         return here != nullptr && here->string() != nullptr ? *here->string() : "(absent)";
     }
 
 private:
-    static const Value* below(const Value& value, std::string_view name) {
-        if (value.array()) {
-            std::size_t index = 0;
-            std::from_chars(name.data(), name.data() + name.size(), index);
-            return index < value.array()->size() ? &(*value.array())[index] : nullptr;
-        }
-        if (!value.dictionary()) return nullptr;
-        for (const auto& [key, entry] : *value.dictionary()) {
-            const std::string_view shown = std::string_view(key).substr(std::string_view(key).find(';') + 1);
-            if (shown == name) return &entry;
-        }
-        return nullptr;
-    }
-
     DirectoryResources _resources{KELVO_RESOURCE_DIR};
     Environment::Scope _environment{{.resources = &_resources}};
     std::unique_ptr<LogGenerator> _generator;

@@ -1,6 +1,5 @@
 #pragma once
 
-#include <charconv>
 #include <cstdlib>
 #include <limits>
 #include <memory>
@@ -15,6 +14,7 @@
 #include "platform/telephony/Technology.h"
 #include "telephony/simulation/Simulation.h"
 #include "tests/support/RecordingLog.h"
+#include "tests/support/ShownAt.h"
 
 namespace kelvo::test {
 
@@ -65,17 +65,10 @@ public:
     }
     simulation::Time time() const { return _time; }
 
-    /// What stands at a path below the display, such as "Neighbors/0/Cell ID": keys as they are shown (without what a
-    /// sorted key has before its ";"), rows by number. None when there is nothing.
+    /// What stands at a path of the display (`shownAt`). None when there is nothing.
     const Value* at(std::string_view path) {
         _display = display();
-        const Value* here = &_display;
-        while (here != nullptr && !path.empty()) {
-            const auto end = path.find('/');
-            here = below(*here, path.substr(0, end));
-            path = end == std::string_view::npos ? std::string_view() : path.substr(end + 1);
-        }
-        return here;
+        return shownAt(_display, path);
     }
     /// The text shown there; "(absent)" when there is none.
     std::string text(std::string_view path) {
@@ -105,20 +98,6 @@ private:
         const Value* value = _state.find("Display");
         return value != nullptr ? *value : Value();
     }
-    static const Value* below(const Value& value, std::string_view name) {
-        if (value.array()) {
-            std::size_t index = 0;
-            std::from_chars(name.data(), name.data() + name.size(), index);
-            return index < value.array()->size() ? &(*value.array())[index] : nullptr;
-        }
-        if (!value.dictionary()) return nullptr;
-        for (const auto& [key, entry] : *value.dictionary()) {
-            const std::string_view shown = std::string_view(key).substr(std::string_view(key).find(';') + 1);
-            if (shown == name) return &entry;
-        }
-        return nullptr;
-    }
-
     RecordingLog _log;
     DirectoryResources _resources{KELVO_RESOURCE_DIR};
     Environment::Scope _environment{{.log = &_log, .resources = &_resources}};

@@ -45,6 +45,28 @@ std::string shortened(const std::string& text, std::size_t longest) {
     return text.substr(0, longest);
 }
 
+/// The name of the first part of "LAC 2101, URA 6", and its number; both leave `parts`.
+std::pair<std::string_view, std::string_view> takePart(std::string_view& parts) {
+    const std::size_t end = std::min(parts.find(", "), parts.size());
+    const std::string_view part = parts.substr(0, end);
+    parts.remove_prefix(std::min(end + 2, parts.size()));
+    const std::size_t space = std::min(part.find(' '), part.size());
+    return {part.substr(0, space), part.substr(space)};
+}
+
+/// The names of those parts that both have and that differ.
+std::vector<std::string_view> changedParts(std::string_view before, std::string_view now) {
+    std::vector<std::string_view> changed;
+    while (!before.empty()) {
+        const auto [name, number] = takePart(before);
+        for (std::string_view rest = now; !rest.empty();) {
+            const auto [same, other] = takePart(rest);
+            if (same == name && other != number) changed.push_back(name);
+        }
+    }
+    return changed;
+}
+
 void addChanged(std::vector<EventValue>& values, std::string_view name, const std::string& before,
                 const std::string& after) {
     if (before != after) values.push_back({std::string(name), before, after});
@@ -192,11 +214,27 @@ void Tracker::noteStates() {
         noteChange(Kind::Band, _before.band, _seen.band);
         noteChange(Kind::State, _before.state, _seen.state);
     }
-    noteChange(Kind::Area, _before.area, _seen.area);
+    noteArea();
     noteChange(Kind::Registration, _before.registrationState, _seen.registrationState);
     if (_seen.reject != _before.reject && !_seen.reject.empty()) {
         happened({.time = _clock, .kind = Kind::Reject, .to = _seen.reject});
     }
+}
+
+/// An area has parts of which a modem tells in records of their own: another "URA" and then another "LAC" are one
+/// change, unless much time lies between them. A part that was not known before is no change.
+void Tracker::noteArea() {
+    const auto parts = changedParts(_before.area, _seen.area);
+    if (parts.empty()) return;
+    const auto last = std::ranges::find(_events.rbegin(), _events.rend(), Kind::Area, &Event::kind);
+    const bool goesOn = last != _events.rend() && _clock - last->time <= kSettling && last->to == _before.area &&
+                        std::ranges::none_of(changedParts(last->from, last->to), [&](std::string_view part) {
+                            return std::ranges::find(parts, part) != parts.end();
+                        });
+    if (!goesOn) return noteChange(Kind::Area, _before.area, _seen.area);
+    last->to = shortened(_seen.area, Event::kLongestText);
+    const auto value = std::ranges::find(last->values, "Area", &EventValue::name);
+    if (value != last->values.end()) value->after = shortened(_seen.area, Event::kLongestValue);
 }
 
 void Tracker::noteContexts() {

@@ -23,6 +23,7 @@ class Tracker {
 public:
     static constexpr auto kHeardFor = std::chrono::seconds(30);  ///< a cell stays that long after it was heard
     static constexpr auto kLostFor = std::chrono::seconds(10);   ///< and that much longer, marked
+    static constexpr auto kSettling = std::chrono::seconds(2);   ///< within which records tell the parts of one area
     static constexpr double kSteady = 2.0;                       ///< dB by which a cell overtakes the one above
 
     struct Limits {
@@ -67,6 +68,7 @@ private:
     void noteCells();
     void noteServing();
     void noteStates();
+    void noteArea();
     void noteContexts();
     void noteService();
     void noteFigure(Followed& followed, const std::optional<Measure>& now, bool isLevel);

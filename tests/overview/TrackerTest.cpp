@@ -223,6 +223,30 @@ TEST(Tracker, StatesAreToldWhenTheyChangeAndNotWhenTheyAppear) {
     EXPECT_EQ(tracker.events()[4].to, "LOCATION_AREA_NOT_ALLOWED");
 }
 
+TEST(Tracker, TheAreasPartsAreOneChange) {
+    Tracker tracker;
+    const auto see = [&](const char* area, Time::duration after) {
+        Observation seen = servedBy("A", 1);
+        seen.area = area;
+        tracker.note(seen, kStart + after);
+    };
+    see("URA 1", 0s);
+    see("LAC 11, URA 1", 1s);  // which was not known before
+    EXPECT_EQ(tracker.events().size(), 1u);
+    see("LAC 11, URA 2", 10s);
+    see("LAC 12, URA 2", 12s);
+    ASSERT_EQ(tracker.events().size(), 2u);
+    EXPECT_EQ(tracker.events()[1].time, kStart + 10s);
+    EXPECT_EQ(tracker.events()[1].from, "LAC 11, URA 1");
+    EXPECT_EQ(tracker.events()[1].to, "LAC 12, URA 2");
+    EXPECT_EQ(tracker.events()[1].values.back(), (EventValue{"Area", "LAC 11, URA 1", "LAC 12, URA 2"}));
+    see("LAC 13, URA 2", 12s);  // the same part again: another change
+    ASSERT_EQ(tracker.events().size(), 3u);
+    see("LAC 13, URA 3", 14s + 1us);  // too late to be of it
+    EXPECT_EQ(tracker.events().size(), 4u);
+    EXPECT_EQ(tracker.events()[3].from, "LAC 13, URA 2");
+}
+
 TEST(Tracker, ContextsComeAndGo) {
     Tracker tracker;
     Observation seen = servedBy("A", 1);

@@ -1,0 +1,71 @@
+#include "tests/overview/drive/Driven.h"
+
+#include <fmt/format.h>
+
+#include <algorithm>
+
+namespace kelvo::overview::test {
+namespace {
+
+constexpr auto kTolerance = std::chrono::seconds(2);
+
+std::string textOf(Kind kind, Time time, const std::string& from, const std::string& to) {
+    const auto milliseconds = std::chrono::duration_cast<std::chrono::milliseconds>(time.time_since_epoch()).count();
+    return fmt::format("{:9.3f} s  {}  {} -> {}", static_cast<double>(milliseconds) / 1000, nameOf(kind), from, to);
+}
+
+}  // namespace
+
+std::uint32_t Driven::next() {
+    const auto message = _modem.next();
+    _time = message.time;
+    const ByteView packet = _generator->takesPackets() ? RecordLedger::packetOf(message.bytes) : ByteView();
+    {
+        const RecordLedger::Counted counted(_records, packet, message.time);
+        _generator->updateState(_state, message.bytes);
+    }
+    if (_records.isFull()) _records.forgetAllBut(_state["Display"]);
+    _tracker.note(observe(_modem.technology(), _state["Display"]), timeOf(_time));
+    return packet.empty() ? 0 : logCode(packet.data());
+}
+
+const TrackedCell* Driven::around(std::string_view identity) const {
+    const auto& cells = _tracker.cells();
+    const auto found = std::ranges::find_if(cells, [&](const auto& cell) { return cell.heard.identity == identity; });
+    return found != cells.end() ? &*found : nullptr;
+}
+
+std::string Driven::fact(const std::vector<Fact>& facts, std::string_view name) {
+    const auto found = std::ranges::find(facts, name, &Fact::name);
+    return found != facts.end() ? found->text : "(absent)";
+}
+
+void Happened::expectIn(const Tracker& tracker) const {
+    std::vector<const Event*> events;
+    for (const Event& event : tracker.events()) events.push_back(&event);
+    for (const One& one : _all) {
+        const auto found = std::ranges::find_if(events, [&](const Event* event) {
+            const auto apart = event->time - timeOf(one.time);
+            return event->kind == one.kind && event->from == one.from && event->to == one.to && apart <= kTolerance &&
+                   apart >= -kTolerance;
+        });
+        if (found != events.end()) {
+            events.erase(found);
+        } else {
+            ADD_FAILURE() << "not listed: " << textOf(one.kind, timeOf(one.time), one.from, one.to);
+        }
+    }
+    for (const Event* event : events) {
+        ADD_FAILURE() << "did not happen: " << textOf(event->kind, event->time, event->from, event->to);
+    }
+}
+
+int Happened::count(Kind kind) const { return static_cast<int>(std::ranges::count(_all, kind, &One::kind)); }
+
+void expectFigure(const std::optional<Measure>& shown, const char* name, double truth, double step) {
+    ASSERT_TRUE(shown) << name;
+    EXPECT_EQ(shown->name, name);
+    EXPECT_NEAR(shown->figure.number, truth, step / 2 + 0.00501) << name;
+}
+
+}  // namespace kelvo::overview::test

@@ -46,6 +46,15 @@ void addBand(Observation& seen, const std::vector<BandChannel>& bands) {
     add(seen.serving, "Band", shown);
 }
 
+void addRncAndCell(Observation& seen, std::int64_t identity) {
+    add(seen.serving, "Cell identity",
+        fmt::format("{} (RNC {}, cell {})", identity, identity >> 16 & 0xFFF, identity & 0xFFFF));
+}
+
+void addColorCodes(Observation& seen, std::int64_t bsic) {
+    add(seen.serving, "Color codes", fmt::format("NCC {}, BCC {}", bsic / 8 % 8, bsic % 8));
+}
+
 void addContexts(Observation& seen, const Value& contexts) {
     for (const Value& row : rowsOf(contexts)) {
         const Screens shown(row);

@@ -32,9 +32,7 @@ void observeGsm(Observation& seen, const Screens& screens) {
     seen.channel = named("ARFCN", cell.text("ARFCN"));
     seen.cell = identity(seen.channel, named("BSIC", cell.text("BSIC")));
     seen.cellRecord = cell.record("ARFCN");
-    if (const auto bsic = cell.whole("BSIC")) {
-        add(seen.serving, "Color codes", fmt::format("NCC {}, BCC {}", *bsic / 8 % 8, *bsic % 8));
-    }
+    if (const auto bsic = cell.whole("BSIC")) addColorCodes(seen, *bsic);
     add(seen.serving, "Cell identity", cell.text("Cell ID"));
     const auto arfcn = cell.whole("ARFCN");
     addBand(seen, arfcn ? gsmBands(*arfcn) : std::vector<BandChannel>());
@@ -56,9 +54,7 @@ void observeUmts(Observation& seen, const Screens& screens) {
         seen.level = measure("RSCP", best.figure("RSCP"));
         seen.quality = measure("Ec/Io", best.figure("Energy Per Chip"), Graded::EcIo);
     }
-    if (const auto id = cell.whole("Cell ID")) {
-        add(seen.serving, "Cell identity", fmt::format("{} (RNC {}, cell {})", *id, *id >> 16, *id & 0xFFFF));
-    }
+    if (const auto id = cell.whole("Cell ID")) addRncAndCell(seen, *id);
     const auto uarfcn = cell.whole(channel);
     addBand(seen, uarfcn ? utraFddBands(*uarfcn) : std::vector<BandChannel>());
     add(seen.serving, "Transmit power", cell.text("Transmit Power"));

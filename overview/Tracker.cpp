@@ -30,12 +30,15 @@ void order(std::vector<TrackedCell>& cells) {
     }
 }
 
-/// Whether one of the two is the other without its code: "ARFCN 23" and "ARFCN 23, BSIC 42". What a modem measures
-/// before it has read the code is that cell, as far as anybody can tell.
-bool isSameCell(const std::string& one, const std::string& other) {
-    const std::string& shorter = one.size() < other.size() ? one : other;
-    const std::string& longer = one.size() < other.size() ? other : one;
-    return one == other || (shorter.find(',') == shorter.npos && longer.starts_with(shorter + ","));
+/// Whether one of the two is the other without its code or its carrier: "ARFCN 23" or "PSC 5" and "ARFCN 23, BSIC 42"
+/// or "UARFCN 10562, PSC 5". What a modem measures before it has read the code is that cell, as far as anybody can
+/// tell.
+bool isSameCell(std::string_view one, std::string_view other) {
+    if (one == other) return true;
+    const std::string_view shorter = one.size() < other.size() ? one : other;
+    const std::string_view longer = one.size() < other.size() ? other : one;
+    const std::size_t comma = longer.find(", ");
+    return comma != longer.npos && (shorter == longer.substr(0, comma) || shorter == longer.substr(comma + 2));
 }
 
 /// Of characters in UTF-8 none is cut in two.
@@ -157,9 +160,10 @@ void Tracker::noteCells() {
         if (known == _cells.end()) {
             _cells.push_back({heard, _now, false});
         } else if (heard.record > known->heard.record) {
-            const std::string identity = std::max(known->heard.identity, heard.identity);  // that with its code
+            std::string whole = std::move(known->heard.identity);
+            if (whole.size() < heard.identity.size()) whole = heard.identity;
             *known = {heard, _now, false};
-            known->heard.identity = identity;
+            known->heard.identity = std::move(whole);
         }
     }
     letPass(_now);

@@ -35,6 +35,26 @@ const TrackedCell* Driven::around(std::string_view identity) const {
     return found != cells.end() ? &*found : nullptr;
 }
 
+const TrackedCell* Driven::onChannel(const std::string& channel) const {
+    const auto& cells = _tracker.cells();
+    const auto found = std::ranges::find_if(cells, [&](const TrackedCell& cell) {
+        return (cell.heard.identity + ",").starts_with(channel + ",") && cell.lastHeard == timeOf(_time);
+    });
+    return found != cells.end() ? &*found : nullptr;
+}
+
+void Driven::expectDistinct(const std::set<std::string>& existing) const {
+    std::set<std::string> rows{seen().cell};
+    for (const TrackedCell& cell : _tracker.cells()) {
+        const std::string& name = cell.heard.identity;
+        EXPECT_TRUE(existing.contains(name)) << name;
+        EXPECT_TRUE(rows.insert(name).second) << name << " twice";
+        for (const std::string& other : rows) {  // "ARFCN 23" or "PSC 5" beside the whole name
+            EXPECT_FALSE(other.starts_with(name + ",") || other.ends_with(", " + name)) << name << " and " << other;
+        }
+    }
+}
+
 std::string Driven::fact(const std::vector<Fact>& facts, std::string_view name) {
     const auto found = std::ranges::find(facts, name, &Fact::name);
     return found != facts.end() ? found->text : "(absent)";

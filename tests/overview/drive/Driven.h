@@ -5,6 +5,7 @@
 #include <cmath>
 #include <memory>
 #include <optional>
+#include <set>
 #include <string>
 #include <vector>
 
@@ -35,6 +36,10 @@ public:
     const Observation& seen() const { return _tracker.latest(); }
     /// The cell of that name around the serving one; null when it is not there.
     const TrackedCell* around(std::string_view identity) const;
+    /// The cell heard now that is on this channel, whatever its code; null when there is none.
+    const TrackedCell* onChannel(const std::string& channel) const;
+    /// Each row is a cell that exists, none is there twice, and none is the serving cell.
+    void expectDistinct(const std::set<std::string>& existing) const;
     /// The text of a fact; "(absent)" without.
     static std::string fact(const std::vector<Fact>& facts, std::string_view name);
 

@@ -113,8 +113,7 @@ TEST_P(LteDrive, IsTheSimulatedWorlds) {
             ++measurements;
         }
         if (code == 0xB179 || code == 0xB180) expectNeighbors(driven, modem.modem());
-        for (const TrackedCell& cell : driven.tracker().cells())
-            EXPECT_TRUE(existing.contains(cell.heard.identity)) << cell.heard.identity;
+        driven.expectDistinct(existing);
     }
     EXPECT_GT(measurements, 1000);
     EXPECT_GT(happened.count(Kind::Handover), 3);

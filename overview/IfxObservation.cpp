@@ -44,9 +44,7 @@ Observation observeIfx(const Value& display) {
     seen.cellRecord = serving.record("");
     seen.cell =
         identity(seen.channel, isUmts ? named("PSC", serving.text("SCN")) : named("BSIC", serving.text("BSIC")));
-    const std::string country = serving.text("MCC");
-    const std::string network = serving.text("MNC");
-    if (!country.empty() && !network.empty()) add(seen.serving, "Network", country + "-" + network);
+    addNetwork(seen, serving.text("MCC"), serving.text("MNC"));
     seen.area = named("LAC", serving.text("LAC"));
     const auto id = serving.whole("CellId");
     const auto bsic = serving.whole("BSIC");
@@ -65,6 +63,7 @@ Observation observeIfx(const Value& display) {
     for (const Value& row : rowsOf(screens.at("Neighbours/GSM"))) addCell(seen, row, false);
     for (const Value& row : rowsOf(screens.at("Neighbours/UMTS"))) addCell(seen, row, true);
     seen.registrationState = textOf(screens, "Registration");
+    seen.knowsService = !seen.registrationState.empty();
     seen.isWithoutService = seen.registrationState == "Searching";
     add(seen.registration, "Registration", seen.registrationState);
     for (const char* rate : {"Errors", "Throughput", "TxPower"})

@@ -127,6 +127,7 @@ void Tracker::note(Observation seen, Time now, Time clock) {
     _clock = clock;
     noteCells();
     noteServing();
+    noteWhetherHandover();
     noteStates();
     noteContexts();
     noteService();
@@ -170,20 +171,54 @@ void Tracker::noteCells() {
     order(_cells);
 }
 
+/// The last event of its kind, when what changes now is another part of what changed then: "ARFCN 21" comes in one
+/// record and "BSIC 44" in another, but it is one cell.
+Event* Tracker::unfinished(bool isCell, const std::string& before, const std::string& now) {
+    const auto last = std::find_if(_events.rbegin(), _events.rend(), [&](const Event& event) {
+        return isCell ? isCellChange(event.kind) : event.kind == Kind::Area;
+    });
+    if (last == _events.rend() || _clock - last->time > kSettling || last->to != before) return nullptr;
+    const auto parts = changedParts(before, now);
+    for (const std::string_view part : changedParts(last->from, last->to)) {
+        if (std::ranges::find(parts, part) != parts.end()) return nullptr;
+    }
+    return &*last;
+}
+
+void Tracker::complete(Event& event, std::string_view name, const std::string& now) {
+    event.to = shortened(now, Event::kLongestText);
+    const auto value = std::ranges::find(event.values, name, &EventValue::name);
+    if (value != event.values.end()) value->after = shortened(now, Event::kLongestValue);
+}
+
 void Tracker::noteServing() {
     if (_seen.cell.empty() || _seen.cell == _before.cell) return;
+    if (_seen.cellComesInParts) {
+        if (Event* change = unfinished(true, _before.cell, _seen.cell)) return complete(*change, "Cell", _seen.cell);
+    }
     const bool isFirst = _before.cell.empty();
-    const bool stays = isFresh(_level) && _before.isDedicated && _seen.isDedicated;
+    const bool wasConnected = isFresh(_level) && _before.isDedicated;
     happened({.time = _clock,
-              .kind = isFirst ? Kind::CellFound
-                      : stays ? Kind::Handover
-                              : Kind::Reselection,
+              .kind = isFirst                             ? Kind::CellFound
+                      : wasConnected && _seen.isDedicated ? Kind::Handover
+                                                          : Kind::Reselection,
               .from = _before.cell,
               .to = _seen.cell,
               .levelBefore = isFirst || !isFresh(_level) ? std::string() : _level.text,
               .record = _seen.cellRecord});
     _level.isAwaited = true;
     _quality.isAwaited = true;
+    _leftConnected = wasConnected && !isFirst ? std::optional(_now) : std::nullopt;
+}
+
+/// On another radio the record of the state may come after that of the cell.
+void Tracker::noteWhetherHandover() {
+    if (!_leftConnected || !_seen.isDedicated) return;
+    const bool isOne = _now - *_leftConnected <= kSettling;
+    _leftConnected.reset();
+    const auto change =
+        std::find_if(_events.rbegin(), _events.rend(), [](const Event& e) { return isCellChange(e.kind); });
+    if (isOne && change != _events.rend()) change->kind = Kind::Handover;
 }
 
 /// A figure that was written before the cell changed is the old cell's.
@@ -225,20 +260,11 @@ void Tracker::noteStates() {
     }
 }
 
-/// An area has parts of which a modem tells in records of their own: another "URA" and then another "LAC" are one
-/// change, unless much time lies between them. A part that was not known before is no change.
+/// A part that was not known before is no change.
 void Tracker::noteArea() {
-    const auto parts = changedParts(_before.area, _seen.area);
-    if (parts.empty()) return;
-    const auto last = std::ranges::find(_events.rbegin(), _events.rend(), Kind::Area, &Event::kind);
-    const bool goesOn = last != _events.rend() && _clock - last->time <= kSettling && last->to == _before.area &&
-                        std::ranges::none_of(changedParts(last->from, last->to), [&](std::string_view part) {
-                            return std::ranges::find(parts, part) != parts.end();
-                        });
-    if (!goesOn) return noteChange(Kind::Area, _before.area, _seen.area);
-    last->to = shortened(_seen.area, Event::kLongestText);
-    const auto value = std::ranges::find(last->values, "Area", &EventValue::name);
-    if (value != last->values.end()) value->after = shortened(_seen.area, Event::kLongestValue);
+    if (changedParts(_before.area, _seen.area).empty()) return;
+    if (Event* change = unfinished(false, _before.area, _seen.area)) return complete(*change, "Area", _seen.area);
+    noteChange(Kind::Area, _before.area, _seen.area);
 }
 
 void Tracker::noteContexts() {
@@ -258,19 +284,15 @@ void Tracker::noteContexts() {
 }
 
 void Tracker::noteService() {
-    if (!std::exchange(_isBegun, true)) {
-        if (_seen.isWithoutService) _lostSince = _now;
-        return;
-    }
-    if (_seen.isWithoutService == _before.isWithoutService) return;
-    Event event{.time = _clock, .kind = Kind::ServiceLost};
+    if (!_seen.knowsService) return;
+    const auto before = std::exchange(_isWithoutService, _seen.isWithoutService);
+    if (before == _seen.isWithoutService) return;
     if (_seen.isWithoutService) {
         _lostSince = _now;
-    } else {
-        event.kind = Kind::ServiceBack;
-        event.to = lengthText(_now - _lostSince.value_or(_now));
+        if (before) happened({.time = _clock, .kind = Kind::ServiceLost});
+    } else if (before) {
+        happened({.time = _clock, .kind = Kind::ServiceBack, .to = lengthText(_now - _lostSince)});
     }
-    happened(std::move(event));
 }
 
 void Tracker::noteChange(Kind kind, const std::string& from, const std::string& to) {

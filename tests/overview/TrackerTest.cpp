@@ -180,10 +180,15 @@ TEST(Tracker, AnotherRadioIsOneEventAndNotThree) {
 TEST(Tracker, APhoneThatNeverHadServiceHasNotLostIt) {
     Tracker tracker;
     Observation seen;
+    tracker.note(seen, kStart - 1s);
+    seen.knowsService = true;
     seen.isWithoutService = true;
     tracker.note(seen, kStart);
     EXPECT_TRUE(tracker.events().empty());
-    tracker.note(Observation(), kStart + 2s);
+    seen.isWithoutService = false;
+    tracker.note(seen, kStart + 2s);
+    ASSERT_EQ(tracker.events().size(), 1u);
+    EXPECT_EQ(tracker.events().back().kind, Kind::ServiceBack);
     EXPECT_EQ(tracker.events().back().to, "after 2.0 s");
 }
 
@@ -247,6 +252,40 @@ TEST(Tracker, TheAreasPartsAreOneChange) {
     EXPECT_EQ(tracker.events()[3].from, "LAC 13, URA 2");
 }
 
+TEST(Tracker, ACellWhoseCodeComesLaterIsOneChange) {
+    Tracker tracker;
+    const auto see = [&](const char* cell, std::uint64_t record, Time::duration after) {
+        Observation seen = servedBy(cell, record);
+        seen.cellComesInParts = true;
+        tracker.note(seen, kStart + after);
+    };
+    see("ARFCN 21, BSIC 44", 1, 0s);
+    see("ARFCN 23, BSIC 44", 2, 10s);
+    see("ARFCN 23, BSIC 42", 3, 11s);
+    ASSERT_EQ(tracker.events().size(), 2u);
+    EXPECT_EQ(tracker.events()[1].time, kStart + 10s);
+    EXPECT_EQ(tracker.events()[1].from, "ARFCN 21, BSIC 44");
+    EXPECT_EQ(tracker.events()[1].to, "ARFCN 23, BSIC 42");
+    EXPECT_EQ(tracker.events()[1].values[0], (EventValue{"Cell", "ARFCN 21, BSIC 44", "ARFCN 23, BSIC 42"}));
+    see("ARFCN 25, BSIC 42", 4, 12s);
+    EXPECT_EQ(tracker.events().size(), 3u);
+}
+
+TEST(Tracker, WithTheStateInTheNewCellAChangeIsAHandover) {
+    for (const auto& [after, kind] : {std::pair(2s, Kind::Handover), std::pair(3s, Kind::Reselection)}) {
+        Tracker tracker;
+        Observation seen = servedBy("A", 1);
+        seen.isDedicated = true;
+        tracker.note(seen, kStart);
+        seen = servedBy("B", 2);
+        tracker.note(seen, kStart + 1s);
+        EXPECT_EQ(tracker.events()[1].kind, Kind::Reselection);
+        seen.isDedicated = true;
+        tracker.note(seen, kStart + 1s + after);
+        EXPECT_EQ(tracker.events()[1].kind, kind);
+    }
+}
+
 TEST(Tracker, ContextsComeAndGo) {
     Tracker tracker;
     Observation seen = servedBy("A", 1);
@@ -266,6 +305,7 @@ TEST(Tracker, ContextsComeAndGo) {
 TEST(Tracker, LossOfServiceHasALength) {
     Tracker tracker;
     Observation seen = servedBy("A", 1);
+    seen.knowsService = true;
     tracker.note(seen, kStart);
     seen.isWithoutService = true;
     tracker.note(seen, kStart + 1s);

@@ -35,6 +35,7 @@ void observeGsm(Observation& seen, const Screens& screens, std::uint64_t leftUmt
     const Screens cell(screens.at(kGsmCell));
     seen.access = "GSM";
     seen.state = stateSince(leftUmts, screens, kRrState);
+    if (seen.state == "RR_INACTIVE") seen.state.clear();  // on its way to UMTS, or there already
     seen.isDedicated = seen.state == "RR_DATA_TRANSFER" || seen.state == "RR_G2W_INTERRAT_HANDOVER_ PROGRESS";
     seen.cellComesInParts = true;
     seen.channel = named("ARFCN", cell.text("ARFCN"));

@@ -179,6 +179,7 @@ Event* Tracker::unfinished(bool isCell, const std::string& before, const std::st
     });
     if (last == _events.rend() || _clock - last->time > kSettling || last->to != before) return nullptr;
     const auto parts = changedParts(before, now);
+    if (parts.empty()) return nullptr;
     for (const std::string_view part : changedParts(last->from, last->to)) {
         if (std::ranges::find(parts, part) != parts.end()) return nullptr;
     }
@@ -197,7 +198,7 @@ void Tracker::noteServing() {
         if (Event* change = unfinished(true, _before.cell, _seen.cell)) return complete(*change, "Cell", _seen.cell);
     }
     const bool isFirst = _before.cell.empty();
-    const bool wasConnected = isFresh(_level) && _before.isDedicated;
+    const bool wasConnected = isFresh(_level) && _connectedSince && _now - *_connectedSince >= kMoment;
     happened({.time = _clock,
               .kind = isFirst                             ? Kind::CellFound
                       : wasConnected && _seen.isDedicated ? Kind::Handover
@@ -211,8 +212,10 @@ void Tracker::noteServing() {
     _leftConnected = wasConnected && !isFirst ? std::optional(_now) : std::nullopt;
 }
 
-/// On another radio the record of the state may come after that of the cell.
+/// On another radio the record of the state may come after that of the cell; between the two it is not known.
 void Tracker::noteWhetherHandover() {
+    if (!_seen.isDedicated && !_seen.state.empty()) _connectedSince.reset();
+    if (_seen.isDedicated && !_connectedSince) _connectedSince = _now;
     if (!_leftConnected || !_seen.isDedicated) return;
     const bool isOne = _now - *_leftConnected <= kSettling;
     _leftConnected.reset();
@@ -262,9 +265,8 @@ void Tracker::noteStates() {
 
 /// A part that was not known before is no change.
 void Tracker::noteArea() {
-    if (changedParts(_before.area, _seen.area).empty()) return;
     if (Event* change = unfinished(false, _before.area, _seen.area)) return complete(*change, "Area", _seen.area);
-    noteChange(Kind::Area, _before.area, _seen.area);
+    if (!changedParts(_before.area, _seen.area).empty()) noteChange(Kind::Area, _before.area, _seen.area);
 }
 
 void Tracker::noteContexts() {

@@ -24,7 +24,8 @@ public:
     static constexpr auto kHeardFor = std::chrono::seconds(30);  ///< a cell stays that long after it was heard
     static constexpr auto kLostFor = std::chrono::seconds(10);   ///< and that much longer, marked
     static constexpr auto kSettling = std::chrono::seconds(2);   ///< within which several records tell of one change
-    static constexpr double kSteady = 2.0;                       ///< dB by which a cell overtakes the one above
+    static constexpr auto kMoment = std::chrono::milliseconds(100);  ///< within which all belong to one step of a modem
+    static constexpr double kSteady = 2.0;                           ///< dB by which a cell overtakes the one above
 
     struct Limits {
         std::size_t events = 2000;
@@ -93,6 +94,7 @@ private:
     std::deque<Event> _events;
     Followed _level;
     Followed _quality;
+    std::optional<Time> _connectedSince;    // as the last state said that was known
     std::optional<Time> _leftConnected;     // a cell, and the state in the new one is not known yet
     std::optional<bool> _isWithoutService;  // none while the screens have not told
     Time _lostSince{};                      // service

@@ -101,6 +101,12 @@ TEST(GsmUmtsObservation, AStateOfAnEarlierVisitIsNone) {
     EXPECT_EQ(seen(6, 9).state, "RR_DATA_TRANSFER");
 }
 
+TEST(GsmUmtsObservation, AnInactiveLayerHasNoState) {
+    const Value cells =
+        group({{"GSM Serving Cell", gsmCell(3)}, {"GSM RR Info", shown({{"RR State", "RR_INACTIVE"}}, 4)}});
+    EXPECT_EQ(observe(Technology::GSM, group({{"GSM Cell and Neighbours", cells}})).state, "");
+}
+
 TEST(GsmUmtsObservation, RankedCellsBearTheirCarrier) {
     const Value ranked = shown(
         {{"Scrambling Code", "30"}, {"Downlink Frequency", "10562"}, {"RSCP", "-80 dB"}, {"Energy Per Chip", "-9 dB"}});

@@ -58,12 +58,27 @@ TEST(Tracker, AChangeOfCellOutOfAConnectionIsAReselection) {
 
 TEST(Tracker, AChangeOfCellWithinAConnectionIsAHandover) {
     Tracker tracker;
-    for (const auto& [cell, record] : {std::pair("A", 1), std::pair("B", 2)}) {
-        Observation seen = servedBy(cell, static_cast<std::uint64_t>(record));
-        seen.isDedicated = true;
-        tracker.note(seen, kStart);
-    }
+    Observation seen = servedBy("A", 1);
+    seen.isDedicated = true;
+    tracker.note(seen, kStart);
+    seen = servedBy("B", 2);
+    seen.isDedicated = true;
+    tracker.note(seen, kStart + 100ms);
     EXPECT_EQ(tracker.events().back().kind, Kind::Handover);
+}
+
+TEST(Tracker, AConnectionThatBeganWithTheNewCellIsNotHandedOver) {
+    Tracker tracker;
+    Observation seen = servedBy("A", 1);
+    seen.state = "idle";
+    tracker.note(seen, kStart);
+    seen.state = "connected";  // which a record tells before the cell's
+    seen.isDedicated = true;
+    tracker.note(seen, kStart + 1s);
+    seen.cell = "B";
+    seen.cellRecord = 2;
+    tracker.note(seen, kStart + 1s + 20ms);
+    EXPECT_EQ(tracker.events().back().kind, Kind::Reselection);
 }
 
 TEST(Tracker, ALevelThatIsOlderThanTheChangeIsTheOldCells) {
@@ -283,6 +298,27 @@ TEST(Tracker, WithTheStateInTheNewCellAChangeIsAHandover) {
         seen.isDedicated = true;
         tracker.note(seen, kStart + 1s + after);
         EXPECT_EQ(tracker.events()[1].kind, kind);
+    }
+}
+
+TEST(Tracker, WhileTheStateIsNotKnownAPhoneIsAsItWas) {
+    for (const auto& [between, kind] : {std::pair("", Kind::Handover), std::pair("idle", Kind::Reselection)}) {
+        Tracker tracker;
+        Observation seen = servedBy("A", 1);
+        seen.state = "connected";
+        seen.isDedicated = true;
+        tracker.note(seen, kStart);
+        seen.state = between;
+        seen.isDedicated = false;
+        tracker.note(seen, kStart + 100ms);
+        seen = servedBy("B", 2);
+        seen.state = "connected";
+        seen.isDedicated = true;
+        tracker.note(seen, kStart + 200ms);
+        const auto& events = tracker.events();
+        const auto change = std::ranges::find(events, std::string("B"), &Event::to);
+        ASSERT_NE(change, events.end());
+        EXPECT_EQ(change->kind, kind);
     }
 }
 

@@ -14,11 +14,13 @@ constexpr std::size_t kMostKnown = 1 << 16;
 constexpr int kRounds = 10;
 
 // clang-format off
-constexpr std::array<std::uint64_t, 22> kBounds = {
+// From 2^31 on numbers are shown as negative ones too, and keep the digits of those.
+constexpr auto kBounds = std::to_array<std::uint64_t>({
     0, 1, 10, 100, 255, 256, 1'000, 10'000, 65'535, 65'536, 100'000, 1'000'000, 10'000'000, 100'000'000,
-    268'435'455, 268'435'456, 1'000'000'000, 2'147'483'647, 2'147'483'648, 4'294'967'295, 4'294'967'296,
-    std::uint64_t{1} << 33,
-};
+    268'435'455, 268'435'456, 1'000'000'000, 2'147'483'647, 2'147'483'648, 3'294'967'297, 4'194'967'297,
+    4'284'967'297, 4'293'967'297, 4'294'867'297, 4'294'957'297, 4'294'966'297, 4'294'967'197, 4'294'967'287,
+    4'294'967'295, 4'294'967'296,
+});
 // clang-format on
 
 void startSodium() {

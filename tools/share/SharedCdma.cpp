@@ -75,6 +75,7 @@ void take1xStatus(RecordCopy& copy) {
         const std::size_t extras = copy.count(at + 9, u8);
         const SharedField energy[] = {{static_cast<std::uint16_t>(12 + 4 * extras), u16}};
         const std::size_t stride = (6 * extras + 15) / 4 * 4;
+        // Without extra entries a pilot's energy is read where the next one's offset is: that goes first.
         copy.takeEntries(at + 12, stride, copy.count(at + 8, u8), kPilot);
         copy.takeEntries(at + 12, stride, copy.count(at + 8, u8), energy);
     });

@@ -21,6 +21,22 @@ constexpr std::size_t kCodeAt = 3;
 constexpr std::size_t kTimestampAt = 5;
 constexpr std::size_t kLongestRecord = 65'535;
 
+/// A record that the adaptation refuses and screens show all the same: one that was cut, or an older version, or a
+/// newer one's number on what has exactly the fixed layout's length.
+bool isInFixedLayout(ByteView packet, adaptation::Refusal refusal) {
+    const RecordView record(packet);
+    const std::size_t size = packet.size() - kPayloadOffset;
+    const std::int64_t version = record.read(kPayloadOffset, u8);
+    switch (logCode(packet.data())) {
+        case 0xB0C1: return version < 2 || size == 9;
+        case 0xB0C2: return version < 3 || size == 25;
+        case 0xB179: return version < 3;
+        case 0xB17F: return version < 3 || size == 20;
+        case 0xB180: return version < 4;
+        default: return refusal == adaptation::Refusal::TooShort;
+    }
+}
+
 void put(Bytes& bytes, std::size_t at, std::size_t count, std::uint64_t value) {
     for (std::size_t i = 0; i < count; ++i) bytes[at + i] = static_cast<std::uint8_t>(value >> 8 * i);
 }
@@ -42,7 +58,7 @@ std::optional<ByteView> RecordSharer::shareRecord(ByteView message) {
         return leftOut("message that is no record");
     }
     const Adapted adapted = _adapter->adapt(packet);
-    if (adapted.outcome == Adapted::Outcome::Refused) {
+    if (adapted.outcome == Adapted::Outcome::Refused && !isInFixedLayout(packet, adapted.refusal)) {
         if (adapted.refusal == adaptation::Refusal::NotOurs)
             return leftOut("record of a code that Kelvo does not know");
         return leftOut("record in a layout that Kelvo cannot read");

@@ -232,6 +232,8 @@ constexpr SharedKey kKeys[] = {
     { "", "EF-ADMINISTRATIVE DATA",                   None           },
     { "", "EF-RAT MODE",                              None           },
     { "", "Context ID",                               None           },
+    { "PDP Context Info", "Address",                  Address        },
+    { "PDP Context Info", "Type",                     None           },
     { "", "PDP Type",                                 None           },
     { "", "Quality of Service",                       None           },
 };

@@ -71,6 +71,17 @@ TEST_F(DecodeCommand, TellsTheRecordBehindEachValueWhenAsked) {
     EXPECT_EQ(display["Measured Neighbor Cells"].dump(), "[]");
 }
 
+TEST_F(DecodeCommand, TellsTheNumbersOfACellMonitorsTextsWithTheirProvenanceAlone) {
+    const std::string_view tree = "{ Serving = { MNC = 01; RSSI = \"-71 dBm\"; C1 = 33; }; }";
+    const std::string file = capture(Technology::IFX, {Bytes(tree.begin(), tree.end())});
+    EXPECT_EQ(json({"decode", "--json", file})["display"]["Serving"].dump(),
+              R"({"MNC":"01","RSSI":"-71 dBm","C1":"33"})");
+    const auto serving = json({"decode", "--json", "--provenance", file})["display"]["Serving"];
+    EXPECT_EQ(serving["RSSI"].dump(), R"({"text":"-71 dBm","number":-71,"unit":"dBm","record":1,"age":0.0})");
+    EXPECT_EQ(serving["MNC"].dump(), R"({"text":"01","record":1,"age":0.0})");
+    EXPECT_EQ(serving["C1"].dump(), R"({"text":"33","number":33,"record":1,"age":0.0})");
+}
+
 TEST_F(DecodeCommand, LeavesTheMarksOfAnOrderAloneAndWantsJsonForProvenance) {
     const std::string file = capture(Technology::CDMA, {test::Record(0x1183, 50).bytes()});
     const auto display = json({"decode", "--json", "--provenance", file})["display"];

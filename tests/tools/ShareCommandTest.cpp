@@ -510,6 +510,14 @@ TEST_F(ShareCommand, ShiftsTheTimesOfASnapshotAndHidesItsZone) {
     EXPECT_NE(listed.find("Snapshot (2020-01-01 00:00:00 +0000)"), std::string::npos) << listed;
 }
 
+TEST_F(ShareCommand, HidesTheZoneOfASnapshotWithItsCells) {
+    const std::string in = snapshot({lteMessages().front()}, Dictionary::make({}));
+    share(in);
+    EXPECT_NE(kelvoctl({"snapshot", out()}).output.find("Snapshot (2023-11-04 08:15:02 +0000)"), std::string::npos);
+    share(in, {"--keep-cells"});
+    EXPECT_NE(kelvoctl({"snapshot", out()}).output.find("Snapshot (2023-11-04 09:15:02 +0100)"), std::string::npos);
+}
+
 TEST_F(ShareCommand, CopiesWhatIsGoodAndTellsWhereItStopped) {
     const std::string in = capture(Technology::LTE, lteMessages());
     const std::string whole = contentsOf(in);

@@ -154,6 +154,14 @@ TEST_F(ShareCommand, HidesTheZoneOfASnapshotWithItsCells) {
     EXPECT_NE(kelvoctl({"snapshot", out()}).output.find("Snapshot (2023-11-04 09:15:02 +0100)"), std::string::npos);
 }
 
+TEST_F(ShareCommand, RemovesADateThatNoClockShows) {
+    const Value all = Dictionary::make({{"Timestamp", "4022-02-28 08:15:02 +0000"}, {"Data", Array::make({})}});
+    const Finished done = share(directory.write("in.kelvo", *writeXmlPropertyList(all)), {"--shift-times"});
+    EXPECT_EQ(done.status, 0) << done.errors;
+    EXPECT_NE(done.output.find("        1  entry of a snapshot that Kelvo does not know\n"), std::string::npos);
+    EXPECT_EQ(contentsOf(out()).find("4022"), std::string::npos);
+}
+
 TEST_F(ShareCommand, CopiesWhatIsGoodAndTellsWhereItStopped) {
     const std::string in = capture(Technology::LTE, lteMessages());
     const std::string whole = contentsOf(in);

@@ -16,6 +16,7 @@
 #include "tools/SnapshotCommand.h"
 #include "tools/StartCommandCommand.h"
 #include "tools/WatchCommand.h"
+#include "tools/report/ReportCommand.h"
 
 namespace {
 
@@ -47,6 +48,7 @@ int main(int argc, char** argv) {
     kelvo::addDecodeCommand(app);
     kelvo::addWatchCommand(app);
     kelvo::addEventsCommand(app);
+    kelvo::addReportCommand(app);
     kelvo::addSnapshotCommand(app);
     kelvo::addImportCommand(app);
     kelvo::addStartCommandCommand(app);

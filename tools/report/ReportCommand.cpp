@@ -1,0 +1,82 @@
+#include "tools/report/ReportCommand.h"
+
+#include <fmt/format.h>
+
+#include <memory>
+#include <optional>
+#include <string>
+#include <vector>
+
+#include "platform/encodings/Utf8.h"
+#include "platform/system/OutputFile.h"
+#include "tools/Command.h"
+#include "tools/CommandFailure.h"
+#include "tools/StandardOutput.h"
+#include "tools/TechnologyOption.h"
+#include "tools/inputs/Input.h"
+#include "tools/report/FollowDrive.h"
+#include "tools/report/ReportPage.h"
+
+namespace kelvo {
+namespace {
+
+struct Options {
+    std::vector<std::string> files;
+    std::string out;
+    std::string title;
+    std::optional<Technology> technology;
+    bool force = false;
+};
+
+void writeReport(const Options& options) {
+    if (options.files.size() > report::kMostDrives) {
+        throw CommandFailure(fmt::format("a report compares at most {} files", report::kMostDrives));
+    }
+    OutputFile file = orFail(OutputFile::create(options.out, {options.force, filesOf(options.files)}));
+    std::vector<report::Drive> drives;
+    std::optional<Failure> breakOff;
+    std::uint64_t records = 0;
+    for (const std::string& path : options.files) {
+        Input input = orFail(Input::open(path, options.technology));
+        drives.push_back(report::followDrive(input));
+        records += drives.back().records;
+        if (input.breakOff()) breakOff = input.breakOff();
+    }
+    const std::string page = report::reportPage(drives, {options.title, false});
+    orFail(file.write({reinterpret_cast<const std::uint8_t*>(page.data()), page.size()}));
+    orFail(file.appear());
+    writeToStandardOutput(
+        fmt::format("{} record{} reported in {}\n", records, records == 1 ? "" : "s", printable(options.out)));
+    if (breakOff) throw CommandFailure(*breakOff);
+}
+
+}  // namespace
+
+void addReportCommand(CLI::App& app) {
+    CLI::App& command = addCommand(
+        app, "report", "Makes a page of recordings, for a browser or paper: figures, charts, cells, states, events");
+    const auto options = std::make_shared<Options>();
+    command
+        .add_option("FILE", options->files,
+                    "Captures, snapshots, whatever \"kelvoctl import\" reads; - for a capture from standard input")
+        ->required();
+    command.add_option("-o,--output", options->out, "Writes the page to REPORT.html")
+        ->type_name("REPORT.html")
+        ->required();
+    command.add_option("--title", options->title, "Calls the report that, not by the names of the files")
+        ->type_name("TEXT");
+    addTechnologyOption(command, options->technology, "Takes this technology, whatever the file says");
+    command.add_flag("--force", options->force, "Replaces a file that is there already");
+    command.footer(
+        "One file is told of by itself; two to six are compared, their charts aligned by the time since the start.\n"
+        "The page needs neither network nor other files, and no script to be read or printed.\n"
+        "Of a file that breaks off, the good part is told of; then one line tells where it ends, and the status is "
+        "1.\n\n"
+        "Examples:\n"
+        "  kelvoctl report drive.pcap -o drive.html\n"
+        "  kelvoctl report before.pcap after.pcap --title \"New antenna\" -o antenna.html\n"
+        "  zcat drive.pcap.gz | kelvoctl report - -o drive.html\n");
+    command.callback([options] { writeReport(*options); });
+}
+
+}  // namespace kelvo

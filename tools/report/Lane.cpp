@@ -30,6 +30,7 @@ void Lane::close(Elapsed at) {
 }
 
 void Lane::thin() {
+    putTogether();
     while (_segments.size() > kMostSegments / 2) {
         _width *= 2;
         putTogether();

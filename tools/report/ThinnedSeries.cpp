@@ -8,7 +8,12 @@ namespace kelvo::report {
 
 void ThinnedSeries::add(Elapsed at, double value) {
     if (!std::isfinite(value)) return;
-    merge(_steps, {at / _width, at, at, value, value, value, 1, std::exchange(_begins, false)});
+    const Step step{at / _width, at, at, value, value, value, 1, std::exchange(_begins, false)};
+    if (step.begins) {
+        _steps.push_back(step);
+    } else {
+        merge(_steps, step);
+    }
     while (_steps.size() > kMostSteps) widen();
 }
 

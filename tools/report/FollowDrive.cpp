@@ -11,6 +11,7 @@
 #include "tools/CapturePackets.h"
 #include "tools/FamilyCodes.h"
 #include "tools/report/DriveRecorder.h"
+#include "tools/report/Words.h"
 
 namespace kelvo::report {
 namespace {
@@ -84,7 +85,7 @@ std::string withoutFolder(std::string sentence, const std::string& path, const s
 
 }  // namespace
 
-Drive followDrive(Input& input) {
+Drive followDrive(Input& input, RecordSharer* sharer) {
     const Technology technology = input.technology();
     Environment silent = Environment::current();
     silent.log = nullptr;
@@ -97,18 +98,37 @@ Drive followDrive(Input& input) {
         {.events = std::numeric_limits<std::size_t>::max(), .span = overview::Time::duration::max()});
     BothClocks clocks;
     Unread unread(*generator);
+    std::uint64_t leftOut = 0;
     while (const auto packet = input.next()) {
-        const auto time = std::chrono::floor<std::chrono::microseconds>(packet->time);
+        ByteView message = packet->bytes;
+        CaptureTime clock = packet->time;
+        if (sharer != nullptr) {
+            clock = sharer->times().host(clock);
+            const auto shared = sharer->share(message, technology);
+            if (!shared) {
+                ++leftOut;
+                continue;
+            }
+            message = *shared;
+        }
+        const auto time = std::chrono::floor<std::chrono::microseconds>(clock);
         orTell(input.name(), input.count(),
-               [&] { update(*generator, *state, records, packet->bytes, packet->time.time_since_epoch()); });
+               [&] { update(*generator, *state, records, message, clock.time_since_epoch()); });
         tracker.note(overview::observe(technology, (*state)["Display"]), time);
         clocks.note(tracker, time);
-        unread.note(records, packet->bytes);
+        unread.note(records, message);
     }
     Drive drive = clocks.end(tracker);
     drive.name = std::filesystem::path(input.name()).filename().string();
     drive.technology = technology;
     drive.codes = unread.take();
+    if (sharer != nullptr) {
+        drive.name = "shared recording";
+        if (leftOut != 0)
+            drive.remarks.push_back(counted(leftOut, "record") + " left out: Kelvo cannot look into them.");
+        if (input.breakOff()) drive.remarks.emplace_back("The recording breaks off; what comes before is told of.");
+        return drive;
+    }
     if (input.breakOff()) drive.remarks.push_back(withoutFolder(input.breakOff()->reason, input.name(), drive.name));
     for (const std::string& sentence : input.leftOut()) {
         drive.remarks.push_back(withoutFolder(sentence, input.name(), drive.name));

@@ -26,6 +26,9 @@ struct Options {
     std::string title;
     std::optional<Technology> technology;
     bool force = false;
+    bool isShared = false;
+    bool keepCells = false;
+    ShareChoices choices;
 };
 
 void writeReport(const Options& options) {
@@ -33,16 +36,21 @@ void writeReport(const Options& options) {
         throw CommandFailure(fmt::format("a report compares at most {} files", report::kMostDrives));
     }
     OutputFile file = orFail(OutputFile::create(options.out, {options.force, filesOf(options.files)}));
+    ShareChoices choices = options.choices;
+    choices.hideCells = !options.keepCells;
+    // One for all files, so that a cell is the same in each of them.
+    const Pseudonyms::Secret secret = Pseudonyms::randomSecret();
     std::vector<report::Drive> drives;
     std::optional<Failure> breakOff;
     std::uint64_t records = 0;
     for (const std::string& path : options.files) {
         Input input = orFail(Input::open(path, options.technology));
-        drives.push_back(report::followDrive(input));
+        RecordSharer sharer(choices, secret);
+        drives.push_back(report::followDrive(input, options.isShared ? &sharer : nullptr));
         records += drives.back().records;
         if (input.breakOff()) breakOff = input.breakOff();
     }
-    const std::string page = report::reportPage(drives, {options.title, false});
+    const std::string page = report::reportPage(drives, {options.title, options.isShared});
     orFail(file.write({reinterpret_cast<const std::uint8_t*>(page.data()), page.size()}));
     orFail(file.appear());
     writeToStandardOutput(
@@ -66,6 +74,13 @@ void addReportCommand(CLI::App& app) {
     command.add_option("--title", options->title, "Calls the report that, not by the names of the files")
         ->type_name("TEXT");
     addTechnologyOption(command, options->technology, "Takes this technology, whatever the file says");
+    CLI::Option* share =
+        command.add_flag("--share", options->isShared,
+                         "Puts pseudonyms in place of identities, as \"kelvoctl share\" does, and names no file");
+    command.add_flag("--keep-cells", options->keepCells, "Leaves cells, areas and networks as they are")->needs(share);
+    command.add_flag("--hide-apns", options->choices.hideApns, "Replaces access point names")->needs(share);
+    command.add_flag("--shift-times", options->choices.shiftTimes, "Moves all times to the beginning of 2020")
+        ->needs(share);
     command.add_flag("--force", options->force, "Replaces a file that is there already");
     command.footer(
         "One file is told of by itself; two to six are compared, their charts aligned by the time since the start.\n"
@@ -75,6 +90,7 @@ void addReportCommand(CLI::App& app) {
         "Examples:\n"
         "  kelvoctl report drive.pcap -o drive.html\n"
         "  kelvoctl report before.pcap after.pcap --title \"New antenna\" -o antenna.html\n"
+        "  kelvoctl report drive.pcap --share -o for-others.html\n"
         "  zcat drive.pcap.gz | kelvoctl report - -o drive.html\n");
     command.callback([options] { writeReport(*options); });
 }

@@ -31,6 +31,21 @@ struct Options {
     ShareChoices choices;
 };
 
+/// Which pseudonyms there are, and what is as it was.
+std::string sharedText(const ShareChoices& choices) {
+    std::string hidden = "Identities";
+    std::string kept;
+    const auto tell = [&](bool isHidden, const std::string& what) {
+        std::string& list = isHidden ? hidden : kept;
+        list += (list.empty() ? "" : ", ") + what;
+    };
+    tell(choices.hideApns, "access points");
+    tell(choices.hideCells, "cells, areas and networks");
+    if (!choices.shiftTimes) kept += (kept.empty() ? "" : ", ") + std::string("times");
+    return hidden + " have pseudonyms." + (choices.shiftTimes ? " Times are moved, intervals stay." : "") +
+           (kept.empty() ? "" : " As they were: " + kept + ".");
+}
+
 void writeReport(const Options& options) {
     if (options.files.size() > report::kMostDrives) {
         throw CommandFailure(fmt::format("a report compares at most {} files", report::kMostDrives));
@@ -50,7 +65,8 @@ void writeReport(const Options& options) {
         records += drives.back().records;
         if (input.breakOff()) breakOff = input.breakOff();
     }
-    const std::string page = report::reportPage(drives, {options.title, options.isShared});
+    const std::string page =
+        report::reportPage(drives, {options.title, options.isShared ? sharedText(choices) : std::string()});
     orFail(file.write({reinterpret_cast<const std::uint8_t*>(page.data()), page.size()}));
     orFail(file.appear());
     writeToStandardOutput(

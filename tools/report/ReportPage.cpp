@@ -182,7 +182,7 @@ std::string reportPage(const std::vector<Drive>& drives, const PageTerms& terms)
     parts["title"] = html(titleOf(drives, terms));
     parts["version"] = html(Environment::current().version);
     parts["heading"] = heading(drives, titleOf(drives, terms));
-    if (terms.isShared) parts["shared"] = "<p class=\"shared\">Identities are replaced by pseudonyms.</p>\n";
+    if (!terms.shared.empty()) parts["shared"] = "<p class=\"shared\">" + html(terms.shared) + "</p>\n";
     parts["summary"] = isOne ? summary(drives.front()) : comparison(drives);
     parts["charts"] = chartPart(charts, drives);
     if (!isOne) parts["tables"] = section("compared", "Serving cells, compared", comparedCells(drives));

@@ -9,7 +9,7 @@ namespace kelvo::report {
 
 struct PageTerms {
     std::string title;      ///< empty: the names of the files
-    bool isShared = false;  ///< identities have been replaced
+    std::string shared;  ///< what has been replaced in them; empty: nothing
 };
 
 /// The whole page of one recording, or of two to six compared.

@@ -253,6 +253,35 @@ TEST_F(ReportCommand, ReadsACaptureFromStandardInput) {
     expectHas(contentsOf(path("out.html")), "<h1>standard input</h1>");
 }
 
+TEST_F(ReportCommand, SharedItTellsWhatItDidAndOfNobody) {
+    // One cell, one area: neither is its own pseudonym.
+    const std::string file =
+        captureOf("262011234567890.pcap",
+                  {{1000, test::servingCell(185)}, {1001, connected(185, 120)}, {1003, connected(185, 200)}});
+    const std::string open = report({file});
+    for (const char* told : {"PCI 185", "TAC 4566", "262011234567890", "1970-01-01 00:16:40"}) expectHas(open, told);
+
+    const std::string shared = report({file}, {"--share", "--shift-times"});
+    for (const char* secret : {"PCI 185", "TAC 4566", "262011234567890", "1970-01-01", "00:16:40"})
+        expectLacks(shared, secret);
+    expectHas(shared, "2020-01-01 00:00:00 to 00:00:03 UTC");
+    expectHas(shared, "cells, areas and networks have pseudonyms");
+    const std::string levels = "<th scope=\"row\">RSRP</th><td class=\"n\" data-k=\"-110\">-110 dBm</td>";
+    expectHas(open, levels);
+    expectHas(shared, levels);
+
+    const std::string kept = report({file}, {"--share", "--keep-cells"});
+    expectHas(kept, "PCI 185");
+    expectLacks(kept, "262011234567890");
+    EXPECT_EQ(kelvoctl({"report", file, "-o", path("x.html"), "--keep-cells"}).status, 1);
+}
+
+TEST_F(ReportCommand, SharedItHidesAccessPointsOnRequest) {
+    const std::string file = KELVO_TEST_CAPTURES "/lte-idle.pcap";
+    expectHas(report({file}, {"--share"}), "internet");
+    expectLacks(report({file}, {"--share", "--hide-apns"}), "internet");
+}
+
 TEST_F(ReportCommand, ThePageNeedsNothingElse) {
     const std::string page = report({drive()});
     expectHas(page, "default-src 'none'");

@@ -8,6 +8,7 @@ namespace kelvo::report {
 namespace {
 
 constexpr std::size_t kStyles = 6;
+constexpr const char* kRates = "Rates and errors";
 
 Chart& chartOf(std::vector<Chart>& charts, const std::string& title, const MeasureFigures& figures) {
     const auto known = std::ranges::find_if(
@@ -44,10 +45,13 @@ std::vector<Chart> chartsOf(const std::vector<Drive>& drives) {
     }
     for (std::size_t i = 0; i < drives.size(); ++i) {
         for (const MeasureFigures& figures : drives[i].rates) {
-            Chart& chart = chartOf(charts, "Rates and errors", figures);
+            Chart& chart = chartOf(charts, kRates, figures);
             addLine(chart, isOne ? figures.name : letterOf(i) + ": " + figures.name, chart.lines.size(),
                     figures.series);
         }
+    }
+    for (Chart& chart : charts) {  // one of its unit needs no other name
+        if (chart.title == kRates && chart.lines.size() == 1) chart.title = chart.measure;
     }
     std::erase_if(charts, [](const Chart& chart) { return chart.lines.empty(); });
     return charts;

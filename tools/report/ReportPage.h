@@ -8,7 +8,7 @@
 namespace kelvo::report {
 
 struct PageTerms {
-    std::string title;      ///< empty: the names of the files
+    std::string title;   ///< empty: the names of the files
     std::string shared;  ///< what has been replaced in them; empty: nothing
 };
 

@@ -149,7 +149,7 @@ function addChart(chart, figure) {
                     Object.assign(dots[i].style, {left: pixel(x) + 'px', top: graph.toDomYCoord(value[1]) + 'px',
                         background: colour('l' + chart.lines[i].style)});
                 }
-                parts.push(`${chart.measure} ${chart.lines[i].name} ${worded(value, chart.unit)}`);
+                parts.push(`${chart.measure}${chart.lines[i].name} ${worded(value, chart.unit)}`);
             });
         },
     });

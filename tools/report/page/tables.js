@@ -32,7 +32,7 @@ function addSorting(table) {
 
 const figures = [...document.querySelectorAll('figure.chart')];
 data.charts.forEach((chart, i) => {
-    chart.measure = chart.title.replace(/^[^:]*: /, '');
+    chart.measure = chart.title.includes(': ') ? chart.title.replace(/^[^:]*: /, '') + ' ' : '';
     addChart(chart, figures[i]);
 });
 const laneFigures = [...document.querySelectorAll('figure.states')];

@@ -92,7 +92,7 @@ std::string stateFigure(const Drive& drive, const std::string& name, const std::
 }
 
 constexpr const char* kTools =
-    "<div class=\"tools\" role=\"toolbar\" aria-label=\"Zoom of all charts\">"
+    "<div class=\"tools\" role=\"group\" aria-label=\"Zoom of all charts\">"
     "<button type=\"button\" data-do=\"in\" aria-label=\"Zoom in\">+</button>"
     "<button type=\"button\" data-do=\"out\" aria-label=\"Zoom out\">−</button>"
     "<button type=\"button\" data-do=\"earlier\" aria-label=\"Earlier\">◀</button>"

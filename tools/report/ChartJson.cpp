@@ -12,7 +12,6 @@ namespace kelvo::report {
 namespace {
 
 using Json = nlohmann::ordered_json;
-using overview::Event;
 
 std::int64_t milliseconds(Elapsed at) { return std::chrono::floor<std::chrono::milliseconds>(at).count(); }
 
@@ -84,21 +83,20 @@ Json laneJson(const NamedLane& lane) {
 
 Json driveJson(const Drive& drive) {
     const Elapsed closest = drive.length / 4000;  // more marks than that nobody can tell apart
-    std::map<Event::Kind, Elapsed> marked;
     Json stretches = Json::array();
     for (const Stretch& stretch : drive.time.stretches()) {
         const auto clock = std::chrono::floor<std::chrono::milliseconds>(stretch.time).time_since_epoch().count();
         stretches.push_back({milliseconds(stretch.at), clock});
     }
+    std::map<bool, Elapsed> marked;  // handovers and reselections each by themselves
     Differences at;
     std::string kinds;
-    for (const auto& [time, event] : drive.events) {
-        if (event.kind != Event::Kind::Handover && event.kind != Event::Kind::Reselection) continue;
-        const auto last = marked.find(event.kind);
-        if (last != marked.end() && time - last->second < closest) continue;
-        marked[event.kind] = time;
-        at.add(time);
-        kinds += event.kind == Event::Kind::Handover ? 'h' : 'r';
+    for (const CellChange& change : drive.changes) {
+        const auto last = marked.find(change.isHandover);
+        if (last != marked.end() && change.at - last->second < closest) continue;
+        marked[change.isHandover] = change.at;
+        at.add(change.at);
+        kinds += change.isHandover ? 'h' : 'r';
     }
     Json lanes = Json::array();
     for (const NamedLane& lane : drive.lanes) lanes.push_back(laneJson(lane));

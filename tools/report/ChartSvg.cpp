@@ -122,24 +122,19 @@ std::string gradeNames(const Chart& chart, const Heights& y) {
     return names;
 }
 
-bool isCellChange(const overview::Event& event) {
-    return event.kind == overview::Event::Kind::Handover || event.kind == overview::Event::Kind::Reselection;
-}
-
 /// A handover is a line, a reselection a dotted one. Many, and those of several recordings, are notches at the top.
 std::string marks(const std::vector<Drive>& drives, const Across& x) {
     std::string handovers;
     std::string reselections;
     for (std::size_t i = 0; i < drives.size(); ++i) {
-        const auto count = std::ranges::count_if(drives[i].events, [](const auto& e) { return isCellChange(e.event); });
-        const bool isFull = drives.size() == 1 && static_cast<std::size_t>(count) <= kMostFullMarks;
+        const bool isFull = drives.size() == 1 && drives[i].changes.size() <= kMostFullMarks;
         double drawn = -1;
-        for (const auto& [at, event] : drives[i].events) {
-            const double place = x(at);
-            if (!isCellChange(event) || place - drawn < 0.5) continue;
+        for (const CellChange& change : drives[i].changes) {
+            const double place = x(change.at);
+            if (place - drawn < 0.5) continue;
             drawn = place;
             const double top = kTop - 8 + 6 * static_cast<double>(i);
-            auto& path = event.kind == overview::Event::Kind::Handover ? handovers : reselections;
+            auto& path = change.isHandover ? handovers : reselections;
             path += fmt::format("M{:.1f} {}V{}", place, top, isFull ? kBottom : top + 5);
         }
     }

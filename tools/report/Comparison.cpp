@@ -104,21 +104,19 @@ std::vector<Figure> figuresOf(const std::vector<Drive>& drives) {
         [](const Drive& drive) { return static_cast<double>(drive.serving.cells.size()); });
     add("Cells heard around", Unit::Count,
         [](const Drive& drive) { return static_cast<double>(drive.neighbors.cells.size()); });
-    const std::pair<Event::Kind, const char*> kinds[] = {{Event::Kind::Handover, "Handovers"},
-                                                         {Event::Kind::Reselection, "Reselections"},
-                                                         {Event::Kind::Access, "Changes of radio"},
-                                                         {Event::Kind::Area, "Changes of area"},
-                                                         {Event::Kind::Registration, "Changes of registration"},
-                                                         {Event::Kind::Reject, "Rejects"},
-                                                         {Event::Kind::ServiceLost, "Losses of service"},
-                                                         {Event::Kind::ContextDown, "Contexts gone down"}};
-    for (const auto& [kind, name] : kinds) {
-        const bool happened = std::ranges::any_of(drives, [&](const Drive& drive) { return drive.count(kind) != 0; });
-        const bool isMain =
-            kind == Event::Kind::Handover || kind == Event::Kind::Reselection || kind == Event::Kind::Registration;
-        if (!happened && !isMain) continue;
-        add(name, Unit::Count, [&](const Drive& drive) { return static_cast<double>(drive.count(kind)); });
-    }
+    const auto addCount = [&](Event::Kind kind, const char* name, bool evenIfNone = false) {
+        const auto happened = [kind](const Drive& drive) { return drive.count(kind) != 0; };
+        if (!evenIfNone && std::ranges::none_of(drives, happened)) return;
+        add(name, Unit::Count, [kind](const Drive& drive) { return static_cast<double>(drive.count(kind)); });
+    };
+    addCount(Event::Kind::Handover, "Handovers", true);
+    addCount(Event::Kind::Reselection, "Reselections", true);
+    addCount(Event::Kind::Access, "Changes of radio");
+    addCount(Event::Kind::Area, "Changes of area");
+    addCount(Event::Kind::Registration, "Changes of registration", true);
+    addCount(Event::Kind::Reject, "Rejects");
+    addCount(Event::Kind::ServiceLost, "Losses of service");
+    addCount(Event::Kind::ContextDown, "Contexts gone down");
     addMeasures(rows, drives, &Drive::rates);
     return rows;
 }

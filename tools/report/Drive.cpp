@@ -17,8 +17,14 @@ const Lane* Drive::lane(std::string_view name) const {
 }
 
 std::uint64_t Drive::count(overview::Event::Kind kind) const {
-    return static_cast<std::uint64_t>(
-        std::ranges::count_if(events, [&](const DriveEvent& event) { return event.event.kind == kind; }));
+    const auto known = counts.find(kind);
+    return known == counts.end() ? 0 : known->second;
+}
+
+std::uint64_t Drive::eventCount() const {
+    std::uint64_t all = 0;
+    for (const auto& [kind, count] : counts) all += count;
+    return all;
 }
 
 }  // namespace kelvo::report

@@ -65,6 +65,12 @@ struct DriveEvent {
     overview::Event event;
 };
 
+/// Where another cell began to serve.
+struct CellChange {
+    Elapsed at;
+    bool isHandover;
+};
+
 /// Records of one code that Kelvo could not read.
 struct UnreadCode {
     std::uint64_t records = 0;
@@ -74,6 +80,8 @@ struct UnreadCode {
 
 /// What one recording has to tell.
 struct Drive {
+    static constexpr std::size_t kMostEvents = 1000;
+
     std::string name;  ///< of the file
     Technology technology{};
     std::uint64_t records = 0;
@@ -84,13 +92,16 @@ struct Drive {
     std::vector<MeasureFigures> rates;
     CellTable serving;
     CellTable neighbors;
-    std::vector<NamedLane> lanes;  ///< radio, network, cell, state, registration, service, contexts
-    std::vector<DriveEvent> events;
+    std::vector<NamedLane> lanes;    ///< radio, network, cell, state, registration, service, contexts
+    std::vector<DriveEvent> events;  ///< the first `kMostEvents`
+    std::map<overview::Event::Kind, std::uint64_t> counts;  ///< of all
+    std::vector<CellChange> changes;                        ///< likewise
     std::map<LogCode, UnreadCode> codes;
     std::vector<std::string> remarks;  ///< where the file breaks off, and what else of it could not be read
 
     const Lane* lane(std::string_view name) const;
     std::uint64_t count(overview::Event::Kind kind) const;
+    std::uint64_t eventCount() const;
 };
 
 }  // namespace kelvo::report

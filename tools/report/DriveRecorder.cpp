@@ -10,6 +10,7 @@ namespace {
 using namespace overview;
 
 constexpr auto kRecently = std::chrono::seconds(5);  // what was heard before is no rival of what is heard now
+constexpr std::size_t kUnsettled = 500;              // of the latest events something may change yet
 constexpr std::size_t kMostMeasures = 12;            // a recording has two to five; a hostile one must not fill a page
 
 /// Some screens show the level RSCP in dB, others in dBm, which it is in (3GPP TS 25.215, clause 5.1.1).
@@ -73,7 +74,7 @@ void DriveRecorder::note(const Tracker& tracker, std::uint64_t number, Elapsed a
     noteNeighbors(tracker, number, at, now);
     noteRates(seen, number, at);
     noteLanes(seen, at);
-    _eventTimes.resize(tracker.events().size(), at);
+    noteEvents(tracker, at);
 }
 
 void DriveRecorder::interrupt() {
@@ -90,11 +91,27 @@ void DriveRecorder::end(const Tracker& tracker, Elapsed at) {
     _serving = nullptr;
     for (NamedLane& lane : _drive.lanes) lane.lane.end(at);
     std::erase_if(_drive.lanes, [](const NamedLane& lane) { return lane.lane.segments().empty(); });
-    const auto& events = tracker.events();
-    for (std::size_t i = 0; i < events.size() && i < _eventTimes.size(); ++i) {
-        _drive.events.push_back({_eventTimes[i], events[i]});
-    }
+    while (!_eventTimes.empty()) keepOldestEvent(tracker);
     _drive.length = at;
+}
+
+/// The tracker fills in an event's levels, and finds out whether it was a handover, a while after it happened.
+void DriveRecorder::noteEvents(const Tracker& tracker, Elapsed at) {
+    _eventTimes.resize(_eventTimes.size() + (tracker.eventCount() - _eventCount), at);
+    _eventCount = tracker.eventCount();
+    while (_eventTimes.size() > kUnsettled) keepOldestEvent(tracker);
+}
+
+void DriveRecorder::keepOldestEvent(const Tracker& tracker) {
+    const std::size_t fromEnd = _eventTimes.size();
+    const Elapsed at = _eventTimes.front();
+    _eventTimes.pop_front();
+    if (fromEnd > tracker.events().size()) return;  // one record told of more than the tracker keeps
+    const Event& event = tracker.events()[tracker.events().size() - fromEnd];
+    ++_drive.counts[event.kind];
+    const bool isHandover = event.kind == Event::Kind::Handover;
+    if (isHandover || event.kind == Event::Kind::Reselection) _drive.changes.push_back({at, isHandover});
+    if (_drive.events.size() < Drive::kMostEvents) _drive.events.push_back({at, event});
 }
 
 void DriveRecorder::noteServing(const Observation& seen, Elapsed at) {

@@ -1,6 +1,7 @@
 #pragma once
 
 #include <cstdint>
+#include <deque>
 #include <string>
 
 #include "overview/Tracker.h"
@@ -26,6 +27,8 @@ private:
     void noteLevels(const overview::Observation& seen, Elapsed at);
     void noteNeighbors(const overview::Tracker& tracker, std::uint64_t number, Elapsed at, overview::Time now);
     void noteRates(const overview::Observation& seen, std::uint64_t number, Elapsed at);
+    void noteEvents(const overview::Tracker& tracker, Elapsed at);
+    void keepOldestEvent(const overview::Tracker& tracker);
     void noteLanes(const overview::Observation& seen, Elapsed at);
 
     Drive& _drive;
@@ -35,7 +38,8 @@ private:
     Elapsed _servingSince{0};
     std::uint64_t _levelRecord = 0;
     std::uint64_t _qualityRecord = 0;
-    std::vector<Elapsed> _eventTimes;
+    std::deque<Elapsed> _eventTimes;  // of those that are not in the drive yet
+    std::uint64_t _eventCount = 0;
 };
 
 }  // namespace kelvo::report

@@ -203,8 +203,7 @@ std::string eventTable(const Drive& drive) {
                                                 {"To", Kind::Text},
                                                 {"Level before", Kind::Text},
                                                 {"Level after", Kind::Text}});
-    for (std::size_t i = 0; i < drive.events.size() && i < kMostRows; ++i) {
-        const auto& [at, event] = drive.events[i];
+    for (const auto& [at, event] : drive.events) {
         table.add({whenCell(at, drive),
                    {std::string(nameOf(event.kind))},
                    textCell(event.from),
@@ -212,10 +211,10 @@ std::string eventTable(const Drive& drive) {
                    textCell(event.levelBefore),
                    textCell(event.levelAfter)});
     }
-    if (drive.events.size() <= kMostRows) return table.text();
+    if (drive.eventCount() <= drive.events.size()) return table.text();
     return table.text() +
            fmt::format("<p class=\"note\">The first {} of {}; <code>kelvoctl events</code> lists all.</p>\n",
-                       grouped(kMostRows), grouped(drive.events.size()));
+                       grouped(drive.events.size()), grouped(drive.eventCount()));
 }
 
 std::string unreadPart(const Drive& drive) {

@@ -94,8 +94,7 @@ Drive followDrive(Input& input, RecordSharer* sharer) {
     generator->limitRawLog(0);
     const DictionaryRef state = Dictionary::make();
     RecordLedger records;
-    overview::Tracker tracker(
-        {.events = std::numeric_limits<std::size_t>::max(), .span = overview::Time::duration::max()});
+    overview::Tracker tracker({.events = 2000, .span = overview::Time::duration::max()});
     BothClocks clocks;
     Unread unread(*generator);
     std::uint64_t leftOut = 0;

@@ -128,7 +128,7 @@ std::string tablesOf(const Drive& drive, const std::string& mark, const std::str
     if (!events.empty()) {
         parts += section("events" + mark, prefix + "Events",
                          fmt::format("<details><summary>{}, one by one</summary>{}</details>\n",
-                                     counted(drive.events.size(), "event"), events));
+                                     counted(drive.eventCount(), "event"), events));
     }
     return parts;
 }

@@ -1,5 +1,6 @@
 #include <set>
 
+#include "platform/encodings/Base64.h"
 #include "platform/encodings/PropertyList.h"
 #include "tests/support/CellArray.h"
 #include "tests/support/Secrets.h"
@@ -152,6 +153,17 @@ Bytes cellMonitorTree() {
     return *writeXmlPropertyList(Dictionary::make({{"Serving", Dictionary::make({{"Cell", cell}})}}));
 }
 
+/// A file's content, and behind it what its data stand for, and what that holds in its turn.
+std::string unfolded(const std::string& content) {
+    std::string all = content;
+    for (std::size_t at = all.find("<data>"); at != all.npos; at = all.find("<data>", at + 1)) {
+        const std::string text = all.substr(at + 6, all.find("</data>", at) - at - 6);
+        const auto bytes = bytesFromBase64(text);
+        if (bytes) all.append(bytes->begin(), bytes->end());
+    }
+    return all;
+}
+
 struct ShareCommand : test::KelvoctlTest {
     ShareCommand() { directory.write("key", bytesOf("a key of a test, long enough")); }
 
@@ -162,10 +174,10 @@ struct ShareCommand : test::KelvoctlTest {
     }
     /// Shares a file in which some of the secrets stand, and looks for each in the copy and in what is printed.
     void expectNoSecret(const std::string& in, std::size_t planted) {
-        const std::string before = contentsOf(in);
+        const std::string before = unfolded(contentsOf(in));
         const Finished done = share(in);
         EXPECT_EQ(done.status, 0) << done.errors;
-        const std::string after = contentsOf(out()) + done.output + done.errors;
+        const std::string after = unfolded(contentsOf(out())) + done.output + done.errors;
         std::size_t found = 0;
         std::string missing;
         for (const Secret& secret : kSecrets) {
@@ -496,6 +508,14 @@ TEST_F(ShareCommand, ShiftsTheTimesOfASnapshotAndHidesItsZone) {
     const std::string listed = kelvoctl({"snapshot", out()}).output;
     EXPECT_NE(listed.find("Timestamp    2020-01-01 00:00:00 +0000"), std::string::npos) << listed;
     EXPECT_NE(listed.find("Snapshot (2020-01-01 00:00:00 +0000)"), std::string::npos) << listed;
+}
+
+TEST_F(ShareCommand, HidesTheZoneOfASnapshotWithItsCells) {
+    const std::string in = snapshot({lteMessages().front()}, Dictionary::make({}));
+    share(in);
+    EXPECT_NE(kelvoctl({"snapshot", out()}).output.find("Snapshot (2023-11-04 08:15:02 +0000)"), std::string::npos);
+    share(in, {"--keep-cells"});
+    EXPECT_NE(kelvoctl({"snapshot", out()}).output.find("Snapshot (2023-11-04 09:15:02 +0100)"), std::string::npos);
 }
 
 TEST_F(ShareCommand, CopiesWhatIsGoodAndTellsWhereItStopped) {

@@ -41,6 +41,7 @@ for (const one of data.drives) if (one.lanes.length) addLanes(one, laneFigures[l
 const actions = {in: () => zoom(0.5, middle()), out: () => zoom(2, middle()), earlier: () => pan(-0.5), later: () => pan(0.5), all: () => show(0, length)};
 for (const button of document.querySelectorAll('.tools button')) button.addEventListener('click', actions[button.dataset.do]);
 for (const table of document.querySelectorAll('table.sortable')) addSorting(table);
+addEventListener('resize', () => read(place));
 dark.addEventListener('change', () => { for (const view of views) view.theme(); });
 if (readout) read(null);
 page.dataset.ready = Math.round(performance.now());

@@ -12,6 +12,7 @@
 #include "tools/DoctorCommand.h"
 #include "tools/EventsCommand.h"
 #include "tools/ExplainCommand.h"
+#include "tools/ExportCommand.h"
 #include "tools/ImportCommand.h"
 #include "tools/ShareCommand.h"
 #include "tools/SnapshotCommand.h"
@@ -52,6 +53,7 @@ int main(int argc, char** argv) {
     kelvo::addReportCommand(app);
     kelvo::addSnapshotCommand(app);
     kelvo::addImportCommand(app);
+    kelvo::addExportCommand(app);
     kelvo::addShareCommand(app);
     kelvo::addStartCommandCommand(app);
     kelvo::addDoctorCommand(app);

@@ -21,11 +21,11 @@ struct TrackedCell {
 /// caller's and does not go back.
 class Tracker {
 public:
-    static constexpr auto kHeardFor = std::chrono::seconds(30);  ///< a cell stays that long after it was heard
-    static constexpr auto kLostFor = std::chrono::seconds(10);   ///< and that much longer, marked
-    static constexpr auto kSettling = std::chrono::seconds(2);   ///< within which several records tell of one change
+    static constexpr auto kHeardFor = std::chrono::seconds(30);     ///< a cell stays that long after it was heard
+    static constexpr auto kLostFor = std::chrono::seconds(10);      ///< and that much longer, marked
+    static constexpr auto kSettling = std::chrono::seconds(2);      ///< within which several records tell of one change
     static constexpr auto kMoment = std::chrono::milliseconds(10);  ///< within which all belong to one step of a modem
-    static constexpr double kSteady = 2.0;                           ///< dB by which a cell overtakes the one above
+    static constexpr double kSteady = 2.0;                          ///< dB by which a cell overtakes the one above
 
     struct Limits {
         std::size_t events = 2000;
@@ -56,6 +56,8 @@ public:
     const std::vector<TrackedCell>& cells() const { return _cells; }
     /// Oldest first.
     const std::deque<Event>& events() const { return _events; }
+    /// How many there have been, those that are no longer kept among them.
+    std::uint64_t eventCount() const { return _eventCount; }
 
 private:
     /// The serving cell's level or quality.
@@ -92,6 +94,7 @@ private:
     Time _clock{};
     std::vector<TrackedCell> _cells;
     std::deque<Event> _events;
+    std::uint64_t _eventCount = 0;
     Followed _level;
     Followed _quality;
     std::optional<Time> _connectedSince;    // as the last state said that was known

@@ -18,6 +18,7 @@
 #include "tools/SnapshotCommand.h"
 #include "tools/StartCommandCommand.h"
 #include "tools/WatchCommand.h"
+#include "tools/report/ReportCommand.h"
 
 namespace {
 
@@ -49,6 +50,7 @@ int main(int argc, char** argv) {
     kelvo::addDecodeCommand(app);
     kelvo::addWatchCommand(app);
     kelvo::addEventsCommand(app);
+    kelvo::addReportCommand(app);
     kelvo::addSnapshotCommand(app);
     kelvo::addImportCommand(app);
     kelvo::addExportCommand(app);

@@ -103,5 +103,41 @@ TEST_F(EventsCommand, WhereTimesGoBackNothingIsYoungerThanNow) {
     EXPECT_EQ(json({"decode", "--overview", "--json", path("back.pcap")})["serving"]["age"], 0.0);
 }
 
+/// 0xB0C2: the cell that serves.
+Bytes broadcast(std::uint16_t channel, std::uint16_t physicalCellId, std::uint16_t area) {
+    return Record(0xB0C2, 38).u16(14, physicalCellId).u16(16, channel).u16(18, channel + 18000).u16(26, area).bytes();
+}
+
+/// What a phone with two carriers sent on a network in 2016: one is measured every 40 ms, the other every 160 ms, each
+/// as if it served; later it went to another cell.
+TEST_F(EventsCommand, OfAPhoneWithTwoCarriersOneServes) {
+    using namespace std::chrono_literals;
+    const auto measured = [](std::uint16_t channel, std::uint16_t physicalCellId, std::uint16_t rsrp) {
+        return Record(0xB179, 29).u16(17, channel).u16(19, physicalCellId).u16(23, rsrp).u16(25, 80).bytes();
+    };
+    {
+        CaptureWriter writer = test::captureAt(path("two.pcap"), Technology::LTE);
+        CaptureTime at(1453002041s);
+        const auto send = [&](const Bytes& message, std::chrono::milliseconds after) {
+            at += after;
+            ASSERT_TRUE(writer.append(at, message));
+        };
+        for (int turn = 0; turn < 5; ++turn) {
+            send(measured(5780, 185, 122), 40ms);
+            send(measured(700, 185, 132), 36ms);
+            send(measured(5780, 185, 122), 44ms);
+            send(measured(5780, 185, 122), 40ms);
+        }
+        send(broadcast(5780, 185, 21512), 95s);
+        send(measured(700, 185, 132), 100ms);
+        send(broadcast(2075, 42, 21512), 60s);
+        send(measured(2075, 42, 117), 40ms);
+    }
+    EXPECT_EQ(kelvoctl({"events", path("two.pcap")}).output,
+              "2016-01-17T03:40:41.040Z  cell found  EARFCN 5780, PCI 185 (-109.50 dBm)\n"
+              "2016-01-17T03:43:16.900Z  reselection  EARFCN 5780, PCI 185 -> EARFCN 2075, PCI 42 (-110.75 dBm)\n"
+              "2016-01-17T03:43:16.900Z  band change  17 -> 4\n");
+}
+
 }  // namespace
 }  // namespace kelvo

@@ -38,6 +38,41 @@ bool isSameCell(const std::string& one, const std::string& other) {
     return one == other || (shorter.find(',') == shorter.npos && longer.starts_with(shorter + ","));
 }
 
+/// Of characters in UTF-8 none is cut in two.
+std::string shortened(const std::string& text, std::size_t longest) {
+    if (text.size() <= longest) return text;
+    while (longest > 0 && (static_cast<unsigned char>(text[longest]) & 0xC0) == 0x80) --longest;
+    return text.substr(0, longest);
+}
+
+void addChanged(std::vector<EventValue>& values, std::string_view name, const std::string& before,
+                const std::string& after) {
+    if (before != after) values.push_back({std::string(name), before, after});
+}
+
+void addChanged(std::vector<EventValue>& values, const std::vector<Fact>& before, const std::vector<Fact>& after) {
+    for (const Fact& fact : before) {
+        const auto same = std::ranges::find(after, fact.name, &Fact::name);
+        addChanged(values, fact.name, fact.text, same != after.end() ? same->text : std::string());
+    }
+    for (const Fact& fact : after) {
+        if (std::ranges::find(before, fact.name, &Fact::name) == before.end())
+            addChanged(values, fact.name, {}, fact.text);
+    }
+}
+
+std::vector<Fact> factsOf(const std::vector<Context>& contexts) {
+    std::vector<Fact> facts;
+    facts.reserve(contexts.size());
+    for (const Context& context : contexts) facts.push_back({context.name, context.text});
+    return facts;
+}
+
+std::string lengthText(Time::duration length) {
+    const auto milliseconds = std::chrono::duration_cast<std::chrono::milliseconds>(length).count();
+    return fmt::format("after {:.1f} s", static_cast<double>(milliseconds) / 1000);
+}
+
 }  // namespace
 
 std::string_view nameOf(Event::Kind kind) {
@@ -54,124 +89,190 @@ std::string_view nameOf(Event::Kind kind) {
         case Kind::ContextUp: return "context up";
         case Kind::ContextDown: return "context down";
         case Kind::ServiceLost: return "service lost";
-        case Kind::ServiceBack: break;
+        case Kind::ServiceBack: return "service back";
+        case Kind::ConnectionLost: return "connection lost";
+        case Kind::ConnectionBack: break;
     }
-    return "service back";
+    return "connection back";
 }
 
-void Tracker::note(Observation seen, Time now) {
-    const Observation before = std::exchange(_seen, std::move(seen));
-    noteCells(now);
-    noteServing(before, now);
-    noteLevel(now);
-    noteStates(before, now);
-    noteContexts(before, now);
-    noteService(before, now);
+void Tracker::note(Observation seen, Time now, Time clock) {
+    _before = std::exchange(_seen, std::move(seen));
+    _now = now;
+    _clock = clock;
+    noteCells();
+    noteServing();
+    noteStates();
+    noteContexts();
+    noteService();
+    noteFigure(_level, _seen.level, true);
+    noteFigure(_quality, _seen.quality, false);
 }
 
-void Tracker::noteCells(Time now) {
-    for (const HeardCell& heard : _seen.cells) {
-        const auto known = std::ranges::find_if(
-            _cells, [&](const TrackedCell& cell) { return isSameCell(cell.heard.identity, heard.identity); });
-        if (known == _cells.end()) {
-            _cells.push_back({heard, now, false});
-        } else if (heard.record > known->heard.record) {
-            const std::string identity = std::max(known->heard.identity, heard.identity);  // that with its code
-            *known = {heard, now, false};
-            known->heard.identity = identity;
-        }
-    }
+void Tracker::letPass(Time now) {
     std::erase_if(_cells, [&](const TrackedCell& cell) {
         return isSameCell(cell.heard.identity, _seen.cell) || now - cell.lastHeard > kHeardFor + kLostFor;
     });
     for (TrackedCell& cell : _cells) cell.isLost = now - cell.lastHeard > kHeardFor;
+}
+
+void Tracker::noteConnectionLost(Time clock) { append({.time = clock, .kind = Kind::ConnectionLost}); }
+
+void Tracker::noteConnectionBack(Time clock, Time::duration lost) {
+    append({.time = clock, .kind = Kind::ConnectionBack, .to = lengthText(lost)});
+}
+
+void Tracker::restart() {
+    std::deque<Event> events = std::move(_events);
+    *this = Tracker(_limits);
+    _events = std::move(events);
+}
+
+void Tracker::noteCells() {
+    for (const HeardCell& heard : _seen.cells) {
+        const auto known = std::ranges::find_if(
+            _cells, [&](const TrackedCell& cell) { return isSameCell(cell.heard.identity, heard.identity); });
+        if (known == _cells.end()) {
+            _cells.push_back({heard, _now, false});
+        } else if (heard.record > known->heard.record) {
+            const std::string identity = std::max(known->heard.identity, heard.identity);  // that with its code
+            *known = {heard, _now, false};
+            known->heard.identity = identity;
+        }
+    }
+    letPass(_now);
     order(_cells);
 }
 
-void Tracker::noteServing(const Observation& before, Time now) {
-    if (_seen.cell.empty() || _seen.cell == before.cell) return;
-    const bool isFirst = before.cell.empty();
-    const bool isFresh = _levelTime && now - *_levelTime <= kHeardFor;
-    const bool stays = isFresh && before.isDedicated && _seen.isDedicated;
-    happened({.time = now,
+void Tracker::noteServing() {
+    if (_seen.cell.empty() || _seen.cell == _before.cell) return;
+    const bool isFirst = _before.cell.empty();
+    const bool stays = isFresh(_level) && _before.isDedicated && _seen.isDedicated;
+    happened({.time = _clock,
               .kind = isFirst ? Kind::CellFound
                       : stays ? Kind::Handover
                               : Kind::Reselection,
-              .from = before.cell,
+              .from = _before.cell,
               .to = _seen.cell,
-              .levelBefore = isFirst || !isFresh ? std::string() : _level,
-              .levelAfter = {},
+              .levelBefore = isFirst || !isFresh(_level) ? std::string() : _level.text,
               .record = _seen.cellRecord});
-    _awaitsLevel = true;
+    _level.isAwaited = true;
+    _quality.isAwaited = true;
 }
 
-/// A level that was written before the cell changed is the old cell's.
-void Tracker::noteLevel(Time now) {
-    if (!_seen.level) return;
-    if (std::exchange(_levelRecord, _seen.level->figure.record) != _levelRecord) _levelTime = now;
-    if (_levelRecord < _seen.cellRecord) return;
-    _level = _seen.level->figure.text;
-    if (!std::exchange(_awaitsLevel, false)) return;
-    const auto change =
-        std::find_if(_events.rbegin(), _events.rend(), [](const Event& e) { return isCellChange(e.kind); });
-    if (change != _events.rend()) change->levelAfter = _level;
+/// A figure that was written before the cell changed is the old cell's.
+void Tracker::noteFigure(Followed& followed, const std::optional<Measure>& now, bool isLevel) {
+    if (!now) return;
+    if (std::exchange(followed.record, now->figure.record) != followed.record) followed.time = _now;
+    if (followed.record < _seen.cellRecord) return;
+    followed.text = now->figure.text;
+    if (std::exchange(followed.isAwaited, false)) fillIn(*now, isLevel);
 }
 
-void Tracker::noteStates(const Observation& before, Time now) {
-    noteChange(Kind::Access, before.access, _seen.access, now);
-    if (before.access == _seen.access) {  // bands and states of two radios do not compare
-        noteChange(Kind::Band, before.band, _seen.band, now);
-        noteChange(Kind::State, before.state, _seen.state, now);
+/// The first figure of the cell that began to serve, which the events from then on lack.
+void Tracker::fillIn(const Measure& figure, bool isLevel) {
+    const std::string name = shortened(figure.name, Event::kLongestValue);
+    const std::string text = shortened(figure.figure.text, Event::kLongestValue);
+    for (auto event = _events.rbegin(); event != _events.rend(); ++event) {
+        const bool isChange = isCellChange(event->kind);
+        const auto value = std::ranges::find(event->values, name, &EventValue::name);
+        if (value != event->values.end()) {
+            if (value->after.empty()) value->after = text;
+        } else if (isChange && event->values.size() < Event::kMostValues) {
+            event->values.push_back({name, {}, text});
+        }
+        if (isChange && isLevel) event->levelAfter = text;
+        if (isChange) return;
     }
-    noteChange(Kind::Area, before.area, _seen.area, now);
-    noteChange(Kind::Registration, before.registrationState, _seen.registrationState, now);
-    if (_seen.reject != before.reject && !_seen.reject.empty()) {
-        happened(
-            {.time = now, .kind = Kind::Reject, .from = {}, .to = _seen.reject, .levelBefore = {}, .levelAfter = {}});
+}
+
+void Tracker::noteStates() {
+    noteChange(Kind::Access, _before.access, _seen.access);
+    if (_before.access == _seen.access) {  // bands and states of two radios do not compare
+        noteChange(Kind::Band, _before.band, _seen.band);
+        noteChange(Kind::State, _before.state, _seen.state);
+    }
+    noteChange(Kind::Area, _before.area, _seen.area);
+    noteChange(Kind::Registration, _before.registrationState, _seen.registrationState);
+    if (_seen.reject != _before.reject && !_seen.reject.empty()) {
+        happened({.time = _clock, .kind = Kind::Reject, .to = _seen.reject});
     }
 }
 
-void Tracker::noteContexts(const Observation& before, Time now) {
+void Tracker::noteContexts() {
     const auto tell = [&](Kind kind, const std::vector<Context>& those, const std::vector<Context>& others) {
         for (const Context& context : those) {
             const auto isThere = [&](const Context& other) { return other.isUp && other.name == context.name; };
             if (!context.isUp || std::ranges::any_of(others, isThere)) continue;
             const bool isUp = kind == Kind::ContextUp;
-            happened({.time = now,
+            happened({.time = _clock,
                       .kind = kind,
                       .from = isUp ? std::string() : context.name,
-                      .to = isUp ? context.name : std::string(),
-                      .levelBefore = {},
-                      .levelAfter = {}});
+                      .to = isUp ? context.name : std::string()});
         }
     };
-    tell(Kind::ContextDown, before.contexts, _seen.contexts);
-    tell(Kind::ContextUp, _seen.contexts, before.contexts);
+    tell(Kind::ContextDown, _before.contexts, _seen.contexts);
+    tell(Kind::ContextUp, _seen.contexts, _before.contexts);
 }
 
-void Tracker::noteService(const Observation& before, Time now) {
+void Tracker::noteService() {
     if (!std::exchange(_isBegun, true)) {
-        if (_seen.isWithoutService) _lostSince = now;
+        if (_seen.isWithoutService) _lostSince = _now;
         return;
     }
-    if (_seen.isWithoutService == before.isWithoutService) return;
-    Event event{.time = now, .kind = Kind::ServiceLost, .from = {}, .to = {}, .levelBefore = {}, .levelAfter = {}};
+    if (_seen.isWithoutService == _before.isWithoutService) return;
+    Event event{.time = _clock, .kind = Kind::ServiceLost};
     if (_seen.isWithoutService) {
-        _lostSince = now;
+        _lostSince = _now;
     } else {
         event.kind = Kind::ServiceBack;
-        const auto length = std::chrono::duration_cast<std::chrono::milliseconds>(now - _lostSince.value_or(now));
-        event.to = fmt::format("after {:.1f} s", static_cast<double>(length.count()) / 1000);
+        event.to = lengthText(_now - _lostSince.value_or(_now));
     }
     happened(std::move(event));
 }
 
-void Tracker::noteChange(Kind kind, const std::string& from, const std::string& to, Time now) {
+void Tracker::noteChange(Kind kind, const std::string& from, const std::string& to) {
     if (from == to || from.empty() || to.empty()) return;
-    happened({.time = now, .kind = kind, .from = from, .to = to, .levelBefore = {}, .levelAfter = {}});
+    happened({.time = _clock, .kind = kind, .from = from, .to = to});
+}
+
+void Tracker::addFigure(std::vector<EventValue>& values, const Followed& followed, const std::optional<Measure>& before,
+                        const std::optional<Measure>& after) const {
+    const std::string then = before && isFresh(followed) ? followed.text : std::string();
+    const std::string now = after && after->figure.record >= _seen.cellRecord ? after->figure.text : std::string();
+    const bool isOne = before && after && before->name == after->name;
+    if (!then.empty()) values.push_back({before->name, then, isOne ? now : std::string()});
+    if (!now.empty() && (then.empty() || !isOne)) values.push_back({after->name, {}, now});
+}
+
+std::vector<EventValue> Tracker::valuesAround() const {
+    std::vector<EventValue> values;
+    addChanged(values, "Cell", _before.cell, _seen.cell);
+    addFigure(values, _level, _before.level, _seen.level);
+    addFigure(values, _quality, _before.quality, _seen.quality);
+    addChanged(values, "Radio", _before.access, _seen.access);
+    addChanged(values, "State", _before.state, _seen.state);
+    addChanged(values, "Area", _before.area, _seen.area);
+    addChanged(values, _before.registration, _seen.registration);
+    addChanged(values, factsOf(_before.contexts), factsOf(_seen.contexts));
+    addChanged(values, _before.serving, _seen.serving);
+    if (values.size() > Event::kMostValues) values.resize(Event::kMostValues);
+    for (EventValue& value : values) {
+        for (std::string* text : {&value.name, &value.before, &value.after})
+            *text = shortened(*text, Event::kLongestValue);
+    }
+    values.shrink_to_fit();
+    return values;
 }
 
 void Tracker::happened(Event event) {
+    event.values = valuesAround();
+    for (std::string* text : {&event.from, &event.to, &event.levelBefore})
+        *text = shortened(*text, Event::kLongestText);
+    append(std::move(event));
+}
+
+void Tracker::append(Event event) {
     while (!_events.empty() && (_events.size() >= _limits.events || event.time - _events.front().time > _limits.span)) {
         _events.pop_front();
     }

@@ -267,5 +267,109 @@ TEST(Tracker, EventsAreKeptForADayAndNoMoreThanTwoThousand) {
     EXPECT_EQ(patient.events().size(), 2501u);
 }
 
+TEST(Tracker, AnEventTellsTheValuesBeforeAndAfter) {
+    Tracker tracker;
+    Observation seen = servedBy("A", 1, "-101.00 dBm");
+    seen.area = "TAC 1";
+    seen.serving = {{"Band", "3"}, {"Network", "262-01"}};
+    tracker.note(seen, kStart);
+    Observation later = servedBy("B", 3, "-101.00 dBm");
+    later.level->figure.record = 2;  // the old cell's still
+    later.area = "TAC 2";
+    later.serving = {{"Band", "20"}, {"Network", "262-01"}, {"Bandwidth", "10 MHz"}};
+    tracker.note(later, kStart + 2s);
+    const std::vector<EventValue> values = {{"Cell", "A", "B"},
+                                            {"RSRP", "-101.00 dBm", ""},
+                                            {"Area", "TAC 1", "TAC 2"},
+                                            {"Band", "3", "20"},
+                                            {"Bandwidth", "", "10 MHz"}};
+    ASSERT_EQ(tracker.events().size(), 3u);
+    EXPECT_EQ(tracker.events()[1].kind, Kind::Reselection);
+    EXPECT_EQ(tracker.events()[1].values, values);
+    EXPECT_EQ(tracker.events()[2].kind, Kind::Area);
+    EXPECT_EQ(tracker.events()[2].values, values);
+
+    later.level = rsrp("-88.00 dBm", -88, 4);
+    later.quality = Measure{"RSRQ", {"-9.00 dB", -9, "dB", 4}, ""};
+    tracker.note(later, kStart + 3s);
+    EXPECT_EQ(tracker.events()[1].levelAfter, "-88.00 dBm");
+    EXPECT_EQ(tracker.events()[1].values[1], (EventValue{"RSRP", "-101.00 dBm", "-88.00 dBm"}));
+    EXPECT_EQ(tracker.events()[1].values.back(), (EventValue{"RSRQ", "", "-9.00 dB"}));
+    EXPECT_EQ(tracker.events()[2].values[1], (EventValue{"RSRP", "-101.00 dBm", "-88.00 dBm"}));
+}
+
+TEST(Tracker, LevelsOfTwoRadiosAreTwoValues) {
+    Tracker tracker;
+    tracker.note(servedBy("A", 1, "-95.00 dBm"), kStart);
+    Observation seen = servedBy("B", 2, "-80.00 dBm");
+    seen.access = "UMTS";
+    seen.level->name = "RSCP";
+    tracker.note(seen, kStart + 2s);
+    EXPECT_EQ(
+        tracker.events()[1].values,
+        (std::vector<EventValue>{
+            {"Cell", "A", "B"}, {"RSRP", "-95.00 dBm", ""}, {"RSCP", "", "-80.00 dBm"}, {"Radio", "LTE", "UMTS"}}));
+}
+
+TEST(Tracker, TwoThousandEventsHoldSixMegabytesAtMost) {
+    Tracker tracker;
+    for (int i = 0; i < 700; ++i) {
+        Observation seen;
+        const std::string text = std::string(9, static_cast<char>('a' + i % 2)) + std::string(300, 'x');
+        seen.cell = seen.access = seen.state = seen.area = seen.registrationState = text;
+        seen.cellRecord = static_cast<std::uint64_t>(i) + 1;
+        seen.level = Measure{text, {text, -90, "dBm", seen.cellRecord}, ""};
+        for (int fact = 0; fact < 20; ++fact) seen.serving.push_back({std::to_string(fact) + text, text});
+        tracker.note(seen, kStart);
+    }
+    ASSERT_EQ(tracker.events().size(), 2000u);
+    std::size_t bytes = 0;
+    const auto count = [&](const std::string& text) { bytes += text.capacity() > 15 ? text.capacity() + 17 : 0; };
+    for (const Event& event : tracker.events()) {
+        bytes += sizeof event + event.values.capacity() * sizeof(EventValue);
+        for (const std::string* text : {&event.from, &event.to, &event.levelBefore, &event.levelAfter}) count(*text);
+        for (const EventValue& value : event.values) {
+            for (const std::string* text : {&value.name, &value.before, &value.after}) count(*text);
+        }
+    }
+    EXPECT_LT(bytes, 6'000'000u);
+    EXPECT_EQ(tracker.events().back().from.size(), 128u);
+    EXPECT_EQ(tracker.events().back().values.size(), 8u);
+    EXPECT_EQ(tracker.events().back().values[0].before.size(), 48u);
+}
+
+TEST(Tracker, ATextIsNotCutWithinACharacter) {
+    Tracker tracker;
+    tracker.note(servedBy(("A" + std::string(126, 'x') + "\xC3\xA4").c_str(), 1), kStart);
+    EXPECT_EQ(tracker.events()[0].to, "A" + std::string(126, 'x'));
+}
+
+TEST(Tracker, WhileNothingIsNewCellsGetLostAndGo) {
+    Tracker tracker;
+    Observation seen = servedBy("A", 1);
+    seen.cells = {heard("N", -100, 1)};
+    tracker.note(seen, kStart);
+    tracker.letPass(kStart + 31s);
+    EXPECT_TRUE(tracker.cells()[0].isLost);
+    tracker.letPass(kStart + 41s);
+    EXPECT_TRUE(tracker.cells().empty());
+}
+
+TEST(Tracker, TheConnectionsLossHasALengthAndTheTimeOfDay) {
+    Tracker tracker;
+    tracker.note(servedBy("A", 1), Time(5s), kStart);
+    EXPECT_EQ(tracker.events()[0].time, kStart);
+    EXPECT_EQ(tracker.levelTime(), Time(5s));
+    tracker.noteConnectionLost(kStart + 1s);
+    tracker.noteConnectionBack(kStart + 8s, 7s);
+    EXPECT_EQ(tracker.events()[1].kind, Kind::ConnectionLost);
+    EXPECT_EQ(tracker.events()[2].kind, Kind::ConnectionBack);
+    EXPECT_EQ(tracker.events()[2].to, "after 7.0 s");
+    tracker.restart();
+    EXPECT_EQ(tracker.events().size(), 3u);
+    EXPECT_EQ(tracker.latest().cell, "");
+    EXPECT_EQ(tracker.levelTime(), std::nullopt);
+}
+
 }  // namespace
 }  // namespace kelvo::overview

@@ -12,8 +12,8 @@ namespace kelvo::overview {
 /// "3 s ago", "5 min ago". Of captures put together the times may go back; nothing is younger than now.
 std::string ageText(Time then, Time now);
 
-/// How much more a cell has than the serving one: "+3.25 dB". Empty where one of the two is missing; levels of different
-/// kinds do not compare.
+/// How much more a cell has than the serving one: "+3.25 dB". Empty where one of the two is missing; levels of
+/// different kinds do not compare.
 std::string differenceText(const std::optional<Measure>& level, const std::optional<Measure>& serving);
 
 /// "idle -> connected", with that arrow; of what has no before, or no after, the other alone.

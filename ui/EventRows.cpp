@@ -170,10 +170,9 @@ QVariant EventRows::data(const QModelIndex& index, int role) const {
 }
 
 QHash<int, QByteArray> EventRows::roleNames() const {
-    return {{TimeRole, "time"},     {DayRole, "day"},       {TitleRole, "title"},
-            {WhatRole, "what"},     {LevelsRole, "levels"}, {OpensRole, "opens"},
-            {IsOpenRole, "isOpen"}, {NamesRole, "names"},   {BeforeRole, "before"},
-            {AfterRole, "after"},   {SentenceRole, "sentence"}};
+    return {{TimeRole, "time"},     {DayRole, "day"},     {TitleRole, "title"},      {WhatRole, "what"},
+            {LevelsRole, "levels"}, {OpensRole, "opens"}, {IsOpenRole, "isOpen"},    {NamesRole, "names"},
+            {BeforeRole, "before"}, {AfterRole, "after"}, {SentenceRole, "sentence"}};
 }
 
 }  // namespace kelvo

@@ -34,10 +34,14 @@ QString comparison(const std::optional<Measure>& level, const std::optional<Meas
 
 QStringList rowOf(const TrackedCell& cell, const std::optional<Measure>& serving, overview::Time now) {
     const QString identity = shown(cell.heard.identity);
-    const QString age = shown(ageText(cell.lastHeard, now));
+    const QString age = shown(overview::ageText(cell.lastHeard, now));
     const QString mark = cell.isLost ? QStringLiteral("lost") : shown(cell.heard.mark);
-    QStringList sentence = {identity, mark, named(cell.heard.level), named(cell.heard.quality),
-                            comparison(cell.heard.level, serving), QStringLiteral("heard %1").arg(age)};
+    QStringList sentence = {identity,
+                            mark,
+                            named(cell.heard.level),
+                            named(cell.heard.quality),
+                            comparison(cell.heard.level, serving),
+                            QStringLiteral("heard %1").arg(age)};
     sentence.removeAll(QString());
     return {identity,
             textOf(cell.heard.level),
@@ -140,8 +144,8 @@ void OverviewController::reloadCells(const overview::Tracker& tracker) {
     _cells.setRows(rows);
 }
 
-/// Each fact stays in its place; one that is not told now is empty there. A new one comes behind the one that it is told
-/// behind.
+/// Each fact stays in its place; one that is not told now is empty there. A new one comes behind the one that it is
+/// told behind.
 void OverviewController::keepPlaces(Facts& kept, const Facts& told) {
     for (Fact& fact : kept) fact.text.clear();
     auto place = kept.begin();

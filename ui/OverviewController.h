@@ -54,8 +54,8 @@ public:
 
     const QString& title() const { return _title; }  ///< the radio
     const QString& state() const { return _state; }
-    const QString& cell() const { return _cell; }       ///< a dash while none serves
-    bool isCellKnown() const { return _isCellKnown; }   ///< one has served
+    const QString& cell() const { return _cell; }             ///< a dash while none serves
+    bool isCellKnown() const { return _isCellKnown; }         ///< one has served
     bool cellsHaveLevel() const { return _cellsHave.level; }  ///< one of the cells around, so far
     bool cellsHaveQuality() const { return _cellsHave.quality; }
     bool cellsHaveDifference() const { return _cellsHave.difference; }
@@ -88,7 +88,7 @@ private:
     bool _isOpen = false;
     bool _isWatched = false;
     bool _isFresh = false;  // refreshed since time passed last
-    std::string _access;  // whose places are kept
+    std::string _access;    // whose places are kept
     QString _title;
     QString _state;
     QString _cell;

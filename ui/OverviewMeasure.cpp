@@ -33,14 +33,16 @@ QString joined(QStringList parts) {
 
 void OverviewMeasure::show(const Shown& shown) {
     if (!shown.measure && !isKnown()) return;
-    _age = shown.written ? QString::fromStdString(ageText(*shown.written, shown.now)) : QString();
+    _age = shown.written ? QString::fromStdString(overview::ageText(*shown.written, shown.now)) : QString();
     if (shown.measure) {
         _name = QString::fromStdString(shown.measure->name);
         _number = withoutUnit(shown.measure->figure);
         _unit = QString::fromStdString(shown.measure->figure.unit);
         _grade = QString::fromStdString(shown.measure->grade);
+        _isGraded = _isGraded || !_grade.isEmpty();
         _step = stepOf(shown.measure->grade);
-        _sentence = joined({_name + QLatin1Char(' ') + QString::fromStdString(shown.measure->figure.text), _grade, _age});
+        _sentence =
+            joined({_name + QLatin1Char(' ') + QString::fromStdString(shown.measure->figure.text), _grade, _age});
     } else {
         _number = QStringLiteral("–");
         _unit = _grade = _age = QString();
@@ -65,6 +67,7 @@ void OverviewMeasure::showLine(const overview::LiveOverview::Line& line, Trend::
 
 void OverviewMeasure::forget() {
     _name = _number = _unit = _grade = _age = _sentence = _summary = QString();
+    _isGraded = false;
     _step = 0;
     _line = {};
     Q_EMIT changed();

@@ -21,6 +21,7 @@ class OverviewMeasure : public QObject {
     Q_PROPERTY(QString number READ number NOTIFY changed)
     Q_PROPERTY(QString unit READ unit NOTIFY changed)
     Q_PROPERTY(QString grade READ grade NOTIFY changed)
+    Q_PROPERTY(bool graded READ isGraded NOTIFY changed)
     Q_PROPERTY(int step READ step NOTIFY changed)
     Q_PROPERTY(QString age READ age NOTIFY changed)
     Q_PROPERTY(QString sentence READ sentence NOTIFY changed)
@@ -44,6 +45,7 @@ public:
     const QString& number() const { return _number; }      ///< "-95.25"; a dash while it is not told
     const QString& unit() const { return _unit; }          ///< "dBm"; empty for a plain number
     const QString& grade() const { return _grade; }        ///< "good"; empty without one
+    bool isGraded() const { return _isGraded; }            ///< has had a grade since the last `forget`
     int step() const { return _step; }                     ///< of the grade, 0 without one
     const QString& age() const { return _age; }            ///< "3 s ago"; empty when nobody knows
     const QString& sentence() const { return _sentence; }  ///< all of this for a screen reader
@@ -60,6 +62,7 @@ private:
     QString _number;
     QString _unit;
     QString _grade;
+    bool _isGraded = false;
     int _step = 0;
     QString _age;
     QString _sentence;

@@ -138,7 +138,7 @@ void TrendPainting::paint(const DetailsController& details, const Trend::Point* 
 void TrendPainting::paintSmall(const Trend& trend) {
     constexpr double kShortest = 10;  // dB: less is hardly more than noise, and shall look so
     const std::array<const Trend*, 1> one = {&trend};
-    _axis = axisOf(one, kShortest);
+    _axis = axisOf(one, trend.unit.empty() ? 0 : kShortest);
     _painter.fillRect(QRectF({0, 0}, _size), _colors.background);
     const auto paintText = [this](const QRectF& place, Qt::Alignment alignment, const QString& text) {
         _painter.setPen(_colors.text);

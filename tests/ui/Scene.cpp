@@ -50,7 +50,8 @@ void Scene::settle() {
         const QQuickItem* stack = itemOfType("QQuickStackView");
         const QQuickItem* sheet = itemOfType("SaveSheet");
         const QQuickItem* details = itemOfType("DetailsSheet");
-        const bool sliding = stack->property("busy").toBool() ||
+        const double arrival = _view->rootObject()->property("arrival").toDouble();  // of the overview
+        const bool sliding = stack->property("busy").toBool() || arrival != (_app->overview()->isOpen() ? 1 : 0) ||
                              (sheet != nullptr && sheet->property("moving").toBool()) ||
                              (details != nullptr && details->property("moving").toBool());
         return !sliding && (sheet != nullptr) == (_app->saveViewController() != nullptr) &&
@@ -82,11 +83,15 @@ KelvoCell* Scene::row(const QString& key) {
     return qobject_cast<KelvoCell*>(item);
 }
 
-QQuickItem* Scene::itemOfType(const char* type) {
-    return findItem(_view->contentItem(), [&](QQuickItem* item) {
+QQuickItem* Scene::itemOfType(const char* type, QQuickItem* within) {
+    return findItem(within, [&](QQuickItem* item) {
         return QByteArray(item->metaObject()->className()).startsWith(type) || item->inherits(type);
     });
 }
+
+QQuickItem* Scene::itemOfType(const char* type) { return itemOfType(type, _view->contentItem()); }
+
+QQuickItem* Scene::paneItemOfType(const char* type) { return itemOfType(type, itemOfType("QQuickStackView")); }
 
 void Scene::touch(const QPointF& at) { QTest::touchEvent(_view, touchScreen()).press(0, at.toPoint()); }
 void Scene::move(const QPointF& to) {

@@ -31,6 +31,8 @@ public:
     bool shows(const QString& text) { return find(text) != nullptr; }
     /// The first visible item of a type, by the name its class starts with; null when there is none.
     QQuickItem* itemOfType(const char* type);
+    /// The same of the panes, which in a wide window are not alone.
+    QQuickItem* paneItemOfType(const char* type);
 
     /// The visible row of that key; fails the test when there is none.
     KelvoCell* row(const QString& key);
@@ -47,6 +49,7 @@ public:
 
 private:
     QQuickItem* find(const QString& text);
+    static QQuickItem* itemOfType(const char* type, QQuickItem* within);
     void nextFrame();
 
     std::unique_ptr<KelvoApp> _app;

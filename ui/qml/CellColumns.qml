@@ -18,13 +18,20 @@ Item {
     property color quietColor: Theme.secondaryText
     property int pixelSize: 15
 
-    readonly property real wideFigure: 96
+    readonly property real wideFigure: oneLine ? 96 : 90
     readonly property real lineHeight: oneLine ? height : (height - 10) / 2
     readonly property string second: mark === "" || age === "" ? mark + age : mark + ", " + age
     // Without levels the qualities take their place.
     readonly property string firstFigure: overview.cellsHaveLevel ? level : quality
     readonly property string secondFigure: overview.cellsHaveLevel ? quality : ""
-    readonly property real differenceWidth: overview.cellsHaveDifference ? (oneLine ? wideFigure : 84) : 0
+    readonly property real differenceWidth: overview.cellsHaveDifference ? (oneLine ? wideFigure : 80) : 0
+    // From right to left.
+    readonly property real end: width - 14
+    readonly property real heardWidth: oneLine ? 150 : 0
+    readonly property real differenceX: end - heardWidth - differenceWidth
+    readonly property real lastFigureX: differenceX - wideFigure
+    readonly property real firstFigureX: oneLine && overview.cellsHaveLevel && overview.cellsHaveQuality ? lastFigureX - wideFigure : lastFigureX
+    readonly property real secondLine: oneLine ? 0 : 5 + lineHeight
 
     component Part: Text {
         y: columns.oneLine ? 0 : 5
@@ -43,36 +50,32 @@ Item {
 
     Part {
         x: 14
-        width: firstFigure.x - x - 8
+        width: columns.firstFigureX - 22
         text: columns.identity
         fontSizeMode: Text.HorizontalFit
         minimumPixelSize: Math.min(font.pixelSize, 12)
     }
     Figure {
-        id: firstFigure
-        x: columns.oneLine ? secondFigure.x - (columns.overview.cellsHaveLevel && columns.overview.cellsHaveQuality ? width : 0) : toServing.x - width
+        x: columns.firstFigureX
         text: columns.firstFigure
     }
     Figure {
-        id: secondFigure
-        x: columns.oneLine ? toServing.x - width : firstFigure.x
-        y: columns.oneLine ? 0 : 5 + columns.lineHeight
+        x: columns.lastFigureX
+        y: columns.secondLine
         text: columns.secondFigure
         color: columns.quietColor
         font.pixelSize: Math.min(columns.pixelSize, columns.oneLine ? 15 : 13)
     }
     Figure {
-        id: toServing
-        x: (columns.oneLine ? heard.x : columns.width - 14) - width
+        x: columns.differenceX
         width: columns.differenceWidth
         text: columns.difference
         font.pixelSize: Math.min(columns.pixelSize, columns.oneLine ? 15 : 14)
     }
     Part {
-        id: heard
-        x: columns.oneLine ? columns.width - 14 - width : 14
-        y: columns.oneLine ? 0 : 5 + columns.lineHeight
-        width: columns.oneLine ? 150 : firstFigure.x - x - 8
+        x: columns.oneLine ? columns.end - columns.heardWidth : 14
+        y: columns.secondLine
+        width: columns.oneLine ? columns.heardWidth : columns.firstFigureX - 22
         horizontalAlignment: columns.oneLine ? Text.AlignRight : Text.AlignLeft
         text: columns.second
         color: columns.quietColor

@@ -1,3 +1,4 @@
+pragma ComponentBehavior: Bound
 import QtQuick
 import Kelvo.Ui
 
@@ -20,8 +21,10 @@ Item {
     required property bool marked
 
     signal chosen
+    signal grown
 
     height: 52 + values.height
+    onHeightChanged: if (isOpen) grown()
 
     Rectangle {
         anchors { fill: parent; margins: 1 }
@@ -51,7 +54,7 @@ Item {
             text: row.title
             elide: Text.ElideRight
             color: Theme.text
-            font { pixelSize: 15; bold: true }
+            font.pixelSize: 15
         }
         Text {
             anchors { left: title.right; leftMargin: 8; right: time.left; rightMargin: 8; baseline: title.baseline }
@@ -100,15 +103,19 @@ Item {
         }
     }
 
-    Loader {
+    Column {
         id: values
         anchors { left: parent.left; right: parent.right; top: head.bottom }
-        active: row.isOpen
-        height: active ? implicitHeight : 0
-        sourceComponent: EventValues {
-            names: row.names
-            before: row.before
-            after: row.after
+
+        Repeater {
+            model: row.isOpen ? 1 : 0
+
+            EventValues {
+                width: row.width
+                names: row.names
+                before: row.before
+                after: row.after
+            }
         }
     }
 

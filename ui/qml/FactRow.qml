@@ -42,8 +42,15 @@ Item {
         textFormat: Text.PlainText
         wrapMode: Text.Wrap
         color: Theme.text
-        font.pixelSize: 14
+        font.pixelSize: metrics.advanceWidth > width && metrics.advanceWidth * 12 / 14 <= width ? 12 : 14
         onImplicitHeightChanged: row.keepRoom()
+    }
+
+    // A little too long for its line it becomes smaller rather than two lines.
+    TextMetrics {
+        id: metrics
+        text: row.text
+        font.pixelSize: 14
     }
 
     Hairline {

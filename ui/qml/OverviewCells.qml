@@ -49,7 +49,7 @@ OverviewCard {
 
     Item {
         width: card.width
-        height: (Math.max(4, card.overview.cells.most) - card.overview.cells.count) * card.rowHeight
+        height: (Math.max(3, card.overview.cells.most) - card.overview.cells.count) * card.rowHeight
 
         Text {
             x: 14

@@ -31,9 +31,11 @@ OverviewCard {
             model: card.overview.events
 
             EventRow {
+                id: event
                 width: card.width
                 marked: rows.activeFocus && rows.currentRow === index
                 onChosen: card.overview.events.toggle(index)
+                onGrown: card.revealed(event)
             }
         }
     }

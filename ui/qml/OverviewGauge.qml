@@ -6,6 +6,7 @@ Column {
     id: gauge
 
     required property OverviewMeasure measure
+    required property bool roomForGrade
 
     Accessible.ignored: !enabled
     Accessible.role: Accessible.StaticText
@@ -54,6 +55,7 @@ Column {
     Item {
         width: parent.width
         height: 24
+        visible: gauge.roomForGrade
 
         GradeSteps {
             id: steps

@@ -8,6 +8,7 @@ OverviewCard {
     required property OverviewController overview
     readonly property bool twice: overview.quality.known
     readonly property bool stacked: width < 280
+    readonly property bool graded: overview.level.graded || overview.quality.graded
 
     objectName: "overviewServing"
 
@@ -35,10 +36,12 @@ OverviewCard {
             }
             Text {
                 id: state
-                anchors { left: radio.right; leftMargin: 10; right: parent.right; baseline: radio.baseline }
+                anchors { left: radio.right; leftMargin: 10; right: parent.right; bottom: radio.bottom; bottomMargin: 2 }
                 text: card.overview.state
                 textFormat: Text.PlainText
                 elide: Text.ElideRight
+                fontSizeMode: Text.HorizontalFit
+                minimumPixelSize: 12
                 color: Theme.secondaryText
                 font.pixelSize: 17
             }
@@ -65,15 +68,17 @@ OverviewCard {
 
             OverviewGauge {
                 objectName: "levelGauge"
-                width: card.stacked || !card.twice ? card.width - 28 : (card.width - 48) / 2
+                width: card.stacked || !card.twice ? card.width - 28 : Math.floor((card.width - 48) / 2)
                 measure: card.overview.level
                 visible: measure.known
+                roomForGrade: card.graded
             }
             OverviewGauge {
                 objectName: "qualityGauge"
-                width: card.stacked ? card.width - 28 : (card.width - 48) / 2
+                width: card.stacked ? card.width - 28 : Math.floor((card.width - 48) / 2)
                 measure: card.overview.quality
                 visible: measure.known
+                roomForGrade: card.graded
             }
         }
 

@@ -13,7 +13,7 @@ FocusScope {
     readonly property KelvoPaneController pane: application.navigation.topViewController
     readonly property bool empty: pane.emptyText !== ""
 
-    signal left
+    signal back
 
     Component.onCompleted: overview.watched = true
     Component.onDestruction: overview.watched = false
@@ -23,7 +23,7 @@ FocusScope {
     Accessible.name: titleBar.title
 
     Keys.onPressed: event => {
-        const back = event.key === Qt.Key_Escape || event.key === Qt.Key_Back || event.key === Qt.Key_Backspace
+        const leads = event.key === Qt.Key_Escape || event.key === Qt.Key_Back || event.key === Qt.Key_Backspace
             || (event.key === Qt.Key_Left && (event.modifiers & Qt.AltModifier));
         const page = scroll.height - 50;
         const steps = {
@@ -36,9 +36,9 @@ FocusScope {
         };
         if (event.key in steps)
             scroll.scrollBy(steps[event.key]);
-        else if (back && !overview.events.closeAll())
-            left();
-        event.accepted = back || event.key in steps;
+        else if (leads && !overview.events.closeAll())
+            back();
+        event.accepted = leads || event.key in steps;
     }
 
     Rectangle {
@@ -52,7 +52,7 @@ FocusScope {
         title: qsTr("Overview")
         backTitle: view.wide ? "" : view.pane.title
         column: sections
-        onBack: view.left()
+        onBack: view.back()
     }
 
     Flickable {

@@ -82,23 +82,25 @@ FocusScope {
         Component.onCompleted: show(screen.application.navigation.rootViewController, false)
     }
 
-    // On a phone a screen over the panes, made when it is opened; in a wide window beside them.
-    Loader {
+    // Where the overview is: on a phone over the panes, in a wide window beside them.
+    FocusScope {
         id: beside
         objectName: "beside"
+
+        readonly property bool used: screen.wide || screen.overview.open || screen.arrival > 0
+        property OverviewView view: null
 
         x: screen.wide ? stack.width : (1 - screen.arrival) * screen.width
         width: screen.wide ? screen.width - stack.width : screen.width
         height: screen.height
-        active: screen.wide || screen.overview.open || screen.arrival > 0
         enabled: screen.uncovered && (screen.wide || screen.overview.open)
-        sourceComponent: OverviewView {
-            application: screen.application
-            wide: screen.wide
-            focus: true
-            onLeft: {
-                screen.overview.close();
-                stack.forceActiveFocus();
+        onUsedChanged: {
+            if (used) {
+                view = overviewView.createObject(beside) as OverviewView;
+            } else {
+                view.visible = false;  // it lives a moment longer
+                view.destroy();
+                view = null;
             }
         }
     }
@@ -132,6 +134,20 @@ FocusScope {
             enabled: screen.uncovered && !stack.busy && (stack.depth > 1 || (!screen.wide && screen.arrival === 1))
             yAxis.enabled: false
             onActiveTranslationChanged: if (activeTranslation.x > 64) screen.back()
+        }
+    }
+
+    Component {
+        id: overviewView
+        OverviewView {
+            anchors.fill: parent
+            focus: true
+            application: screen.application
+            wide: screen.wide
+            onBack: {
+                screen.overview.close();
+                stack.forceActiveFocus();
+            }
         }
     }
 

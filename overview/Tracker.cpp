@@ -30,12 +30,15 @@ void order(std::vector<TrackedCell>& cells) {
     }
 }
 
-/// Whether one of the two is the other without its code: "ARFCN 23" and "ARFCN 23, BSIC 42". What a modem measures
-/// before it has read the code is that cell, as far as anybody can tell.
-bool isSameCell(const std::string& one, const std::string& other) {
-    const std::string& shorter = one.size() < other.size() ? one : other;
-    const std::string& longer = one.size() < other.size() ? other : one;
-    return one == other || (shorter.find(',') == shorter.npos && longer.starts_with(shorter + ","));
+/// Whether one of the two is the other without its code or its carrier: "ARFCN 23" or "PSC 5" and "ARFCN 23, BSIC 42"
+/// or "UARFCN 10562, PSC 5". What a modem measures before it has read the code is that cell, as far as anybody can
+/// tell.
+bool isSameCell(std::string_view one, std::string_view other) {
+    if (one == other) return true;
+    const std::string_view shorter = one.size() < other.size() ? one : other;
+    const std::string_view longer = one.size() < other.size() ? other : one;
+    const std::size_t comma = longer.find(", ");
+    return comma != longer.npos && (shorter == longer.substr(0, comma) || shorter == longer.substr(comma + 2));
 }
 
 /// Of characters in UTF-8 none is cut in two.
@@ -43,6 +46,28 @@ std::string shortened(const std::string& text, std::size_t longest) {
     if (text.size() <= longest) return text;
     while (longest > 0 && (static_cast<unsigned char>(text[longest]) & 0xC0) == 0x80) --longest;
     return text.substr(0, longest);
+}
+
+/// The name of the first part of "LAC 2101, URA 6", and its number; both leave `parts`.
+std::pair<std::string_view, std::string_view> takePart(std::string_view& parts) {
+    const std::size_t end = std::min(parts.find(", "), parts.size());
+    const std::string_view part = parts.substr(0, end);
+    parts.remove_prefix(std::min(end + 2, parts.size()));
+    const std::size_t space = std::min(part.find(' '), part.size());
+    return {part.substr(0, space), part.substr(space)};
+}
+
+/// The names of those parts that both have and that differ.
+std::vector<std::string_view> changedParts(std::string_view before, std::string_view now) {
+    std::vector<std::string_view> changed;
+    while (!before.empty()) {
+        const auto [name, number] = takePart(before);
+        for (std::string_view rest = now; !rest.empty();) {
+            const auto [same, other] = takePart(rest);
+            if (same == name && other != number) changed.push_back(name);
+        }
+    }
+    return changed;
 }
 
 void addChanged(std::vector<EventValue>& values, std::string_view name, const std::string& before,
@@ -102,6 +127,7 @@ void Tracker::note(Observation seen, Time now, Time clock) {
     _clock = clock;
     noteCells();
     noteServing();
+    noteWhetherHandover();
     noteStates();
     noteContexts();
     noteService();
@@ -135,29 +161,67 @@ void Tracker::noteCells() {
         if (known == _cells.end()) {
             _cells.push_back({heard, _now, false});
         } else if (heard.record > known->heard.record) {
-            const std::string identity = std::max(known->heard.identity, heard.identity);  // that with its code
+            std::string whole = std::move(known->heard.identity);
+            if (whole.size() < heard.identity.size()) whole = heard.identity;
             *known = {heard, _now, false};
-            known->heard.identity = identity;
+            known->heard.identity = std::move(whole);
         }
     }
     letPass(_now);
     order(_cells);
 }
 
+/// The last event of its kind, when what changes now is another part of what changed then: "ARFCN 21" comes in one
+/// record and "BSIC 44" in another, but it is one cell.
+Event* Tracker::unfinished(bool isCell, const std::string& before, const std::string& now) {
+    const auto last = std::find_if(_events.rbegin(), _events.rend(), [&](const Event& event) {
+        return isCell ? isCellChange(event.kind) : event.kind == Kind::Area;
+    });
+    if (last == _events.rend() || _clock - last->time > kSettling || last->to != before) return nullptr;
+    const auto parts = changedParts(before, now);
+    if (parts.empty()) return nullptr;
+    for (const std::string_view part : changedParts(last->from, last->to)) {
+        if (std::ranges::find(parts, part) != parts.end()) return nullptr;
+    }
+    return &*last;
+}
+
+void Tracker::complete(Event& event, std::string_view name, const std::string& now) {
+    event.to = shortened(now, Event::kLongestText);
+    const auto value = std::ranges::find(event.values, name, &EventValue::name);
+    if (value != event.values.end()) value->after = shortened(now, Event::kLongestValue);
+}
+
 void Tracker::noteServing() {
     if (_seen.cell.empty() || _seen.cell == _before.cell) return;
+    if (_seen.cellComesInParts) {
+        if (Event* change = unfinished(true, _before.cell, _seen.cell)) return complete(*change, "Cell", _seen.cell);
+    }
     const bool isFirst = _before.cell.empty();
-    const bool stays = isFresh(_level) && _before.isDedicated && _seen.isDedicated;
+    const bool wasConnected = isFresh(_level) && _connectedSince && _now - *_connectedSince >= kMoment;
     happened({.time = _clock,
-              .kind = isFirst ? Kind::CellFound
-                      : stays ? Kind::Handover
-                              : Kind::Reselection,
+              .kind = isFirst                             ? Kind::CellFound
+                      : wasConnected && _seen.isDedicated ? Kind::Handover
+                                                          : Kind::Reselection,
               .from = _before.cell,
               .to = _seen.cell,
               .levelBefore = isFirst || !isFresh(_level) ? std::string() : _level.text,
               .record = _seen.cellRecord});
     _level.isAwaited = true;
     _quality.isAwaited = true;
+    _leftConnected = wasConnected && !isFirst ? std::optional(_now) : std::nullopt;
+}
+
+/// On another radio the record of the state may come after that of the cell; between the two it is not known.
+void Tracker::noteWhetherHandover() {
+    if (!_seen.isDedicated && !_seen.state.empty()) _connectedSince.reset();
+    if (_seen.isDedicated && !_connectedSince) _connectedSince = _now;
+    if (!_leftConnected || !_seen.isDedicated) return;
+    const bool isOne = _now - *_leftConnected <= kSettling;
+    _leftConnected.reset();
+    const auto change =
+        std::find_if(_events.rbegin(), _events.rend(), [](const Event& e) { return isCellChange(e.kind); });
+    if (isOne && change != _events.rend()) change->kind = Kind::Handover;
 }
 
 /// A figure that was written before the cell changed is the old cell's.
@@ -192,11 +256,17 @@ void Tracker::noteStates() {
         noteChange(Kind::Band, _before.band, _seen.band);
         noteChange(Kind::State, _before.state, _seen.state);
     }
-    noteChange(Kind::Area, _before.area, _seen.area);
+    noteArea();
     noteChange(Kind::Registration, _before.registrationState, _seen.registrationState);
     if (_seen.reject != _before.reject && !_seen.reject.empty()) {
         happened({.time = _clock, .kind = Kind::Reject, .to = _seen.reject});
     }
+}
+
+/// A part that was not known before is no change.
+void Tracker::noteArea() {
+    if (Event* change = unfinished(false, _before.area, _seen.area)) return complete(*change, "Area", _seen.area);
+    if (!changedParts(_before.area, _seen.area).empty()) noteChange(Kind::Area, _before.area, _seen.area);
 }
 
 void Tracker::noteContexts() {
@@ -216,19 +286,15 @@ void Tracker::noteContexts() {
 }
 
 void Tracker::noteService() {
-    if (!std::exchange(_isBegun, true)) {
-        if (_seen.isWithoutService) _lostSince = _now;
-        return;
-    }
-    if (_seen.isWithoutService == _before.isWithoutService) return;
-    Event event{.time = _clock, .kind = Kind::ServiceLost};
+    if (!_seen.knowsService) return;
+    const auto before = std::exchange(_isWithoutService, _seen.isWithoutService);
+    if (before == _seen.isWithoutService) return;
     if (_seen.isWithoutService) {
         _lostSince = _now;
-    } else {
-        event.kind = Kind::ServiceBack;
-        event.to = lengthText(_now - _lostSince.value_or(_now));
+        if (before) happened({.time = _clock, .kind = Kind::ServiceLost});
+    } else if (before) {
+        happened({.time = _clock, .kind = Kind::ServiceBack, .to = lengthText(_now - _lostSince)});
     }
-    happened(std::move(event));
 }
 
 void Tracker::noteChange(Kind kind, const std::string& from, const std::string& to) {

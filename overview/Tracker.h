@@ -23,7 +23,9 @@ class Tracker {
 public:
     static constexpr auto kHeardFor = std::chrono::seconds(30);  ///< a cell stays that long after it was heard
     static constexpr auto kLostFor = std::chrono::seconds(10);   ///< and that much longer, marked
-    static constexpr double kSteady = 2.0;                       ///< dB by which a cell overtakes the one above
+    static constexpr auto kSettling = std::chrono::seconds(2);   ///< within which several records tell of one change
+    static constexpr auto kMoment = std::chrono::milliseconds(100);  ///< within which all belong to one step of a modem
+    static constexpr double kSteady = 2.0;                           ///< dB by which a cell overtakes the one above
 
     struct Limits {
         std::size_t events = 2000;
@@ -66,7 +68,11 @@ private:
 
     void noteCells();
     void noteServing();
+    void noteWhetherHandover();
+    Event* unfinished(bool isCell, const std::string& before, const std::string& now);
+    static void complete(Event& event, std::string_view name, const std::string& now);
     void noteStates();
+    void noteArea();
     void noteContexts();
     void noteService();
     void noteFigure(Followed& followed, const std::optional<Measure>& now, bool isLevel);
@@ -88,8 +94,10 @@ private:
     std::deque<Event> _events;
     Followed _level;
     Followed _quality;
-    bool _isBegun = false;           // something has been noted
-    std::optional<Time> _lostSince;  // service
+    std::optional<Time> _connectedSince;    // as the last state said that was known
+    std::optional<Time> _leftConnected;     // a cell, and the state in the new one is not known yet
+    std::optional<bool> _isWithoutService;  // none while the screens have not told
+    Time _lostSince{};                      // service
 };
 
 }  // namespace kelvo::overview

@@ -58,12 +58,27 @@ TEST(Tracker, AChangeOfCellOutOfAConnectionIsAReselection) {
 
 TEST(Tracker, AChangeOfCellWithinAConnectionIsAHandover) {
     Tracker tracker;
-    for (const auto& [cell, record] : {std::pair("A", 1), std::pair("B", 2)}) {
-        Observation seen = servedBy(cell, static_cast<std::uint64_t>(record));
-        seen.isDedicated = true;
-        tracker.note(seen, kStart);
-    }
+    Observation seen = servedBy("A", 1);
+    seen.isDedicated = true;
+    tracker.note(seen, kStart);
+    seen = servedBy("B", 2);
+    seen.isDedicated = true;
+    tracker.note(seen, kStart + 100ms);
     EXPECT_EQ(tracker.events().back().kind, Kind::Handover);
+}
+
+TEST(Tracker, AConnectionThatBeganWithTheNewCellIsNotHandedOver) {
+    Tracker tracker;
+    Observation seen = servedBy("A", 1);
+    seen.state = "idle";
+    tracker.note(seen, kStart);
+    seen.state = "connected";  // which a record tells before the cell's
+    seen.isDedicated = true;
+    tracker.note(seen, kStart + 1s);
+    seen.cell = "B";
+    seen.cellRecord = 2;
+    tracker.note(seen, kStart + 1s + 20ms);
+    EXPECT_EQ(tracker.events().back().kind, Kind::Reselection);
 }
 
 TEST(Tracker, ALevelThatIsOlderThanTheChangeIsTheOldCells) {
@@ -180,10 +195,15 @@ TEST(Tracker, AnotherRadioIsOneEventAndNotThree) {
 TEST(Tracker, APhoneThatNeverHadServiceHasNotLostIt) {
     Tracker tracker;
     Observation seen;
+    tracker.note(seen, kStart - 1s);
+    seen.knowsService = true;
     seen.isWithoutService = true;
     tracker.note(seen, kStart);
     EXPECT_TRUE(tracker.events().empty());
-    tracker.note(Observation(), kStart + 2s);
+    seen.isWithoutService = false;
+    tracker.note(seen, kStart + 2s);
+    ASSERT_EQ(tracker.events().size(), 1u);
+    EXPECT_EQ(tracker.events().back().kind, Kind::ServiceBack);
     EXPECT_EQ(tracker.events().back().to, "after 2.0 s");
 }
 
@@ -223,6 +243,85 @@ TEST(Tracker, StatesAreToldWhenTheyChangeAndNotWhenTheyAppear) {
     EXPECT_EQ(tracker.events()[4].to, "LOCATION_AREA_NOT_ALLOWED");
 }
 
+TEST(Tracker, TheAreasPartsAreOneChange) {
+    Tracker tracker;
+    const auto see = [&](const char* area, Time::duration after) {
+        Observation seen = servedBy("A", 1);
+        seen.area = area;
+        tracker.note(seen, kStart + after);
+    };
+    see("URA 1", 0s);
+    see("LAC 11, URA 1", 1s);  // which was not known before
+    EXPECT_EQ(tracker.events().size(), 1u);
+    see("LAC 11, URA 2", 10s);
+    see("LAC 12, URA 2", 12s);
+    ASSERT_EQ(tracker.events().size(), 2u);
+    EXPECT_EQ(tracker.events()[1].time, kStart + 10s);
+    EXPECT_EQ(tracker.events()[1].from, "LAC 11, URA 1");
+    EXPECT_EQ(tracker.events()[1].to, "LAC 12, URA 2");
+    EXPECT_EQ(tracker.events()[1].values.back(), (EventValue{"Area", "LAC 11, URA 1", "LAC 12, URA 2"}));
+    see("LAC 13, URA 2", 12s);  // the same part again: another change
+    ASSERT_EQ(tracker.events().size(), 3u);
+    see("LAC 13, URA 3", 14s + 1us);  // too late to be of it
+    EXPECT_EQ(tracker.events().size(), 4u);
+    EXPECT_EQ(tracker.events()[3].from, "LAC 13, URA 2");
+}
+
+TEST(Tracker, ACellWhoseCodeComesLaterIsOneChange) {
+    Tracker tracker;
+    const auto see = [&](const char* cell, std::uint64_t record, Time::duration after) {
+        Observation seen = servedBy(cell, record);
+        seen.cellComesInParts = true;
+        tracker.note(seen, kStart + after);
+    };
+    see("ARFCN 21, BSIC 44", 1, 0s);
+    see("ARFCN 23, BSIC 44", 2, 10s);
+    see("ARFCN 23, BSIC 42", 3, 11s);
+    ASSERT_EQ(tracker.events().size(), 2u);
+    EXPECT_EQ(tracker.events()[1].time, kStart + 10s);
+    EXPECT_EQ(tracker.events()[1].from, "ARFCN 21, BSIC 44");
+    EXPECT_EQ(tracker.events()[1].to, "ARFCN 23, BSIC 42");
+    EXPECT_EQ(tracker.events()[1].values[0], (EventValue{"Cell", "ARFCN 21, BSIC 44", "ARFCN 23, BSIC 42"}));
+    see("ARFCN 25, BSIC 42", 4, 12s);
+    EXPECT_EQ(tracker.events().size(), 3u);
+}
+
+TEST(Tracker, WithTheStateInTheNewCellAChangeIsAHandover) {
+    for (const auto& [after, kind] : {std::pair(2s, Kind::Handover), std::pair(3s, Kind::Reselection)}) {
+        Tracker tracker;
+        Observation seen = servedBy("A", 1);
+        seen.isDedicated = true;
+        tracker.note(seen, kStart);
+        seen = servedBy("B", 2);
+        tracker.note(seen, kStart + 1s);
+        EXPECT_EQ(tracker.events()[1].kind, Kind::Reselection);
+        seen.isDedicated = true;
+        tracker.note(seen, kStart + 1s + after);
+        EXPECT_EQ(tracker.events()[1].kind, kind);
+    }
+}
+
+TEST(Tracker, WhileTheStateIsNotKnownAPhoneIsAsItWas) {
+    for (const auto& [between, kind] : {std::pair("", Kind::Handover), std::pair("idle", Kind::Reselection)}) {
+        Tracker tracker;
+        Observation seen = servedBy("A", 1);
+        seen.state = "connected";
+        seen.isDedicated = true;
+        tracker.note(seen, kStart);
+        seen.state = between;
+        seen.isDedicated = false;
+        tracker.note(seen, kStart + 100ms);
+        seen = servedBy("B", 2);
+        seen.state = "connected";
+        seen.isDedicated = true;
+        tracker.note(seen, kStart + 200ms);
+        const auto& events = tracker.events();
+        const auto change = std::ranges::find(events, std::string("B"), &Event::to);
+        ASSERT_NE(change, events.end());
+        EXPECT_EQ(change->kind, kind);
+    }
+}
+
 TEST(Tracker, ContextsComeAndGo) {
     Tracker tracker;
     Observation seen = servedBy("A", 1);
@@ -242,6 +341,7 @@ TEST(Tracker, ContextsComeAndGo) {
 TEST(Tracker, LossOfServiceHasALength) {
     Tracker tracker;
     Observation seen = servedBy("A", 1);
+    seen.knowsService = true;
     tracker.note(seen, kStart);
     seen.isWithoutService = true;
     tracker.note(seen, kStart + 1s);

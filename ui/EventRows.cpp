@@ -84,6 +84,13 @@ void EventRows::update(const std::deque<Event>& events) {
     if (hadOpen != hasOpen()) Q_EMIT openChanged();
 }
 
+void EventRows::beginAnew() {
+    closeAll();
+    _most = kFirst;
+    dropOlder(_most);
+    Q_EMIT countChanged();
+}
+
 void EventRows::showMore(const std::deque<Event>& events) {
     _most += kMore;
     addOlder(events);

@@ -42,6 +42,8 @@ public:
     int count() const { return static_cast<int>(_rows.size()); }
     bool hasMore() const { return _rows.size() < _known; }
     bool hasOpen() const;
+    /// As few rows as in the beginning, and none open.
+    void beginAnew();
     /// Shows what `update` left out.
     void showMore(const std::deque<overview::Event>& events);
 

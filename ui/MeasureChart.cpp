@@ -29,7 +29,8 @@ void MeasureChart::paint(QPainter* painter) {
     const QRectF area(1, TrendPainting::kSmallTop, std::max(1.0, width() - TrendPainting::kSmallRight - 1),
                       std::max(1.0, height() - TrendPainting::kSmallTop - TrendPainting::kSmallBottom));
     const TrendPainting::Colors colors{_lineColor, _textColor, _textColor, _gridColor, _backgroundColor};
-    TrendPainting(*painter, {width(), height()}, area, view, colors).paintSmall(_measure->line());
+    TrendPainting(*painter, {width(), height()}, area, view, colors)
+        .paintSmall(_measure->line(), _measure->servingCells());
 }
 
 }  // namespace kelvo

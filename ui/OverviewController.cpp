@@ -80,7 +80,7 @@ void OverviewController::setOpen(bool open) {
 void OverviewController::setWatched(bool watched) {
     if (_isWatched == watched) return;
     _isWatched = watched;
-    if (!watched) _events.closeAll();
+    if (!watched) _events.beginAnew();
     reload();
     Q_EMIT watchedChanged();
 }
@@ -121,9 +121,9 @@ void OverviewController::reloadServing(const overview::Observation& seen) {
     _isCellKnown = _isCellKnown || !seen.cell.empty();
     _cell = seen.cell.empty() ? QStringLiteral("–") : shown(seen.cell);
     _level.show({seen.level, tracker.levelTime(), now});
-    _level.showLine(_live.level(), _live.lineTime());
+    _level.showLine(_live.level(), _live.servingCells(), _live.lineTime());
     _quality.show({seen.quality, tracker.qualityTime(), now});
-    _quality.showLine(_live.quality(), _live.lineTime());
+    _quality.showLine(_live.quality(), _live.servingCells(), _live.lineTime());
     Facts facts;
     if (!seen.area.empty()) facts.push_back({"Area", seen.area});
     facts.insert(facts.end(), seen.serving.begin(), seen.serving.end());

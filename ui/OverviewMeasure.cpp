@@ -6,6 +6,7 @@
 #include "model/LevelGrades.h"
 #include "model/TrendWords.h"
 #include "overview/Words.h"
+#include "ui/KelvoPaneController.h"
 
 namespace kelvo {
 namespace {
@@ -34,6 +35,7 @@ QString joined(QStringList parts) {
 void OverviewMeasure::show(const Shown& shown) {
     if (!shown.measure && !isKnown()) return;
     _age = shown.written ? QString::fromStdString(overview::ageText(*shown.written, shown.now)) : QString();
+    _isOld = shown.written && shown.now - *shown.written >= KelvoPaneController::kOldFrom;
     if (shown.measure) {
         _name = QString::fromStdString(shown.measure->name);
         _number = withoutUnit(shown.measure->figure);
@@ -52,8 +54,10 @@ void OverviewMeasure::show(const Shown& shown) {
     Q_EMIT changed();
 }
 
-void OverviewMeasure::showLine(const overview::LiveOverview::Line& line, Trend::Time now) {
+void OverviewMeasure::showLine(const overview::LiveOverview::Line& line, const std::deque<TrendChange>& servingCells,
+                               Trend::Time now) {
     _lineEnd = now;
+    _servingCells.assign(servingCells.begin(), servingCells.end());
     _lineUnit = line.unit;
     _line.unit = _lineUnit;
     _line.points.clear();

@@ -3,7 +3,9 @@
 #include <QtQml/qqmlregistration.h>
 #include <QObject>
 #include <QString>
+#include <deque>
 #include <optional>
+#include <vector>
 
 #include "model/Trend.h"
 #include "overview/LiveOverview.h"
@@ -24,6 +26,7 @@ class OverviewMeasure : public QObject {
     Q_PROPERTY(bool graded READ isGraded NOTIFY changed)
     Q_PROPERTY(int step READ step NOTIFY changed)
     Q_PROPERTY(QString age READ age NOTIFY changed)
+    Q_PROPERTY(bool old READ isOld NOTIFY changed)
     Q_PROPERTY(QString sentence READ sentence NOTIFY changed)
     Q_PROPERTY(QString summary READ summary NOTIFY lineChanged)
 public:
@@ -35,8 +38,9 @@ public:
         overview::Time now;
     };
     void show(const Shown& shown);
-    /// What `line` is at `now`, its right end.
-    void showLine(const overview::LiveOverview::Line& line, Trend::Time now);
+    /// `now` is the line's right end; upright lines tell where another cell began to serve.
+    void showLine(const overview::LiveOverview::Line& line, const std::deque<TrendChange>& servingCells,
+                  Trend::Time now);
     /// Another radio's figures follow.
     void forget();
 
@@ -48,9 +52,11 @@ public:
     bool isGraded() const { return _isGraded; }            ///< has had a grade since the last `forget`
     int step() const { return _step; }                     ///< of the grade, 0 without one
     const QString& age() const { return _age; }            ///< "3 s ago"; empty when nobody knows
+    bool isOld() const { return _isOld; }                  ///< so old that it must not pass for current
     const QString& sentence() const { return _sentence; }  ///< all of this for a screen reader
     const QString& summary() const { return _summary; }    ///< of the line, likewise
     const Trend& line() const { return _line; }
+    const std::vector<TrendChange>& servingCells() const { return _servingCells; }
     Trend::Time lineEnd() const { return _lineEnd; }
 
 Q_SIGNALS:
@@ -65,10 +71,12 @@ private:
     bool _isGraded = false;
     int _step = 0;
     QString _age;
+    bool _isOld = false;
     QString _sentence;
     QString _summary;
     Trend _line;
     std::string _lineUnit;  // which the line refers to
+    std::vector<TrendChange> _servingCells;
     Trend::Time _lineEnd{0};
 };
 

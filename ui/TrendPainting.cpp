@@ -135,7 +135,7 @@ void TrendPainting::paint(const DetailsController& details, const Trend::Point* 
     if (cursor != nullptr) paintCursor(*cursor);
 }
 
-void TrendPainting::paintSmall(const Trend& trend) {
+void TrendPainting::paintSmall(const Trend& trend, const std::vector<TrendChange>& servingCells) {
     constexpr double kShortest = 10;  // dB: less is hardly more than noise, and shall look so
     const std::array<const Trend*, 1> one = {&trend};
     _axis = axisOf(one, trend.unit.empty() ? 0 : kShortest);
@@ -151,6 +151,11 @@ void TrendPainting::paintSmall(const Trend& trend) {
         if (trend.points.empty()) continue;
         paintText({_area.right() + 4, y - 9, kSmallRight - 4, 18}, Qt::AlignLeft | Qt::AlignVCenter,
                   QString::fromStdString(numberText(number)));
+    }
+    for (const TrendChange& change : servingCells) {
+        const qreal x = std::round(xOf(change.at)) + 0.5;
+        _painter.setPen(QPen(faint(_colors.text, 0.6F), 1, Qt::DashLine));
+        if (change.at >= _view.from()) _painter.drawLine(QPointF(x, _area.top()), QPointF(x, _area.bottom()));
     }
     const QRectF below(_area.left(), _area.bottom() + 3, _area.width(), kSmallBottom - 3);
     paintText(below, Qt::AlignLeft, beforeNow(_view.span()));

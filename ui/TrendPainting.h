@@ -39,8 +39,8 @@ public:
 
     /// `cursor` may be null.
     void paint(const DetailsController& details, const Trend::Point* cursor);
-    /// One line alone, for a glance: which way it goes, and between what.
-    void paintSmall(const Trend& trend);
+    /// One line alone, for a glance: which way it goes, between what, and where another cell began to serve.
+    void paintSmall(const Trend& trend, const std::vector<TrendChange>& servingCells);
 
 private:
     AxisRange axisOf(std::span<const Trend* const> trends, double shortest = 0) const;

@@ -100,6 +100,9 @@ TEST_F(OverviewEvents, AreFollowedWhileNobodyLooks) {
     scene->settle();
     EXPECT_EQ(scene->app().overview()->events()->count(), 26);
     EXPECT_FALSE(scene->shows(text("Show earlier")));
+    scene->app().overview()->close();
+    scene->settle();
+    EXPECT_EQ(scene->app().overview()->events()->count(), 20);
 }
 
 }  // namespace

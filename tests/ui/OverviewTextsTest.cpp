@@ -179,6 +179,7 @@ TEST_F(OverviewTexts, AgeWhileNothingComes) {
     EXPECT_TRUE(isHeard("RSRP -95.00 dBm, fair, 14 s ago")) << joined(heard());
     scene->pass(20s);
     EXPECT_TRUE(scene->shows(text("lost, 34 s ago")));
+    EXPECT_TRUE(scene->app().overview()->level()->isOld());
 }
 
 TEST_F(OverviewTexts, TellHowTheLevelHasGone) {

@@ -40,7 +40,7 @@ Column {
             id: figure
             objectName: "figure"
             text: gauge.measure.number
-            color: Theme.text
+            color: gauge.measure.old ? Theme.oldText : Theme.text
             font.pixelSize: Math.max(20, Math.min(38, Math.floor(gauge.width / 5)))
         }
         Text {

@@ -110,6 +110,7 @@ void OverviewController::beginRadio(const std::string& access) {
     _registrationFacts.clear();
     _level.forget();
     _quality.forget();
+    Q_EMIT columnsChanged();
     for (TextRows* rows : {&_serving, &_cells, &_registration, &_data}) rows->clear();
 }
 
@@ -133,15 +134,18 @@ void OverviewController::reloadServing(const overview::Observation& seen) {
 
 void OverviewController::reloadCells(const overview::Tracker& tracker) {
     const std::optional<Measure>& serving = tracker.latest().level;
+    const overview::Time now = _live.now();
+    const Columns before = _cellsHave;
     std::vector<QStringList> rows;
     rows.reserve(tracker.cells().size());
     for (const TrackedCell& cell : tracker.cells()) {
         _cellsHave.level = _cellsHave.level || cell.heard.level;
         _cellsHave.quality = _cellsHave.quality || cell.heard.quality;
-        rows.push_back(rowOf(cell, serving, _live.now()));
+        rows.push_back(rowOf(cell, serving, now));
         _cellsHave.difference = _cellsHave.difference || !rows.back()[3].isEmpty();
     }
     _cells.setRows(rows);
+    if (_cellsHave != before) Q_EMIT columnsChanged();
 }
 
 /// Each fact stays in its place; one that is not told now is empty there. A new one comes behind the one that it is

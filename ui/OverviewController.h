@@ -25,9 +25,9 @@ class OverviewController : public QObject {
     Q_PROPERTY(QString state READ state NOTIFY changed)
     Q_PROPERTY(QString cell READ cell NOTIFY changed)
     Q_PROPERTY(bool cellKnown READ isCellKnown NOTIFY changed)
-    Q_PROPERTY(bool cellsHaveLevel READ cellsHaveLevel NOTIFY changed)
-    Q_PROPERTY(bool cellsHaveQuality READ cellsHaveQuality NOTIFY changed)
-    Q_PROPERTY(bool cellsHaveDifference READ cellsHaveDifference NOTIFY changed)
+    Q_PROPERTY(bool cellsHaveLevel READ cellsHaveLevel NOTIFY columnsChanged)
+    Q_PROPERTY(bool cellsHaveQuality READ cellsHaveQuality NOTIFY columnsChanged)
+    Q_PROPERTY(bool cellsHaveDifference READ cellsHaveDifference NOTIFY columnsChanged)
     Q_PROPERTY(kelvo::OverviewMeasure* level READ level CONSTANT)
     Q_PROPERTY(kelvo::OverviewMeasure* quality READ quality CONSTANT)
     Q_PROPERTY(kelvo::TextRows* serving READ serving CONSTANT)
@@ -72,9 +72,16 @@ Q_SIGNALS:
     void openChanged();
     void watchedChanged();
     void changed();
+    void columnsChanged();
 
 private:
     using Facts = std::vector<overview::Fact>;
+    struct Columns {
+        bool level = false;
+        bool quality = false;
+        bool difference = false;
+        bool operator==(const Columns&) const = default;
+    };
 
     void setOpen(bool open);
     void reload();
@@ -93,11 +100,7 @@ private:
     QString _state;
     QString _cell;
     bool _isCellKnown = false;
-    struct {
-        bool level = false;
-        bool quality = false;
-        bool difference = false;
-    } _cellsHave;
+    Columns _cellsHave;
     Facts _servingFacts;
     Facts _registrationFacts;
     OverviewMeasure _level;

@@ -103,6 +103,10 @@ TEST_F(OverviewView, StandsBesideThePanesFrom900Pixels) {
     EXPECT_TRUE(hasFocus(panes()));
     openSection();
     EXPECT_NE(overview(), nullptr);
+
+    startLte({1200, 640});
+    EXPECT_EQ(scene->row(text(kSection))->width(), 640);  // as wide as rows get
+    EXPECT_EQ(overview()->width(), 560);
 }
 
 TEST_F(OverviewView, OfAWindowThatChangesItsWidthThereIsOne) {
@@ -110,7 +114,7 @@ TEST_F(OverviewView, OfAWindowThatChangesItsWidthThereIsOne) {
     openOverview();
     scene->view().resize(1000, 640);
     scene->settle();
-    EXPECT_EQ(left(overview()), 400);
+    EXPECT_EQ(left(overview()), 440);
     EXPECT_EQ(left(panes()), 0);
     EXPECT_TRUE(hasFocus(overview()));
     scene->view().resize(412, 915);

@@ -61,8 +61,8 @@ void Scene::settle() {
     _view->grabWindow();
 }
 
-QQuickItem* Scene::find(const QString& text) {
-    return findItem(_view->contentItem(), [&](QQuickItem* item) {
+QQuickItem* Scene::find(const QString& text, QQuickItem* within) {
+    return findItem(within, [&](QQuickItem* item) {
         const bool isText = item->inherits("QQuickText");
         return isText && item->property("text").toString() == text;
     });
@@ -71,6 +71,12 @@ QQuickItem* Scene::find(const QString& text) {
 QQuickItem* Scene::itemWithText(const QString& text) {
     QQuickItem* item = find(text);
     EXPECT_NE(item, nullptr) << "nothing on the screen says " << text.toStdString();
+    return item;
+}
+
+QQuickItem* Scene::paneItemWithText(const QString& text) {
+    QQuickItem* item = find(text, itemOfType("QQuickStackView"));
+    EXPECT_NE(item, nullptr) << "nothing on the panes says " << text.toStdString();
     return item;
 }
 

@@ -33,6 +33,7 @@ public:
     QQuickItem* itemOfType(const char* type);
     /// The same of the panes, which in a wide window are not alone.
     QQuickItem* paneItemOfType(const char* type);
+    QQuickItem* paneItemWithText(const QString& text);
 
     /// The visible row of that key; fails the test when there is none.
     KelvoCell* row(const QString& key);
@@ -48,7 +49,8 @@ public:
     static void useDarkColours(bool dark);
 
 private:
-    QQuickItem* find(const QString& text);
+    QQuickItem* find(const QString& text) { return find(text, _view->contentItem()); }
+    static QQuickItem* find(const QString& text, QQuickItem* within);
     static QQuickItem* itemOfType(const char* type, QQuickItem* within);
     void nextFrame();
 

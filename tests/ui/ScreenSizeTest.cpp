@@ -90,7 +90,7 @@ protected:
             EXPECT_GE(areaOf(row).left(), list.left()) << key;
             EXPECT_LE(areaOf(row).right(), list.right()) << key;
             expectInside(strip(text(key)), row);
-            expectInside(scene->itemWithText(text(key)), strip(text(key)));
+            expectInside(scene->paneItemWithText(text(key)), strip(text(key)));
             above = row;
         }
     }

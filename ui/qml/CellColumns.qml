@@ -38,7 +38,6 @@ Item {
         height: columns.lineHeight
         verticalAlignment: Text.AlignVCenter
         textFormat: Text.PlainText
-        elide: Text.ElideRight
         color: columns.color
         font.pixelSize: columns.pixelSize
     }
@@ -52,6 +51,7 @@ Item {
         x: 14
         width: columns.firstFigureX - 22
         text: columns.identity
+        elide: Text.ElideRight
         fontSizeMode: Text.HorizontalFit
         minimumPixelSize: Math.min(font.pixelSize, 12)
     }
@@ -78,6 +78,7 @@ Item {
         width: columns.oneLine ? columns.heardWidth : columns.firstFigureX - 22
         horizontalAlignment: columns.oneLine ? Text.AlignRight : Text.AlignLeft
         text: columns.second
+        elide: Text.ElideRight
         color: columns.quietColor
         font.pixelSize: Math.min(columns.pixelSize, 13)
     }

@@ -59,7 +59,7 @@ FocusScope {
         id: stack
 
         x: screen.wide ? 0 : -screen.arrival * width / 3
-        width: screen.wide ? Math.max(400, Math.min(640, Math.round(screen.width * 0.4))) : screen.width
+        width: screen.wide ? Math.max(400, Math.min(640, screen.width - 560)) : screen.width  // 640 is what rows use
         height: screen.height
         focus: true
         enabled: screen.uncovered && (screen.wide || !screen.overview.open)

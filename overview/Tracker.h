@@ -24,7 +24,7 @@ public:
     static constexpr auto kHeardFor = std::chrono::seconds(30);  ///< a cell stays that long after it was heard
     static constexpr auto kLostFor = std::chrono::seconds(10);   ///< and that much longer, marked
     static constexpr auto kSettling = std::chrono::seconds(2);   ///< within which several records tell of one change
-    static constexpr auto kMoment = std::chrono::milliseconds(100);  ///< within which all belong to one step of a modem
+    static constexpr auto kMoment = std::chrono::milliseconds(10);  ///< within which all belong to one step of a modem
     static constexpr double kSteady = 2.0;                           ///< dB by which a cell overtakes the one above
 
     struct Limits {

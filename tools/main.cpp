@@ -13,6 +13,7 @@
 #include "tools/EventsCommand.h"
 #include "tools/ExplainCommand.h"
 #include "tools/ImportCommand.h"
+#include "tools/ShareCommand.h"
 #include "tools/SnapshotCommand.h"
 #include "tools/StartCommandCommand.h"
 #include "tools/WatchCommand.h"
@@ -49,6 +50,7 @@ int main(int argc, char** argv) {
     kelvo::addEventsCommand(app);
     kelvo::addSnapshotCommand(app);
     kelvo::addImportCommand(app);
+    kelvo::addShareCommand(app);
     kelvo::addStartCommandCommand(app);
     kelvo::addDoctorCommand(app);
     kelvo::addExplainCommand(app);

@@ -63,7 +63,7 @@ TEST(Tracker, AChangeOfCellWithinAConnectionIsAHandover) {
     tracker.note(seen, kStart);
     seen = servedBy("B", 2);
     seen.isDedicated = true;
-    tracker.note(seen, kStart + 100ms);
+    tracker.note(seen, kStart + 10ms);
     EXPECT_EQ(tracker.events().back().kind, Kind::Handover);
 }
 
@@ -77,7 +77,7 @@ TEST(Tracker, AConnectionThatBeganWithTheNewCellIsNotHandedOver) {
     tracker.note(seen, kStart + 1s);
     seen.cell = "B";
     seen.cellRecord = 2;
-    tracker.note(seen, kStart + 1s + 20ms);
+    tracker.note(seen, kStart + 1s + 9ms);
     EXPECT_EQ(tracker.events().back().kind, Kind::Reselection);
 }
 

@@ -37,9 +37,12 @@ TEST_F(EventsCommand, TellsWhatHappenedWithTheRecordsTimes) {
 TEST_F(EventsCommand, AsJsonLinesAndAsCommaSeparatedValues) {
     const std::string file = capture(Technology::LTE, {connected(185, 122)});
     const Finished json = kelvoctl({"events", "--json", file});
-    EXPECT_EQ(json.output, R"({"time":"1970-01-01T00:00:00.000Z","event":"cell found","to":"EARFCN 5780, PCI 185",)"
-                           R"("levelAfter":"-109.50 dBm","record":1})"
-                           "\n");
+    EXPECT_EQ(json.output,
+              R"js({"time":"1970-01-01T00:00:00.000Z","event":"cell found","to":"EARFCN 5780, PCI 185",)js"
+              R"js("levelAfter":"-109.50 dBm","record":1,"values":{"Cell":{"after":"EARFCN 5780, PCI 185"},)js"
+              R"js("RSRP":{"after":"-109.50 dBm"},"RSRQ":{"after":"-10.00 dB"},"Radio":{"after":"LTE"},)js"
+              R"js("State":{"after":"connected"},"Band":{"after":"17 (739.0 MHz down, 709.0 MHz up)"}}})js"
+              "\n");
     const Finished csv = kelvoctl({"events", "--csv", file});
     EXPECT_EQ(
         csv.output,
@@ -65,7 +68,7 @@ TEST_F(EventsCommand, TheOverviewShowsTheCellsThatWereHeard) {
               "LTE, connected\n"
               "  Cell           EARFCN 5780, PCI 185\n"
               "  RSRP           -109.50 dBm, poor, 3 s ago\n"
-              "  RSRQ           -10.00 dB, excellent\n"
+              "  RSRQ           -10.00 dB, excellent, 3 s ago\n"
               "  Area           TAC 4566\n"
               "  Cell identity  77 (eNB 0, sector 77)\n"
               "  Band           17 (739.0 MHz down, 709.0 MHz up)\n"
@@ -82,6 +85,7 @@ TEST_F(EventsCommand, TheOverviewShowsTheCellsThatWereHeard) {
     EXPECT_EQ(shown["serving"]["level"]["number"], -109.5);
     EXPECT_EQ(shown["serving"]["level"]["record"], 1);
     EXPECT_EQ(shown["serving"]["age"], 3.0);
+    EXPECT_EQ(shown["serving"]["qualityAge"], 3.0);
     EXPECT_EQ(shown["cells"][0]["cell"], "EARFCN 5780, PCI 302");
     EXPECT_EQ(shown["cells"][0]["age"], 1.0);
     EXPECT_EQ(shown["cells"][0]["lost"], false);

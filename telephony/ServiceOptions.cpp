@@ -7,6 +7,7 @@
 #include <cstdio>
 
 #include "platform/encodings/WholeNumber.h"
+#include "platform/version/Version.h"
 
 namespace kelvo {
 namespace {
@@ -176,7 +177,7 @@ private:
     }
     void addStatus() {
         _app.add_flag("--json", _options.json, "The status as one JSON object")->needs(_status);
-        _app.set_version_flag("--version", "kelvo-telephonyd " KELVO_VERSION);
+        _app.set_version_flag("--version", versionLine("kelvo-telephonyd"));
     }
 
     void settle() {

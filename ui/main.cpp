@@ -20,6 +20,8 @@
 #include "platform/host/UnixSignals.h"
 #include "platform/system/DirectoryResources.h"
 #include "platform/system/Environment.h"
+#include "platform/version/Version.h"
+#include "ui/ApplicationOptions.h"
 #include "ui/KelvoApp.h"
 #include "ui/PlatformStart.h"
 #include "ui/QuickWindow.h"
@@ -57,7 +59,7 @@ int runApplication(int argc, char** argv) {
     HostSystemLog log("kelvo");
     const DirectoryResources resources(HostPaths::resourcesDirectory());
     const Environment::Scope environment(
-        {.log = &log, .resources = &resources, .standardOutput = stdout, .version = KELVO_VERSION});
+        {.log = &log, .resources = &resources, .standardOutput = stdout, .version = version()});
 
     HostMainQueue queue;
     HostMessagePorts ports;
@@ -82,6 +84,7 @@ int main(int argc, char** argv) {
     // A failure that ends the program still leaves through every destructor: the log is written out, the ports are
     // given up, and what happened is the last line on standard error.
     try {
+        if (const auto status = applicationExitStatus(argc, argv)) return *status;
         return runApplication(argc, argv);
     } catch (const std::exception& failure) {
         fmt::print(stderr, "kelvo: {}\n", failure.what());

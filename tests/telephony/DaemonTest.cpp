@@ -266,13 +266,6 @@ TEST_F(DaemonTest, SaysPlainlyWhichModemsHaveGenerations) {
               "generations\n");
 }
 
-TEST_F(DaemonTest, TellsItsVersion) {
-    const auto [status, error] = run({"--version"});
-    EXPECT_EQ(status, 0);
-    EXPECT_EQ(error, "");
-    EXPECT_EQ(_output, "kelvo-telephonyd " KELVO_VERSION "\n");
-}
-
 TEST_F(DaemonTest, HelpsOnStandardOutput) {
     const auto [status, error] = run({"--help"});
     EXPECT_EQ(status, 0);

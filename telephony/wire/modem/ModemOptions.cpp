@@ -5,6 +5,8 @@
 #include <CLI/CLI.hpp>
 #include <cstdio>
 
+#include "platform/version/Version.h"
+
 namespace kelvo::modem {
 namespace {
 
@@ -85,7 +87,7 @@ ParsedModemOptions parseModemOptions(int argc, const char* const* argv) {
         ->type_name("N")
         ->check(CLI::NonNegativeNumber)
         ->capture_default_str();
-    app.set_version_flag("--version", "kelvo-modem " KELVO_VERSION);
+    app.set_version_flag("--version", versionLine("kelvo-modem"));
     try {
         app.parse(argc, argv);
         if (simulate->count() > 0) options.simulate = *technologyBy(&TechnologyNames::word, std::string_view(word));

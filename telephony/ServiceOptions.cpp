@@ -93,7 +93,7 @@ public:
         settle();
         return _options;
     }
-    std::string help() const { return _app.help(); }
+    const CLI::App& app() const { return _app; }
 
 private:
     void addSources() {
@@ -221,7 +221,7 @@ ParsedOptions parseServiceOptions(int argc, const char* const* argv) {
     try {
         return {line.read(argc, argv), 0};
     } catch (const CLI::CallForHelp&) {
-        fmt::print("{}", line.help());
+        fmt::print("{}", line.app().help());
         return {std::nullopt, 0};
     } catch (const CLI::CallForVersion& version) {
         fmt::print("{}\n", version.what());
@@ -231,5 +231,7 @@ ParsedOptions parseServiceOptions(int argc, const char* const* argv) {
         return {std::nullopt, 1};
     }
 }
+
+void describeServiceOptions(const std::function<void(const CLI::App&)>& reader) { reader(CommandLine().app()); }
 
 }  // namespace kelvo

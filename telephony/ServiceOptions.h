@@ -2,6 +2,7 @@
 
 #include <cstdint>
 #include <filesystem>
+#include <functional>
 #include <optional>
 #include <string>
 
@@ -10,6 +11,10 @@
 #include "telephony/line/SerialLine.h"
 #include "telephony/simulation/Generation.h"
 #include "telephony/wire/Session.h"
+
+namespace CLI {
+class App;
+}
 
 namespace kelvo {
 
@@ -40,5 +45,8 @@ struct ParsedOptions {
 
 /// Reads the command line. Prints help to standard output and errors, in one line, to standard error.
 ParsedOptions parseServiceOptions(int argc, const char* const* argv);
+
+/// Shows the command line's description to `reader`, for the manual.
+void describeServiceOptions(const std::function<void(const CLI::App&)>& reader);
 
 }  // namespace kelvo

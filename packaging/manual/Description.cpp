@@ -35,7 +35,7 @@ Argument describeArgument(const CLI::Option& option) {
     argument.isRequired = option.get_required();
     argument.needs = sortedNames(option.get_needs());
     argument.excludes = sortedNames(option.get_excludes());
-    if (option.get_type_size_max() == 0) return argument;
+    if (option.get_expected_max() == 0) return argument;
     argument.type = option.nonpositional() ? option.get_type_name() : argument.names.front();
     argument.type = argument.type.substr(
         0, argument.type.find(':') == std::string::npos || argument.type.find('|') != std::string::npos

@@ -137,8 +137,7 @@ TEST_F(DaemonTest, TellsItsStatusToWhoeverAsks) {
 TEST_F(DaemonTest, SaysInOneLineWhatIsWrongWithItsCommandLine) {
     const QString capture = QString::fromStdString(_capture);
     const QString missing = QString::fromStdString(_temporary.path() / "missing");
-    for (const QStringList& arguments : {QStringList{},
-                                         QStringList{"--replay"},
+    for (const QStringList& arguments : {QStringList{"--replay"},
                                          QStringList{"--replay", missing},
                                          QStringList{"--replay", capture, "--speed", "0"},
                                          QStringList{"--replay", capture, "--speed", "-1"},

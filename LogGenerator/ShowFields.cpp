@@ -32,13 +32,12 @@ void showDelivered(Value& value, const Value& delivered) {
 
 void showFields(Dictionary& shown, RecordView record, std::size_t base, std::span<const Field> fields) {
     const std::uint64_t number = RecordBeingShown::number();
-    std::size_t next = 0;
     for (const Field& field : fields) {
         const std::int64_t raw = record.read(base + field.at, field.raw);
         if (field.shown.leavesOut(raw)) {
             shown.remove(field.key);
         } else {
-            showValue(shown.slot(field.key, next), raw, field.shown, field.place.from(base), number);
+            showValue(shown.slot(field.key), raw, field.shown, field.place.from(base), number);
         }
     }
 }

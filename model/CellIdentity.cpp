@@ -1,5 +1,6 @@
 #include "model/CellIdentity.h"
 
+#include <algorithm>
 #include <array>
 #include <unordered_map>
 
@@ -59,6 +60,11 @@ void append(std::string& identity, const std::string& shortName, const std::stri
 const std::string* shortNameOf(std::string_view key) {
     const auto at = shortNames().find(key);
     return at != shortNames().end() ? &at->second : nullptr;
+}
+
+bool namesAnArea(std::string_view key) {
+    constexpr std::array<std::string_view, 4> kKeys = {"MCC", "MNC", "LAC", "RAC"};
+    return std::ranges::find(kKeys, key) != kKeys.end();
 }
 
 int rankAsServingCell(std::string_view key) {

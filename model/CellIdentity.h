@@ -14,6 +14,9 @@ namespace kelvo {
 /// and measures nothing; null for every other key.
 const std::string* shortNameOf(std::string_view key);
 
+/// Whether the value of `key` names an area or a network: a number to write, and none to reckon with.
+bool namesAnArea(std::string_view key);
+
 /// Whether the value of `key`, outside of lists, names the serving cell; the smaller the better people know it by that
 /// name. 0 when it does not.
 int rankAsServingCell(std::string_view key);

@@ -120,8 +120,8 @@ void KelvoModel::chooseGenerator(const Value& answer) {
     const std::string* identifier = technology->string();
     _logGenerator = identifier != nullptr ? generatorFromTechnology(*identifier) : nullptr;
     if (_logGenerator) _logGenerator->limitRawLog(kRawLogLimit);
-    if (_logGenerator && !_technology)
-        _technology = technologyBy(&TechnologyNames::identifier, std::string_view(*identifier));
+    if (_logGenerator) _spokenTechnology = technologyBy(&TechnologyNames::identifier, std::string_view(*identifier));
+    if (!_technology) _technology = _spokenTechnology;
     logLine(Level::Error, "Got log generated: %p", addressOf(_logGenerator));
 }
 
@@ -141,6 +141,7 @@ void KelvoModel::startMonitor() {
     _displayUpdateTimer = _services.queue.repeat(2s, _lifetime.whileAlive([this] { refresh(); }));
     _receiving = false;
     _silentSince = _services.queue.now();
+    ++_connectionCount;
     tellConnection();
 }
 

@@ -70,6 +70,14 @@ public:
     NodeRef shownNodeAtPath(const std::string& path) const { return _nodesByPath.find(path); }
     /// The family whose screens these are: the first that was spoken; none before.
     std::optional<Technology> technology() const { return _technology; }
+    /// What the modem speaks that was connected last; another than the screens' when it was exchanged. None before.
+    std::optional<Technology> spokenTechnology() const { return _spokenTechnology; }
+    /// The values of the screens as they are now, without a refresh; none before the first record.
+    const Value& display() const { return (*_state)["Display"]; }
+    /// How many records have come so far, over all connections.
+    std::uint64_t recordCount() const { return _records.count(); }
+    /// How often a connection has come: one that went and came back between two looks is another.
+    std::uint64_t connectionCount() const { return _connectionCount; }
     /// How the values have gone; each rebuild of the tree is one refresh of them. Their time is that of the main queue.
     const Trends& trends() const { return _trends; }
     Trends::Time trendTime() const;
@@ -110,6 +118,8 @@ private:
     std::vector<std::unique_ptr<LogGenerator>> _replacedGenerators;  // none is released before the model goes
     std::unique_ptr<LogGenerator> _logGenerator;
     std::optional<Technology> _technology;
+    std::optional<Technology> _spokenTechnology;
+    std::uint64_t _connectionCount = 0;
     NodeRef _nodes;
     NodesByPath _nodesByPath;  // built with _nodes and empty without
     Trends _trends;

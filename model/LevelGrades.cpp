@@ -48,13 +48,14 @@ std::span<const LevelGrade> gradesOf(std::string_view trendName, std::string_vie
     const std::string_view key = takeLast(path);
     if (unit == "dBm" && has(key, "RSRP")) return kRsrp;
     if (unit == "dB" && has(key, "RSRQ")) return kRsrq;
-    if (unit == "dB" && key == "Energy Per Chip") return kEcIo;
+    if (unit == "dB" && (key == "Energy Per Chip" || key == "ECN0")) return kEcIo;
     if (unit == "dB" && isNumber(key) && path.ends_with("/Active Set")) return kEcIo;  // a pilot by its PN offset
     // The serving cell's record has the index, whatever the screen calls it; so have its neighbors'.
     if (key == "Serving Rx Level") return kRxLevIndex;
     if (key != "RSSI") return {};
     if (path.ends_with("/GSM Serving Cell") || has(path, "/Neighboring Cells/")) return kRxLevIndex;
-    if (unit == "dBm" && has(path, "GSM Set/")) return kRxLev;
+    const bool isCellMonitors = path == "/Serving" || has(path, "/Neighbours/GSM/");
+    if (unit == "dBm" && (isCellMonitors || has(path, "GSM Set/"))) return kRxLev;
     return {};
 }
 

@@ -60,7 +60,7 @@ private:
     void visitLeaf(std::string_view key, const Value& value) {
         const Reading* reading = value.reading();
         const bool isName = shortNameOf(key) != nullptr;
-        if (reading != nullptr && !isName && reading->quantity->measure(reading->raw)) {
+        if (reading != nullptr && !isName && !namesAnArea(key) && reading->quantity->measure(reading->raw)) {
             return _trends.noteNumber(_name, *reading, value.record());
         }
         if (isName && _openArrays > 0) return;  // is the row's name

@@ -8,11 +8,19 @@ namespace kelvo::overview {
 namespace {
 
 constexpr std::string_view kReference = "(ref pilot) ";
+constexpr const char* kInTraffic = "in traffic";
 
 /// "Traffic [8]" without its number.
 std::string withoutNumber(std::string label) {
     if (const std::size_t bracket = label.rfind(" ["); bracket != label.npos && bracket > 0) label.resize(bracket);
     return label;
+}
+
+/// An idle phone sleeps and wakes for its pages every few seconds: that is no change of its state.
+std::string stateOf(const std::string& label) {
+    const std::string state = withoutNumber(label);
+    if (state == "Paging" || state == "Slotted mode sleep state") return "idle";
+    return state == "Traffic" ? kInTraffic : state;
 }
 
 /// "800 MHz cellular band [0]".
@@ -59,8 +67,8 @@ Observation observeCdma(const Value& display) {
     const Screens system(screens.at("System"));
     Observation seen;
     seen.access = "CDMA2000 1x";
-    seen.state = withoutNumber(oneX.text("State"));
-    seen.isDedicated = seen.state == "Traffic";
+    seen.state = stateOf(oneX.text("State"));
+    seen.isDedicated = seen.state == kInTraffic;
     seen.channel = named("channel", oneX.text("Rx0 Channel"));
     seen.level = measure("Rx AGC", oneX.figure("Rx0 AGC"));
     observePilots(seen, oneX);
@@ -68,9 +76,10 @@ Observation observeCdma(const Value& display) {
     const auto bandClass = numberOf(oneX.text("Rx0 Band Class"));
     const auto channel = oneX.whole("Rx0 Channel");
     addBand(seen, bandClass && channel ? cdmaBands(*bandClass, *channel) : std::vector<BandChannel>());
-    const std::string sid = named("SID", system.text("System ID"));
-    const std::string nid = named("NID", system.text("Network ID"));
-    seen.area = sid.empty() || nid.empty() ? sid : sid + ", " + nid;
+    const auto sid = system.whole("System ID");  // no number: a system of another kind
+    const auto nid = system.whole("Network ID");
+    if (sid) seen.area = fmt::format("SID {}", *sid);
+    if (sid && nid) seen.area += fmt::format(", NID {}", *nid);
     add(seen.serving, "Base station", system.text("Base Station ID"));
     const std::string session = evdo.text("Session State");
     const std::string device = evdo.text("Device State");

@@ -1,5 +1,7 @@
 #include "overview/Families.h"
 
+#include <algorithm>
+
 namespace kelvo::overview {
 namespace {
 
@@ -44,6 +46,23 @@ void addBand(Observation& seen, const std::vector<BandChannel>& bands) {
         shown += fmt::format("{}{} ({})", shown.empty() ? "" : " or ", band.band, frequencies(band));
     }
     add(seen.serving, "Band", shown);
+}
+
+void addNetwork(Observation& seen, std::string country, std::string network) {
+    network.erase(network.find_last_not_of(' ') + 1);
+    if (country.empty() || network.empty()) return;
+    country.insert(0, 3 - std::min<std::size_t>(country.size(), 3), '0');
+    network.insert(0, 2 - std::min<std::size_t>(network.size(), 2), '0');
+    add(seen.serving, "Network", country + "-" + network);
+}
+
+void addRncAndCell(Observation& seen, std::int64_t identity) {
+    add(seen.serving, "Cell identity",
+        fmt::format("{} (RNC {}, cell {})", identity, identity >> 16 & 0xFFF, identity & 0xFFFF));
+}
+
+void addColorCodes(Observation& seen, std::int64_t bsic) {
+    add(seen.serving, "Color codes", fmt::format("NCC {}, BCC {}", bsic / 8 % 8, bsic % 8));
 }
 
 void addContexts(Observation& seen, const Value& contexts) {

@@ -2,11 +2,13 @@
 
 #include "overview/Families.h"
 
-/// GSM and UMTS: the phone is on the radio whose serving level came last.
+/// GSM and UMTS: the phone is on the radio whose serving cell was told last. What the other one's screens say, and what
+/// a state was when the phone was here before, is of the past.
 namespace kelvo::overview {
 namespace {
 
 constexpr const char* kGsmCell = "GSM Cell and Neighbours/GSM Serving Cell";
+constexpr const char* kRrState = "GSM Cell and Neighbours/GSM RR Info/RR State";
 constexpr const char* kUmtsCell = "UMTS Radio/UMTS RR Info";
 constexpr const char* kActiveSet = "UMTS Cells/Active Set";
 
@@ -24,41 +26,58 @@ std::optional<Measure> rxLevel(std::optional<Figure> figure) {
     return measure("RxLev", std::move(figure), Graded::RxLev);
 }
 
-void observeGsm(Observation& seen, const Screens& screens) {
+/// `left` is the last record of the other radio.
+std::string stateSince(std::uint64_t left, const Screens& screens, const std::string& path) {
+    return screens.record(path) > left ? screens.text(path) : std::string();
+}
+
+void observeGsm(Observation& seen, const Screens& screens, std::uint64_t leftUmts) {
     const Screens cell(screens.at(kGsmCell));
     seen.access = "GSM";
-    seen.state = screens.text("GSM Cell and Neighbours/GSM RR Info/RR State");
-    seen.isDedicated = seen.state == "RR_DATA_TRANSFER";
+    seen.state = stateSince(leftUmts, screens, kRrState);
+    if (seen.state == "RR_INACTIVE") seen.state.clear();  // on its way to UMTS, or there already
+    seen.isDedicated = seen.state == "RR_DATA_TRANSFER" || seen.state == "RR_G2W_INTERRAT_HANDOVER_ PROGRESS";
+    seen.cellComesInParts = true;
     seen.channel = named("ARFCN", cell.text("ARFCN"));
     seen.cell = identity(seen.channel, named("BSIC", cell.text("BSIC")));
     seen.cellRecord = cell.record("ARFCN");
-    if (const auto bsic = cell.whole("BSIC")) {
-        add(seen.serving, "Color codes", fmt::format("NCC {}, BCC {}", *bsic / 8 % 8, *bsic % 8));
-    }
+    if (const auto bsic = cell.whole("BSIC")) addColorCodes(seen, *bsic);
     add(seen.serving, "Cell identity", cell.text("Cell ID"));
     const auto arfcn = cell.whole("ARFCN");
     addBand(seen, arfcn ? gsmBands(*arfcn) : std::vector<BandChannel>());
     seen.level = rxLevel(cell.figure("RSSI"));
 }
 
-void observeUmts(Observation& seen, const Screens& screens) {
+/// Of the cells of a soft handover the one that the cell's own screen names, else the first.
+const Value* servingOf(const std::vector<Value>& active, const Screens& cell) {
+    const std::string code = cell.text("Scrambling Code");
+    const auto row =
+        std::ranges::find_if(active, [&](const Value& one) { return Screens(one).text("Scrambling Code") == code; });
+    return row != active.end() ? &*row : active.empty() ? nullptr : &active.front();
+}
+
+void observeUmts(Observation& seen, const Screens& screens, std::uint64_t leftGsm) {
     const Screens cell(screens.at(kUmtsCell));
     seen.access = "UMTS";
-    seen.state = cell.text("RRC State");
+    seen.state = stateSince(leftGsm, screens, in(kUmtsCell, "RRC State"));
     seen.isDedicated = seen.state == "CELL_DCH";
     const std::string channel = cell.text("UARFCN").empty() ? "Downlink Frequency" : "UARFCN";
     seen.channel = named("UARFCN", cell.text(channel));
     const auto active = rowsOf(screens.at(kActiveSet));
-    if (!active.empty()) {
-        const Screens best(active.front());
-        seen.cell = identity(seen.channel, named("PSC", best.text("Scrambling Code")));
-        seen.cellRecord = best.record("Scrambling Code");
-        seen.level = measure("RSCP", best.figure("RSCP"));
-        seen.quality = measure("Ec/Io", best.figure("Energy Per Chip"), Graded::EcIo);
+    const Value* row = servingOf(active, cell);
+    const std::uint64_t told = cell.record("Scrambling Code");
+    if (row != nullptr) {
+        const Screens serving(*row);
+        seen.cell = identity(seen.channel, named("PSC", serving.text("Scrambling Code")));
+        seen.cellRecord = serving.record("Scrambling Code");
+        seen.level = measure("RSCP", serving.figure("RSCP"));
+        seen.quality = measure("Ec/Io", serving.figure("Energy Per Chip"), Graded::EcIo);
     }
-    if (const auto id = cell.whole("Cell ID")) {
-        add(seen.serving, "Cell identity", fmt::format("{} (RNC {}, cell {})", *id, *id >> 16, *id & 0xFFFF));
+    if (told > seen.cellRecord) {  // the active set is not that of this cell yet
+        seen.cell = identity(seen.channel, named("PSC", cell.text("Scrambling Code")));
+        seen.cellRecord = told;
     }
+    if (const auto id = cell.whole("Cell ID")) addRncAndCell(seen, *id);
     const auto uarfcn = cell.whole(channel);
     addBand(seen, uarfcn ? utraFddBands(*uarfcn) : std::vector<BandChannel>());
     add(seen.serving, "Transmit power", cell.text("Transmit Power"));
@@ -78,6 +97,7 @@ void addGsmCell(Observation& seen, const Value& row) {
 void addUmtsCell(Observation& seen, const Value& row, std::string channel, std::string_view mark) {
     const Screens cell(row);
     if (channel.empty()) channel = named("UARFCN", cell.text("UARFCN"));
+    if (channel.empty()) channel = named("UARFCN", cell.text("Downlink Frequency"));
     HeardCell heard;
     heard.identity = identity(channel, named("PSC", cell.text("Scrambling Code")));
     heard.mark = mark;
@@ -90,7 +110,10 @@ void addUmtsCell(Observation& seen, const Value& row, std::string channel, std::
 void observeCells(Observation& seen, const Screens& screens) {
     const std::string channel = seen.access == "UMTS" ? seen.channel : std::string();
     const auto active = rowsOf(screens.at(kActiveSet));
-    for (std::size_t i = 1; i < active.size() && !channel.empty(); ++i) addUmtsCell(seen, active[i], channel, "active");
+    for (const Value& row : active) {
+        if (!channel.empty()) addUmtsCell(seen, row, channel, "active");
+    }
+    std::erase_if(seen.cells, [&](const HeardCell& cell) { return cell.identity == seen.cell; });
     for (const Value& row : rowsOf(screens.at("UMTS Cells/UMTS Set"))) addUmtsCell(seen, row, {}, "");
     for (const char* list : {"Neighboring Cells", "GSM Set"}) {
         for (const Value& row : rowsOf(screens.at(in("GSM Cell and Neighbours", list)))) addGsmCell(seen, row);
@@ -103,11 +126,9 @@ void observeRegistration(Observation& seen, const Screens& screens) {
     const std::string lac = named("LAC", network.text("Location Area Code"));
     const std::string rac = named("RAC", network.text("Routing Area Code"));
     seen.area = lac.empty() || rac.empty() ? lac : lac + ", " + rac;
-    std::string code = network.text("Mobile Network Code");
-    code.erase(code.find_last_not_of(' ') + 1);
-    const std::string country = network.text("Mobile Country Code");
-    if (!country.empty() && !code.empty()) add(seen.serving, "Network", country + "-" + code);
+    addNetwork(seen, network.text("Mobile Country Code"), network.text("Mobile Network Code"));
     const std::string service = network.text("Service Type");
+    seen.knowsService = !service.empty();
     seen.isWithoutService = service == "NO_SERVICE" || service == "LIMITED_SERVICE";
     seen.registrationState = registration.text("Process PS/MM State");
     const std::string update = registration.text("Process CS/LU Reject Cause");
@@ -126,14 +147,14 @@ void observeRegistration(Observation& seen, const Screens& screens) {
 Observation observeGsmUmts(const Value& display) {
     const Screens screens(display);
     Observation seen;
-    std::uint64_t umts = 0;
+    std::uint64_t umts = screens.record(in(kUmtsCell, "Scrambling Code"));
     for (const Value& row : rowsOf(screens.at(kActiveSet)))
         umts = std::max(umts, Screens(row).record("Scrambling Code"));
-    const std::uint64_t gsm = screens.record(in(kGsmCell, "RSSI"));
+    const std::uint64_t gsm = screens.record(kGsmCell);
     if (umts > gsm) {
-        observeUmts(seen, screens);
+        observeUmts(seen, screens, gsm);
     } else if (gsm != 0) {
-        observeGsm(seen, screens);
+        observeGsm(seen, screens, umts);
     }
     observeCells(seen, screens);
     observeRegistration(seen, screens);

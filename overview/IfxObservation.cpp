@@ -39,16 +39,18 @@ Observation observeIfx(const Value& display) {
     seen.access = serving.text("Technology");
     const bool isUmts = seen.access == "UMTS";
     seen.state = textOf(screens, "Connection");
-    seen.isDedicated = seen.state == "Call" || screens.text("Connection/Channel") == "DCH";
+    seen.isDedicated = !seen.state.empty() && seen.state != "Idle";
     seen.channel = isUmts ? named("UARFCN", serving.text("UARFCN")) : named("ARFCN", serving.text("ARFCN"));
     seen.cellRecord = serving.record("");
     seen.cell =
         identity(seen.channel, isUmts ? named("PSC", serving.text("SCN")) : named("BSIC", serving.text("BSIC")));
-    const std::string country = serving.text("MCC");
-    const std::string network = serving.text("MNC");
-    if (!country.empty() && !network.empty()) add(seen.serving, "Network", country + "-" + network);
+    addNetwork(seen, serving.text("MCC"), serving.text("MNC"));
     seen.area = named("LAC", serving.text("LAC"));
-    add(seen.serving, "Cell identity", serving.text("CellId"));
+    const auto id = serving.whole("CellId");
+    const auto bsic = serving.whole("BSIC");
+    if (id && isUmts && *id >= 0) addRncAndCell(seen, *id);
+    if (id && !isUmts) add(seen.serving, "Cell identity", std::to_string(*id));
+    if (bsic && !isUmts) addColorCodes(seen, *bsic);
     seen.band = serving.text("BandInfo");
     const auto number = serving.whole(isUmts ? "UARFCN" : "ARFCN");
     auto bands = !number ? std::vector<BandChannel>() : isUmts ? utraFddBands(*number) : gsmBands(*number);
@@ -61,6 +63,7 @@ Observation observeIfx(const Value& display) {
     for (const Value& row : rowsOf(screens.at("Neighbours/GSM"))) addCell(seen, row, false);
     for (const Value& row : rowsOf(screens.at("Neighbours/UMTS"))) addCell(seen, row, true);
     seen.registrationState = textOf(screens, "Registration");
+    seen.knowsService = !seen.registrationState.empty();
     seen.isWithoutService = seen.registrationState == "Searching";
     add(seen.registration, "Registration", seen.registrationState);
     for (const char* rate : {"Errors", "Throughput", "TxPower"})

@@ -44,13 +44,15 @@ struct Context {
 
 /// What the screens say at one moment, in the words of the overview. Whatever they do not say is empty.
 struct Observation {
-    std::string access;        ///< which radio the phone is on: "LTE", "GSM", "UMTS", "CDMA2000 1x"
-    std::string state;         ///< "idle", "connected", "Cell DCH", "traffic"
-    bool isDedicated = false;  ///< connected: a change of cell is a handover
+    std::string access;         ///< which radio the phone is on: "LTE", "GSM", "UMTS", "CDMA2000 1x"
+    std::string state;          ///< "idle", "connected", "Cell DCH", "traffic"
+    bool isDedicated = false;   ///< connected: a change of cell is a handover
+    bool knowsService = false;  ///< the screens tell whether there is service
     bool isWithoutService = false;
-    std::string cell;              ///< the serving cell's identity as in `HeardCell`
-    std::uint64_t cellRecord = 0;  ///< which told that it serves
-    std::string channel;           ///< the part of it that names the carrier
+    std::string cell;               ///< the serving cell's identity as in `HeardCell`
+    std::uint64_t cellRecord = 0;   ///< which told that it serves
+    std::string channel;            ///< the part of it that names the carrier
+    bool cellComesInParts = false;  ///< records tell carrier and code apart, so that one may be new and one old
     std::string band;
     std::string area;           ///< "TAC 1042"
     std::vector<Fact> serving;  ///< what else is known of the serving cell

@@ -22,9 +22,7 @@ Observation observeUtran(const Value& display) {
     const std::string lac = named("LAC", info.text("Local Area Code"));
     const std::string ura = named("URA", info.text("URA ID"));
     seen.area = lac.empty() || ura.empty() ? lac + ura : lac + ", " + ura;
-    if (const auto id = info.whole("Cell ID")) {
-        add(seen.serving, "Cell identity", fmt::format("{} (RNC {}, cell {})", *id, *id >> 16, *id & 0xFFFF));
-    }
+    if (const auto id = info.whole("Cell ID")) addRncAndCell(seen, *id);
     const auto uarfcn = info.whole("Downlink UARFCN");
     addBand(seen, uarfcn ? utraTddBands(*uarfcn) : std::vector<BandChannel>());
     add(seen.serving, "Access", info.text("Allowed Access"));

@@ -2,19 +2,13 @@
 
 #include <fmt/format.h>
 
-#include <optional>
 #include <string>
 
 #include "LogGenerator/LogGenerator.h"
 #include "LogGenerator/RecordLedger.h"
-#include "platform/host/Capture.h"
 #include "tools/CommandFailure.h"
 
 namespace kelvo {
-
-/// Which family a capture, `path`, is decoded as: `chosen` or else what its link type names; a failure when it names
-/// none.
-Technology technologyOf(const std::string& path, std::optional<Technology> chosen, const CaptureReader& reader);
 
 /// Hands `message` to the generator; what it shows bears its number in `records`.
 void update(LogGenerator& generator, Dictionary& state, RecordLedger& records, ByteView message,

@@ -10,10 +10,8 @@
 #include "LogGenerator/Factory.h"
 #include "LogGenerator/RecordLedger.h"
 #include "model/Snapshot.h"
-#include "platform/host/Capture.h"
 #include "platform/system/Environment.h"
 #include "platform/system/OutputFile.h"
-#include "telephony/recordings/RecordingKind.h"
 #include "tools/CapturePackets.h"
 #include "tools/Command.h"
 #include "tools/DisplayJson.h"
@@ -26,6 +24,7 @@
 #include "tools/ProvenanceJson.h"
 #include "tools/StandardOutput.h"
 #include "tools/TechnologyOption.h"
+#include "tools/inputs/Input.h"
 
 namespace kelvo {
 
@@ -80,29 +79,23 @@ struct Decoded {
     std::optional<Failure> breakOff;  ///< where the capture can be read no further, and why
 };
 
-Decoded decodeAll(const Options& options, CaptureReader& reader, LogGenerator& generator, Dictionary& state) {
+Decoded decodeAll(const Options& options, Input& input, LogGenerator& generator, Dictionary& state) {
     const FamilyCodes codes(*generator.getStartCommand());
     Decoded decoded;
-    while (!decoded.breakOff) {
-        const auto packet = reader.next();
-        if (!packet) {
-            decoded.breakOff = packet.error();
-        } else if (!*packet) {
-            break;
-        } else {
-            ++decoded.messages;
-            decoded.understood += codes.include((*packet)->bytes) ? 1 : 0;
-            decoded.end = (*packet)->time.time_since_epoch();
-            orTell(options.file, decoded.messages, [&] {
-                update(generator, state, decoded.records, (*packet)->bytes, decoded.end);
-                if (options.refreshEvery && decoded.messages % *options.refreshEvery == 0) {
-                    generator.generateLogUsingState(state);
-                }
-            });
-        }
+    while (const auto packet = input.next()) {
+        decoded.messages = input.count();
+        decoded.understood += codes.include(packet->bytes) ? 1 : 0;
+        decoded.end = packet->time.time_since_epoch();
+        orTell(input.name(), decoded.messages, [&] {
+            update(generator, state, decoded.records, packet->bytes, decoded.end);
+            if (options.refreshEvery && decoded.messages % *options.refreshEvery == 0) {
+                generator.generateLogUsingState(state);
+            }
+        });
     }
+    decoded.breakOff = input.breakOff();
     if (decoded.breakOff && decoded.messages == 0) throw CommandFailure(*decoded.breakOff);
-    orTell(options.file, decoded.messages, [&] { decoded.display = generator.generateLogUsingState(state); });
+    orTell(input.name(), decoded.messages, [&] { decoded.display = generator.generateLogUsingState(state); });
     if (decoded.messages != 0 && !decoded.display) {
         throw CommandFailure("the display's template cannot be loaded; the installation is not complete");
     }
@@ -122,36 +115,33 @@ std::string grouped(std::size_t number) {
 }
 
 /// Screens of another family than the capture's are empty or, worse, look right.
-void warnOfOtherFamily(const Options& options, const Decoded& decoded, const CaptureReader& reader) {
-    const bool named = options.technology && reader.technology() && *options.technology != *reader.technology();
+void warnOfOtherFamily(const Decoded& decoded, const Input& input) {
+    const auto told = input.technologyTold();
+    const bool named = told && *told != input.technology();
     if (decoded.messages == 0 || (decoded.understood != 0 && !named)) return;
     std::string line = fmt::format(
         "{} of {} record{} {} of this family", decoded.understood != 0 ? grouped(decoded.understood) : "none",
         grouped(decoded.messages), decoded.messages != 1 ? "s" : "", decoded.understood > 1 ? "are" : "is");
     if (named) {
-        line += fmt::format("; the link type says {}, not {}", namesOf(*reader.technology()).name,
-                            namesOf(*options.technology).name);
+        line += fmt::format("; the link type says {}, not {}", namesOf(*told).name, namesOf(input.technology()).name);
     }
-    fmt::print(stderr, "kelvoctl: {}: {}\n", printable(options.file), line);
+    fmt::print(stderr, "kelvoctl: {}: {}\n", printable(input.name()), line);
 }
 
 /// Followed record by record: the cells around and what happened are more than the last values.
-void showOverview(const Options& options, CaptureReader& reader, Technology technology) {
-    const FollowedCapture followed = followCapture(options.file, reader, technology);
+void showOverview(const Options& options, Input& input) {
+    const FollowedCapture followed = followCapture(input);
     writeToStandardOutput(options.json ? printedJson(overviewJson(followed.tracker, followed.end))
                                        : overviewText(followed.tracker, followed.end));
     if (followed.breakOff) throw CommandFailure(*followed.breakOff);
 }
 
 void decode(const Options& options) {
-    auto opened = CaptureReader::open(options.file);
-    if (!opened) throw CommandFailure(whyNoCapture(options.file, opened.error().reason));
-    CaptureReader& reader = *opened;
-    const Technology technology = technologyOf(options.file, options.technology, reader);
-    if (options.overview) return showOverview(options, reader, technology);
-    const TechnologyNames& names = namesOf(technology);
+    Input input = orFail(Input::openCapture(options.file, options.technology));
+    if (options.overview) return showOverview(options, input);
+    const TechnologyNames& names = namesOf(input.technology());
     std::optional<OutputFile> output;
-    if (options.save) output = orFail(OutputFile::create(*options.save, {options.force, {options.file}}));
+    if (options.save) output = orFail(OutputFile::create(*options.save, {options.force, filesOf({options.file})}));
 
     CollectedLog log;
     Environment environment = Environment::current();
@@ -161,7 +151,7 @@ void decode(const Options& options) {
     const auto generator = generatorFromTechnology(names.identifier);
     if (!generator) throw CommandFailure(fmt::format("no generator decodes {}", names.name));
     const DictionaryRef state = Dictionary::make();
-    const Decoded decoded = decodeAll(options, reader, *generator, *state);
+    const Decoded decoded = decodeAll(options, input, *generator, *state);
     if (output) save(*output, *generator, *state);
 
     if (options.json) {
@@ -175,7 +165,7 @@ void decode(const Options& options) {
     } else {
         writeToStandardOutput(log.text() + displayText(decoded.display));
     }
-    warnOfOtherFamily(options, decoded, reader);
+    warnOfOtherFamily(decoded, input);
     if (decoded.breakOff) throw CommandFailure(*decoded.breakOff);
 }
 
@@ -184,7 +174,8 @@ void decode(const Options& options) {
 void addDecodeCommand(CLI::App& app) {
     CLI::App& command = addCommand(app, "decode", "Shows what the messages of a capture give on the screens");
     const auto options = std::make_shared<Options>();
-    command.add_option("FILE", options->file, "A classic pcap file, one log message a packet")->required();
+    command.add_option("FILE", options->file, "A classic pcap file, one log message a packet; - for standard input")
+        ->required();
     addTechnologyOption(command, options->technology, "Decodes as this technology, whatever the link type says");
     addNumberOption(command, "--refresh-every", options->refreshEvery, 1,
                     "Rebuilds the display, and so records a snapshot, after every N messages too");
@@ -210,6 +201,7 @@ void addDecodeCommand(CLI::App& app) {
         "Examples:\n"
         "  kelvoctl decode drive.pcap\n"
         "  kelvoctl decode --json drive.pcap | jq .display\n"
+        "  zcat drive.pcap.gz | kelvoctl decode -\n"
         "  kelvoctl decode --overview drive.pcap\n"
         "  kelvoctl decode --json --provenance drive.pcap | jq '.display.\"Serving Cell Measurements\"'\n"
         "  kelvoctl decode --log drive.pcap | grep '^\\[3\\]'\n"

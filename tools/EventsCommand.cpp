@@ -8,9 +8,8 @@
 #include <vector>
 
 #include "platform/encodings/Utf8.h"
-#include "telephony/recordings/RecordingKind.h"
-#include "tools/CapturePackets.h"
 #include "tools/Command.h"
+#include "tools/CommandFailure.h"
 #include "tools/FollowedCapture.h"
 #include "tools/OverviewJson.h"
 #include "tools/OverviewText.h"
@@ -58,9 +57,8 @@ void listEvents(const Options& options) {
     }
     std::optional<Failure> breakOff;
     for (const std::string& file : options.files) {
-        auto reader = CaptureReader::open(file);
-        if (!reader) throw CommandFailure(whyNoCapture(file, reader.error().reason));
-        const FollowedCapture followed = followCapture(file, *reader, technologyOf(file, options.technology, *reader));
+        Input input = orFail(Input::openCapture(file, options.technology));
+        const FollowedCapture followed = followCapture(input);
         std::string text;
         if (options.files.size() > 1 && !options.csv && !options.json) text = printable(file) + ":\n";
         for (const Event& event : followed.tracker.events()) text += lineOf(options, file, event);
@@ -77,7 +75,8 @@ void addEventsCommand(CLI::App& app) {
         addCommand(app, "events",
                    "Lists what happened in captures: changes of cell, state, area and registration, contexts, service");
     const auto options = std::make_shared<Options>();
-    command.add_option("FILE", options->files, "Classic pcap files, one log message a packet")->required();
+    command.add_option("FILE", options->files, "Classic pcap files, one log message a packet; - for standard input")
+        ->required();
     addTechnologyOption(command, options->technology, "Decodes as this technology, whatever the link type says");
     CLI::Option* csv = command.add_flag("--csv", options->csv, "Prints comma-separated values after RFC 4180");
     command.add_flag("--json", options->json, "Prints one JSON object a line")->excludes(csv);
@@ -86,6 +85,7 @@ void addEventsCommand(CLI::App& app) {
         "tells where it ends, and the status is 1.\n\n"
         "Examples:\n"
         "  kelvoctl events drive.pcap\n"
+        "  zcat drive.pcap.gz | kelvoctl events -\n"
         "  kelvoctl events --csv monday.pcap tuesday.pcap > events.csv\n"
         "  kelvoctl events --json drive.pcap | jq 'select(.event == \"handover\")'\n");
     command.callback([options] { listEvents(*options); });

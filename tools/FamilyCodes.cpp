@@ -2,7 +2,9 @@
 
 #include <algorithm>
 
+#include "LogGenerator/Factory.h"
 #include "LogGenerator/Framing.h"
+#include "platform/system/Environment.h"
 #include "platform/telephony/LogChannelProtocol.h"
 #include "platform/values/Array.h"
 
@@ -30,6 +32,13 @@ FamilyCodes::FamilyCodes(const Dictionary& startCommand) {
     append(*_codes, ordinary, 0);
     append(*_codes, extended, kExtendedLogCodes);
     std::ranges::sort(*_codes);
+}
+
+FamilyCodes FamilyCodes::of(Technology technology) {
+    Environment silent = Environment::current();
+    silent.log = nullptr;  // generators tell of themselves
+    const Environment::Scope scope(silent);
+    return FamilyCodes(*generatorFromTechnology(namesOf(technology).identifier)->getStartCommand());
 }
 
 bool FamilyCodes::include(ByteView message) const {

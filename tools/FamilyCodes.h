@@ -4,6 +4,7 @@
 #include <vector>
 
 #include "LogGenerator/LogCode.h"
+#include "platform/telephony/Technology.h"
 #include "platform/values/Bytes.h"
 #include "platform/values/Dictionary.h"
 
@@ -14,6 +15,7 @@ class FamilyCodes {
 public:
     /// By the family's start command; one that names no codes takes every message.
     explicit FamilyCodes(const Dictionary& startCommand);
+    static FamilyCodes of(Technology technology);
 
     /// Whether `message` is a record of this family.
     bool include(ByteView message) const;

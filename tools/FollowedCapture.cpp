@@ -9,7 +9,8 @@
 
 namespace kelvo {
 
-FollowedCapture followCapture(const std::string& path, CaptureReader& reader, Technology technology) {
+FollowedCapture followCapture(Input& input) {
+    const Technology technology = input.technology();
     Environment silent = Environment::current();
     silent.log = nullptr;
     const Environment::Scope scope(silent);
@@ -20,17 +21,14 @@ FollowedCapture followCapture(const std::string& path, CaptureReader& reader, Te
     FollowedCapture followed;
     followed.tracker =
         overview::Tracker({.events = std::numeric_limits<std::size_t>::max(), .span = overview::Time::duration::max()});
-    for (;;) {
-        const auto next = reader.next();
-        if (!next) followed.breakOff = next.error();
-        if (!next || !*next) break;
-        const CapturePacket& packet = **next;
-        ++followed.messages;
-        followed.end = std::chrono::floor<std::chrono::microseconds>(packet.time);
-        orTell(path, followed.messages,
-               [&] { update(*generator, *state, records, packet.bytes, packet.time.time_since_epoch()); });
+    while (const auto packet = input.next()) {
+        followed.end = std::chrono::floor<std::chrono::microseconds>(packet->time);
+        orTell(input.name(), input.count(),
+               [&] { update(*generator, *state, records, packet->bytes, packet->time.time_since_epoch()); });
         followed.tracker.note(overview::observe(technology, (*state)["Display"]), followed.end);
     }
+    followed.messages = input.count();
+    followed.breakOff = input.breakOff();
     if (followed.breakOff && followed.messages == 0) throw CommandFailure(*followed.breakOff);
     return followed;
 }

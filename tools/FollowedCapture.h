@@ -2,11 +2,10 @@
 
 #include <cstddef>
 #include <optional>
-#include <string>
 
 #include "overview/Tracker.h"
-#include "platform/host/Capture.h"
 #include "platform/values/Result.h"
+#include "tools/inputs/Input.h"
 
 namespace kelvo {
 
@@ -18,8 +17,8 @@ struct FollowedCapture {
     std::optional<Failure> breakOff;  ///< where the capture can be read no further, and why
 };
 
-/// Follows what is left of `reader`'s capture, `path`. Throws CommandFailure for a record that ends the program
-/// elsewhere.
-FollowedCapture followCapture(const std::string& path, CaptureReader& reader, Technology technology);
+/// Follows what is left of `input`. Throws CommandFailure for a record that ends the program elsewhere, and for an
+/// input that breaks off before its first record.
+FollowedCapture followCapture(Input& input);
 
 }  // namespace kelvo

@@ -5,10 +5,8 @@
 #include <algorithm>
 #include <memory>
 
-#include "LogGenerator/Factory.h"
 #include "LogGenerator/Framing.h"
 #include "platform/host/Capture.h"
-#include "platform/system/Environment.h"
 #include "tools/Command.h"
 #include "tools/CommandFailure.h"
 #include "tools/DisplayJson.h"
@@ -17,6 +15,7 @@
 #include "tools/TechnologyOption.h"
 #include "tools/import/ImportListing.h"
 #include "tools/import/ImportedFile.h"
+#include "tools/import/RecordingClock.h"
 #include "tools/import/TimeOption.h"
 
 namespace kelvo {
@@ -40,14 +39,8 @@ struct Options {
 void tell(const std::string& text) { fmt::print(stderr, "kelvoctl: {}\n", printable(text)); }
 
 void tellDamage(const std::string& path, const ImportedFile& file) {
-    const RecordingDamage damage = file.reader->damage();
-    if (damage.damagedFrames != 0) tell(fmt::format("{}: {} damaged frames left out", path, damage.damagedFrames));
-    if (damage.skippedBytes != 0) tell(fmt::format("{}: {} bytes between records skipped", path, damage.skippedBytes));
-    if (damage.encryptedRecords != 0) {
-        tell(fmt::format("{}: {} records are encrypted by the modem", path, damage.encryptedRecords));
-    }
-    if (damage.isCut) tell(path + " breaks off; what comes before is read");
-    if (!file.odd.empty()) tell(path + ": " + file.odd.front());
+    for (const std::string& line : damageOf(path, file)) tell(line);
+    if (file.reader->damage().isCut) tell(path + " breaks off; what comes before is read");
 }
 
 /// What all files hold. Every file is told of once, here.
@@ -61,27 +54,12 @@ RecordSurvey surveyOf(const Options& options) {
     return survey;
 }
 
-/// A clock that was not set counts from 1980 on: then a record's time is that of the record before it, and where there
-/// is none the first that any record tells.
-class Clocks {
-public:
-    explicit Clocks(std::optional<CaptureTime> first) : _last(first) {}
-
-    CaptureTime timeOf(const RecordedMessage& message) {
-        if (message.time) _last = message.time;
-        return _last.value_or(CaptureTime(std::chrono::sys_days(std::chrono::year(1980) / 1 / 6)));
-    }
-
-private:
-    std::optional<CaptureTime> _last;
-};
-
 /// The messages of several files by their times; of two at the same time that of the file named first.
 class Merge {
 public:
     Merge(const Options& options, const RecordSurvey& survey) {
         for (const std::string& path : options.files) {
-            _inputs.push_back({orFail(ImportedFile::open(path)), Clocks(survey.first())});
+            _inputs.push_back({orFail(ImportedFile::open(path)), RecordingClock(survey.first())});
         }
         for (Input& input : _inputs) advance(input);
     }
@@ -105,25 +83,18 @@ public:
 private:
     struct Input {
         ImportedFile file;
-        Clocks clocks;
+        RecordingClock clock;
         std::optional<RecordedMessage> next{};
         CaptureTime time{};
     };
     static void advance(Input& input) {
         input.next = orFail(input.file.reader->next());
-        if (input.next) input.time = input.clocks.timeOf(*input.next);
+        if (input.next) input.time = input.clock.timeOf(*input.next);
     }
 
     std::vector<Input> _inputs;
     Input* _given = nullptr;
 };
-
-FamilyCodes codesOf(Technology technology) {
-    Environment silent = Environment::current();
-    silent.log = nullptr;
-    const Environment::Scope scope(silent);
-    return FamilyCodes(*generatorFromTechnology(namesOf(technology).identifier)->getStartCommand());
-}
 
 struct Written {
     std::uint64_t records = 0;
@@ -133,7 +104,7 @@ struct Written {
 };
 
 Written writeCapture(const Options& options, const RecordSurvey& survey, Technology technology, CaptureWriter& writer) {
-    const FamilyCodes codes = codesOf(technology);
+    const FamilyCodes codes = FamilyCodes::of(technology);
     const auto subscription = options.subscription ? options.subscription : survey.subscription();
     adaptation::RecordAdapter adapter;
     Written written;

@@ -8,6 +8,7 @@
 #include "tools/EventsCommand.h"
 #include "tools/ExplainCommand.h"
 #include "tools/ImportCommand.h"
+#include "tools/ShareCommand.h"
 #include "tools/SnapshotCommand.h"
 #include "tools/StartCommandCommand.h"
 #include "tools/WatchCommand.h"
@@ -25,6 +26,7 @@ std::unique_ptr<CLI::App> makeKelvoctl() {
     addEventsCommand(*app);
     addSnapshotCommand(*app);
     addImportCommand(*app);
+    addShareCommand(*app);
     addStartCommandCommand(*app);
     addDoctorCommand(*app);
     addExplainCommand(*app);

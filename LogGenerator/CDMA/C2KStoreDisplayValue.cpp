@@ -6,7 +6,7 @@ namespace {
 
 /// Hands every place that is bound to `lookupKey` to `store`.
 template <class Store>
-void atEachPlace(Key lookupKey, const DictionaryRef& lookup, Store store) {
+void atEachPlace(const Key& lookupKey, const DictionaryRef& lookup, Store store) {
     static constexpr Key kDict("dict");
     static constexpr Key kKey("key");
     if (!lookup) return;

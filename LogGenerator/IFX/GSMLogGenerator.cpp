@@ -1,6 +1,7 @@
 #include "LogGenerator/IFX/GSMLogGenerator.h"
 
 #include "LogGenerator/AssertionFailure.h"
+#include "LogGenerator/IFX/NumberInText.h"
 #include "LogGenerator/ShowFields.h"
 #include "platform/encodings/PropertyList.h"
 #include "platform/telephony/LogChannelProtocol.h"
@@ -15,7 +16,21 @@ constexpr std::string_view kSource = "LogGenerator/GSM/GSMLogGenerator";
 Value simplifiedChild(const Value& child) {
     Value processed = GSMLogGenerator::processObject(child);
     Value collapsed = GSMLogGenerator::canCollapse(processed);
-    return collapsed ? collapsed : processed;
+    return collapsed ? std::move(collapsed) : std::move(processed);
+}
+
+/// Keeps the number beside each text that is one. A text that is a list's row has lost its key, so nobody knows what it
+/// counts. Recursive as `processObject` is.
+void keepNumbers(const Value& tree) {
+    const auto keepIn = [](Value& child) {
+        const std::string* text = child.string();
+        if (text == nullptr) return keepNumbers(child);
+        if (const auto reading = numberInText(*text)) child.set(*reading, child.record());
+    };
+    if (tree.dictionary()) tree.dictionary()->forEachValue(keepIn);
+    if (tree.array()) {
+        for (const Value& row : *tree.array()) keepNumbers(row);
+    }
 }
 
 }  // namespace
@@ -29,6 +44,7 @@ Value GSMLogGenerator::processObject(const Value& object) {
     if (object.string() != nullptr) return object;
     if (object.dictionary()) {
         const DictionaryRef simplified = Dictionary::make();
+        simplified->reserve(object.dictionary()->size());
         for (const auto& [key, child] : *object.dictionary()) simplified->set(key, simplifiedChild(child));
         return simplified;
     }
@@ -49,6 +65,7 @@ void GSMLogGenerator::updateState(Dictionary& state, ByteView data) {
     if (!tree) throw AssertionFailure("updateState:withData:", kSource, 90, "Could not deserialize the object");
     Value display;
     showDelivered(display, processObject(*tree));
+    keepNumbers(display);
     state.set("DisplayState", *tree);
     state.set("Display", display);
     state.set("ExtraInfo", Dictionary::make());

@@ -5,8 +5,8 @@
 namespace kelvo {
 
 /// The generator of modems whose service sends ready-made cell-monitor trees: each message is one property list, in any
-/// encoding, of dictionaries, arrays and strings. It replaces the whole display. The generator has no template and
-/// keeps nothing: all is in the state.
+/// encoding, of dictionaries, arrays and strings. It replaces the whole display. Beside a text that is a number
+/// stands the number, as beside a record's. The generator has no template and keeps nothing: all is in the state.
 class GSMLogGenerator final : public LogGenerator {
 public:
     GSMLogGenerator() { logCreation(); }

@@ -42,10 +42,10 @@ void RRC_State::updateWithData(ByteView data, LogCode logCode) {
     const RecordView record(data);
     const bool tellsMode = record.read(13, u8) == 1 && record.size() > 14;
     const std::int64_t mode = tellsMode ? record.read(14, u8) : kUnknownMode;
-    std::string name;
-    kShownMode.print(name, mode);
     if (values()) showValue(values()->slot("State"), mode, kShownMode, tellsMode ? u8.placeAt(14) : Place());
     if (!logWants(Level::Warning)) return;
+    std::string name;
+    kShownMode.print(name, mode);
     const std::string shown = values() ? describe(*values()) : "(none)";
     logLine(Level::Warning, "Display Dict = %s, rrc mode = %d %s", shown, mode, name);
 }

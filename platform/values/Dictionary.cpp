@@ -10,7 +10,7 @@ DictionaryRef Dictionary::make(std::initializer_list<std::pair<std::string_view,
     return dictionary;
 }
 
-std::size_t Dictionary::indexOf(Key key) const {
+inline std::size_t Dictionary::indexOf(const Key& key) const {
     if (_index) return indexOfIndexed(key);
     for (std::size_t i = 0; i < _hashes.size(); ++i) {
         if (isAt(i, key)) return i;
@@ -18,35 +18,31 @@ std::size_t Dictionary::indexOf(Key key) const {
     return kNotFound;
 }
 
-std::size_t Dictionary::indexOfIndexed(Key key) const {
+std::size_t Dictionary::indexOfIndexed(const Key& key) const {
     const auto at = _index->find(key.text());
     return at != _index->end() ? at->second : kNotFound;
 }
 
-const Value* Dictionary::find(Key key) const {
+constinit const Value Dictionary::kNone{};
+
+const Value* Dictionary::find(const Key& key) const {
     const std::size_t index = indexOf(key);
     return index != kNotFound ? &_entries[index].value : nullptr;
 }
 
-const Value& Dictionary::operator[](Key key) const {
-    static const Value kNone;
-    const Value* value = find(key);
-    return value != nullptr ? *value : kNone;
+const Value& Dictionary::operator[](const Key& key) const {
+    const std::size_t index = indexOf(key);
+    return index != kNotFound ? _entries[index].value : kNone;
 }
 
-Value& Dictionary::slot(Key key) {
+Value& Dictionary::slotElsewhere(const Key& key) {
     const std::size_t index = indexOf(key);
+    _next = (index != kNotFound ? index : _entries.size()) + 1;
     return index != kNotFound ? _entries[index].value : append(key);
 }
 
-Value& Dictionary::slotElsewhere(Key key, std::size_t& next) {
-    const std::size_t index = indexOf(key);
-    next = (index != kNotFound ? index : _entries.size()) + 1;
-    return index != kNotFound ? _entries[index].value : append(key);
-}
-
-Value& Dictionary::append(Key key) {
-    _entries.push_back({std::string(key.text()), Value()});
+Value& Dictionary::append(const Key& key) {
+    _entries.emplace_back().key = key.text();
     _hashes.push_back(key.hash());
     if (_index) {
         _index->emplace(key.text(), _entries.size() - 1);
@@ -56,7 +52,7 @@ Value& Dictionary::append(Key key) {
     return _entries.back().value;
 }
 
-bool Dictionary::remove(Key key) {
+bool Dictionary::remove(const Key& key) {
     const std::size_t index = indexOf(key);
     if (index == kNotFound) return false;
     if (_index) {
@@ -68,10 +64,9 @@ bool Dictionary::remove(Key key) {
     return true;
 }
 
-void Dictionary::truncate(std::size_t size) {
-    if (size == _hashes.size()) return;
-    _entries.erase(_entries.begin() + static_cast<std::ptrdiff_t>(size), _entries.end());
-    _hashes.resize(size);
+void Dictionary::eraseFrom(std::size_t index) {
+    _entries.erase(_entries.begin() + static_cast<std::ptrdiff_t>(index), _entries.end());
+    _hashes.resize(index);
     if (_index) buildIndex();
 }
 

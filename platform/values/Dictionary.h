@@ -34,26 +34,26 @@ public:
     auto end() const { return _entries.end(); }
 
     /// The value under `key`, null when there is none.
-    const Value* find(Key key) const;
+    const Value* find(const Key& key) const;
     /// The value under `key`, a none value when there is none; for reading through in one expression.
-    const Value& operator[](Key key) const;
-    /// The value under `key` for writing; a key that is not there yet is appended with a none value.
-    Value& slot(Key key);
-    /// As `slot`, for keys that mostly follow one another: looks at position `next` first, and leaves there the
-    /// position behind the key's.
-    Value& slot(Key key, std::size_t& next) {
-        if (next >= _hashes.size() || !isAt(next, key)) return slotElsewhere(key, next);
-        return _entries[next++].value;
+    const Value& operator[](const Key& key) const;
+    /// The value under `key` for writing; a key that is not there yet is appended with a none value. Records write the
+    /// same keys in the same order over and over: the position behind the last one written is looked at first.
+    Value& slot(const Key& key) {
+        const std::size_t at = _next < _hashes.size() ? _next : 0;
+        if (at == _hashes.size() || !isAt(at, key)) return slotElsewhere(key);
+        _next = at + 1;
+        return _entries[at].value;
     }
     /// Sets the value under `key`; a key that is there keeps its place, another is appended.
-    void set(Key key, Value value) { slot(key) = std::move(value); }
+    void set(const Key& key, Value value) { slot(key) = std::move(value); }
     /// Calls `visit` with every value, in order, for writing.
     template <class Visit>
     void forEachValue(Visit visit) {
         for (Entry& entry : _entries) visit(entry.value);
     }
     /// Removes `key` and keeps the order of the others; false when it was not there.
-    bool remove(Key key);
+    bool remove(const Key& key);
     void reserve(std::size_t entries);
 
     DictionaryRef copy() const;  ///< deep
@@ -62,21 +62,26 @@ public:
     class Rewrite;
 
 private:
+    static const Value kNone;
     static constexpr std::size_t kNotFound = static_cast<std::size_t>(-1);
     static constexpr std::size_t kScanLimit = 64;  ///< up to here comparing hashes in a row beats any index
 
-    bool isAt(std::size_t index, Key key) const {
+    bool isAt(std::size_t index, const Key& key) const {
         return _hashes[index] == key.hash() && isSameText(_entries[index].key, key.text());
     }
-    std::size_t indexOf(Key key) const;
-    std::size_t indexOfIndexed(Key key) const;
-    Value& slotElsewhere(Key key, std::size_t& next);
-    Value& append(Key key);
-    void truncate(std::size_t size);
+    std::size_t indexOf(const Key& key) const;
+    std::size_t indexOfIndexed(const Key& key) const;
+    Value& slotElsewhere(const Key& key);
+    Value& append(const Key& key);
+    void truncate(std::size_t size) {
+        if (size < _hashes.size()) eraseFrom(size);
+    }
+    void eraseFrom(std::size_t index);
     void buildIndex();
 
     std::vector<Entry> _entries;
     std::vector<std::uint32_t> _hashes;  // of the entries' keys, side by side
+    std::size_t _next = 0;               // behind the entry that `slot` handed out last; may lie past the end
     // Key to position, once past kScanLimit; ordered, because keys can be chosen so that their hashes are all the same.
     using Index = std::map<std::string, std::size_t, std::less<>>;
     std::unique_ptr<Index> _index;
@@ -92,7 +97,7 @@ public:
     Rewrite& operator=(const Rewrite&) = delete;
 
     /// The value under `key`, behind those written so far; it holds what it held before, or none.
-    Value& next(Key key) {
+    Value& next(const Key& key) {
         const std::size_t at = _written++;
         if (at < _dictionary._hashes.size() && _dictionary.isAt(at, key)) return _dictionary._entries[at].value;
         _dictionary.truncate(at);

@@ -8,22 +8,33 @@
 
 namespace kelvo {
 
-/// Whether two texts are the same. Keys are short: comparing them eight bytes at a time costs a record half of what a
-/// call of the library's comparison would.
+/// Whether the same `Word` stands at two places.
+template <class Word>
+bool isSameWord(const char* a, const char* b) {
+    Word ofA = 0;
+    Word ofB = 0;
+    std::memcpy(&ofA, a, sizeof(Word));
+    std::memcpy(&ofB, b, sizeof(Word));
+    return ofA == ofB;
+}
+
+/// Whether two texts are the same. Keys are short: comparing them word by word costs a record half of what a call of
+/// the library's comparison would. The last word reaches back into the one before it.
 inline bool isSameText(std::string_view a, std::string_view b) {
-    const auto wordOf = [](std::string_view text, std::size_t at) {
-        std::uint64_t word = 0;
-        std::memcpy(&word, text.data() + at, sizeof word);
-        return word;
-    };
-    constexpr std::size_t kWord = sizeof(std::uint64_t);
-    if (a.size() != b.size()) return false;
-    if (a.size() < kWord) return a == b;
-    for (std::size_t at = 0; at + kWord < a.size(); at += kWord) {
-        if (wordOf(a, at) != wordOf(b, at)) return false;
+    using Long = std::uint64_t;
+    using Short = std::uint32_t;
+    const std::size_t size = a.size();
+    if (size != b.size()) return false;
+    const char* const endOfA = a.data() + size;
+    const char* const endOfB = b.data() + size;
+    if (size >= sizeof(Long)) {
+        for (std::size_t at = 0; at + sizeof(Long) < size; at += sizeof(Long)) {
+            if (!isSameWord<Long>(a.data() + at, b.data() + at)) return false;
+        }
+        return isSameWord<Long>(endOfA - sizeof(Long), endOfB - sizeof(Long));
     }
-    const std::size_t last = a.size() - kWord;
-    return wordOf(a, last) == wordOf(b, last);
+    if (size < sizeof(Short)) return a == b;
+    return isSameWord<Short>(a.data(), b.data()) && isSameWord<Short>(endOfA - sizeof(Short), endOfB - sizeof(Short));
 }
 
 /// A dictionary key together with its hash, borrowed for the call. A key made from a literal in a constant expression

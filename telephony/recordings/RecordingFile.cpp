@@ -21,7 +21,12 @@ Failure failed(const std::string& path, int error) { return {path + " cannot be 
 gzFile handleOf(void* handle) { return static_cast<gzFile>(handle); }
 
 ssize_t readStream(void* cookie, char* bytes, std::size_t size) {
-    const auto got = static_cast<RecordingFile*>(cookie)->read({reinterpret_cast<std::uint8_t*>(bytes), size});
+    auto& file = *static_cast<RecordingFile*>(cookie);
+    const auto got = file.read({reinterpret_cast<std::uint8_t*>(bytes), size});
+    if (got && *got == 0 && size != 0 && file.isCut()) {  // a reader must not take this for the file's end
+        errno = EIO;
+        return -1;
+    }
     return got ? static_cast<ssize_t>(*got) : -1;
 }
 

@@ -22,7 +22,8 @@ public:
     Result<std::size_t> read(std::span<std::uint8_t> bytes);
     bool isCut() const { return _cut; }
 
-    /// The same as a stream for a library that wants one, which takes the file over.
+    /// The same as a stream for a library that wants one, which takes the file over. Where packed data are cut, reading
+    /// it fails.
     static std::FILE* stream(RecordingFile file);
 
 private:

@@ -85,12 +85,16 @@ TEST(LevelGrades, AreThoseOfTheLevel) {
     EXPECT_EQ(gradeOf("/GSM Cell and Neighbours/GSM Set/ARFCN 3, BSIC 4/RSSI", "dBm", -86), "fair");
     EXPECT_EQ(gradeOf("/GSM Cell and Neighbours/GSM Serving Cell/RSSI", "dBm", 45), "excellent");
     EXPECT_EQ(gradeOf("/GSM Cell and Neighbours/GSM RR Info/Serving Rx Level", "", 9), "poor");
+    EXPECT_EQ(gradeOf("/Serving/RSSI", "dBm", -71), "good");
+    EXPECT_EQ(gradeOf("/Neighbours/GSM/ARFCN 70, BSIC 17/RSSI", "dBm", -101), "poor");
+    EXPECT_EQ(gradeOf("/Neighbours/UMTS/PSC 9/ECN0", "dB", -10.5), "fair");
 }
 
 TEST(LevelGrades, AreNoneForOtherValues) {
     EXPECT_TRUE(gradesOf("/Serving Cell Measurements/Srxlev", "dBm").empty());
     EXPECT_TRUE(gradesOf("/Serving Cell Measurements/Measured RSSI", "dBm").empty());
     EXPECT_TRUE(gradesOf("/1x/Rx0 AGC", "dBm").empty());
+    EXPECT_TRUE(gradesOf("/Serving/RSCP", "dBm").empty());
     EXPECT_EQ(gradeOf("/1x/Tx AGC", "dBm", 1), "");
 }
 

@@ -4,6 +4,8 @@
 
 #include <limits>
 
+#include "LogGenerator/IFX/GSMLogGenerator.h"
+#include "platform/encodings/PropertyList.h"
 #include "platform/values/Array.h"
 #include "platform/values/Dictionary.h"
 
@@ -215,6 +217,39 @@ TEST_F(TrendsTest, TakesTheSeveralNamesOfACellAsOneChange) {
     EXPECT_EQ(trends.servingCells(), (Changes{{1004s, "PCI 17"}}));
     serve(1002, 18);
     EXPECT_EQ(trends.servingCells(), (Changes{{1004s, "PCI 17"}, {1008s, "PCI 18"}}));
+}
+
+/// What a cell monitor shows after a message with these cells.
+Value monitored(const Value& serving, std::initializer_list<Value> neighbors) {
+    const ArrayRef list = Array::make({"header"});
+    for (const Value& neighbor : neighbors) list->append(neighbor);
+    GSMLogGenerator generator;
+    Dictionary state;
+    const Value tree = Dictionary::make(
+        {{"Serving", Dictionary::make({{"Cell", serving}})}, {"Neighbours", Dictionary::make({{"GSM", list}})}});
+    generator.updateState(state, *writeXmlPropertyList(tree));
+    return state["Display"];
+}
+
+Value monitoredCell(const char* channel, const char* level) {
+    return Dictionary::make({{"ARFCN", channel}, {"BSIC", "17"}, {"RSSI", level}});
+}
+
+TEST_F(TrendsTest, ReadsTheNumbersOfACellMonitorsTexts) {
+    const auto serving = [](const char* area, const char* level) {
+        return Dictionary::make({{"MCC", "262"}, {"LAC", area}, {"CellId", "1501"}, {"RSSI", level}});
+    };
+    note(monitored(serving("2101", "-71 dBm"), {monitoredCell("70", "-80 dBm"), monitoredCell("44", "-91 dBm")}));
+    note(monitored(serving("2102", "-68 dBm"), {monitoredCell("44", "-85 dBm"), monitoredCell("70", "-83 dBm")}));
+    EXPECT_EQ(points("/Serving/RSSI"), (Points{{1002s, -71}, {1004s, -68}}));
+    EXPECT_EQ(trends.trend("/Serving/RSSI").unit, "dBm");
+    EXPECT_EQ(trends.trend("/Serving/RSSI").points[1].text(), "-68 dBm");
+    EXPECT_EQ(points("/Neighbours/GSM/ARFCN 70, BSIC 17/RSSI"), (Points{{1002s, -80}, {1004s, -83}}));
+    EXPECT_EQ(points("/Neighbours/GSM/ARFCN 44, BSIC 17/RSSI"), (Points{{1002s, -91}, {1004s, -85}}));
+    // What names an area or a cell is no level: its changes are kept.
+    EXPECT_EQ(trends.names().size(), 3U);
+    EXPECT_EQ(trends.changes("/Serving/LAC"), (Changes{{1002s, "2101"}, {1004s, "2102"}}));
+    EXPECT_EQ(trends.changes("/Serving/CellId"), (Changes{{1002s, "1501"}}));
 }
 
 // Three hours of a screen that changes in every value: what is held does not grow after the first half hour.

@@ -34,7 +34,7 @@ TEST(CdmaObservation, TheCellIsTheReferencePilot) {
                                            {"3;Network ID", "2"},
                                            {"4;Base Station ID", "50"}})}}));
     EXPECT_EQ(seen.access, "CDMA2000 1x");
-    EXPECT_EQ(seen.state, "Traffic");
+    EXPECT_EQ(seen.state, "in traffic");
     EXPECT_TRUE(seen.isDedicated);
     EXPECT_EQ(seen.cell, "channel 283, PN 180");
     EXPECT_EQ(seen.cellRecord, 6u);
@@ -53,6 +53,21 @@ TEST(CdmaObservation, TheCellIsTheReferencePilot) {
     EXPECT_DOUBLE_EQ(seen.cells[0].quality->figure.number, -19.67);
     EXPECT_EQ(seen.registrationState, "OFF");
     EXPECT_EQ(seen.rates, (std::vector<Fact>{{"Traffic FER", "1.42%"}}));
+}
+
+TEST(CdmaObservation, AnIdlePhoneSleepsAndWakes) {
+    const auto state = [](const char* label) {
+        return observe(Technology::CDMA, group({{"1;1x", shown({{"01;State", label}})}})).state;
+    };
+    EXPECT_EQ(state("Paging [6]"), "idle");
+    EXPECT_EQ(state("Slotted mode sleep state [7]"), "idle");
+    EXPECT_EQ(state("Acquisition [3]"), "Acquisition");
+}
+
+TEST(CdmaObservation, ASystemOfAnotherKindIsNoArea) {
+    const Value system =
+        shown({{"2;System ID", "(unknown system type 0)"}, {"3;Network ID", "(unknown system type 0)"}});
+    EXPECT_EQ(observe(Technology::CDMA, group({{"4;System", system}})).area, "");
 }
 
 TEST(CdmaObservation, ABadBandClassIsNone) {

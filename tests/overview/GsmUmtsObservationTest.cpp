@@ -12,7 +12,7 @@ Value gsmCell(std::uint64_t record) {
 
 Value gsmCells(std::uint64_t record) {
     return group({{"GSM Serving Cell", gsmCell(record)},
-                  {"GSM RR Info", shown({{"RR State", "RR_DATA_TRANSFER"}})},
+                  {"GSM RR Info", shown({{"RR State", "RR_DATA_TRANSFER"}}, record)},
                   {"Neighboring Cells", list({shown({{"ARFCN", "23"}, {"RSSI", "39"}, {"BSIC", "42"}}, record),
                                               shown({{"ARFCN", "700"}, {"RSSI", "-95 dBm"}}, record)})}});
 }
@@ -24,11 +24,12 @@ Value umtsCells(std::uint64_t record) {
                 shown({{"Scrambling Code", "17"}, {"RSCP", "-101 dB"}, {"Energy Per Chip", "-12 dB"}}, record)})}});
 }
 
-Value umtsRadio() {
+Value umtsRadio(std::uint64_t record = 8) {
     return group({{"UMTS RR Info", shown({{"RRC State", "CELL_DCH"},
                                           {"Cell ID", "6553791"},
                                           {"Downlink Frequency", "10562"},
-                                          {"Transmit Power", "5.33 dBm"}})}});
+                                          {"Transmit Power", "5.33 dBm"}},
+                                         record)}});
 }
 
 TEST(GsmUmtsObservation, OnGsmTheLevelIsThatOfRxLev) {
@@ -71,6 +72,47 @@ TEST(GsmUmtsObservation, OnUmtsTheCellIsTheFirstOfTheActiveSet) {
     EXPECT_EQ(seen.serving, facts);
     EXPECT_EQ(seen.cells[0].identity, "UARFCN 10562, PSC 17");
     EXPECT_EQ(seen.cells[0].mark, "active");
+}
+
+TEST(GsmUmtsObservation, InSoftHandoverTheCellIsTheOneThatItsScreenNames) {
+    const auto withCode = [](const char* code, std::uint64_t record) {
+        const Value radio = group({{"UMTS RR Info", shown({{"UARFCN", "10562"}, {"Scrambling Code", code}}, record)}});
+        return observe(Technology::GSM, group({{"UMTS Cells", umtsCells(8)}, {"UMTS Radio", radio}}));
+    };
+    const Observation seen = withCode("17", 5);
+    EXPECT_EQ(seen.cell, "UARFCN 10562, PSC 17");
+    EXPECT_DOUBLE_EQ(seen.level->figure.number, -101);
+    ASSERT_EQ(seen.cells.size(), 1u);
+    EXPECT_EQ(seen.cells[0].identity, "UARFCN 10562, PSC 394");
+    EXPECT_EQ(seen.cells[0].mark, "active");
+    EXPECT_EQ(withCode("20", 7).cell, "UARFCN 10562, PSC 394") << "which the set has no more";
+    EXPECT_EQ(withCode("20", 9).cell, "UARFCN 10562, PSC 20") << "which the set does not have yet";
+}
+
+TEST(GsmUmtsObservation, AStateOfAnEarlierVisitIsNone) {
+    const auto seen = [](std::uint64_t umts, std::uint64_t state) {
+        return observe(Technology::GSM, group({{"GSM Cell and Neighbours", gsmCells(7)},
+                                               {"UMTS Cells", umtsCells(umts)},
+                                               {"UMTS Radio", umtsRadio(state)}}));
+    };
+    EXPECT_EQ(seen(8, 6).state, "");
+    EXPECT_FALSE(seen(8, 6).isDedicated);
+    EXPECT_EQ(seen(8, 9).state, "CELL_DCH");
+    EXPECT_EQ(seen(6, 9).state, "RR_DATA_TRANSFER");
+}
+
+TEST(GsmUmtsObservation, AnInactiveLayerHasNoState) {
+    const Value cells =
+        group({{"GSM Serving Cell", gsmCell(3)}, {"GSM RR Info", shown({{"RR State", "RR_INACTIVE"}}, 4)}});
+    EXPECT_EQ(observe(Technology::GSM, group({{"GSM Cell and Neighbours", cells}})).state, "");
+}
+
+TEST(GsmUmtsObservation, RankedCellsBearTheirCarrier) {
+    const Value ranked = shown(
+        {{"Scrambling Code", "30"}, {"Downlink Frequency", "10562"}, {"RSCP", "-80 dB"}, {"Energy Per Chip", "-9 dB"}});
+    const Observation seen = observe(Technology::GSM, group({{"UMTS Cells", group({{"UMTS Set", list({ranked})}})}}));
+    ASSERT_EQ(seen.cells.size(), 1u);
+    EXPECT_EQ(seen.cells[0].identity, "UARFCN 10562, PSC 30");
 }
 
 TEST(GsmUmtsObservation, RegistrationTellsServiceAndRejects) {

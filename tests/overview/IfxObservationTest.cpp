@@ -35,8 +35,9 @@ TEST(IfxObservation, TheTreeSaysWhichRadioItIsOn) {
     EXPECT_EQ(seen.level->figure.unit, "dBm");
     EXPECT_DOUBLE_EQ(seen.quality->figure.number, -8.5);
     EXPECT_EQ(seen.area, "LAC 2152");
-    const std::vector<Fact> facts = {
-        {"Network", "001-01"}, {"Cell identity", "6649158"}, {"Band", "UMTS 2100 (2112.4 MHz down, 1922.4 MHz up)"}};
+    const std::vector<Fact> facts = {{"Network", "001-01"},
+                                     {"Cell identity", "6649158 (RNC 101, cell 30022)"},
+                                     {"Band", "UMTS 2100 (2112.4 MHz down, 1922.4 MHz up)"}};
     EXPECT_EQ(seen.serving, facts);
     ASSERT_EQ(seen.cells.size(), 3u);
     EXPECT_EQ(seen.cells[0].identity, "ARFCN 48, BSIC 16");

@@ -58,12 +58,27 @@ TEST(Tracker, AChangeOfCellOutOfAConnectionIsAReselection) {
 
 TEST(Tracker, AChangeOfCellWithinAConnectionIsAHandover) {
     Tracker tracker;
-    for (const auto& [cell, record] : {std::pair("A", 1), std::pair("B", 2)}) {
-        Observation seen = servedBy(cell, static_cast<std::uint64_t>(record));
-        seen.isDedicated = true;
-        tracker.note(seen, kStart);
-    }
+    Observation seen = servedBy("A", 1);
+    seen.isDedicated = true;
+    tracker.note(seen, kStart);
+    seen = servedBy("B", 2);
+    seen.isDedicated = true;
+    tracker.note(seen, kStart + 10ms);
     EXPECT_EQ(tracker.events().back().kind, Kind::Handover);
+}
+
+TEST(Tracker, AConnectionThatBeganWithTheNewCellIsNotHandedOver) {
+    Tracker tracker;
+    Observation seen = servedBy("A", 1);
+    seen.state = "idle";
+    tracker.note(seen, kStart);
+    seen.state = "connected";  // which a record tells before the cell's
+    seen.isDedicated = true;
+    tracker.note(seen, kStart + 1s);
+    seen.cell = "B";
+    seen.cellRecord = 2;
+    tracker.note(seen, kStart + 1s + 9ms);
+    EXPECT_EQ(tracker.events().back().kind, Kind::Reselection);
 }
 
 TEST(Tracker, ALevelThatIsOlderThanTheChangeIsTheOldCells) {
@@ -180,10 +195,15 @@ TEST(Tracker, AnotherRadioIsOneEventAndNotThree) {
 TEST(Tracker, APhoneThatNeverHadServiceHasNotLostIt) {
     Tracker tracker;
     Observation seen;
+    tracker.note(seen, kStart - 1s);
+    seen.knowsService = true;
     seen.isWithoutService = true;
     tracker.note(seen, kStart);
     EXPECT_TRUE(tracker.events().empty());
-    tracker.note(Observation(), kStart + 2s);
+    seen.isWithoutService = false;
+    tracker.note(seen, kStart + 2s);
+    ASSERT_EQ(tracker.events().size(), 1u);
+    EXPECT_EQ(tracker.events().back().kind, Kind::ServiceBack);
     EXPECT_EQ(tracker.events().back().to, "after 2.0 s");
 }
 
@@ -223,6 +243,85 @@ TEST(Tracker, StatesAreToldWhenTheyChangeAndNotWhenTheyAppear) {
     EXPECT_EQ(tracker.events()[4].to, "LOCATION_AREA_NOT_ALLOWED");
 }
 
+TEST(Tracker, TheAreasPartsAreOneChange) {
+    Tracker tracker;
+    const auto see = [&](const char* area, Time::duration after) {
+        Observation seen = servedBy("A", 1);
+        seen.area = area;
+        tracker.note(seen, kStart + after);
+    };
+    see("URA 1", 0s);
+    see("LAC 11, URA 1", 1s);  // which was not known before
+    EXPECT_EQ(tracker.events().size(), 1u);
+    see("LAC 11, URA 2", 10s);
+    see("LAC 12, URA 2", 12s);
+    ASSERT_EQ(tracker.events().size(), 2u);
+    EXPECT_EQ(tracker.events()[1].time, kStart + 10s);
+    EXPECT_EQ(tracker.events()[1].from, "LAC 11, URA 1");
+    EXPECT_EQ(tracker.events()[1].to, "LAC 12, URA 2");
+    EXPECT_EQ(tracker.events()[1].values.back(), (EventValue{"Area", "LAC 11, URA 1", "LAC 12, URA 2"}));
+    see("LAC 13, URA 2", 12s);  // the same part again: another change
+    ASSERT_EQ(tracker.events().size(), 3u);
+    see("LAC 13, URA 3", 14s + 1us);  // too late to be of it
+    EXPECT_EQ(tracker.events().size(), 4u);
+    EXPECT_EQ(tracker.events()[3].from, "LAC 13, URA 2");
+}
+
+TEST(Tracker, ACellWhoseCodeComesLaterIsOneChange) {
+    Tracker tracker;
+    const auto see = [&](const char* cell, std::uint64_t record, Time::duration after) {
+        Observation seen = servedBy(cell, record);
+        seen.cellComesInParts = true;
+        tracker.note(seen, kStart + after);
+    };
+    see("ARFCN 21, BSIC 44", 1, 0s);
+    see("ARFCN 23, BSIC 44", 2, 10s);
+    see("ARFCN 23, BSIC 42", 3, 11s);
+    ASSERT_EQ(tracker.events().size(), 2u);
+    EXPECT_EQ(tracker.events()[1].time, kStart + 10s);
+    EXPECT_EQ(tracker.events()[1].from, "ARFCN 21, BSIC 44");
+    EXPECT_EQ(tracker.events()[1].to, "ARFCN 23, BSIC 42");
+    EXPECT_EQ(tracker.events()[1].values[0], (EventValue{"Cell", "ARFCN 21, BSIC 44", "ARFCN 23, BSIC 42"}));
+    see("ARFCN 25, BSIC 42", 4, 12s);
+    EXPECT_EQ(tracker.events().size(), 3u);
+}
+
+TEST(Tracker, WithTheStateInTheNewCellAChangeIsAHandover) {
+    for (const auto& [after, kind] : {std::pair(2s, Kind::Handover), std::pair(3s, Kind::Reselection)}) {
+        Tracker tracker;
+        Observation seen = servedBy("A", 1);
+        seen.isDedicated = true;
+        tracker.note(seen, kStart);
+        seen = servedBy("B", 2);
+        tracker.note(seen, kStart + 1s);
+        EXPECT_EQ(tracker.events()[1].kind, Kind::Reselection);
+        seen.isDedicated = true;
+        tracker.note(seen, kStart + 1s + after);
+        EXPECT_EQ(tracker.events()[1].kind, kind);
+    }
+}
+
+TEST(Tracker, WhileTheStateIsNotKnownAPhoneIsAsItWas) {
+    for (const auto& [between, kind] : {std::pair("", Kind::Handover), std::pair("idle", Kind::Reselection)}) {
+        Tracker tracker;
+        Observation seen = servedBy("A", 1);
+        seen.state = "connected";
+        seen.isDedicated = true;
+        tracker.note(seen, kStart);
+        seen.state = between;
+        seen.isDedicated = false;
+        tracker.note(seen, kStart + 100ms);
+        seen = servedBy("B", 2);
+        seen.state = "connected";
+        seen.isDedicated = true;
+        tracker.note(seen, kStart + 200ms);
+        const auto& events = tracker.events();
+        const auto change = std::ranges::find(events, std::string("B"), &Event::to);
+        ASSERT_NE(change, events.end());
+        EXPECT_EQ(change->kind, kind);
+    }
+}
+
 TEST(Tracker, ContextsComeAndGo) {
     Tracker tracker;
     Observation seen = servedBy("A", 1);
@@ -242,6 +341,7 @@ TEST(Tracker, ContextsComeAndGo) {
 TEST(Tracker, LossOfServiceHasALength) {
     Tracker tracker;
     Observation seen = servedBy("A", 1);
+    seen.knowsService = true;
     tracker.note(seen, kStart);
     seen.isWithoutService = true;
     tracker.note(seen, kStart + 1s);
@@ -265,6 +365,110 @@ TEST(Tracker, EventsAreKeptForADayAndNoMoreThanTwoThousand) {
     for (std::uint64_t i = 0; i < 2500; ++i) patient.note(servedBy(i % 2 == 0 ? "A" : "B", i + 1), kStart);
     patient.note(servedBy("C", 3000), kStart + 24h + 1s);
     EXPECT_EQ(patient.events().size(), 2501u);
+}
+
+TEST(Tracker, AnEventTellsTheValuesBeforeAndAfter) {
+    Tracker tracker;
+    Observation seen = servedBy("A", 1, "-101.00 dBm");
+    seen.area = "TAC 1";
+    seen.serving = {{"Band", "3"}, {"Network", "262-01"}};
+    tracker.note(seen, kStart);
+    Observation later = servedBy("B", 3, "-101.00 dBm");
+    later.level->figure.record = 2;  // the old cell's still
+    later.area = "TAC 2";
+    later.serving = {{"Band", "20"}, {"Network", "262-01"}, {"Bandwidth", "10 MHz"}};
+    tracker.note(later, kStart + 2s);
+    const std::vector<EventValue> values = {{"Cell", "A", "B"},
+                                            {"RSRP", "-101.00 dBm", ""},
+                                            {"Area", "TAC 1", "TAC 2"},
+                                            {"Band", "3", "20"},
+                                            {"Bandwidth", "", "10 MHz"}};
+    ASSERT_EQ(tracker.events().size(), 3u);
+    EXPECT_EQ(tracker.events()[1].kind, Kind::Reselection);
+    EXPECT_EQ(tracker.events()[1].values, values);
+    EXPECT_EQ(tracker.events()[2].kind, Kind::Area);
+    EXPECT_EQ(tracker.events()[2].values, values);
+
+    later.level = rsrp("-88.00 dBm", -88, 4);
+    later.quality = Measure{"RSRQ", {"-9.00 dB", -9, "dB", 4}, ""};
+    tracker.note(later, kStart + 3s);
+    EXPECT_EQ(tracker.events()[1].levelAfter, "-88.00 dBm");
+    EXPECT_EQ(tracker.events()[1].values[1], (EventValue{"RSRP", "-101.00 dBm", "-88.00 dBm"}));
+    EXPECT_EQ(tracker.events()[1].values.back(), (EventValue{"RSRQ", "", "-9.00 dB"}));
+    EXPECT_EQ(tracker.events()[2].values[1], (EventValue{"RSRP", "-101.00 dBm", "-88.00 dBm"}));
+}
+
+TEST(Tracker, LevelsOfTwoRadiosAreTwoValues) {
+    Tracker tracker;
+    tracker.note(servedBy("A", 1, "-95.00 dBm"), kStart);
+    Observation seen = servedBy("B", 2, "-80.00 dBm");
+    seen.access = "UMTS";
+    seen.level->name = "RSCP";
+    tracker.note(seen, kStart + 2s);
+    EXPECT_EQ(
+        tracker.events()[1].values,
+        (std::vector<EventValue>{
+            {"Cell", "A", "B"}, {"RSRP", "-95.00 dBm", ""}, {"RSCP", "", "-80.00 dBm"}, {"Radio", "LTE", "UMTS"}}));
+}
+
+TEST(Tracker, TwoThousandEventsHoldSixMegabytesAtMost) {
+    Tracker tracker;
+    for (int i = 0; i < 700; ++i) {
+        Observation seen;
+        const std::string text = std::string(9, static_cast<char>('a' + i % 2)) + std::string(300, 'x');
+        seen.cell = seen.access = seen.state = seen.area = seen.registrationState = text;
+        seen.cellRecord = static_cast<std::uint64_t>(i) + 1;
+        seen.level = Measure{text, {text, -90, "dBm", seen.cellRecord}, ""};
+        for (int fact = 0; fact < 20; ++fact) seen.serving.push_back({std::to_string(fact) + text, text});
+        tracker.note(seen, kStart);
+    }
+    ASSERT_EQ(tracker.events().size(), 2000u);
+    std::size_t bytes = 0;
+    const auto count = [&](const std::string& text) { bytes += text.capacity() > 15 ? text.capacity() + 17 : 0; };
+    for (const Event& event : tracker.events()) {
+        bytes += sizeof event + event.values.capacity() * sizeof(EventValue);
+        for (const std::string* text : {&event.from, &event.to, &event.levelBefore, &event.levelAfter}) count(*text);
+        for (const EventValue& value : event.values) {
+            for (const std::string* text : {&value.name, &value.before, &value.after}) count(*text);
+        }
+    }
+    EXPECT_LT(bytes, 6'000'000u);
+    EXPECT_EQ(tracker.events().back().from.size(), 128u);
+    EXPECT_EQ(tracker.events().back().values.size(), 8u);
+    EXPECT_EQ(tracker.events().back().values[0].before.size(), 48u);
+}
+
+TEST(Tracker, ATextIsNotCutWithinACharacter) {
+    Tracker tracker;
+    tracker.note(servedBy(("A" + std::string(126, 'x') + "\xC3\xA4").c_str(), 1), kStart);
+    EXPECT_EQ(tracker.events()[0].to, "A" + std::string(126, 'x'));
+}
+
+TEST(Tracker, WhileNothingIsNewCellsGetLostAndGo) {
+    Tracker tracker;
+    Observation seen = servedBy("A", 1);
+    seen.cells = {heard("N", -100, 1)};
+    tracker.note(seen, kStart);
+    tracker.letPass(kStart + 31s);
+    EXPECT_TRUE(tracker.cells()[0].isLost);
+    tracker.letPass(kStart + 41s);
+    EXPECT_TRUE(tracker.cells().empty());
+}
+
+TEST(Tracker, TheConnectionsLossHasALengthAndTheTimeOfDay) {
+    Tracker tracker;
+    tracker.note(servedBy("A", 1), Time(5s), kStart);
+    EXPECT_EQ(tracker.events()[0].time, kStart);
+    EXPECT_EQ(tracker.levelTime(), Time(5s));
+    tracker.noteConnectionLost(kStart + 1s);
+    tracker.noteConnectionBack(kStart + 8s, 7s);
+    EXPECT_EQ(tracker.events()[1].kind, Kind::ConnectionLost);
+    EXPECT_EQ(tracker.events()[2].kind, Kind::ConnectionBack);
+    EXPECT_EQ(tracker.events()[2].to, "after 7.0 s");
+    tracker.restart();
+    EXPECT_EQ(tracker.events().size(), 3u);
+    EXPECT_EQ(tracker.latest().cell, "");
+    EXPECT_EQ(tracker.levelTime(), std::nullopt);
 }
 
 }  // namespace

@@ -19,8 +19,9 @@ struct Finished {
     std::string errors;
 };
 
-/// Runs a program to its end, without a terminal and without input.
-inline Finished run(const std::string& program, std::vector<std::string> arguments) {
+/// Runs a program to its end, without a terminal; `input` is the file that it finds as its standard input.
+inline Finished run(const std::string& program, std::vector<std::string> arguments,
+                    const std::string& input = "/dev/null") {
     const TemporaryDirectory directory;
     const std::string output = directory.file("out");
     const std::string errors = directory.file("err");
@@ -31,7 +32,7 @@ inline Finished run(const std::string& program, std::vector<std::string> argumen
     const pid_t child = fork();
     if (child < 0) throw std::runtime_error("cannot fork");
     if (child == 0) {
-        dup2(open("/dev/null", O_RDONLY), STDIN_FILENO);
+        dup2(open(input.c_str(), O_RDONLY), STDIN_FILENO);
         dup2(open(output.c_str(), O_WRONLY | O_CREAT, 0600), STDOUT_FILENO);
         dup2(open(errors.c_str(), O_WRONLY | O_CREAT, 0600), STDERR_FILENO);
         execv(program.c_str(), argv.data());

@@ -12,7 +12,9 @@ namespace kelvo::test {
 
 /// Runs the program itself on files of a directory of its own.
 struct KelvoctlTest : testing::Test {
-    Finished kelvoctl(std::vector<std::string> arguments) { return run(KELVOCTL, std::move(arguments)); }
+    Finished kelvoctl(std::vector<std::string> arguments, const std::string& input = "/dev/null") {
+        return run(KELVOCTL, std::move(arguments), input);
+    }
 
     /// Writes a capture of these messages, a second apart, and says where it lies.
     std::string capture(Technology technology, const std::vector<Bytes>& messages) {

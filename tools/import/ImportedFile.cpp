@@ -1,5 +1,7 @@
 #include "tools/import/ImportedFile.h"
 
+#include <fmt/format.h>
+
 #include "platform/host/Capture.h"
 #include "telephony/recordings/DlfRecording.h"
 #include "telephony/recordings/FramesRecording.h"
@@ -86,6 +88,19 @@ Result<ImportedFile> ImportedFile::open(const std::string& path) {
         imported.reader = std::make_unique<DlfRecording>(std::move(file).value());
     }
     return imported;
+}
+
+std::vector<std::string> damageOf(const std::string& path, const ImportedFile& file) {
+    const RecordingDamage damage = file.reader->damage();
+    std::vector<std::string> lines;
+    const auto add = [&](std::uint64_t count, std::string_view what) {
+        if (count != 0) lines.push_back(fmt::format("{}: {} {}", path, count, what));
+    };
+    add(damage.damagedFrames, "damaged frames left out");
+    add(damage.skippedBytes, "bytes between records skipped");
+    add(damage.encryptedRecords, "records are encrypted by the modem");
+    if (!file.odd.empty()) lines.push_back(path + ": " + file.odd.front());
+    return lines;
 }
 
 }  // namespace kelvo

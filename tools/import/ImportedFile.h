@@ -20,4 +20,7 @@ struct ImportedFile {
     static Result<ImportedFile> open(const std::string& path);
 };
 
+/// What stands in a file beside sound records, as far as it has been read: a sentence each, which names the file.
+std::vector<std::string> damageOf(const std::string& path, const ImportedFile& file);
+
 }  // namespace kelvo

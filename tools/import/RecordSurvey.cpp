@@ -2,9 +2,7 @@
 
 #include <algorithm>
 
-#include "LogGenerator/Factory.h"
 #include "LogGenerator/Framing.h"
-#include "platform/system/Environment.h"
 
 namespace kelvo {
 
@@ -17,13 +15,10 @@ constexpr std::size_t kMostKinds = 10'000;
 }  // namespace
 
 RecordSurvey::RecordSurvey() {
-    Environment silent = Environment::current();
-    silent.log = nullptr;  // generators tell of themselves
-    const Environment::Scope scope(silent);
     for (const TechnologyNames& names : kTechnologies) {
-        if (!hasCodes(names.technology)) continue;
-        const auto generator = generatorFromTechnology(names.identifier);
-        if (generator) _families[static_cast<std::size_t>(names.technology)].emplace(*generator->getStartCommand());
+        if (hasCodes(names.technology)) {
+            _families[static_cast<std::size_t>(names.technology)] = FamilyCodes::of(names.technology);
+        }
     }
 }
 

@@ -45,11 +45,12 @@ public:
     std::optional<Technology> technology() const;
     /// The subscription of the first record that has one.
     std::optional<std::int32_t> subscription() const { return _subscription; }
+    /// The only family that has this packet's code; none when several have it, or none.
+    std::optional<Technology> technologyOf(ByteView packet) const;
 
 private:
     using Key = std::tuple<adaptation::RecordKind, adaptation::Adapted::Outcome, adaptation::Refusal>;
 
-    std::optional<Technology> technologyOf(ByteView packet) const;
     std::pair<const Key, Row>* rowOf(const adaptation::Adapted& adapted);
     void noteShown(ByteView packet);
 

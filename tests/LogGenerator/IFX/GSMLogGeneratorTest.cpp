@@ -149,6 +149,30 @@ TEST_F(IFX, ShowsNothingBeforeTheFirstMessage) {
     EXPECT_EQ(state["History"], list({dict({})}));
 }
 
+TEST_F(IFX, KeepsTheNumberBesideATextThatIsOne) {
+    const Value tree =
+        dict({{"Serving", dict({{"Cell", dict({{"MNC", "01"}, {"RSSI", "-71 dBm"}, {"C1", "33"}})}})},
+              {"Neighbours", list({"2", dict({{"ARFCN", "70"}}), dict({{"SCN", "9"}, {"ECN0", "-4.5 dB"}})})}});
+    feed(tree);
+    const Value& display = state["Display"];
+    const Dictionary& serving = *(*display.dictionary())["Serving"].dictionary();
+    EXPECT_FALSE(serving["MNC"].measurement());
+    EXPECT_EQ(serving["RSSI"].measurement()->number, -71);
+    EXPECT_EQ(serving["RSSI"].measurement()->unit, "dBm");
+    EXPECT_EQ(serving["C1"].measurement()->number, 33);
+    EXPECT_EQ(serving["C1"].measurement()->unit, "");
+    const Array& neighbors = *(*display.dictionary())["Neighbours"].array();
+    EXPECT_FALSE(neighbors[0].measurement());  // a row that has lost its key
+    EXPECT_EQ((*neighbors[1].dictionary())["ECN0"].measurement()->number, -4.5);
+
+    // What is shown, told and saved are the texts as they came.
+    const Value texts = dict({{"Serving", dict({{"MNC", "01"}, {"RSSI", "-71 dBm"}, {"C1", "33"}})},
+                              {"Neighbours", list({"70", dict({{"SCN", "9"}, {"ECN0", "-4.5 dB"}})})}});
+    EXPECT_EQ(display, texts);
+    EXPECT_EQ(writeXmlPropertyList(display).value(), writeXmlPropertyList(texts).value());
+    EXPECT_EQ(state["DisplayState"], tree);
+}
+
 TEST_F(IFX, SavesItsHistoryAlone) {
     EXPECT_EQ(generator.getSaveContentsFromState(state)->size(), 0U);
     feed(dict({{"A", dict({{"only", "1"}})}}));

@@ -3,6 +3,7 @@
 #include <gtest/gtest.h>
 
 #include <algorithm>
+#include <iterator>
 #include <limits>
 #include <string>
 #include <unordered_map>
@@ -127,6 +128,48 @@ TEST(Dictionary, RewritesItsEntriesInTheirPlaces) {
     std::string order;
     for (const auto& entry : *row) order += entry.key + *entry.value.string();
     EXPECT_EQ(order, "b6a7");
+}
+
+TEST(Dictionary, WritesWhereTheKeyIsWhateverWasWrittenBefore) {
+    Dictionary values;
+    for (const char* key : {"Cell ID", "TAC", "Physical Cell ID", "ab", "Band"}) values.set(key, key);
+    const auto valueAt = [&](int position) { return *std::next(values.begin(), position)->value.string(); };
+    values.set("Physical Cell ID", "in between");
+    values.set("ab", "behind it");
+    values.set("Cell ID", "back to the first");
+    values.set("Band", "the last");
+    values.set("Cell ID", "and round");
+    EXPECT_EQ(valueAt(0), "and round");
+    EXPECT_EQ(valueAt(1), "TAC");
+    EXPECT_EQ(valueAt(2), "in between");
+    EXPECT_EQ(valueAt(3), "behind it");
+    EXPECT_EQ(valueAt(4), "the last");
+
+    values.set("Physical Cell ID", "before one that goes");
+    EXPECT_TRUE(values.remove("ab"));
+    values.set("Band", "one place up");
+    EXPECT_TRUE(values.remove("Band"));
+    values.set("TAC", "where nothing follows");
+    EXPECT_EQ(valueAt(0), "and round");
+    EXPECT_EQ(valueAt(1), "where nothing follows");
+    EXPECT_EQ(valueAt(2), "before one that goes");
+    EXPECT_EQ(values.size(), 3U);
+    { const Dictionary::Rewrite nothing(values); }
+    values.set("Band", "in an empty one");
+    EXPECT_EQ(values.size(), 1U);
+}
+
+TEST(Key, TextsOfEveryLengthAreTheSameWhenEveryCharacterIs) {
+    for (std::size_t size = 0; size <= 40; ++size) {
+        const std::string text = std::string("Num of Consecutive DRX Cycles of S < 0 ..").substr(0, size);
+        EXPECT_TRUE(isSameText(text, std::string(text)));
+        EXPECT_FALSE(isSameText(text, text + "x"));
+        for (std::size_t at = 0; at < size; ++at) {
+            std::string other = text;
+            other[at] = '#';
+            EXPECT_FALSE(isSameText(text, other)) << other;
+        }
+    }
 }
 
 TEST(Dictionary, RewritesALargeOneIntoASmallOneAndBack) {

@@ -1,0 +1,278 @@
+#include "tools/share/SharedKeys.h"
+
+#include <algorithm>
+#include <array>
+#include <ranges>
+
+namespace kelvo {
+
+namespace {
+
+using enum Identity;
+
+// clang-format off
+constexpr SharedKey kKeys[] = {
+    // LTE
+    { "", "Physical Cell ID",                         PhysicalCell   },
+    { "", "Serving Physical Cell ID",                 PhysicalCell   },
+    { "", "Serving Cell ID",                          PhysicalCell   },
+    { "", "Cell Identity",                            Cell           },
+    { "", "Tracking Area Code",                       Area           },
+    { "Reselection Candidates List", "Cell ID",       PhysicalCell   },
+    { "", "PSC",                                      ScramblingCode },
+    { "", "BSIC ID",                                  Bsic           },
+    { "", "Pilot",                                    Pilot          },
+    { "", "Freq Band Indicator",                      None           },
+    { "", "Download Frequency",                       None           },
+    { "", "Upload Frequency",                         None           },
+    { "", "Download Bandwidth",                       None           },
+    { "", "Upload Bandwidth",                         None           },
+    { "", "Num Tx Antennas",                          None           },
+    { "", "UARFCN",                                   None           },
+    { "", "E-ARFCN",                                  None           },
+    { "", "Measured RSRP",                            None           },
+    { "", "Average RSRP",                             None           },
+    { "", "Measured RSRQ",                            None           },
+    { "", "Average RSRQ",                             None           },
+    { "", "Measured RSSI",                            None           },
+    { "", "Srxlev",                                   None           },
+    { "", "Qrxlevmin",                                None           },
+    { "", "S Intra Search",                           None           },
+    { "", "S Non Intra Search",                       None           },
+    { "", "P_Max",                                    None           },
+    { "", "Max UE Tx Power",                          None           },
+    { "", "Serving Layer Priority",                   None           },
+    { "", "Num of Consecutive DRX Cycles of S < 0",   None           },
+    { "", "Measurement Rules",                        None           },
+    { "", "Measurement Rules Updated",                None           },
+    { "", "Version",                                  None           },
+    { "", "Serving Filtered RSRP",                    None           },
+    { "", "Serving Filtered RSRQ",                    None           },
+    { "", "Subframe Number",                          None           },
+    { "", "Filtered RSRP",                            None           },
+    { "", "Filtered RSRQ",                            None           },
+    { "", "Frequency Offset",                         None           },
+    { "", "Ant 0 Frame Offset",                       None           },
+    { "", "Ant 0 Sample Offset",                      None           },
+    { "", "Ant 1 Frame Offset",                       None           },
+    { "", "Ant 1 Sample Offset",                      None           },
+    { "", "Serving EARFCN",                           None           },
+    { "", "Candidate Priority",                       None           },
+    { "", "Candidate RAT Type",                       None           },
+    { "", "E ARFCN",                                  None           },
+    { "", "U ARFCN",                                  None           },
+    { "", "ARFCN",                                    None           },
+    { "", "Band",                                     None           },
+    { "", "Channel",                                  None           },
+
+    // GSM and UMTS
+    { "", "Mobile Country Code",                      Country        },
+    { "", "Mobile Network Code",                      Network        },
+    { "", "Location Area Code",                       Area           },
+    { "", "Routing Area Code",                        SubArea        },
+    { "", "URA ID",                                   SubArea        },
+    { "UMTS RR Info", "Cell ID",                      Cell           },
+    { "GSM Serving Cell", "Cell ID",                  Cell           },
+    { "", "Scrambling Code",                          ScramblingCode },
+    { "", "BSIC",                                     Bsic           },
+    { "", "Service Type",                             None           },
+    { "", "PLMN Sel Mod",                             None           },
+    { "", "MM Service State",                         None           },
+    { "", "MM State",                                 None           },
+    { "", "MM Sub State",                             None           },
+    { "", "LU Reject Cause",                          None           },
+    { "", "Attach Reject Cause",                      None           },
+    { "", "RSCP",                                     None           },
+    { "", "Energy Per Chip",                          None           },
+    { "", "Downlink Frequency",                       None           },
+    { "", "Uplink Frequency",                         None           },
+    { "", "Ranking Value",                            None           },
+    { "", "Rank Cell RSCP",                           None           },
+    { "", "RRC State",                                None           },
+    { "", "Transmit Power",                           None           },
+    { "", "Ciphering",                                None           },
+    { "", "Carrier Info",                             None           },
+    { "", "Sub Frames",                               None           },
+    { "", "Process ID",                               None           },
+    { "", "No Rx Bits",                               None           },
+    { "", "New Tx",                                   None           },
+    { "", "Block Errors",                             None           },
+    { "", "RSSI",                                     None           },
+    { "", "C1 Value",                                 None           },
+    { "", "C2 Value",                                 None           },
+    { "", "MA Dedicated ARFCN",                       None           },
+    { "", "RR State",                                 None           },
+    { "", "RR Sub State",                             None           },
+    { "", "RR Status",                                None           },
+    { "", "RR Mode",                                  None           },
+    { "", "Serving Rx Level",                         None           },
+    { "", "Rx Quality Full",                          None           },
+    { "", "Rx Quality Sub",                           None           },
+    { "", "DTX Used",                                 None           },
+    { "", "DRX Used",                                 None           },
+    { "", "HSN",                                      None           },
+    { "", "ARFCNs",                                   None           },
+    { "", "Network Operating Mode",                   None           },
+    { "", "Network Control Order",                    None           },
+    { "", "PFC Supported",                            None           },
+    { "", "Priority Access Threshold",                None           },
+    { "", "T3192",                                    None           },
+    { "", "DRX Timer Max",                            None           },
+    { "", "Access Burst Type",                        None           },
+    { "", "PBCCH Present",                            None           },
+    { "", "SI13 Position",                            None           },
+    { "", "Packet SI Status",                         None           },
+    { "", "Packet PSI Status",                        None           },
+    { "", "Ext Measurement Order",                    None           },
+    { "", "Cell Reselect Hysteresis",                 None           },
+    { "", "Count LR",                                 None           },
+    { "", "Count HR",                                 None           },
+    { "", "Window Size",                              None           },
+    { "", "Transport Channel ID",                     None           },
+    { "", "CRC Received",                             None           },
+    { "", "CRC Received in Error",                    None           },
+
+    // UTRAN
+    { "Serving Cell Info", "Cell ID",                 Cell           },
+    { "Neighbor Cell List", "Cell ID",                CellParameter  },
+    { "GSM Neighbor Cell List", "Cell ID",            CellParameter  },
+    { "", "Local Area Code",                          Area           },
+    { "", "Cell Scrambling Code",                     ScramblingCode },
+    { "", "NCC",                                      Colour         },
+    { "", "BCC",                                      Colour         },
+    { "", "State",                                    None           },
+    { "", "Downlink UARFCN",                          None           },
+    { "", "Uplink UARFCN",                            None           },
+    { "", "Allowed Access",                           None           },
+    { "", "Cell Access Restrictions",                 None           },
+    { "", "Filter RSCP",                              None           },
+    { "", "Status",                                   None           },
+    { "", "inJDCS",                                   None           },
+    { "", "Band Indicator",                           None           },
+    { "", "BSIC Valid",                               None           },
+    { "", "TRCH ID",                                  None           },
+    { "", "TRCH BLER Measurement",                    None           },
+    { "", "CCTRCH ID",                                None           },
+    { "", "TSNUM",                                    None           },
+    { "", "SIR",                                      None           },
+
+    // CDMA
+    { "", "Active Set",                               Pilot          },
+    { "", "Fingers",                                  Pilot          },
+    { "", "Serving PN Offset",                        Pilot          },
+    { "", "UATI24",                                   Temporary      },
+    { "", "Color Code",                               System         },
+    { "", "System ID",                                System         },
+    { "", "Network ID",                               System         },
+    { "", "Packet Zone ID",                           System         },
+    { "", "Base Station ID",                          Cell           },
+    { "", "Traffic FER",                              None           },
+    { "", "Tx AGC",                                   None           },
+    { "", "Rx0 AGC",                                  None           },
+    { "", "Rx0 Channel",                              None           },
+    { "", "Rx0 Band Class",                           None           },
+    { "", "Rx1 AGC",                                  None           },
+    { "", "Rx1 Channel",                              None           },
+    { "", "Rx1 Band Class",                           None           },
+    { "", "Device State",                             None           },
+    { "", "Session State",                            None           },
+    { "", "Band Class",                               None           },
+    { "", "EV-DO Forward Rate",                       None           },
+    { "", "EV-DO Reverse Rate",                       None           },
+    { "", "1x Traffic FER",                           None           },
+    { "", "Roaming Indicator",                        None           },
+    { "", "Protocol Revision",                        None           },
+
+    // Cell monitors, and what modems' makers may add to them
+    { "", "MCC",                                      Country        },
+    { "", "MNC",                                      Network        },
+    { "", "LAC",                                      Area           },
+    { "", "TAC",                                      Area           },
+    { "", "RAC",                                      SubArea        },
+    { "", "CellId",                                   Cell           },
+    { "", "SCN",                                      ScramblingCode },
+    { "", "PID",                                      PhysicalCell   },
+    { "", "IMSI",                                     Subscriber     },
+    { "", "IMEI",                                     Equipment      },
+    { "", "IMEISV",                                   Equipment      },
+    { "", "MEID",                                     Equipment      },
+    { "", "ESN",                                      Equipment      },
+    { "", "TMSI",                                     Temporary      },
+    { "", "P-TMSI",                                   Temporary      },
+    { "", "M-TMSI",                                   Temporary      },
+    { "", "GUTI",                                     Temporary      },
+    { "", "ICCID",                                    SimNumber      },
+    { "", "MSISDN",                                   Phone          },
+    { "", "Technology",                               None           },
+    { "", "BandInfo",                                 None           },
+    { "", "ECN0",                                     None           },
+    { "", "C1",                                       None           },
+    { "", "GSM",                                      None           },
+    { "", "Registration",                             None           },
+    { "", "Connection",                               None           },
+    { "", "Throughput",                               None           },
+    { "", "Errors",                                   None           },
+    { "", "TxPower",                                  None           },
+
+    // What all phones tell
+    { "", "EF-ICCID",                                 SimNumber      },
+    { "", "EF-MSISDN",                                Phone          },
+    { "", "EF-3GPP MAIL BOX DIALING NUMBER",          Phone          },
+    { "", "EF-LOCI",                                  Location       },
+    { "", "EF-GPRS/PS-LOCI",                          PsLocation     },
+    { "", "EF-ACCESS CONTROL CLASS",                  AccessClass    },
+    { "", "EF-FPLMN",                                 Plmn           },
+    { "", "EF-ACTING HPLMN",                          Plmn           },
+    { "", "EF-PLMN NETWORK NAME",                     NetworkName    },
+    { "", "EF-OPERATOR PLMN LIST",                    PlmnAreas      },
+    { "", "EF-OPLMNAcT",                              PlmnAccess     },
+    { "", "APN",                                      Apn            },
+    { "", "PDP Address",                              Address        },
+    { "", "EF-HPPLMN SEARCH PERIOD",                  None           },
+    { "", "EF-ADMINISTRATIVE DATA",                   None           },
+    { "", "EF-RAT MODE",                              None           },
+    { "", "Context ID",                               None           },
+    { "PDP Context Info", "Address",                  Address        },
+    { "PDP Context Info", "Type",                     None           },
+    { "", "PDP Type",                                 None           },
+    { "", "Quality of Service",                       None           },
+};
+
+constexpr std::string_view kScreens[] = {
+    "1x", "Active Set", "BLER", "CCTRCH SIR", "Cell", "Cell Change Counters", "Coding Scheme",
+    "Connected mode LTE Intra-frequency Measurement", "Connection", "Counters", "Detected Cells", "Detected Set", "EV-DO",
+    "Equivalent PLMN List", "Fingers", "GPRS", "GPRS Information", "GSM", "GSM Cell and Neighbours",
+    "GSM Neighbor Cell List", "GSM RR Info", "GSM Serving Cell", "GSM Set", "HSDPA Info", "Measured Neighbor Cells",
+    "Mobile Allocation", "Monitored Set", "Neighbor Cell List", "Neighbor Cells List", "Neighbor Measurements",
+    "Neighboring Cells", "Neighbours", "Non-Ranked GSM Set", "Non-Ranked UMTS Set", "PDP Context Info",
+    "Primary HARQ Process", "Process CO", "Process CS", "Process PS", "RRC Info", "Rates and Errors", "Registration",
+    "Registration and Network", "Reselection Candidates", "Reselection Candidates List", "SIM Info",
+    "SIM and Data Contexts", "Secondary HARQ Process", "Serving", "Serving Cell Info", "Serving Cell Measurements",
+    "Serving PLMN", "System", "TRCH BLER", "Transport Channels", "UMTS", "UMTS Cells", "UMTS RR Info",
+    "UMTS RR Measurement", "UMTS Radio", "UMTS Set", "Virtual Active Set", "ARFCNs", "SIR",
+};
+// clang-format on
+
+}  // namespace
+
+std::span<const SharedKey> sharedKeys() { return kKeys; }
+
+std::string_view withoutOrder(std::string_view name) {
+    const std::size_t end = name.find(';');
+    const bool isOrder = end != name.npos && end > 0 && end < 3 &&
+                         std::ranges::all_of(name.substr(0, end), [](char c) { return c >= '0' && c <= '9'; });
+    return isOrder ? name.substr(end + 1) : name;
+}
+
+std::optional<Identity> identityOf(std::string_view section, std::string_view key) {
+    section = withoutOrder(section);
+    key = withoutOrder(key);
+    const auto found = std::ranges::find_if(kKeys, [&](const SharedKey& known) {
+        return known.key == key && (known.section.empty() || known.section == section);
+    });
+    return found != std::end(kKeys) ? std::optional(found->identity) : std::nullopt;
+}
+
+bool isScreen(std::string_view name) { return std::ranges::find(kScreens, withoutOrder(name)) != std::end(kScreens); }
+
+}  // namespace kelvo

@@ -11,33 +11,38 @@ namespace kelvo {
 namespace {
 
 constexpr const char* kFooter =
-    "What it shows comes from the telephony service, kelvo-telephonyd. In a terminal, \"kelvoctl watch\" shows the\n"
-    "same screens.";
+    "Without a file, what it shows comes from the telephony service, kelvo-telephonyd, and a second start brings the\n"
+    "window of the first to the front. In a terminal, \"kelvoctl watch\" shows the same screens.\n\n"
+    "Examples:\n"
+    "  kelvo\n"
+    "  kelvo drive.pcap\n";
 
 struct CommandLine {
     CommandLine() {
         app.footer(kFooter);
+        app.add_option("FILE", options.capture, "A capture to replay, in a loop, instead of the service's log");
         app.set_version_flag("--version", versionLine("kelvo"));
     }
+    ApplicationOptions options;
     CLI::App app{"Shows what a phone's baseband modem reports right now, as screens.", "kelvo"};
 };
 
 }  // namespace
 
-std::optional<int> applicationExitStatus(int argc, const char* const* argv) {
+ParsedApplicationOptions parseApplicationOptions(int argc, const char* const* argv) {
     CommandLine line;
     try {
         line.app.parse(argc, argv);
-        return std::nullopt;
+        return {line.options, 0};
     } catch (const CLI::CallForHelp&) {
         fmt::print("{}", line.app.help());
-        return 0;
+        return {std::nullopt, 0};
     } catch (const CLI::CallForVersion& version) {
         fmt::print("{}\n", version.what());
-        return 0;
+        return {std::nullopt, 0};
     } catch (const CLI::ParseError& error) {
         fmt::print(stderr, "kelvo: {}\n", error.what());
-        return 1;
+        return {std::nullopt, 1};
     }
 }
 

@@ -22,8 +22,9 @@ std::vector<std::string> namesOf(const CLI::Option& option) {
 }
 
 std::vector<std::string> sortedNames(const std::set<CLI::Option*>& options) {
-    std::vector<std::string> names;
-    for (const CLI::Option* option : options) names.push_back(namesOf(*option).back());
+    std::vector<std::string> names(options.size());
+    std::transform(options.begin(), options.end(), names.begin(),
+                   [](const CLI::Option* option) { return namesOf(*option).back(); });
     std::sort(names.begin(), names.end());
     return names;
 }

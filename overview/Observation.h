@@ -16,7 +16,8 @@ namespace kelvo::overview {
 struct Fact {
     std::string name;
     std::string text;
-    bool operator==(const Fact&) const = default;
+    std::optional<Figure> figure{};  ///< of a rate: the number behind the text, where it is one
+    bool operator==(const Fact& other) const { return name == other.name && text == other.text; }
 };
 
 /// A level or a quality, with what people call it here.

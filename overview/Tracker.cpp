@@ -151,8 +151,10 @@ void Tracker::noteConnectionBack(Time clock, Time::duration lost) {
 
 void Tracker::restart() {
     std::deque<Event> events = std::move(_events);
+    const std::uint64_t count = _eventCount;
     *this = Tracker(_limits);
     _events = std::move(events);
+    _eventCount = count;
 }
 
 void Tracker::noteCells() {
@@ -367,6 +369,7 @@ void Tracker::append(Event event) {
         _events.pop_front();
     }
     _events.push_back(std::move(event));
+    ++_eventCount;
 }
 
 }  // namespace kelvo::overview

@@ -57,6 +57,8 @@ public:
     const std::vector<TrackedCell>& cells() const { return _cells; }
     /// Oldest first.
     const std::deque<Event>& events() const { return _events; }
+    /// How many there have been, those that are no longer kept among them.
+    std::uint64_t eventCount() const { return _eventCount; }
 
 private:
     /// The serving cell's level or quality.
@@ -94,6 +96,7 @@ private:
     Time _clock{};
     std::vector<TrackedCell> _cells;
     std::deque<Event> _events;
+    std::uint64_t _eventCount = 0;
     Followed _level;
     Followed _quality;
     std::string _area;                      // the last that was known

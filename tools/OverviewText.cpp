@@ -5,6 +5,7 @@
 #include <algorithm>
 #include <vector>
 
+#include "overview/Words.h"
 #include "platform/encodings/Utf8.h"
 #include "tools/TerminalText.h"
 #include "tools/TrendBlocks.h"
@@ -58,15 +59,6 @@ std::vector<Line> linesOf(const std::vector<Fact>& facts) {
     return lines;
 }
 
-/// Of captures put together the times may go back; nothing is younger than now.
-std::string ageText(Time then, Time now) {
-    const auto age = std::max(now - then, Time::duration::zero());
-    const auto seconds = std::chrono::duration_cast<std::chrono::seconds>(age).count();
-    if (seconds < 120) return fmt::format("{} s ago", seconds);
-    if (seconds < 7200) return fmt::format("{} min ago", seconds / 60);
-    return seconds < 172800 ? fmt::format("{} h ago", seconds / 3600) : fmt::format("{} days ago", seconds / 86400);
-}
-
 void addFigure(std::vector<Line>& lines, const std::optional<Measure>& measure, std::optional<Time> heard, Time now) {
     if (!measure) return;
     std::string text = measure->figure.text;
@@ -97,19 +89,12 @@ std::string serving(const Tracker& tracker, Time now, const Layout& layout) {
 
 std::string textOf(const std::optional<Measure>& measure) { return measure ? printable(measure->figure.text) : ""; }
 
-/// How much more a cell has than the serving one; levels of different kinds do not compare.
-std::string difference(const std::optional<Measure>& level, const std::optional<Measure>& serving) {
-    if (!level || !serving || level->name != serving->name) return "";
-    return fmt::format("{:+.2f}{}", level->figure.number - serving->figure.number,
-                       level->figure.unit.empty() ? "" : " dB");
-}
-
 std::string cellsAround(const Tracker& tracker, Time now, const Layout& layout) {
     std::vector<Line> lines;
     for (const TrackedCell& cell : tracker.cells()) {
         const std::string mark = cell.isLost ? "lost" : cell.heard.mark;
         lines.push_back({printable(cell.heard.identity), textOf(cell.heard.level), textOf(cell.heard.quality),
-                         difference(cell.heard.level, tracker.latest().level), ageText(cell.lastHeard, now), mark});
+                         differenceText(cell.heard.level, tracker.latest().level), ageText(cell.lastHeard, now), mark});
     }
     lines.resize(std::max(lines.size(), layout.cellRows), {""});
     if (!lines.empty()) lines.insert(lines.begin(), {"Cell", "Level", "Quality", "To serving", "Heard", ""});
@@ -147,13 +132,10 @@ std::string isoText(Time time) {
 }
 
 std::string eventText(const Event& event) {
-    const auto change = [](const std::string& from, const std::string& to) {
-        return from.empty() || to.empty() ? from + to : from + " -> " + to;
-    };
     std::string text = fmt::format("{}  {}", isoText(event.time), nameOf(event.kind));
-    const std::string what = change(event.from, event.to);
+    const std::string what = changeText(event.from, event.to, "->");
     if (!what.empty()) text += "  " + what;
-    const std::string levels = change(event.levelBefore, event.levelAfter);
+    const std::string levels = changeText(event.levelBefore, event.levelAfter, "->");
     if (!levels.empty()) text += fmt::format(" ({})", levels);
     return printable(text);
 }

@@ -8,6 +8,7 @@ namespace kelvo::overview {
 namespace {
 
 constexpr const char* kGsmCell = "GSM Cell and Neighbours/GSM Serving Cell";
+constexpr std::int64_t kNoArea = 0xFFFE;  // and 0xFFFF: 3GPP TS 23.003, 4.1, a phone that has no valid location area
 constexpr const char* kRrState = "GSM Cell and Neighbours/GSM RR Info/RR State";
 constexpr const char* kUmtsCell = "UMTS Radio/UMTS RR Info";
 constexpr const char* kActiveSet = "UMTS Cells/Active Set";
@@ -123,9 +124,11 @@ void observeCells(Observation& seen, const Screens& screens) {
 void observeRegistration(Observation& seen, const Screens& screens) {
     const Screens registration(screens.at("Registration and Network"));
     const Screens network(registration.at("Serving PLMN"));
-    const std::string lac = named("LAC", network.text("Location Area Code"));
+    const auto code = network.whole("Location Area Code");
+    const bool isArea = code && *code < kNoArea;
     const std::string rac = named("RAC", network.text("Routing Area Code"));
-    seen.area = lac.empty() || rac.empty() ? lac : lac + ", " + rac;
+    if (isArea) seen.area = fmt::format("LAC {}", *code);
+    if (isArea && !rac.empty()) seen.area += ", " + rac;
     addNetwork(seen, network.text("Mobile Country Code"), network.text("Mobile Network Code"));
     const std::string service = network.text("Service Type");
     seen.knowsService = !service.empty();

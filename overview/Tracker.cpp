@@ -287,10 +287,12 @@ void Tracker::noteStates() {
     }
 }
 
-/// A part that was not known before is no change.
+/// A part that was not known before is no change. Without service there is no area, which is none either.
 void Tracker::noteArea() {
-    if (Event* change = unfinished(false, _before.area, _seen.area)) return complete(*change, "Area", _seen.area);
-    if (!changedParts(_before.area, _seen.area).empty()) noteChange(Kind::Area, _before.area, _seen.area);
+    if (_seen.area.empty()) return;
+    const std::string before = std::exchange(_area, _seen.area);
+    if (Event* change = unfinished(false, before, _seen.area)) return complete(*change, "Area", _seen.area);
+    if (!changedParts(before, _seen.area).empty()) noteChange(Kind::Area, before, _seen.area);
 }
 
 void Tracker::noteContexts() {

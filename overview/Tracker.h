@@ -99,6 +99,7 @@ private:
     std::uint64_t _eventCount = 0;
     Followed _level;
     Followed _quality;
+    std::string _area;                      // the last that was known
     Time _servingTold{};                    // when a record named the serving cell last
     std::optional<Time> _connectedSince;    // as the last state said that was known
     std::optional<Time> _leftConnected;     // a cell, and the state in the new one is not known yet

@@ -138,6 +138,16 @@ TEST(GsmUmtsObservation, RegistrationTellsServiceAndRejects) {
     EXPECT_EQ(registered("NO_SERVICE", "GMM_GU3_PLMN_NOT_ALLOWED").reject, "GMM_GU3_PLMN_NOT_ALLOWED");
 }
 
+TEST(GsmUmtsObservation, AnAreaOfNowhereIsNone) {
+    const auto area = [](const char* code) {
+        const Value network = shown({{"Location Area Code", code}, {"Routing Area Code", "255"}});
+        return observe(Technology::GSM, group({{"Registration and Network", group({{"Serving PLMN", network}})}})).area;
+    };
+    EXPECT_EQ(area("65535"), "");
+    EXPECT_EQ(area("65534"), "");
+    EXPECT_EQ(area("65533"), "LAC 65533, RAC 255");
+}
+
 TEST(GsmUmtsObservation, ErrorRatesAndContexts) {
     const Observation seen = observe(
         Technology::GSM,

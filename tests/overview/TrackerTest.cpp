@@ -267,6 +267,18 @@ TEST(Tracker, TheAreasPartsAreOneChange) {
     EXPECT_EQ(tracker.events()[3].from, "LAC 13, URA 2");
 }
 
+TEST(Tracker, AnAreaThatComesBackIsNoChangeAndAnotherIs) {
+    Tracker tracker;
+    Observation seen = servedBy("A", 1);
+    for (const char* area : {"LAC 11", "", "LAC 11", "", "LAC 12"}) {
+        seen.area = area;
+        tracker.note(seen, kStart);
+    }
+    ASSERT_EQ(tracker.events().size(), 2u);
+    EXPECT_EQ(tracker.events()[1].from, "LAC 11");
+    EXPECT_EQ(tracker.events()[1].to, "LAC 12");
+}
+
 TEST(Tracker, ACellWhoseCodeComesLaterIsOneChange) {
     Tracker tracker;
     const auto see = [&](const char* cell, std::uint64_t record, Time::duration after) {

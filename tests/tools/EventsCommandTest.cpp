@@ -139,5 +139,33 @@ TEST_F(EventsCommand, OfAPhoneWithTwoCarriersOneServes) {
               "2016-01-17T03:43:16.900Z  band change  17 -> 4\n");
 }
 
+/// 0x7135: network 460-00; service 0 none, 3 both; an area of 65535 and 255 is none.
+Bytes network(std::uint8_t service, std::uint16_t location, std::uint8_t routing) {
+    Record record(0x7135, 32);
+    record.u8(14, service).u8(15, 0x64).u8(16, 0xF0).u8(17, 0x00);
+    return record.u8(18, location >> 8).u8(19, location & 0xFF).u8(20, routing).bytes();
+}
+
+/// 0x7130: state 1 deregistered, 3 registered, 5 updates; status 3 routing area not allowed.
+Bytes packetState(std::uint8_t state, std::uint8_t status) {
+    return Record(0x7130, 16).u8(13, state).u8(15, status).bytes();
+}
+
+/// What a phone sent on a network in 2015 when it lost its service and found it again.
+TEST_F(EventsCommand, OfAPhoneThatLosesItsServiceItTellsTheLength) {
+    const std::string file = capture(Technology::GSM, {network(3, 4566, 100), packetState(3, 0), packetState(5, 0),
+                                                       packetState(3, 0), network(0, 65535, 255), packetState(1, 0),
+                                                       packetState(1, 3), network(3, 4566, 100), packetState(3, 0)});
+    EXPECT_EQ(kelvoctl({"events", file}).output,
+              "1970-01-01T00:00:02.000Z  registration  GMM_REGISTERED -> GMM_ROUTING_AREA_UPDATE_INITIATED\n"
+              "1970-01-01T00:00:03.000Z  registration  GMM_ROUTING_AREA_UPDATE_INITIATED -> GMM_REGISTERED\n"
+              "1970-01-01T00:00:04.000Z  service lost\n"
+              "1970-01-01T00:00:05.000Z  registration  GMM_REGISTERED -> GMM_DEREGISTERED\n"
+              "1970-01-01T00:00:06.000Z  reject  GMM_GU3_ROUTING_AREA_NOT_ALLOWED\n"
+              "1970-01-01T00:00:07.000Z  service back  after 3.0 s\n"
+              "1970-01-01T00:00:08.000Z  registration  GMM_DEREGISTERED -> GMM_REGISTERED\n");
+    EXPECT_EQ(json({"decode", "--overview", "--json", file})["serving"]["area"], "LAC 4566, RAC 100");
+}
+
 }  // namespace
 }  // namespace kelvo

@@ -31,6 +31,11 @@ add_compile_options(-Wall -Wextra -Wpedantic -Wconversion -Wno-sign-conversion -
 if(CMAKE_CXX_COMPILER_ID STREQUAL "GNU")
     add_compile_options(-Wno-restrict)  # GCC 12 sees overlaps in std::string's operator+ that are not there
 endif()
+# Every processor shows the same texts as x86-64: there a product is rounded before something is added to it, and char has a
+# sign.
+if(NOT CMAKE_SYSTEM_PROCESSOR STREQUAL "x86_64")
+    add_compile_options(-ffp-contract=off -fsigned-char)
+endif()
 if(CMAKE_CXX_COMPILER_ID STREQUAL "Clang")
     add_compile_options(-Wthread-safety)  # data that a lock guards is touched under it (platform/system/Mutex.h)
 endif()

@@ -24,6 +24,7 @@ public:
     static constexpr auto kHeardFor = std::chrono::seconds(30);     ///< a cell stays that long after it was heard
     static constexpr auto kLostFor = std::chrono::seconds(10);      ///< and that much longer, marked
     static constexpr auto kSettling = std::chrono::seconds(2);      ///< within which several records tell of one change
+    static constexpr auto kTurn = std::chrono::milliseconds(500);   ///< within which each of several carriers is told
     static constexpr auto kMoment = std::chrono::milliseconds(10);  ///< within which all belong to one step of a modem
     static constexpr double kSteady = 2.0;                          ///< dB by which a cell overtakes the one above
 
@@ -69,6 +70,7 @@ private:
     };
 
     void noteCells();
+    void keepServing();
     void noteServing();
     void noteWhetherHandover();
     Event* unfinished(bool isCell, const std::string& before, const std::string& now);
@@ -97,6 +99,7 @@ private:
     std::uint64_t _eventCount = 0;
     Followed _level;
     Followed _quality;
+    Time _servingTold{};                    // when a record named the serving cell last
     std::optional<Time> _connectedSince;    // as the last state said that was known
     std::optional<Time> _leftConnected;     // a cell, and the state in the new one is not known yet
     std::optional<bool> _isWithoutService;  // none while the screens have not told

@@ -9,6 +9,7 @@
 #include <cstdio>
 
 #include "platform/encodings/WholeNumber.h"
+#include "platform/version/Version.h"
 
 namespace kelvo {
 namespace {
@@ -22,6 +23,11 @@ constexpr const char* kFooter =
     "five seconds last five. After the last packet, or where the file breaks off, the service stays, and its status\n"
     "says so; SIGINT or SIGTERM ends it.\n"
     "A recording appears with its first record.\n"
+    "Without a source it starts as telephonyd.conf says, in the user's configuration directory (~/.config/kelvo) or "
+    "else\n"
+    "in /etc/kelvo: the names of these options, a line each, such as port = \"auto\" and allow-remote = true. What "
+    "stands\n"
+    "on the command line goes before it.\n"
     "A simulated modem drives through a town without end; the same seed drives the same way, byte for byte.\n"
     "A modem at a port is asked for what the clients want while there are any; one that goes is waited for.\n"
     "The service logs to standard error in a terminal and to the system log otherwise.";
@@ -85,18 +91,64 @@ public:
         addReplayAndSimulation();
         addRecordings();
         addPort();
+        addConfiguration();
         addStatus();
     }
 
-    /// Throws what CLI11 throws.
-    ServiceOptions read(int argc, const char* const* argv) {
-        _app.parse(argc, argv);
-        settle();
+    /// Throws what CLI11 throws, and CLI::Success when it has checked the configuration.
+    ServiceOptions read(std::vector<std::string> arguments, const ConfigPlaces& places) {
+        const bool namesSource =
+            std::ranges::any_of(kSources, [&](const char* source) { return isGiven(arguments, source); });
+        const bool isAsked =
+            std::ranges::any_of(kQuestions, [&](const char* question) { return isGiven(arguments, question); });
+        if (!namesSource && !isAsked) return readConfigured(arguments, places);
+        if (namesSource && (isGiven(arguments, "--config") || isGiven(arguments, "--check-config")))
+            throw CLI::ConfigError("a configuration is read where the command line names no source");
+        parse(arguments);
         return _options;
     }
-    std::string help() const { return _app.help(); }
+    const CLI::App& app() const { return _app; }
 
 private:
+    static constexpr std::array kSources = {"--replay", "--simulate", "--port", "--modemmanager", "--status"};
+    static constexpr std::array kQuestions = {"--help", "-h", "--version"};
+
+    void parse(std::vector<std::string> arguments) {
+        std::ranges::reverse(arguments);  // as CLI11 takes them
+        _app.parse(std::move(arguments));
+        settle();
+    }
+    ServiceOptions readConfigured(const std::vector<std::string>& arguments, const ConfigPlaces& places) {
+        const auto file = configurationOf(arguments, places);
+        const auto configured = readServiceConfig(file, _app);
+        if (!configured) throw CLI::ConfigError(fmt::format("{}: {}", file.native(), configured.error().reason));
+        std::vector<std::string> all = arguments;
+        for (const std::string& one : *configured) {
+            if (!isGiven(arguments, one.substr(0, one.find('=')))) all.push_back(one);
+        }
+        const bool namesSource =
+            std::ranges::any_of(kSources, [&](const char* source) { return isGiven(all, source); });
+        if (!namesSource)
+            throw CLI::ConfigError(file.native() + ": it names no source: replay, simulate, port or modemmanager");
+        try {
+            parse(all);
+        } catch (const CLI::ParseError& error) {
+            throw CLI::ConfigError(fmt::format("{}: {}", file.native(), error.what()));
+        }
+        if (_checkOnly) throw CLI::Success(file.native() + " is in order", CLI::ExitCodes::Success);
+        return _options;
+    }
+    /// The file that is named, or the one that is there.
+    static std::filesystem::path configurationOf(const std::vector<std::string>& arguments,
+                                                 const ConfigPlaces& places) {
+        for (std::size_t at = 0; at < arguments.size(); ++at) {
+            if (arguments[at].starts_with("--config=")) return arguments[at].substr(arguments[at].find('=') + 1);
+            if (arguments[at] == "--config" && at + 1 < arguments.size()) return arguments[at + 1];
+        }
+        if (auto file = places.existing()) return *file;
+        throw CLI::ConfigError(fmt::format("it needs a source (--help tells which), or a configuration: {} or {}",
+                                           places.user.native(), places.system.native()));
+    }
     void addSources() {
         auto* const source =
             _app.add_option_group("source", "Where the records come from: one of them, or --port and --modemmanager");
@@ -172,12 +224,15 @@ private:
             ->needs(_port);
         _app.add_flag("--allow-remote", _remote, "Let tcp: lead to other machines: whoever is in between is trusted")
             ->needs(_port);
-        const auto leaveOff = [this](std::int64_t) { _options.line.controlLines = false; };
-        _app.add_flag("--no-dtr-rts", leaveOff, "Leave a serial port's lines DTR and RTS off")->needs(_port);
+        _app.add_flag("--no-dtr-rts", _noControlLines, "Leave a serial port's lines DTR and RTS off")->needs(_port);
+    }
+    void addConfiguration() {
+        _app.add_option("--config", _configuration, "Start as this file says, and as no other does")->type_name("FILE");
+        _app.add_flag("--check-config", _checkOnly, "Tell whether the configuration is in order, and end");
     }
     void addStatus() {
         _app.add_flag("--json", _options.json, "The status as one JSON object")->needs(_status);
-        _app.set_version_flag("--version", "kelvo-telephonyd " KELVO_VERSION);
+        _app.set_version_flag("--version", versionLine("kelvo-telephonyd"));
     }
 
     void settle() {
@@ -194,6 +249,7 @@ private:
             _options.simulate = *technologyBy(&TechnologyNames::word, std::string_view(_simulated));
         if (_generation->count() > 0) _options.generation = generationOf(_options.simulate, _year);
         _options.session.technology = technologyBy(&TechnologyNames::word, std::string_view(_portTechnology));
+        _options.line.controlLines = !_noControlLines;
         _options.speed = speedOf(_speed);
     }
 
@@ -204,7 +260,10 @@ private:
     std::string _portName;
     std::string _managedModem;
     std::string _portTechnology = "auto";
+    std::string _configuration;
     bool _remote = false;
+    bool _noControlLines = false;
+    bool _checkOnly = false;
     CLI::App _app{
         "Telephony service: gives Kelvo the log of a baseband modem: a real one, simulated, or replayed from a "
         "capture.",
@@ -219,20 +278,25 @@ private:
 
 }  // namespace
 
-ParsedOptions parseServiceOptions(int argc, const char* const* argv) {
+ParsedOptions parseServiceOptions(int argc, const char* const* argv, const ConfigPlaces& places) {
     CommandLine line;
     try {
-        return {line.read(argc, argv), 0};
+        return {line.read({argv + 1, argv + argc}, places), 0};
     } catch (const CLI::CallForHelp&) {
-        fmt::print("{}", line.help());
+        fmt::print("{}", line.app().help());
         return {std::nullopt, 0};
     } catch (const CLI::CallForVersion& version) {
         fmt::print("{}\n", version.what());
+        return {std::nullopt, 0};
+    } catch (const CLI::Success& checked) {
+        fmt::print("{}\n", checked.what());
         return {std::nullopt, 0};
     } catch (const CLI::ParseError& error) {
         fmt::print(stderr, "kelvo-telephonyd: {}\n", error.what());
         return {std::nullopt, 1};
     }
 }
+
+void describeServiceOptions(const std::function<void(const CLI::App&)>& reader) { reader(CommandLine().app()); }
 
 }  // namespace kelvo

@@ -2,10 +2,12 @@
 
 #include <cstdint>
 #include <filesystem>
+#include <functional>
 #include <optional>
 #include <string>
 
 #include "telephony/PacedSource.h"
+#include "telephony/ServiceConfig.h"
 #include "telephony/line/PortAddress.h"
 #include "telephony/line/SerialLine.h"
 #include "telephony/simulation/Generation.h"
@@ -38,7 +40,12 @@ struct ParsedOptions {
     int exitStatus = 0;
 };
 
-/// Reads the command line. Prints help to standard output and errors, in one line, to standard error.
-ParsedOptions parseServiceOptions(int argc, const char* const* argv);
+/// Reads the command line, and where that names no source the configuration: what the command line says goes before it.
+/// Prints help, and what has become of a check of the configuration, to standard output; errors, in one line, to
+/// standard error.
+ParsedOptions parseServiceOptions(int argc, const char* const* argv, const ConfigPlaces& places);
+
+/// Shows the command line's description to `reader`, for the manual.
+void describeServiceOptions(const std::function<void(const CLI::App&)>& reader);
 
 }  // namespace kelvo

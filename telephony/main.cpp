@@ -11,6 +11,7 @@
 #include "platform/host/HostEventLoop.h"
 #include "platform/host/HostMainQueue.h"
 #include "platform/host/HostMessagePorts.h"
+#include "platform/host/HostPaths.h"
 #include "platform/host/HostSystemLog.h"
 #include "platform/host/UnixSignals.h"
 #include "platform/system/Environment.h"
@@ -19,6 +20,7 @@
 #include "telephony/CaptureStream.h"
 #include "telephony/CompletedSource.h"
 #include "telephony/ModemSource.h"
+#include "telephony/ServiceManager.h"
 #include "telephony/ServiceOptions.h"
 #include "telephony/SimulationStream.h"
 #include "telephony/StatusText.h"
@@ -108,6 +110,11 @@ void tellSource(const RecordSource& source) {
 int serve(const ServiceOptions& options) {
     HostMainQueue queue;
     HostMessagePorts ports;
+    ServiceManager manager = ServiceManager::ofEnvironment();
+    auto socket =
+        ServiceManager::passedSocket(HostPaths::portDirectory() / (std::string(kPLTelephonyServicePort) + ".port"));
+    if (!socket) return fail(socket.error());
+    if (*socket) ports.usePassedSocket(std::string(kPLTelephonyServicePort), std::move(socket).value());
     const auto opened = openSource(options, queue);
     if (!opened) return fail(opened.error());
     RecordSource& source = **opened;
@@ -119,11 +126,13 @@ int serve(const ServiceOptions& options) {
     bool ending = false;  // the second signal does not wait for the modem
     const UnixSignals handler({SIGINT, SIGTERM, SIGHUP}, [&](int) {
         if (std::exchange(ending, true)) return QCoreApplication::quit();
+        manager.tellEnding();
         source.end([] { QCoreApplication::quit(); });
     });
     TelephonyService service(ports, source);
     if (const auto made = service.open(); !made) return fail(made.error());
     tellSource(source);
+    manager.tellReady("Serving " + source.description(), queue);
     return HostEventLoop::run(QCoreApplication::exec);
 }
 
@@ -145,7 +154,7 @@ int tellStatus(bool json) {
 }  // namespace
 
 int main(int argc, char** argv) {
-    const auto parsed = parseServiceOptions(argc, argv);
+    const auto parsed = parseServiceOptions(argc, argv, ConfigPlaces::ofHost());
     if (!parsed.options) return parsed.exitStatus;
     const QCoreApplication application(argc, argv);
     const bool inTerminal = ::isatty(STDERR_FILENO) != 0;

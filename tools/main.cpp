@@ -6,19 +6,10 @@
 
 #include "platform/system/DirectoryResources.h"
 #include "platform/system/Environment.h"
+#include "platform/version/Version.h"
 #include "tools/CommandFailure.h"
-#include "tools/DecodeCommand.h"
 #include "tools/DisplayText.h"
-#include "tools/DoctorCommand.h"
-#include "tools/EventsCommand.h"
-#include "tools/ExplainCommand.h"
-#include "tools/ExportCommand.h"
-#include "tools/ImportCommand.h"
-#include "tools/ShareCommand.h"
-#include "tools/SnapshotCommand.h"
-#include "tools/StartCommandCommand.h"
-#include "tools/WatchCommand.h"
-#include "tools/report/ReportCommand.h"
+#include "tools/Kelvoctl.h"
 
 namespace {
 
@@ -40,29 +31,15 @@ int main(int argc, char** argv) {
     const kelvo::DirectoryResources resources(resourcesDirectory());
     kelvo::Environment environment;
     environment.resources = &resources;
-    environment.version = KELVO_VERSION;
+    environment.version = kelvo::version();
     const kelvo::Environment::Scope scope(environment);
 
-    CLI::App app("Kelvo in the terminal: the screens of a phone's radio, of captures and of snapshots.", "kelvoctl");
-    app.require_subcommand(1);
-    app.set_version_flag("--version", "kelvoctl " KELVO_VERSION);
-    app.footer("\"kelvoctl COMMAND --help\" tells more about a command.");
-    kelvo::addDecodeCommand(app);
-    kelvo::addWatchCommand(app);
-    kelvo::addEventsCommand(app);
-    kelvo::addReportCommand(app);
-    kelvo::addSnapshotCommand(app);
-    kelvo::addImportCommand(app);
-    kelvo::addExportCommand(app);
-    kelvo::addShareCommand(app);
-    kelvo::addStartCommandCommand(app);
-    kelvo::addDoctorCommand(app);
-    kelvo::addExplainCommand(app);
+    const auto app = kelvo::makeKelvoctl();
     try {
-        app.parse(argc, argv);
+        app->parse(argc, argv);
         return 0;
     } catch (const CLI::Success& help) {
-        return app.exit(help);
+        return app->exit(help);
     } catch (const CLI::ParseError& error) {
         return fail(std::string(error.what()) + " (kelvoctl --help tells what there is)");
     } catch (...) {

@@ -6,7 +6,12 @@
 #include <cstdio>
 #include <cstdlib>
 #include <exception>
+#include <filesystem>
+#include <memory>
 #include <optional>
+#include <stdexcept>
+#include <string>
+#include <utility>
 
 #include "platform/host/HostColorScheme.h"
 #include "platform/host/HostEventLoop.h"
@@ -20,9 +25,13 @@
 #include "platform/host/UnixSignals.h"
 #include "platform/system/DirectoryResources.h"
 #include "platform/system/Environment.h"
+#include "platform/version/Version.h"
+#include "ui/ApplicationOptions.h"
+#include "ui/FirstWindow.h"
 #include "ui/KelvoApp.h"
 #include "ui/PlatformStart.h"
 #include "ui/QuickWindow.h"
+#include "ui/ReplayService.h"
 #include "ui/Theme.h"
 
 namespace {
@@ -38,7 +47,14 @@ void followDesktop(HostColorScheme::Scheme scheme) {
     Theme::follow(decided ? std::optional(scheme == HostColorScheme::Scheme::Dark) : std::nullopt);
 }
 
-int runApplication(int argc, char** argv) {
+std::unique_ptr<ReplayService> startReplay(const std::string& capture) {
+    const std::filesystem::path programs = QGuiApplication::applicationDirPath().toStdString();
+    auto started = ReplayService::start(programs / "kelvo-telephonyd", capture);
+    if (!started) throw std::runtime_error(started.error().reason);
+    return std::move(started).value();
+}
+
+int runApplication(int argc, char** argv, const ApplicationOptions& options) {
     ::mallopt(M_MMAP_THRESHOLD, kOwnMappingFrom);
     std::optional<PlatformStart> start(std::in_place);
     QuickWindow::chooseSceneGraph();
@@ -57,10 +73,13 @@ int runApplication(int argc, char** argv) {
     HostSystemLog log("kelvo");
     const DirectoryResources resources(HostPaths::resourcesDirectory());
     const Environment::Scope environment(
-        {.log = &log, .resources = &resources, .standardOutput = stdout, .version = KELVO_VERSION});
+        {.log = &log, .resources = &resources, .standardOutput = stdout, .version = version()});
 
     HostMainQueue queue;
-    HostMessagePorts ports;
+    const std::unique_ptr<ReplayService> replay = options.capture ? startReplay(*options.capture) : nullptr;
+    HostMessagePorts ports(replay ? replay->portDirectory() : HostPaths::portDirectory());
+    const FirstWindow first(ports);
+    if (first.isElsewhere()) return EXIT_SUCCESS;
     HostTelephonyClient telephony(ports);
     HostPreferences preferences;
     HostWorker worker;
@@ -82,7 +101,8 @@ int main(int argc, char** argv) {
     // A failure that ends the program still leaves through every destructor: the log is written out, the ports are
     // given up, and what happened is the last line on standard error.
     try {
-        return runApplication(argc, argv);
+        const auto parsed = parseApplicationOptions(argc, argv);
+        return parsed.options ? runApplication(argc, argv, *parsed.options) : parsed.exitStatus;
     } catch (const std::exception& failure) {
         fmt::print(stderr, "kelvo: {}\n", failure.what());
         return EXIT_FAILURE;

@@ -1,5 +1,7 @@
 #include "LogGenerator/GSMUMTS/UMTSRRInfo.h"
 
+#include <cmath>
+
 #include "LogGenerator/PhoneServices/CellInfo.h"
 #include "platform/system/Environment.h"
 #include "platform/telephony/TelephonyConstants.h"
@@ -72,8 +74,9 @@ void UMTSRRInfo::showTransmitPower(ByteView data) {
         sum += static_cast<double>((raw + 512) / 10 - 70);
         ++count;
     }
-    // Intended: without an entry that counts, 0/0 is shown.
-    showReal(values()->slot("Transmit Power"), sum / count, kTransmitPower);
+    // Intended: without an entry that counts, 0/0 is shown. Its sign is the processor's; every one shows x86's.
+    const double power = sum / count;
+    showReal(values()->slot("Transmit Power"), std::isnan(power) ? std::copysign(power, -1.0) : power, kTransmitPower);
 }
 
 }  // namespace kelvo

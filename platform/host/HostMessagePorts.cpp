@@ -1,5 +1,7 @@
 #include "platform/host/HostMessagePorts.h"
 
+#include <utility>
+
 #include "platform/host/HostLocalPort.h"
 #include "platform/host/HostPaths.h"
 #include "platform/host/HostRemotePort.h"
@@ -34,11 +36,17 @@ std::int64_t ownerOf(const std::filesystem::path& directory, std::string_view na
 HostMessagePorts::HostMessagePorts(std::filesystem::path directory) : _directory(std::move(directory)) {}
 HostMessagePorts::HostMessagePorts() : HostMessagePorts(HostPaths::portDirectory()) {}
 
+void HostMessagePorts::usePassedSocket(std::string name, UniqueFd listener) {
+    _passedName = std::move(name);
+    _passed = std::move(listener);
+}
+
 MessagePorts::Local HostMessagePorts::createLocal(std::string_view name, MessageCallback callback) {
     if (!checkName(name)) return {};
     UniqueFd directory = openDirectory(_directory);
     if (!directory) return {};
-    auto claim = PortClaim::take(std::move(directory), std::string(name));
+    UniqueFd passed = name == _passedName ? std::exchange(_passed, UniqueFd()) : UniqueFd();
+    auto claim = PortClaim::take(std::move(directory), std::string(name), std::move(passed));
     if (!claim) {
         const PortRefusal& refusal = claim.error();
         if (!refusal.isTaken) logLine(Level::Error, "Cannot make port %s: %s", name, refusal.reason);

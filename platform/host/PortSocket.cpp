@@ -76,16 +76,26 @@ pid_t processOfPeer(int fd) {
     return peer ? peer->pid : 0;
 }
 
-Result<PortClaim, PortRefusal> PortClaim::take(UniqueFd directory, std::string name) {
+Result<PortClaim, PortRefusal> PortClaim::take(UniqueFd directory, std::string name, UniqueFd passed) {
     PortClaim claim(std::move(directory), std::move(name));
     if (const auto locked = claim.lock(); !locked) return locked.error();
+    if (passed) {
+        ::fcntl(passed.get(), F_SETFL, O_NONBLOCK);
+        claim._listener = std::move(passed);
+        claim._wasPassed = true;
+        return claim;
+    }
+    if (connectToPort(claim._directory.get(), claim._name)) {
+        claim._wasPassed = true;  // it is another's, and stays
+        return PortRefusal{true, "somebody listens already"};
+    }
     if (const auto listening = claim.listen(); !listening) return listening.error();
     return claim;
 }
 
 PortClaim::~PortClaim() {
     if (!_lock) return;
-    ::unlinkat(_directory.get(), (_name + ".port").c_str(), 0);
+    if (!_wasPassed) ::unlinkat(_directory.get(), (_name + ".port").c_str(), 0);
     ::unlinkat(_directory.get(), (_name + ".lock").c_str(), 0);
 }
 

@@ -31,13 +31,15 @@ struct PortRefusal {
 };
 
 /// The right to a port's name, and the socket that listens under it: `<name>.port` beside `<name>.lock`, which is held
-/// locked for as long as the owner lives. A lock that is free therefore marks what a dead owner left behind.
+/// locked for as long as the owner lives. A lock that is free therefore marks what a dead owner left behind, unless
+/// somebody listens all the same: a service manager does, until it passes the socket to the owner that it starts.
 class PortClaim {
 public:
-    static Result<PortClaim, PortRefusal> take(UniqueFd directory, std::string name);
+    /// `passed` is a socket that listens under the name already, and stays behind: whoever has passed it keeps it too.
+    static Result<PortClaim, PortRefusal> take(UniqueFd directory, std::string name, UniqueFd passed = {});
     PortClaim(PortClaim&&) = default;
     PortClaim& operator=(PortClaim&&) = delete;
-    ~PortClaim();  ///< removes both files
+    ~PortClaim();  ///< removes both files, but no socket that was passed
 
     int listener() const { return _listener.get(); }
 
@@ -50,6 +52,7 @@ private:
     std::string _name;
     UniqueFd _lock;
     UniqueFd _listener;
+    bool _wasPassed = false;
 };
 
 }  // namespace kelvo

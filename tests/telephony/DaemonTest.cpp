@@ -137,8 +137,7 @@ TEST_F(DaemonTest, TellsItsStatusToWhoeverAsks) {
 TEST_F(DaemonTest, SaysInOneLineWhatIsWrongWithItsCommandLine) {
     const QString capture = QString::fromStdString(_capture);
     const QString missing = QString::fromStdString(_temporary.path() / "missing");
-    for (const QStringList& arguments : {QStringList{},
-                                         QStringList{"--replay"},
+    for (const QStringList& arguments : {QStringList{"--replay"},
                                          QStringList{"--replay", missing},
                                          QStringList{"--replay", capture, "--speed", "0"},
                                          QStringList{"--replay", capture, "--speed", "-1"},
@@ -265,13 +264,6 @@ TEST_F(DaemonTest, SaysPlainlyWhichModemsHaveGenerations) {
     EXPECT_EQ(run({"--simulate", "cdma", "--generation", "2014"}).second,
               "kelvo-telephonyd: --generation: CDMA records have one layout, whatever the year: only lte and gsm have "
               "generations\n");
-}
-
-TEST_F(DaemonTest, TellsItsVersion) {
-    const auto [status, error] = run({"--version"});
-    EXPECT_EQ(status, 0);
-    EXPECT_EQ(error, "");
-    EXPECT_EQ(_output, "kelvo-telephonyd " KELVO_VERSION "\n");
 }
 
 TEST_F(DaemonTest, HelpsOnStandardOutput) {

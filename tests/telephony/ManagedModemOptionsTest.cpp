@@ -10,7 +10,7 @@ namespace {
 std::optional<ServiceOptions> parsed(std::vector<const char*> arguments) {
     arguments.insert(arguments.begin(), "kelvo-telephonyd");
     testing::internal::CaptureStderr();
-    const auto options = parseServiceOptions(static_cast<int>(arguments.size()), arguments.data()).options;
+    const auto options = parseServiceOptions(static_cast<int>(arguments.size()), arguments.data(), {}).options;
     const std::string told = testing::internal::GetCapturedStderr();
     EXPECT_EQ(std::ranges::count(told, '\n'), options ? 0 : 1) << told;
     return options;

@@ -271,13 +271,6 @@ TEST_F(DecodeCommand, PrintsTheStartCommand) {
     EXPECT_TRUE((*command->dictionary())["SetPlExtraCodes"].array());
 }
 
-TEST_F(DecodeCommand, TellsItsVersion) {
-    const Finished done = kelvoctl({"--version"});
-    EXPECT_EQ(done.status, 0);
-    EXPECT_EQ(done.output, "kelvoctl " KELVO_VERSION "\n");
-    EXPECT_EQ(done.errors, "");
-}
-
 TEST_F(DecodeCommand, HelpTellsOfEveryCommandOnStandardOutput) {
     const Finished done = kelvoctl({"--help"});
     EXPECT_EQ(done.status, 0);

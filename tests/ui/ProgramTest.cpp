@@ -14,7 +14,7 @@ constexpr int kPatience = 20'000;  // milliseconds; a wait ends as soon as its c
 class Program : public testing::Test {
 protected:
     /// With nothing of a desktop but the named platform.
-    void start(const char* platform) {
+    void start(const char* platform, const QStringList& arguments = {}) {
         QProcessEnvironment environment = QProcessEnvironment::systemEnvironment();
         for (const char* name : {"DISPLAY", "WAYLAND_DISPLAY", "WAYLAND_SOCKET", "DBUS_SESSION_BUS_ADDRESS"}) {
             environment.remove(QLatin1String(name));
@@ -22,7 +22,7 @@ protected:
         environment.insert(QStringLiteral("XDG_RUNTIME_DIR"), QString::fromStdString(runtime.path().string()));
         environment.insert(QStringLiteral("QT_QPA_PLATFORM"), QLatin1String(platform));
         program.setProcessEnvironment(environment);
-        program.start(QStringLiteral(KELVO_PROGRAM), QStringList());
+        program.start(QStringLiteral(KELVO_PROGRAM), arguments);
     }
     /// The one line that it ends with, and nothing else, having failed in an orderly way.
     std::string lineOfFailure() {
@@ -50,6 +50,26 @@ TEST_F(Program, SaysInOneLineThatThePlatformIsUnknown) {
     const std::string line = lineOfFailure();
     EXPECT_EQ(line.find("kelvo: no window can be opened: "), 0U);
     EXPECT_NE(line.find("of-another-world"), std::string::npos) << line;
+}
+
+TEST_F(Program, SaysInOneLineWhatIsWrongWithAFile) {
+    start("offscreen", {QStringLiteral("/nowhere/drive.pcap")});
+    EXPECT_EQ(lineOfFailure(), "kelvo: /nowhere/drive.pcap cannot be opened: No such file or directory");
+}
+
+TEST_F(Program, LeavesTheSecondStartToTheFirstWindow) {
+    start("offscreen");
+    program.setReadChannel(QProcess::StandardError);
+    ASSERT_TRUE(program.waitForReadyRead(kPatience));  // it has started, and looks for a telephony service
+    QProcess second;
+    second.setProcessEnvironment(program.processEnvironment());
+    second.start(QStringLiteral(KELVO_PROGRAM), QStringList());
+    ASSERT_TRUE(second.waitForFinished(kPatience));
+    EXPECT_EQ(second.exitCode(), 0);
+    EXPECT_EQ(second.readAllStandardError(), QByteArray());
+    EXPECT_EQ(program.state(), QProcess::Running);
+    program.terminate();
+    ASSERT_TRUE(program.waitForFinished(kPatience));
 }
 
 TEST_F(Program, EndsWithZeroWhenItIsAskedToEnd) {

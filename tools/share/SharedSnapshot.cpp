@@ -62,9 +62,12 @@ private:
     /// "2011-03-04 09:15:02 +0100"; in UTC unless places may be told, for a zone is one.
     Value date(const Value& value) {
         constexpr std::size_t kLength = 25;
+        constexpr std::int64_t kLast = 0xFFFFFFFF;  // as captures have their seconds
         const std::string* text = value.string();
-        const auto time = text != nullptr && text->size() == kLength ? dateFromDescription(*text) : std::nullopt;
-        if (!time) return {};
+        const bool isDate = text != nullptr && text->size() == kLength &&
+                            text->find_first_not_of("0123456789-: +") == std::string::npos;
+        const auto time = isDate ? dateFromDescription(*text) : std::nullopt;
+        if (!time || time->time_since_epoch().count() < 0 || time->time_since_epoch().count() > kLast) return {};
         if (!hidesZone()) return *text;
         return utcDateDescription(std::chrono::floor<std::chrono::seconds>(_sharer.times().host(*time)));
     }

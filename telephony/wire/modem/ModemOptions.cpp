@@ -5,6 +5,8 @@
 #include <CLI/CLI.hpp>
 #include <cstdio>
 
+#include "platform/version/Version.h"
+
 namespace kelvo::modem {
 namespace {
 
@@ -51,47 +53,70 @@ std::string footer() {
     return text;
 }
 
+/// The command line, and the words that are settled once all have been read.
+class CommandLine {
+public:
+    CommandLine() {
+        _app.footer(footer());
+        auto* source = _app.add_option_group("source", "What the modem is; one of them");
+        _simulate = source->add_option("--simulate", _word, "A modem that drives through a town without end")
+                        ->type_name("gsm|cdma|lte|utran")
+                        ->check(checkTechnology);
+        source
+            ->add_option("--replay", _options.replay,
+                         "The records of a capture (pcap), or of the frames that a diagnostic port sent\n"
+                         "(a file called *.frames)")
+            ->type_name("FILE");
+        source->require_option(1);
+        _generation = _app.add_option("--generation", _year,
+                                      "The year of the simulated modem: newer ones word an LTE or GSM/UMTS drive in\n"
+                                      "newer layouts; otherwise 2010")
+                          ->type_name("2010|2014|2018")
+                          ->needs(_simulate);
+        _app.add_option("--on", _options.on,
+                        "A link to make to the pseudo-terminal, or a socket to listen on instead: tcp:PORT on this\n"
+                        "machine, unix:PATH")
+            ->type_name("LINK|tcp:PORT|unix:PATH")
+            ->check(checkPlace);
+        _app.add_option("--faults", _faults, "In what ways it misbehaves; see below")
+            ->type_name("LIST")
+            ->check(checkFaults);
+        _app.add_option("--seed", _options.seed, "Which drive to simulate, and which faults to make")
+            ->type_name("N")
+            ->check(CLI::NonNegativeNumber)
+            ->capture_default_str();
+        _app.set_version_flag("--version", versionLine("kelvo-modem"));
+    }
+
+    /// Throws what CLI11 throws.
+    ModemOptions read(int argc, const char* const* argv) {
+        _app.parse(argc, argv);
+        if (_simulate->count() > 0)
+            _options.simulate = *technologyBy(&TechnologyNames::word, std::string_view(_word));
+        if (_generation->count() > 0) _options.generation = generationOf(_options.simulate, _year);
+        _options.faults = *Faults::parse(_faults);
+        return _options;
+    }
+    const CLI::App& app() const { return _app; }
+
+private:
+    ModemOptions _options;
+    std::string _word;
+    std::string _year;
+    std::string _faults;
+    CLI::App _app{"Plays a modem, simulated or recorded, behind the diagnostic protocol of a real one.", "kelvo-modem"};
+    CLI::Option* _simulate = nullptr;
+    CLI::Option* _generation = nullptr;
+};
+
 }  // namespace
 
 ParsedModemOptions parseModemOptions(int argc, const char* const* argv) {
-    ModemOptions options;
-    std::string word;
-    std::string year;
-    std::string faults;
-    CLI::App app("Plays a modem, simulated or recorded, behind the diagnostic protocol of a real one.", "kelvo-modem");
-    app.footer(footer());
-    auto* source = app.add_option_group("source", "What the modem is; one of them");
-    auto* simulate = source->add_option("--simulate", word, "A modem that drives through a town without end")
-                         ->type_name("gsm|cdma|lte|utran")
-                         ->check(checkTechnology);
-    source
-        ->add_option("--replay", options.replay,
-                     "The records of a capture (pcap), or of the frames that a diagnostic port sent\n"
-                     "(a file called *.frames)")
-        ->type_name("FILE");
-    source->require_option(1);
-    auto* generation = app.add_option("--generation", year,
-                                      "The year of the simulated modem: newer ones word an LTE or GSM/UMTS drive in\n"
-                                      "newer layouts; otherwise 2010")
-                           ->type_name("2010|2014|2018")
-                           ->needs(simulate);
-    app.add_option("--on", options.on,
-                   "A link to make to the pseudo-terminal, or a socket to listen on instead: tcp:PORT on this\n"
-                   "machine, unix:PATH")
-        ->type_name("LINK|tcp:PORT|unix:PATH")
-        ->check(checkPlace);
-    app.add_option("--faults", faults, "In what ways it misbehaves; see below")->type_name("LIST")->check(checkFaults);
-    app.add_option("--seed", options.seed, "Which drive to simulate, and which faults to make")
-        ->type_name("N")
-        ->check(CLI::NonNegativeNumber)
-        ->capture_default_str();
-    app.set_version_flag("--version", "kelvo-modem " KELVO_VERSION);
+    CommandLine line;
     try {
-        app.parse(argc, argv);
-        if (simulate->count() > 0) options.simulate = *technologyBy(&TechnologyNames::word, std::string_view(word));
-        if (generation->count() > 0) options.generation = generationOf(options.simulate, year);
+        return {line.read(argc, argv), 0};
     } catch (const CLI::CallForHelp&) {
-        fmt::print("{}", app.help());
+        fmt::print("{}", line.app().help());
         return {std::nullopt, 0};
     } catch (const CLI::CallForVersion& version) {
         fmt::print("{}\n", version.what());
@@ -100,8 +125,8 @@ ParsedModemOptions parseModemOptions(int argc, const char* const* argv) {
         fmt::print(stderr, "kelvo-modem: {}\n", error.what());
         return {std::nullopt, 1};
     }
-    options.faults = *Faults::parse(faults);
-    return {options, 0};
 }
+
+void describeModemOptions(const std::function<void(const CLI::App&)>& reader) { reader(CommandLine().app()); }
 
 }  // namespace kelvo::modem

@@ -2,12 +2,17 @@
 
 #include <cstdint>
 #include <filesystem>
+#include <functional>
 #include <optional>
 #include <string>
 
 #include "platform/telephony/Technology.h"
 #include "telephony/simulation/Generation.h"
 #include "telephony/wire/modem/Faults.h"
+
+namespace CLI {
+class App;
+}
 
 namespace kelvo::modem {
 
@@ -29,5 +34,8 @@ struct ParsedModemOptions {
 
 /// Reads the command line. Prints help to standard output and errors, in one line, to standard error.
 ParsedModemOptions parseModemOptions(int argc, const char* const* argv);
+
+/// Shows the command line's description to `reader`, for the manual.
+void describeModemOptions(const std::function<void(const CLI::App&)>& reader);
 
 }  // namespace kelvo::modem

@@ -1,5 +1,6 @@
 #include "platform/host/HostMessagePorts.h"
 
+#include <fcntl.h>
 #include <gtest/gtest.h>
 #include <sys/stat.h>
 #include <sys/wait.h>
@@ -7,6 +8,8 @@
 #include <fstream>
 
 #include "platform/host/HostPaths.h"
+#include "platform/host/PortSocket.h"
+#include "platform/host/PrivateDirectory.h"
 #include "platform/system/Environment.h"
 #include "tests/platform/host/RawPort.h"
 #include "tests/support/EventLoop.h"
@@ -84,6 +87,43 @@ TEST_F(HostMessagePortsNames, OfADeadOwnerAreRecovered) {
     const auto recovered = _ports.createLocal("orphan", noReply);
     ASSERT_TRUE(recovered.port);
     EXPECT_TRUE(_ports.openRemote("orphan"));
+}
+
+TEST_F(HostMessagePortsNames, OfASocketThatSomebodyListensOnAreTaken) {
+    auto owner = PortClaim::take(openPrivateDirectory(_directory).value(), "held");
+    ASSERT_TRUE(owner);
+    fs::remove(_directory / "held.lock");  // as before a service manager has started anybody
+    const auto refused = _ports.createLocal("held", noReply);
+    EXPECT_FALSE(refused.port);
+    EXPECT_TRUE(refused.alreadyExisted);
+    EXPECT_TRUE(fs::exists(_directory / "held.port"));
+    EXPECT_FALSE(fs::exists(_directory / "held.lock"));
+}
+
+TEST_F(HostMessagePortsNames, OfASocketThatWasPassedServeItAndLeaveItBehind) {
+    const auto holder = PortClaim::take(openPrivateDirectory(_directory).value(), "held");
+    ASSERT_TRUE(holder);
+    fs::remove(_directory / "held.lock");
+    const auto early = _ports.openRemote("held");  // before there is anybody to answer
+    ASSERT_TRUE(early);
+    ::fcntl(holder->listener(), F_SETFL, 0);  // as a service manager passes it: accepting waits
+    _ports.usePassedSocket("held", UniqueFd(::dup(holder->listener())));
+
+    std::string heard;
+    auto local = _ports.createLocal("held", [&](std::int32_t, ByteView data) {
+        heard += textOf(data);
+        return Bytes{};
+    });
+    ASSERT_TRUE(local.port);
+    local.port->schedule();
+    ASSERT_TRUE(early->request(0, bytesOf("hello"), {}, std::nullopt));
+    ASSERT_TRUE(runUntil([&] { return heard == "hello"; }));
+    EXPECT_TRUE(_ports.createLocal("held", noReply).alreadyExisted);
+    local.port.reset();
+    EXPECT_TRUE(fs::exists(_directory / "held.port"));
+    EXPECT_FALSE(fs::exists(_directory / "held.lock"));
+    EXPECT_TRUE(_ports.openRemote("held"));
+    EXPECT_TRUE(_log.lines().empty());
 }
 
 TEST_F(HostMessagePortsNames, ThatAreNoNamesAreRefusedWithOneLine) {

@@ -5,6 +5,7 @@
 #include "LogGenerator/Factory.h"
 #include "glossary/Glossary.h"
 #include "platform/system/DirectoryResources.h"
+#include "platform/system/Environment.h"
 #include "platform/values/Value.h"
 #include "tools/share/SharedRecords.h"
 
@@ -69,6 +70,8 @@ TEST(SharedKeys, KnowNoOthers) {
 }
 
 TEST(SharedRecords, HaveATableForEveryCodeThatIsDecoded) {
+    const DirectoryResources resources(KELVO_RESOURCE_DIR);
+    const Environment::Scope environment({.resources = &resources});
     std::size_t codes = 0;
     for (const TechnologyNames& names : kTechnologies) {
         const DictionaryRef command = generatorFromTechnology(names.identifier)->getStartCommand();

@@ -1,0 +1,81 @@
+#!/usr/bin/python3
+"""The units of the service, as systemd's own tools see them. Usage: units_test.py UNITS   (UNITS has system/ and user/)"""
+import os
+import re
+import shutil
+import subprocess
+import sys
+import tempfile
+import unittest
+from pathlib import Path
+
+UNITS = Path(sys.argv[1])
+LIMIT = 2.0  # the exposure that systemd-analyze works out, of 10
+
+
+def analyze(*arguments):
+    with tempfile.TemporaryDirectory() as runtime:  # of a user without a session
+        done = subprocess.run(["systemd-analyze", "--no-pager", *arguments], capture_output=True, text=True,
+                              env={**os.environ, "XDG_RUNTIME_DIR": runtime})
+    return done.returncode, done.stdout, done.stderr
+
+
+def entries(path):
+    """What a unit says, a list of values for each name."""
+    found = {}
+    for name, value in re.findall(r"^(\w+)=(.*)$", path.read_text(), re.MULTILINE):
+        found.setdefault(name, []).append(value)
+    return found
+
+
+class Units(unittest.TestCase):
+    def setUp(self):
+        if not shutil.which("systemd-analyze"):
+            print("left out: the units, without systemd-analyze", flush=True)
+            self.skipTest("no systemd-analyze")
+        directory = tempfile.TemporaryDirectory()
+        self.addCleanup(directory.cleanup)
+        self.directory = Path(directory.name)
+        for unit in UNITS.glob("*/kelvo-telephonyd*"):
+            shutil.copy(unit, self.directory)
+        # A template is looked at for somebody.
+        (self.directory / "kelvo-telephonyd@somebody.service").write_text(
+            (UNITS / "system/kelvo-telephonyd@.service").read_text())
+
+    def test_are_understood(self):
+        for manager, units in (("--user", ["kelvo-telephonyd.socket", "kelvo-telephonyd.service"]),
+                               ("--system", ["kelvo-telephonyd@somebody.service"])):
+            status, _, said = analyze(manager, "verify", "--man=no", "--recursive-errors=no",
+                                      *(self.directory / unit for unit in units))
+            said = "\n".join(line for line in said.splitlines() if "kelvo" in line)
+            self.assertEqual(said, "")
+            self.assertEqual(status, 0)
+
+    def test_leave_little_open(self):
+        for unit in ("kelvo-telephonyd@somebody.service", "kelvo-telephonyd.service"):
+            _, text, said = analyze("security", "--offline=yes", self.directory / unit)
+            exposure = re.search(r"Overall exposure level for \S+: ([\d.]+)", text)
+            self.assertIsNotNone(exposure, said)
+            self.assertLess(float(exposure[1]), LIMIT)
+
+
+class Devices(unittest.TestCase):
+    def test_are_those_of_modems_alone(self):
+        for unit in ("system/kelvo-telephonyd@.service", "user/kelvo-telephonyd.service"):
+            said = entries(UNITS / unit)
+            self.assertEqual(said["DevicePolicy"], ["closed"])
+            self.assertEqual(said["DeviceAllow"], ["char-ttyUSB rw", "char-ttyACM rw", "char-ttyHS rw", "/dev/diag rw"])
+
+    def test_the_service_is_watched_and_comes_back(self):
+        for unit in ("system/kelvo-telephonyd@.service", "user/kelvo-telephonyd.service"):
+            said = entries(UNITS / unit)
+            self.assertEqual((said["Type"], said["WatchdogSec"], said["Restart"]), (["notify"], ["30"], ["on-failure"]))
+
+    def test_nobody_else_reaches_the_users_socket(self):
+        said = entries(UNITS / "user/kelvo-telephonyd.socket")
+        self.assertEqual((said["SocketMode"], said["DirectoryMode"]), (["0600"], ["0700"]))
+        self.assertEqual(said["ListenSequentialPacket"], ["%t/kelvo/ports/com.zorvik.TelephonyService.port"])
+
+
+if __name__ == "__main__":
+    unittest.main(argv=sys.argv[:1])

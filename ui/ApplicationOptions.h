@@ -1,0 +1,30 @@
+#pragma once
+
+#include <functional>
+#include <optional>
+#include <string>
+
+namespace CLI {
+class App;
+}
+
+namespace kelvo {
+
+/// What the application's command line asks for.
+struct ApplicationOptions {
+    std::optional<std::string> capture;  ///< to replay; none: the log of the telephony service
+};
+
+/// Options to work with, or the status to exit with at once.
+struct ParsedApplicationOptions {
+    std::optional<ApplicationOptions> options;
+    int exitStatus = 0;
+};
+
+/// Reads the command line. Prints help to standard output and errors, in one line, to standard error.
+ParsedApplicationOptions parseApplicationOptions(int argc, const char* const* argv);
+
+/// Shows the command line's description to `reader`, for the manual.
+void describeApplicationOptions(const std::function<void(const CLI::App&)>& reader);
+
+}  // namespace kelvo

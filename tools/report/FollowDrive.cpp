@@ -85,7 +85,7 @@ std::string withoutFolder(std::string sentence, const std::string& path, const s
 
 }  // namespace
 
-Drive followDrive(Input& input, RecordSharer* sharer) {
+Drive followDrive(Input& input, RecordSharer* sharer, const std::function<void()>& afterEach) {
     const Technology technology = input.technology();
     Environment silent = Environment::current();
     silent.log = nullptr;
@@ -99,6 +99,7 @@ Drive followDrive(Input& input, RecordSharer* sharer) {
     Unread unread(*generator);
     std::uint64_t leftOut = 0;
     while (const auto packet = input.next()) {
+        afterEach();
         ByteView message = packet->bytes;
         CaptureTime clock = packet->time;
         if (sharer != nullptr) {

@@ -1,5 +1,7 @@
 #pragma once
 
+#include <functional>
+
 #include "tools/inputs/Input.h"
 #include "tools/report/Drive.h"
 #include "tools/share/RecordSharer.h"
@@ -8,7 +10,8 @@ namespace kelvo::report {
 
 /// Follows a recording from its beginning to its end, or to where it can be read no further, and keeps what a report
 /// tells of it. Every record goes through `sharer` first, when there is one; then nothing else tells of the file, its
-/// name neither. Throws CommandFailure for a record that ends the program elsewhere.
-Drive followDrive(Input& input, RecordSharer* sharer = nullptr);
+/// name neither. `afterEach` is called after each record. Throws CommandFailure for a record that ends the program
+/// elsewhere.
+Drive followDrive(Input& input, RecordSharer* sharer, const std::function<void()>& afterEach);
 
 }  // namespace kelvo::report

@@ -13,6 +13,7 @@
 #include "tools/CommandFailure.h"
 #include "tools/StandardOutput.h"
 #include "tools/TechnologyOption.h"
+#include "tools/export/Progress.h"
 #include "tools/inputs/Input.h"
 #include "tools/report/FollowDrive.h"
 #include "tools/report/ReportPage.h"
@@ -58,13 +59,21 @@ void writeReport(const Options& options) {
     std::vector<report::Drive> drives;
     std::optional<Failure> breakOff;
     std::uint64_t records = 0;
+    Progress progress(progressOnTerminal(false), steadyNow);
     for (const std::string& path : options.files) {
         Input input = orFail(Input::open(path, options.technology));
         RecordSharer sharer(choices, secret);
-        drives.push_back(report::followDrive(input, options.isShared ? &sharer : nullptr));
+        const auto portion = [&]() -> std::optional<double> {
+            const auto ofThis = input.portion();
+            if (!ofThis) return std::nullopt;
+            return (static_cast<double>(drives.size()) + *ofThis) / static_cast<double>(options.files.size());
+        };
+        drives.push_back(report::followDrive(input, options.isShared ? &sharer : nullptr,
+                                             [&] { progress.at(records + input.count(), portion); }));
         records += drives.back().records;
         if (input.breakOff()) breakOff = input.breakOff();
     }
+    progress.clear();
     const std::string page =
         report::reportPage(drives, {options.title, options.isShared ? sharedText(choices) : std::string()});
     orFail(file.write({reinterpret_cast<const std::uint8_t*>(page.data()), page.size()}));
@@ -101,6 +110,7 @@ void addReportCommand(CLI::App& app) {
     command.footer(
         "One file is told of by itself; two to six are compared, their charts aligned by the time since the start.\n"
         "The page needs neither network nor other files, and no script to be read or printed.\n"
+        "What takes more than a second shows its progress on a terminal.\n"
         "Of a file that breaks off, the good part is told of; then one line tells where it ends, and the status is "
         "1.\n\n"
         "Examples:\n"

@@ -68,7 +68,7 @@ constexpr Meaning kContexts[] = {
       "3GPP TS 24.008, 10.5.6.4" },
     { "PDP Context Info", "Quality of Service",
       "How the network treats the data context: its traffic class, or its QCI in LTE.",
-      "3GPP TS 23.107, 6.4; TS 23.203, 6.1.7" },
+      "3GPP TS 23.107; TS 23.203" },
 };
 // clang-format on
 

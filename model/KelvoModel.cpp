@@ -228,6 +228,7 @@ void KelvoModel::updateWithData(ByteView data) {
         const ByteView packet = _logGenerator->takesPackets() ? RecordLedger::packetOf(data) : ByteView();
         const RecordLedger::Counted counted(_records, packet, now);
         _logGenerator->updateState(*_state, data);
+        if (_services.recordShown) _services.recordShown(data);
     }
     _updated = true;
     _receiving = true;

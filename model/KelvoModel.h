@@ -40,6 +40,8 @@ public:
         /// Runs on the main queue when the connection has come or gone, and when what `connectionText` says of it is
         /// another than before: nobody has to ask again and again.
         std::function<void()> connectionChanged = {};
+        /// Runs after each message of the log channel, when its values are on the display.
+        std::function<void(ByteView message)> recordShown = {};
         /// How messages are encoded.
         std::function<Result<Bytes>(const Value&)> encode = writeXmlPropertyList;
     };

@@ -89,9 +89,9 @@ Observation observeCdma(const Value& display) {
     }
     seen.registrationState = withoutNumber(system.text("Roaming Indicator"));
     add(seen.registration, "Roaming", seen.registrationState);
-    add(seen.rates, "Traffic FER", oneX.text("Traffic FER"));
-    add(seen.rates, "EV-DO forward", screens.text("Rates and Errors/EV-DO Forward Rate"));
-    add(seen.rates, "EV-DO reverse", screens.text("Rates and Errors/EV-DO Reverse Rate"));
+    addRate(seen.rates, "Traffic FER", oneX, "Traffic FER");
+    addRate(seen.rates, "EV-DO forward", screens, "Rates and Errors/EV-DO Forward Rate");
+    addRate(seen.rates, "EV-DO reverse", screens, "Rates and Errors/EV-DO Reverse Rate");
     return seen;
 }
 

@@ -33,6 +33,11 @@ void add(std::vector<Fact>& facts, std::string_view name, std::string text) {
     if (!text.empty()) facts.push_back({std::string(name), std::move(text)});
 }
 
+void addRate(std::vector<Fact>& rates, std::string_view name, const Screens& screens, std::string_view path) {
+    std::string text = screens.text(path);
+    if (!text.empty()) rates.push_back({std::string(name), std::move(text), screens.figure(path)});
+}
+
 std::optional<Measure> measure(std::string_view name, std::optional<Figure> figure, std::optional<Graded> graded) {
     if (!figure) return std::nullopt;
     std::string grade(graded ? gradeOf(gradesOf(*graded), figure->number) : std::string_view());

@@ -19,6 +19,8 @@ Observation observeUtran(const Value& display);
 
 /// Appends a fact that has a text.
 void add(std::vector<Fact>& facts, std::string_view name, std::string text);
+/// The same of a value that may be a number.
+void addRate(std::vector<Fact>& rates, std::string_view name, const Screens& screens, std::string_view path);
 /// The measure under that name; none when the screens have no number there.
 std::optional<Measure> measure(std::string_view name, std::optional<Figure> figure,
                                std::optional<Graded> graded = std::nullopt);

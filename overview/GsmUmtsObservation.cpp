@@ -163,8 +163,10 @@ Observation observeGsmUmts(const Value& display) {
         const auto received = channel.whole("CRC Received");
         const auto wrong = channel.whole("CRC Received in Error");
         if (!received || !wrong || *received <= 0) continue;
-        add(seen.rates, "BLER, channel " + channel.text("Transport Channel ID"),
-            fmt::format("{:.1f} %", 100.0 * static_cast<double>(*wrong) / static_cast<double>(*received)));
+        const double share = 100.0 * static_cast<double>(*wrong) / static_cast<double>(*received);
+        const std::string text = fmt::format("{:.1f} %", share);
+        seen.rates.push_back({"BLER, channel " + channel.text("Transport Channel ID"), text,
+                              Figure{text, share, "%", channel.record("CRC Received")}});
     }
     addContexts(seen, screens.at("SIM and Data Contexts/PDP Context Info"));
     return seen;

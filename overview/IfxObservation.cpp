@@ -67,7 +67,7 @@ Observation observeIfx(const Value& display) {
     seen.isWithoutService = seen.registrationState == "Searching";
     add(seen.registration, "Registration", seen.registrationState);
     for (const char* rate : {"Errors", "Throughput", "TxPower"})
-        add(seen.rates, rate, screens.text(std::string("Connection/") + rate));
+        addRate(seen.rates, rate, screens, std::string("Connection/") + rate);
     return seen;
 }
 

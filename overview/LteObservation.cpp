@@ -4,7 +4,8 @@
 #include "overview/Families.h"
 
 /// LTE: idle and connected measurements stand on two screens, the cell's own broadcast on a third. The phone is in the
-/// state whose record came last.
+/// state whose record came last. A connected phone measures each of its carriers in turn, and each measurement calls
+/// its carrier's cell the serving one: which it is the broadcast says, where there is one.
 namespace kelvo::overview {
 namespace {
 
@@ -26,27 +27,47 @@ constexpr std::array<Source, 3> kSources = {{
 
 std::string in(const Source& source, const char* key) { return std::string(source.screen) + "/" + key; }
 
+constexpr const Source& kConnected = kSources[1];
+constexpr const Source& kBroadcast = kSources[2];
+
+std::string cellOf(const Source& source, const Screens& screens) {
+    return identity(named("EARFCN", screens.text(in(source, source.channel))),
+                    named("PCI", screens.text(in(source, source.cell))));
+}
+
 /// The EARFCN of the serving cell.
 std::optional<std::int64_t> observeServing(Observation& seen, const Screens& screens) {
+    const bool isBroadcast = screens.record(in(kBroadcast, kBroadcast.channel)) != 0;
     std::optional<std::int64_t> earfcn;
-    std::uint64_t newest = 0;
-    std::uint64_t newestLevel = 0;
+    const Source* newestLevel = nullptr;
+    std::uint64_t levelRecord = 0;
     for (const Source& source : kSources) {
         const std::uint64_t record = screens.record(in(source, source.channel));
-        if (record > newest) {
-            newest = record;
-            seen.cellRecord = record;
-            earfcn = screens.whole(in(source, source.channel));
-            seen.channel = named("EARFCN", screens.text(in(source, source.channel)));
-            seen.cell = identity(seen.channel, named("PCI", screens.text(in(source, source.cell))));
+        if (source.level != nullptr && record > levelRecord) {
+            levelRecord = record;
+            newestLevel = &source;
         }
-        if (source.level != nullptr && record > newestLevel) {
-            newestLevel = record;
-            seen.state = source.state;
-            seen.isDedicated = seen.state == "connected";
-            seen.level = measure("RSRP", screens.figure(in(source, source.level)), Graded::Rsrp);
-            seen.quality = measure("RSRQ", screens.figure(in(source, source.quality)), Graded::Rsrq);
-        }
+        if (record <= seen.cellRecord || (isBroadcast && &source == &kConnected)) continue;
+        seen.cellRecord = record;
+        earfcn = screens.whole(in(source, source.channel));
+        seen.channel = named("EARFCN", screens.text(in(source, source.channel)));
+        seen.cell = cellOf(source, screens);
+        seen.cellIsOneOfSeveral = &source == &kConnected;
+    }
+    if (newestLevel == nullptr) return earfcn;
+    seen.state = newestLevel->state;
+    seen.isDedicated = seen.state == "connected";
+    HeardCell heard;
+    heard.identity = cellOf(*newestLevel, screens);
+    heard.mark = "active";
+    heard.level = measure("RSRP", screens.figure(in(*newestLevel, newestLevel->level)), Graded::Rsrp);
+    heard.quality = measure("RSRQ", screens.figure(in(*newestLevel, newestLevel->quality)), Graded::Rsrq);
+    heard.record = levelRecord;
+    if (heard.identity == seen.cell) {
+        seen.level = std::move(heard.level);
+        seen.quality = std::move(heard.quality);
+    } else if (seen.isDedicated && !heard.identity.empty()) {
+        seen.cells.push_back(std::move(heard));
     }
     return earfcn;
 }

@@ -16,7 +16,8 @@ namespace kelvo::overview {
 struct Fact {
     std::string name;
     std::string text;
-    bool operator==(const Fact&) const = default;
+    std::optional<Figure> figure{};  ///< of a rate: the number behind the text, where it is one
+    bool operator==(const Fact& other) const { return name == other.name && text == other.text; }
 };
 
 /// A level or a quality, with what people call it here.
@@ -49,10 +50,11 @@ struct Observation {
     bool isDedicated = false;   ///< connected: a change of cell is a handover
     bool knowsService = false;  ///< the screens tell whether there is service
     bool isWithoutService = false;
-    std::string cell;               ///< the serving cell's identity as in `HeardCell`
-    std::uint64_t cellRecord = 0;   ///< which told that it serves
-    std::string channel;            ///< the part of it that names the carrier
-    bool cellComesInParts = false;  ///< records tell carrier and code apart, so that one may be new and one old
+    std::string cell;                 ///< the serving cell's identity as in `HeardCell`
+    std::uint64_t cellRecord = 0;     ///< which told that it serves
+    std::string channel;              ///< the part of it that names the carrier
+    bool cellIsOneOfSeveral = false;  ///< of several carriers each is told as serving, and this one was told last
+    bool cellComesInParts = false;    ///< records tell carrier and code apart, so that one may be new and one old
     std::string band;
     std::string area;           ///< "TAC 1042"
     std::vector<Fact> serving;  ///< what else is known of the serving cell

@@ -125,6 +125,7 @@ void Tracker::note(Observation seen, Time now, Time clock) {
     _before = std::exchange(_seen, std::move(seen));
     _now = now;
     _clock = clock;
+    keepServing();
     noteCells();
     noteServing();
     noteWhetherHandover();
@@ -150,8 +151,10 @@ void Tracker::noteConnectionBack(Time clock, Time::duration lost) {
 
 void Tracker::restart() {
     std::deque<Event> events = std::move(_events);
+    const std::uint64_t count = _eventCount;
     *this = Tracker(_limits);
     _events = std::move(events);
+    _eventCount = count;
 }
 
 void Tracker::noteCells() {
@@ -190,6 +193,27 @@ void Tracker::complete(Event& event, std::string_view name, const std::string& n
     event.to = shortened(now, Event::kLongestText);
     const auto value = std::ranges::find(event.values, name, &EventValue::name);
     if (value != event.values.end()) value->after = shortened(now, Event::kLongestValue);
+}
+
+/// Of several carriers that are told in turn the first stays the serving one for as long as it is told, and the others
+/// are cells beside it. What a record left out stands as it was, and ages.
+void Tracker::keepServing() {
+    const bool isOther = !_before.cell.empty() && _seen.cell != _before.cell;
+    if (isOther && _seen.cellIsOneOfSeveral && _before.cellIsOneOfSeveral && _now - _servingTold <= kTurn) {
+        _seen.cells.push_back({_seen.cell, "active", _seen.level, _seen.quality, _seen.cellRecord});
+        _seen.cell = _before.cell;
+        _seen.cellRecord = _before.cellRecord;
+        _seen.channel = _before.channel;
+        _seen.band = _before.band;
+        _seen.serving = _before.serving;
+        _seen.level = _before.level;
+        _seen.quality = _before.quality;
+    } else if (isOther || _seen.cellRecord != _before.cellRecord) {
+        _servingTold = _now;
+    }
+    if (_seen.cell != _before.cell || _seen.access != _before.access) return;
+    if (!_seen.level) _seen.level = _before.level;
+    if (!_seen.quality) _seen.quality = _before.quality;
 }
 
 void Tracker::noteServing() {
@@ -343,6 +367,7 @@ void Tracker::append(Event event) {
         _events.pop_front();
     }
     _events.push_back(std::move(event));
+    ++_eventCount;
 }
 
 }  // namespace kelvo::overview

@@ -21,11 +21,12 @@ struct TrackedCell {
 /// caller's and does not go back.
 class Tracker {
 public:
-    static constexpr auto kHeardFor = std::chrono::seconds(30);  ///< a cell stays that long after it was heard
-    static constexpr auto kLostFor = std::chrono::seconds(10);   ///< and that much longer, marked
-    static constexpr auto kSettling = std::chrono::seconds(2);   ///< within which several records tell of one change
+    static constexpr auto kHeardFor = std::chrono::seconds(30);     ///< a cell stays that long after it was heard
+    static constexpr auto kLostFor = std::chrono::seconds(10);      ///< and that much longer, marked
+    static constexpr auto kSettling = std::chrono::seconds(2);      ///< within which several records tell of one change
+    static constexpr auto kTurn = std::chrono::milliseconds(500);   ///< within which each of several carriers is told
     static constexpr auto kMoment = std::chrono::milliseconds(10);  ///< within which all belong to one step of a modem
-    static constexpr double kSteady = 2.0;                           ///< dB by which a cell overtakes the one above
+    static constexpr double kSteady = 2.0;                          ///< dB by which a cell overtakes the one above
 
     struct Limits {
         std::size_t events = 2000;
@@ -56,6 +57,8 @@ public:
     const std::vector<TrackedCell>& cells() const { return _cells; }
     /// Oldest first.
     const std::deque<Event>& events() const { return _events; }
+    /// How many there have been, those that are no longer kept among them.
+    std::uint64_t eventCount() const { return _eventCount; }
 
 private:
     /// The serving cell's level or quality.
@@ -67,6 +70,7 @@ private:
     };
 
     void noteCells();
+    void keepServing();
     void noteServing();
     void noteWhetherHandover();
     Event* unfinished(bool isCell, const std::string& before, const std::string& now);
@@ -92,8 +96,10 @@ private:
     Time _clock{};
     std::vector<TrackedCell> _cells;
     std::deque<Event> _events;
+    std::uint64_t _eventCount = 0;
     Followed _level;
     Followed _quality;
+    Time _servingTold{};                    // when a record named the serving cell last
     std::optional<Time> _connectedSince;    // as the last state said that was known
     std::optional<Time> _leftConnected;     // a cell, and the state in the new one is not known yet
     std::optional<bool> _isWithoutService;  // none while the screens have not told

@@ -49,7 +49,7 @@ Observation observeUtran(const Value& display) {
     }
     for (const Value& row : rowsOf(screens.at("TRCH BLER"))) {
         const Screens channel(row);
-        add(seen.rates, "BLER, channel " + channel.text("TRCH ID"), channel.text("TRCH BLER Measurement"));
+        addRate(seen.rates, "BLER, channel " + channel.text("TRCH ID"), channel, "TRCH BLER Measurement");
     }
     addContexts(seen, screens.at("PDP Context Info"));
     return seen;

@@ -171,7 +171,6 @@ private:
                                     "identity; the\nfirst without")
                        ->type_name("[MODEM]")
                        ->expected(0, 1);
-        source->require_option(1, 2);
         for (auto* one : {_replay, _simulate, _status, _port}) {
             for (auto* other : {_replay, _simulate, _status, _port}) {
                 if (one != other) one->excludes(other);
@@ -237,6 +236,9 @@ private:
     }
 
     void settle() {
+        const std::array sources = {_replay, _simulate, _status, _port, _manager};
+        if (std::ranges::all_of(sources, [](const CLI::Option* source) { return source->count() == 0; }))
+            throw CLI::RequiredError("One of --replay, --simulate, --status, --port and --modemmanager");
         const bool records = !_options.record.empty() || !_options.recordFrames.empty();
         if (_options.force && !records) throw CLI::RequiresError("--force", "--record or --record-frames");
         if (records && _options.record == _options.recordFrames)

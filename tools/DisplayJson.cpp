@@ -52,9 +52,11 @@ nlohmann::ordered_json jsonFrom(const Value& value) {
     return nullptr;
 }
 
+namespace {
+
 // JSON leaves DEL and the control characters from U+0080 to U+009F as they are, and terminals obey them.
-std::string printedJson(const nlohmann::ordered_json& json) {
-    const std::string dumped = json.dump(2, ' ', false, nlohmann::ordered_json::error_handler_t::replace);
+std::string printed(const Json& json, int indent) {
+    const std::string dumped = json.dump(indent, ' ', false, Json::error_handler_t::replace);
     std::string text;
     text.reserve(dumped.size() + 1);
     for (std::size_t i = 0; i < dumped.size(); ++i) {
@@ -68,7 +70,13 @@ std::string printedJson(const nlohmann::ordered_json& json) {
             text += dumped[i];
         }
     }
-    return text + "\n";
+    return text;
 }
+
+}  // namespace
+
+std::string printedJson(const nlohmann::ordered_json& json) { return printed(json, 2) + "\n"; }
+
+std::string printedJsonLine(const nlohmann::ordered_json& json) { return printed(json, -1); }
 
 }  // namespace kelvo

@@ -13,5 +13,7 @@ nlohmann::ordered_json jsonFrom(const Value& value);
 
 /// The printed form, indented, with a line end. Bytes that are not UTF-8 become U+FFFD.
 std::string printedJson(const nlohmann::ordered_json& json);
+/// The same on one line, without a line end.
+std::string printedJsonLine(const nlohmann::ordered_json& json);
 
 }  // namespace kelvo

@@ -7,11 +7,13 @@
 #include "tools/DoctorCommand.h"
 #include "tools/EventsCommand.h"
 #include "tools/ExplainCommand.h"
+#include "tools/ExportCommand.h"
 #include "tools/ImportCommand.h"
 #include "tools/ShareCommand.h"
 #include "tools/SnapshotCommand.h"
 #include "tools/StartCommandCommand.h"
 #include "tools/WatchCommand.h"
+#include "tools/report/ReportCommand.h"
 
 namespace kelvo {
 
@@ -24,8 +26,10 @@ std::unique_ptr<CLI::App> makeKelvoctl() {
     addDecodeCommand(*app);
     addWatchCommand(*app);
     addEventsCommand(*app);
+    addReportCommand(*app);
     addSnapshotCommand(*app);
     addImportCommand(*app);
+    addExportCommand(*app);
     addShareCommand(*app);
     addStartCommandCommand(*app);
     addDoctorCommand(*app);

@@ -42,6 +42,11 @@ Json eventJson(const Event& event) {
     add(json, "levelBefore", event.levelBefore);
     add(json, "levelAfter", event.levelAfter);
     if (event.record != 0) json["record"] = event.record;
+    for (const EventValue& value : event.values) {
+        Json& both = json["values"][value.name] = Json::object();
+        add(both, "before", value.before);
+        add(both, "after", value.after);
+    }
     return json;
 }
 
@@ -54,6 +59,7 @@ Json overviewJson(const Tracker& tracker, Time now) {
     add(serving, "level", seen.level);
     add(serving, "quality", seen.quality);
     if (tracker.levelTime()) serving["age"] = seconds(now - *tracker.levelTime());
+    if (tracker.qualityTime()) serving["qualityAge"] = seconds(now - *tracker.qualityTime());
     add(serving, "area", seen.area);
     serving["facts"] = jsonOf(seen.serving);
 

@@ -10,8 +10,8 @@ namespace kelvo {
 /// not tell is left out.
 nlohmann::ordered_json overviewJson(const overview::Tracker& tracker, overview::Time now);
 
-/// One event: "time" in ISO 8601, "event", and of "from", "to", "levelBefore", "levelAfter" and "record" those there
-/// are.
+/// One event: "time" in ISO 8601, "event", and of "from", "to", "levelBefore", "levelAfter", "record" and "values" (an
+/// object of objects with "before" and "after") those there are.
 nlohmann::ordered_json eventJson(const overview::Event& event);
 
 }  // namespace kelvo

@@ -5,8 +5,10 @@
 #include <algorithm>
 #include <vector>
 
+#include "overview/Words.h"
 #include "platform/encodings/Utf8.h"
 #include "tools/TerminalText.h"
+#include "tools/TrendBlocks.h"
 
 namespace kelvo {
 namespace {
@@ -14,12 +16,22 @@ namespace {
 using namespace overview;
 
 constexpr std::size_t kEventsShown = 10;
+constexpr std::size_t kMostCellRows = 12;  // for which room is kept
 
 using Line = std::vector<std::string>;
+using Widths = std::vector<std::size_t>;
+
+/// Where a live overview's columns begin at the earliest, so that they stay where they are.
+struct Layout {
+    const LiveOverview* live = nullptr;  ///< none: of a capture
+    bool hasBlocks = false;
+    std::size_t cellRows = 0;
+    Widths facts() const { return live != nullptr ? Widths{14} : Widths(); }
+    Widths cells() const { return live != nullptr ? Widths{22, 11, 9, 10, 9} : Widths(); }
+};
 
 /// Columns as wide as their widest text, two blanks apart; two blanks before each line.
-std::string table(const std::vector<Line>& lines) {
-    std::vector<std::size_t> widths;
+std::string table(const std::vector<Line>& lines, Widths widths) {
     for (const Line& line : lines) {
         widths.resize(std::max(widths.size(), line.size()));
         for (std::size_t i = 0; i < line.size(); ++i) widths[i] = std::max(widths[i], columnsOf(line[i]));
@@ -36,8 +48,8 @@ std::string table(const std::vector<Line>& lines) {
     return text;
 }
 
-std::string group(std::string_view title, const std::vector<Line>& lines) {
-    return lines.empty() ? std::string() : fmt::format("{}\n{}", title, table(lines));
+std::string group(std::string_view title, const std::vector<Line>& lines, const Widths& widths = {}) {
+    return lines.empty() ? std::string() : fmt::format("{}\n{}", title, table(lines, widths));
 }
 
 std::vector<Line> linesOf(const std::vector<Fact>& facts) {
@@ -47,51 +59,64 @@ std::vector<Line> linesOf(const std::vector<Fact>& facts) {
     return lines;
 }
 
-/// Of captures put together the times may go back; nothing is younger than now.
-std::string ageText(Time then, Time now) {
-    const auto age = std::max(now - then, Time::duration::zero());
-    const auto seconds = std::chrono::duration_cast<std::chrono::seconds>(age).count();
-    if (seconds < 120) return fmt::format("{} s ago", seconds);
-    if (seconds < 7200) return fmt::format("{} min ago", seconds / 60);
-    return seconds < 172800 ? fmt::format("{} h ago", seconds / 3600) : fmt::format("{} days ago", seconds / 86400);
+void addFigure(std::vector<Line>& lines, const std::optional<Measure>& measure, std::optional<Time> heard, Time now) {
+    if (!measure) return;
+    std::string text = measure->figure.text;
+    if (!measure->grade.empty()) text += ", " + measure->grade;
+    if (heard) text += ", " + ageText(*heard, now);
+    lines.push_back({measure->name, printable(text)});
 }
 
-std::string serving(const Tracker& tracker, Time now) {
+void addBlocks(std::vector<Line>& lines, const LiveOverview::Line& line, const Layout& layout) {
+    if (!layout.hasBlocks || line.name.empty()) return;
+    lines.push_back({"", trendBlocks(line, layout.live->servingCells(), layout.live->lineTime())});
+}
+
+std::string serving(const Tracker& tracker, Time now, const Layout& layout) {
     const Observation& seen = tracker.latest();
     std::string title = seen.access.empty() ? "No serving cell" : seen.access;
     if (!seen.state.empty()) title += ", " + seen.state;
     std::vector<Line> lines;
     if (!seen.cell.empty()) lines.push_back({"Cell", printable(seen.cell)});
-    for (const auto* measure : {&seen.level, &seen.quality}) {
-        if (!*measure) continue;
-        std::string text = (*measure)->figure.text;
-        if (!(*measure)->grade.empty()) text += ", " + (*measure)->grade;
-        if (measure == &seen.level && tracker.levelTime()) text += ", " + ageText(*tracker.levelTime(), now);
-        lines.push_back({(*measure)->name, printable(text)});
-    }
+    addFigure(lines, seen.level, tracker.levelTime(), now);
+    if (layout.live != nullptr) addBlocks(lines, layout.live->level(), layout);
+    addFigure(lines, seen.quality, tracker.qualityTime(), now);
+    if (layout.live != nullptr) addBlocks(lines, layout.live->quality(), layout);
     if (!seen.area.empty()) lines.push_back({"Area", seen.area});
     for (Line& line : linesOf(seen.serving)) lines.push_back(std::move(line));
-    return printable(title) + "\n" + table(lines);
+    return printable(title) + "\n" + table(lines, layout.facts());
 }
 
 std::string textOf(const std::optional<Measure>& measure) { return measure ? printable(measure->figure.text) : ""; }
 
-/// How much more a cell has than the serving one; levels of different kinds do not compare.
-std::string difference(const std::optional<Measure>& level, const std::optional<Measure>& serving) {
-    if (!level || !serving || level->name != serving->name) return "";
-    return fmt::format("{:+.2f}{}", level->figure.number - serving->figure.number,
-                       level->figure.unit.empty() ? "" : " dB");
-}
-
-std::string cellsAround(const Tracker& tracker, Time now) {
+std::string cellsAround(const Tracker& tracker, Time now, const Layout& layout) {
     std::vector<Line> lines;
     for (const TrackedCell& cell : tracker.cells()) {
         const std::string mark = cell.isLost ? "lost" : cell.heard.mark;
         lines.push_back({printable(cell.heard.identity), textOf(cell.heard.level), textOf(cell.heard.quality),
-                         difference(cell.heard.level, tracker.latest().level), ageText(cell.lastHeard, now), mark});
+                         differenceText(cell.heard.level, tracker.latest().level), ageText(cell.lastHeard, now), mark});
     }
+    lines.resize(std::max(lines.size(), layout.cellRows), {""});
     if (!lines.empty()) lines.insert(lines.begin(), {"Cell", "Level", "Quality", "To serving", "Heard", ""});
-    return group("Cells around", lines);
+    return group("Cells around", lines, layout.cells());
+}
+
+std::string textWith(const Tracker& tracker, Time now, const Layout& layout) {
+    const Observation& seen = tracker.latest();
+    std::vector<Line> contexts;
+    contexts.reserve(seen.contexts.size());
+    for (const Context& context : seen.contexts) contexts.push_back({printable(context.name), printable(context.text)});
+    std::string text = serving(tracker, now, layout);
+    text += cellsAround(tracker, now, layout);
+    text += group("Registration", linesOf(seen.registration), layout.facts());
+    text += group("Data contexts", contexts, layout.facts());
+    text += group("Rates and errors", linesOf(seen.rates), layout.facts());
+    const auto& events = tracker.events();
+    std::vector<Line> happened;
+    for (auto event = events.rbegin(); event != events.rend() && happened.size() < kEventsShown; ++event) {
+        happened.push_back({eventText(*event)});
+    }
+    return text + group("What happened", happened);
 }
 
 }  // namespace
@@ -107,33 +132,27 @@ std::string isoText(Time time) {
 }
 
 std::string eventText(const Event& event) {
-    const auto change = [](const std::string& from, const std::string& to) {
-        return from.empty() || to.empty() ? from + to : from + " -> " + to;
-    };
     std::string text = fmt::format("{}  {}", isoText(event.time), nameOf(event.kind));
-    const std::string what = change(event.from, event.to);
+    const std::string what = changeText(event.from, event.to, "->");
     if (!what.empty()) text += "  " + what;
-    const std::string levels = change(event.levelBefore, event.levelAfter);
+    const std::string levels = changeText(event.levelBefore, event.levelAfter, "->");
     if (!levels.empty()) text += fmt::format(" ({})", levels);
     return printable(text);
 }
 
-std::string overviewText(const Tracker& tracker, Time now) {
-    const Observation& seen = tracker.latest();
-    std::vector<Line> contexts;
-    contexts.reserve(seen.contexts.size());
-    for (const Context& context : seen.contexts) contexts.push_back({printable(context.name), printable(context.text)});
-    std::string text = serving(tracker, now);
-    text += cellsAround(tracker, now);
-    text += group("Registration", linesOf(seen.registration));
-    text += group("Data contexts", contexts);
-    text += group("Rates and errors", linesOf(seen.rates));
-    const auto& events = tracker.events();
-    std::vector<Line> happened;
-    for (auto event = events.rbegin(); event != events.rend() && happened.size() < kEventsShown; ++event) {
-        happened.push_back({eventText(*event)});
+std::string overviewText(const Tracker& tracker, Time now) { return textWith(tracker, now, {}); }
+
+std::vector<std::string> LiveOverviewText::lines() {
+    const std::size_t rows = _live.tracker().cells().size();
+    _cellRows = std::max(_cellRows, std::min(rows, kMostCellRows));
+    const std::string text = textWith(_live.tracker(), _live.now(), {&_live, _hasBlocks, _cellRows});
+    std::vector<std::string> lines;
+    for (std::size_t at = 0; at < text.size();) {
+        const std::size_t end = std::min(text.find('\n', at), text.size());
+        lines.push_back(text.substr(at, end - at));
+        at = end + 1;
     }
-    return text + group("What happened", happened);
+    return lines;
 }
 
 }  // namespace kelvo

@@ -66,8 +66,7 @@ void share(Options options) {
 }  // namespace
 
 void addShareCommand(CLI::App& app) {
-    CLI::App& command =
-        addCommand(app, "share", "Makes a copy of a file in which nobody and no place can be recognised");
+    CLI::App& command = addCommand(app, "share", "Makes a copy of a file without identities, to hand on");
     const auto options = std::make_shared<Options>();
     command
         .add_option("FILE", options->file,

@@ -21,6 +21,7 @@ constexpr std::pair<std::string_view, TerminalKey> kKeys[] = {
     {"\x1b[H",  TerminalKey::Home},     {"\x1bOH",  TerminalKey::Home},     {"\x1b[1~", TerminalKey::Home}, {"g", TerminalKey::Home},
     {"\x1b[F",  TerminalKey::End},      {"\x1bOF",  TerminalKey::End},      {"\x1b[4~", TerminalKey::End},  {"G", TerminalKey::End},
     {"p",       TerminalKey::Provenance},
+    {"o",       TerminalKey::Overview},
     {"q",       TerminalKey::Quit},     {"Q",       TerminalKey::Quit},
 };
 // clang-format on

@@ -3,6 +3,7 @@
 #include <fmt/format.h>
 
 #include <algorithm>
+#include <array>
 #include <string_view>
 
 #include "tools/StandardOutput.h"
@@ -14,7 +15,7 @@ namespace {
 
 constexpr std::size_t kStatusRows = 2;
 constexpr std::size_t kWidestBesideNotes = 60;  // one long value does not push all notes away
-constexpr std::string_view kKeys = "p ages, q quits";
+constexpr std::array<std::string_view, 2> kKeys = {"o overview, p ages, q quits", "p ages, q quits"};
 
 std::string oneLine(const WatchStatus& status) {
     return status.remark.empty() ? status.text : status.text + "  " + status.remark;
@@ -27,11 +28,13 @@ std::string statusRow(const WatchStatus& status, std::size_t columns) {
     return fmt::format("{:<{}}", " " + (fits ? whole : status.remark), columns);
 }
 
-/// Where the window lies, and the keys at the right edge as long as there is room for both.
+/// Where the window lies, and at the right edge the keys, as many as there is room for.
 std::string placeRow(const std::string& place, std::size_t columns) {
-    const std::size_t left = columns - std::min(columns, kKeys.size());
-    const bool fits = place.size() + 1 < left;
-    return fmt::format("{:<{}}{}", " " + place, fits ? left : columns, fits ? kKeys : std::string_view());
+    for (const std::string_view keys : kKeys) {
+        const std::size_t left = columns - std::min(columns, keys.size());
+        if (place.size() + 1 < left) return fmt::format("{:<{}}{}", " " + place, left, keys);
+    }
+    return fmt::format("{:<{}}", " " + place, columns);
 }
 
 }  // namespace
@@ -79,6 +82,7 @@ void TerminalWatchView::press(TerminalKey key) {
         case TerminalKey::Home: _top = 0; break;
         case TerminalKey::End: _top = _lines.size(); break;
         case TerminalKey::Provenance: _showsNotes = !_showsNotes; break;
+        case TerminalKey::Overview:
         case TerminalKey::Quit: return;
     }
     draw();

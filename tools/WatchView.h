@@ -27,6 +27,8 @@ public:
     virtual ~WatchView() = default;
     /// Shows a new display, line by line, and the status that came with it.
     virtual void showDisplay(std::vector<std::string> lines, const WatchStatus& status) = 0;
+    /// The display has aged, and nothing else: what is printed does not.
+    virtual void showAged(std::vector<std::string> lines, const WatchStatus& status) = 0;
     /// Shows a new status; the display stays.
     virtual void showStatus(const WatchStatus& status) = 0;
     /// What is known of the lines, in their order: shown with the next display or status.
@@ -37,6 +39,7 @@ public:
 class PrintedWatchView final : public WatchView {
 public:
     void showDisplay(std::vector<std::string> lines, const WatchStatus& status) override;
+    void showAged(std::vector<std::string>, const WatchStatus& status) override { showStatus(status); }
     void showStatus(const WatchStatus& status) override;
     void setNotes(std::vector<WatchNote>) override {}  // what is printed does not age
 
@@ -50,10 +53,15 @@ public:
     explicit TerminalWatchView(Terminal& terminal) : _terminal(terminal) {}
 
     void showDisplay(std::vector<std::string> lines, const WatchStatus& status) override;
+    void showAged(std::vector<std::string> lines, const WatchStatus& status) override {
+        showDisplay(std::move(lines), status);
+    }
     void showStatus(const WatchStatus& status) override;
     void setNotes(std::vector<WatchNote> notes) override { _notes = std::move(notes); }
-    /// Scrolls, and shows or hides the notes; Quit is for the caller.
+    /// Scrolls, and shows or hides the notes; Overview and Quit are for the caller.
     void press(TerminalKey key);
+    /// What is shown next is another display, to be seen from its beginning.
+    void goToTop() { _top = _left = 0; }
     /// Draws again with the terminal's size as it is now.
     void redraw();
 

@@ -22,6 +22,7 @@ void KelvoApp::applicationDidFinishLaunching() {
                              .telephony = _services.telephony,
                              .updateViewControllerFromModel = [this] { updateViewControllerFromModel(); },
                              .connectionChanged = [this] { connectionChanged(); }});
+    _overview = std::make_unique<OverviewController>(*_model);
     setUpdateMessage(QStringLiteral("Connecting..."));
     _dateFormatter = std::make_unique<DateFormatter>(QStringLiteral("'Updated' yyyy-MM-dd 'at' HH:mm:ss"));
     auto root = std::make_unique<KelvoPaneController>(nullptr, "/", *this);
@@ -52,11 +53,13 @@ void KelvoApp::updateViewControllerFromModel() {
     if (!_model) return;  // a refresh that was on its way when the program ended
     reloadPanes();
     if (_details) _details->reload();
+    _overview->refreshed();
     if (_model->isConnected()) setUpdateMessage(_dateFormatter->stringFromDate(clock().now()));
     updateStatusForViewController(_navController->topViewController());
 }
 
 void KelvoApp::connectionChanged() {
+    if (_overview) _overview->connectionChanged();
     KelvoPaneController& top = _navController->topViewController();
     if (!_model->isConnected() && !top.isLoading()) return updateStatusForViewController(top);
     top.setConnection(_model->connection());
@@ -114,6 +117,7 @@ std::optional<std::chrono::milliseconds> KelvoApp::ageOf(const KelvoModelNode& n
 void KelvoApp::letValuesAge() {
     _navController->topViewController().updateAges();
     if (_details) _details->reload();
+    _overview->letPass();
 }
 
 void KelvoApp::closeDetails() {
@@ -156,6 +160,7 @@ void KelvoApp::applicationWillTerminate() {
     _agingTimer.reset();
     if (_window) _window->orderOut();
     _window.reset();
+    _overview.reset();
     _model.reset();
 }
 

@@ -15,6 +15,7 @@
 #include "ui/DetailsController.h"
 #include "ui/KelvoSaveViewController.h"
 #include "ui/NavigationStack.h"
+#include "ui/OverviewController.h"
 #include "ui/ScreenHost.h"
 #include "ui/Window.h"
 
@@ -27,6 +28,7 @@ class KelvoApp : public QObject, public ScreenHost, public NavigationStack::Dele
     QML_ELEMENT
     QML_UNCREATABLE("There is one application")
     Q_PROPERTY(kelvo::NavigationStack* navigation READ navigation CONSTANT)
+    Q_PROPERTY(kelvo::OverviewController* overview READ overview CONSTANT)
     Q_PROPERTY(QString alertTitle READ alertTitle NOTIFY alertChanged)
     Q_PROPERTY(QString alertMessage READ alertMessage NOTIFY alertChanged)
     Q_PROPERTY(QString alertButton READ alertButton NOTIFY alertChanged)
@@ -55,6 +57,7 @@ public:
 
     NavigationStack* navigation() const { return _navController.get(); }  ///< null before launch
     KelvoModel* model() const { return _model.get(); }                    ///< null before launch and after termination
+    OverviewController* overview() const { return _overview.get(); }      ///< likewise
     KelvoSaveViewController* saveViewController() const { return _saveViewController.get(); }
 
     const QString& updateMessage() const { return _updateMessage; }
@@ -115,6 +118,7 @@ private:
     std::vector<std::unique_ptr<KelvoSaveViewController>> _leavingSaveViews;  // still drawn sliding away
     std::unique_ptr<DetailsController> _details;
     std::vector<std::unique_ptr<DetailsController>> _leavingDetails;
+    std::unique_ptr<OverviewController> _overview;
     bool _alertShown = false;
     QString _alertTitle;
     QString _alertMessage;

@@ -18,6 +18,7 @@ void NavigationStack::pushViewController(std::unique_ptr<KelvoPaneController> pa
     if (_delegate != nullptr) _delegate->willShowViewController(shown, animated);
     below.viewWillDisappear();
     shown.viewWillAppear();
+    Q_EMIT topViewControllerChanged();
     Q_EMIT pushed(&shown, animated);
 }
 
@@ -31,6 +32,7 @@ void NavigationStack::popToViewController(const KelvoPaneController& pane, bool 
     if (_delegate != nullptr) _delegate->willShowViewController(shown, animated);
     hidden.viewWillDisappear();
     shown.viewWillAppear();
+    Q_EMIT topViewControllerChanged();
     Q_EMIT popped(static_cast<int>(_panes.size()), animated);
 }
 

@@ -16,6 +16,7 @@ class NavigationStack : public QObject {
     QML_ELEMENT
     QML_UNCREATABLE("The application makes its navigation stack")
     Q_PROPERTY(kelvo::KelvoPaneController* rootViewController READ rootViewController CONSTANT)
+    Q_PROPERTY(kelvo::KelvoPaneController* topViewController READ topView NOTIFY topViewControllerChanged)
     Q_PROPERTY(bool toolbarHidden READ isToolbarHidden NOTIFY toolbarHiddenChanged)
 public:
     using Panes = std::vector<std::unique_ptr<KelvoPaneController>>;
@@ -43,6 +44,7 @@ public:
     /// The screen no longer draws a pane that was popped.
     Q_INVOKABLE void didRemoveView(kelvo::KelvoPaneController* pane);
     KelvoPaneController* rootViewController() const { return _panes.front().get(); }
+    KelvoPaneController* topView() const { return _panes.back().get(); }
 
     bool isToolbarHidden() const { return _toolbarHidden; }
     void setToolbarHidden(bool hidden);
@@ -50,6 +52,7 @@ public:
 Q_SIGNALS:
     void pushed(kelvo::KelvoPaneController* pane, bool animated);
     void popped(int depth, bool animated);  ///< `depth` panes are left
+    void topViewControllerChanged();
     void toolbarHiddenChanged();
 
 private:

@@ -97,7 +97,8 @@ TrendPainting::TrendPainting(QPainter& painter, QSizeF size, QRectF area, const 
     _painter.setFont(font);
 }
 
-AxisRange TrendPainting::axisOf(std::span<const Trend* const> trends) const {
+/// Not shorter than `shortest`, around what is seen.
+AxisRange TrendPainting::axisOf(std::span<const Trend* const> trends, double shortest) const {
     double least = std::numeric_limits<double>::infinity();
     double most = -least;
     for (const Trend* trend : trends) {
@@ -107,7 +108,9 @@ AxisRange TrendPainting::axisOf(std::span<const Trend* const> trends) const {
         least = std::min(least, seen->least);
         most = std::max(most, seen->most);
     }
-    return least <= most ? axisFor(least, most, 5) : AxisRange{0, 1, 1};
+    if (least > most) return {0, 1, 1};
+    const double lacking = std::max(0.0, shortest - (most - least)) / 2;
+    return axisFor(least - lacking, most + lacking, 5);
 }
 
 void TrendPainting::paint(const DetailsController& details, const Trend::Point* cursor) {
@@ -130,6 +133,36 @@ void TrendPainting::paint(const DetailsController& details, const Trend::Point* 
     paintLine(trend, _axis, _colors.line, false);
     _painter.setClipping(false);
     if (cursor != nullptr) paintCursor(*cursor);
+}
+
+void TrendPainting::paintSmall(const Trend& trend, const std::vector<TrendChange>& servingCells) {
+    constexpr double kShortest = 10;  // dB: less is hardly more than noise, and shall look so
+    const std::array<const Trend*, 1> one = {&trend};
+    _axis = axisOf(one, trend.unit.empty() ? 0 : kShortest);
+    _painter.fillRect(QRectF({0, 0}, _size), _colors.background);
+    const auto paintText = [this](const QRectF& place, Qt::Alignment alignment, const QString& text) {
+        _painter.setPen(_colors.text);
+        _painter.drawText(place, static_cast<int>(alignment), text);
+    };
+    for (const double number : {_axis.low, _axis.high}) {
+        const qreal y = std::round(yOf(number, _axis)) + 0.5;
+        _painter.setPen(QPen(_colors.grid, 1));
+        _painter.drawLine(QPointF(_area.left(), y), QPointF(_area.right(), y));
+        if (trend.points.empty()) continue;
+        paintText({_area.right() + 4, y - 9, kSmallRight - 4, 18}, Qt::AlignLeft | Qt::AlignVCenter,
+                  QString::fromStdString(numberText(number)));
+    }
+    for (const TrendChange& change : servingCells) {
+        const qreal x = std::round(xOf(change.at)) + 0.5;
+        _painter.setPen(QPen(faint(_colors.text, 0.6F), 1, Qt::DashLine));
+        if (change.at >= _view.from()) _painter.drawLine(QPointF(x, _area.top()), QPointF(x, _area.bottom()));
+    }
+    const QRectF below(_area.left(), _area.bottom() + 3, _area.width(), kSmallBottom - 3);
+    paintText(below, Qt::AlignLeft, beforeNow(_view.span()));
+    paintText(below, Qt::AlignRight, beforeNow(0s));
+    _painter.setClipRect(_area.adjusted(-1, -kLineWidth, kLineWidth, kLineWidth));
+    paintLine(trend, _axis, _colors.line, false);
+    _painter.setClipping(false);
 }
 
 void TrendPainting::paintGrades(std::span<const LevelGrade> grades) {

@@ -26,6 +26,11 @@ public:
     static constexpr qreal kTop = 18;
     static constexpr qreal kBottom = 20;
 
+    // Around a small chart's line: the ends of its axis right, its two times below.
+    static constexpr qreal kSmallRight = 34;
+    static constexpr qreal kSmallTop = 8;
+    static constexpr qreal kSmallBottom = 18;
+
     struct Colors {
         QColor line, other, text, grid, background;
     };
@@ -34,9 +39,11 @@ public:
 
     /// `cursor` may be null.
     void paint(const DetailsController& details, const Trend::Point* cursor);
+    /// One line alone, for a glance: which way it goes, between what, and where another cell began to serve.
+    void paintSmall(const Trend& trend, const std::vector<TrendChange>& servingCells);
 
 private:
-    AxisRange axisOf(std::span<const Trend* const> trends) const;
+    AxisRange axisOf(std::span<const Trend* const> trends, double shortest = 0) const;
     void paintGrades(std::span<const LevelGrade> grades);
     void paintValueAxis(const AxisRange& axis, bool right);
     void paintTimeAxis();

@@ -90,6 +90,12 @@ Result<void> OutputFile::appear() {
     return {};
 }
 
+Result<std::string> OutputFile::place() {
+    if (auto opened = open(); !opened) return opened.error();
+    if (!_temporary) return Failure{_path + " is no file, and cannot be written piece by piece"};
+    return *_temporary;
+}
+
 Result<std::FILE*> OutputFile::stream() {
     if (auto opened = open(); !opened) return opened.error();
     const int fd = ::fcntl(::fileno(_file.get()), F_DUPFD_CLOEXEC, 0);

@@ -35,6 +35,9 @@ public:
     Result<void> appear();
 
     const std::string& path() const { return _path; }
+    /// Where the file takes shape, for a library that opens files by their names and leaves this one alone once it
+    /// appears. A failure for a device or a pipe.
+    Result<std::string> place();
     /// A stream of the caller's own that appends to the file.
     Result<std::FILE*> stream();
 

@@ -2,6 +2,7 @@
 
 #include <algorithm>
 
+#include "LogGenerator/CodeNames.h"
 #include "LogGenerator/Framing.h"
 #include "telephony/adaptation/Minimum.h"
 #include "telephony/adaptation/StandIns.h"
@@ -36,16 +37,16 @@ Adapted RecordAdapter::adapt(ByteView packet) {
 
     std::optional<Refusal> refusal;
     switch (code) {
-        case 0xB0C1: refusal = adaptMasterInformation(payload); break;
-        case 0xB0C2: refusal = adaptServingCell(payload); break;
-        case 0xB179: refusal = adaptConnected(payload); break;
-        case 0xB17F: refusal = adaptIdle(payload); break;
-        case 0xB180: refusal = adaptNeighbors(payload); break;
-        case 0xB193: refusal = adaptAnyMode(payload); break;
-        case 0x4005: refusal = adaptRanking(payload); break;
-        case 0x4127: refusal = adaptCellIdentity(payload); break;
-        case 0x51FC: refusal = adaptCells(payload); break;
-        case 0x7150: refusal = adaptNetworks(payload); break;
+        case code::kLTEMasterInformationBlock: refusal = adaptMasterInformation(payload); break;
+        case code::kLTEServingCell: refusal = adaptServingCell(payload); break;
+        case code::kLTEIntraFrequency: refusal = adaptConnected(payload); break;
+        case code::kLTEServingCellIdle: refusal = adaptIdle(payload); break;
+        case code::kLTENeighborCellsIdle: refusal = adaptNeighbors(payload); break;
+        case code::kLTEServingCellEveryMode: refusal = adaptAnyMode(payload); break;
+        case code::kNeighborRanking: refusal = adaptRanking(payload); break;
+        case code::kUMTSServingCell: refusal = adaptCellIdentity(payload); break;
+        case code::kGPRSReselection: refusal = adaptCells(payload); break;
+        case code::kEquivalentPLMNs: refusal = adaptNetworks(payload); break;
         default:
             if (code == sent) {
                 refusal = lengthRefusal(code, packet);

@@ -29,6 +29,11 @@ std::string difference(const PortCounts& before, const PortCounts& after) {
     return text;
 }
 
+// What of the modem's is lost: texts are no records.
+const char* lost(const PortCounts& before, const PortCounts& after) {
+    return after.damaged() == before.damaged() ? "loses texts" : "loses records";
+}
+
 }  // namespace
 
 std::optional<std::string> LossMeter::update(const PortCounts& counts, nanoseconds now) {
@@ -36,7 +41,8 @@ std::optional<std::string> LossMeter::update(const PortCounts& counts, nanosecon
     if (loss != _last) {
         _last = loss;
         _lastLoss = now;
-        if (!std::exchange(_losing, true)) return "loses records: " + difference(_before, counts);
+        if (!std::exchange(_losing, true))
+            return fmt::format("{}: {}", lost(_before, counts), difference(_before, counts));
     } else if (now - _lastLoss >= kQuiet) {
         return finish(counts);
     }
@@ -47,7 +53,7 @@ std::optional<std::string> LossMeter::update(const PortCounts& counts, nanosecon
 std::optional<std::string> LossMeter::finish(const PortCounts& counts) {
     const PortCounts before = std::exchange(_before, counts);
     if (!std::exchange(_losing, false)) return std::nullopt;
-    return "no longer loses records; it was " + difference(before, counts);
+    return fmt::format("no longer {}; it was {}", lost(before, counts), difference(before, counts));
 }
 
 std::optional<std::chrono::nanoseconds> LossMeter::deadline() const {

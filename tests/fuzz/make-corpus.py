@@ -101,5 +101,7 @@ for path in sorted(CAPTURES.glob("*.pcap")):
         # as one datagram of a port: magic, kind, flags, reserved, id, sequence, length
         header = struct.pack("<IBBHiII", 0x314B4C56, 1, i % 2, 0, 0, i, len(message))
         write("portdatagram", f"{path.stem}-{i}", header + message)
+    write("share", path.stem, b"".join(struct.pack("<H", len(message)) + message for message in messages))
+    write("share", f"{path.stem}.xml", plistlib.dumps(snapshot(messages), sort_keys=False))
     write("snapshot", f"{path.stem}.xml", plistlib.dumps(snapshot(messages), sort_keys=False))
     write("snapshot", f"{path.stem}.bplist", plistlib.dumps(snapshot(messages), fmt=plistlib.FMT_BINARY, sort_keys=False))

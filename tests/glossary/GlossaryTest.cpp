@@ -212,7 +212,7 @@ TEST(GlossaryLookup, TakesTheMeaningOfTheSectionThatAPathLeadsThrough) {
     };
     EXPECT_EQ(standard(Technology::LTE, "/Serving Cell Measurements/Srxlev"), "3GPP TS 36.304, 5.2.3.2");
     EXPECT_EQ(standard(Technology::LTE, "/Neighbor Cells List/3/Srxlev"), "3GPP TS 36.304, 5.2.3.2");
-    EXPECT_EQ(standard(Technology::GSM, "/UMTS Radio/UMTS RR Info/Cell ID"), "3GPP TS 25.331, 10.3.2.2");
+    EXPECT_EQ(standard(Technology::GSM, "/UMTS Radio/UMTS RR Info/Cell ID"), "3GPP TS 25.331");
     EXPECT_EQ(standard(Technology::GSM, "/GSM Cell and Neighbours/GSM Serving Cell/Cell ID"), "3GPP TS 23.003, 4.3.1");
     EXPECT_EQ(standard(Technology::GSM, "/GSM Cell and Neighbours/Mobile Allocation/ARFCNs/2"),
               "3GPP TS 44.018, 10.5.2.21");

@@ -225,8 +225,9 @@ Value monitored(const Value& serving, std::initializer_list<Value> neighbors) {
     for (const Value& neighbor : neighbors) list->append(neighbor);
     GSMLogGenerator generator;
     Dictionary state;
-    const Value tree = Dictionary::make(
-        {{"Serving", Dictionary::make({{"Cell", serving}})}, {"Neighbours", Dictionary::make({{"GSM", list}})}});
+    const Value tree =
+        Dictionary::make({{"Serving", Dictionary::make({{"Cell", serving}})},
+                          {"Neighbours", Dictionary::make({{"GSM", list}, {"UMTS", Array::make({"header"})}})}});
     generator.updateState(state, *writeXmlPropertyList(tree));
     return state["Display"];
 }

@@ -53,6 +53,9 @@ TEST(CdmaObservation, TheCellIsTheReferencePilot) {
     EXPECT_DOUBLE_EQ(seen.cells[0].quality->figure.number, -19.67);
     EXPECT_EQ(seen.registrationState, "OFF");
     EXPECT_EQ(seen.rates, (std::vector<Fact>{{"Traffic FER", "1.42%"}}));
+    ASSERT_TRUE(seen.rates[0].figure);
+    EXPECT_DOUBLE_EQ(seen.rates[0].figure->number, 1.42);
+    EXPECT_EQ(seen.rates[0].figure->unit, "%");
 }
 
 TEST(CdmaObservation, AnIdlePhoneSleepsAndWakes) {

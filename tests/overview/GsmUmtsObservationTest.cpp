@@ -155,6 +155,9 @@ TEST(GsmUmtsObservation, ErrorRatesAndContexts) {
                                                          {"State", "Active"},
                                                          {"PDP Address", "10.20.30.40"}})})}})}}));
     EXPECT_EQ(seen.rates, (std::vector<Fact>{{"BLER, channel 24", "2.0 %"}}));
+    ASSERT_TRUE(seen.rates[0].figure);
+    EXPECT_DOUBLE_EQ(seen.rates[0].figure->number, 2);
+    EXPECT_EQ(seen.rates[0].figure->unit, "%");
     ASSERT_EQ(seen.contexts.size(), 1u);
     EXPECT_EQ(seen.contexts[0].name, "internet (5)");
     EXPECT_EQ(seen.contexts[0].text, "Active, IPv4, 10.20.30.40");

@@ -46,6 +46,9 @@ TEST(IfxObservation, TheTreeSaysWhichRadioItIsOn) {
     EXPECT_EQ(seen.cells[1].record, 3u);
     EXPECT_EQ(seen.cells[2].identity, "UARFCN 10562, PSC 19");
     EXPECT_EQ(seen.rates, (std::vector<Fact>{{"Errors", "0.2 %"}}));
+    ASSERT_TRUE(seen.rates[0].figure);
+    EXPECT_DOUBLE_EQ(seen.rates[0].figure->number, 0.2);
+    EXPECT_EQ(seen.rates[0].figure->unit, "%");
     EXPECT_EQ(seen.registrationState, "Registered");
 }
 

@@ -100,5 +100,24 @@ TEST(LteObservation, CellsAroundBearTheChannelOfTheirList) {
     EXPECT_EQ(seen.cells[3].identity, "ARFCN 37, BSIC 44");
 }
 
+TEST(LteObservation, OfSeveralCarriersTheBroadcastSaysWhichServes) {
+    const Value broadcast = shown({{"Physical Cell ID", "185"}, {"Download Frequency", "5780"}}, 3);
+    const Observation seen =
+        observe(Technology::LTE, group({{kConnected, connected(9)}, {"Serving Cell Info", broadcast}}));
+    EXPECT_EQ(seen.cell, "EARFCN 5780, PCI 185");
+    EXPECT_EQ(seen.cellRecord, 3u);
+    EXPECT_EQ(seen.band, "17");
+    EXPECT_EQ(seen.state, "connected");
+    EXPECT_FALSE(seen.level);
+    ASSERT_EQ(seen.cells.size(), 1u);
+    EXPECT_EQ(seen.cells[0].identity, "EARFCN 1300, PCI 84");
+    EXPECT_EQ(seen.cells[0].mark, "active");
+    EXPECT_EQ(seen.cells[0].level->figure.text, "-88.00 dBm");
+    EXPECT_EQ(seen.cells[0].record, 9u);
+    const Observation later = observe(Technology::LTE, group({{kIdle, idle(10)}, {"Serving Cell Info", broadcast}}));
+    EXPECT_EQ(later.cell, "EARFCN 5780, PCI 185");
+    EXPECT_EQ(later.level->figure.text, "-109.50 dBm");
+}
+
 }  // namespace
 }  // namespace kelvo::overview

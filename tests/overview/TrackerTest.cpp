@@ -322,6 +322,45 @@ TEST(Tracker, WhileTheStateIsNotKnownAPhoneIsAsItWas) {
     }
 }
 
+TEST(Tracker, CarriersThatAreToldInTurnAreNoHandovers) {
+    Tracker tracker;
+    std::uint64_t record = 0;
+    const auto see = [&](const char* cell, const char* level, Time::duration after) {
+        Observation seen = servedBy(cell, ++record, level);
+        seen.isDedicated = seen.cellIsOneOfSeveral = true;
+        tracker.note(seen, kStart + after);
+    };
+    for (int turn = 0; turn < 10; ++turn) {
+        see("A", "-109.00 dBm", turn * 160ms);
+        see("B", "-107.00 dBm", turn * 160ms + 40ms);
+    }
+    EXPECT_EQ(tracker.events().size(), 1u);
+    EXPECT_EQ(tracker.latest().cell, "A");
+    EXPECT_EQ(tracker.latest().level->figure.text, "-109.00 dBm");
+    EXPECT_EQ(identities(tracker), std::vector<std::string>{"B"});
+    EXPECT_EQ(tracker.cells()[0].heard.mark, "active");
+    see("B", "-106.00 dBm", 1600ms);
+    EXPECT_EQ(tracker.events().size(), 1u);
+    see("B", "-106.00 dBm", 2s);  // of A nothing has come for half a second
+    ASSERT_EQ(tracker.events().size(), 2u);
+    EXPECT_EQ(tracker.events()[1].kind, Kind::Handover);
+    EXPECT_EQ(tracker.events()[1].to, "B");
+}
+
+TEST(Tracker, AFigureThatARecordLeftOutStaysAndAges) {
+    Tracker tracker;
+    tracker.note(servedBy("A", 1, "-90.00 dBm"), kStart);
+    Observation seen = servedBy("A", 2);
+    seen.level.reset();
+    tracker.note(seen, kStart + 5s);
+    EXPECT_EQ(tracker.latest().level->figure.text, "-90.00 dBm");
+    EXPECT_EQ(tracker.levelTime(), kStart);
+    seen.cell = "B";
+    seen.cellRecord = 3;
+    tracker.note(seen, kStart + 6s);
+    EXPECT_FALSE(tracker.latest().level);
+}
+
 TEST(Tracker, ContextsComeAndGo) {
     Tracker tracker;
     Observation seen = servedBy("A", 1);

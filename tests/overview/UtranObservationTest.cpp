@@ -34,6 +34,9 @@ TEST(UtranObservation, TheServingCellIsTheRowOfTheActiveSet) {
     EXPECT_EQ(seen.cells[0].identity, "UARFCN 10055, cell 105");
     EXPECT_EQ(seen.cells[1].mark, "detected");
     EXPECT_EQ(seen.rates, (std::vector<Fact>{{"BLER, channel 5", "42"}}));
+    ASSERT_TRUE(seen.rates[0].figure);
+    EXPECT_DOUBLE_EQ(seen.rates[0].figure->number, 42);
+    EXPECT_EQ(seen.rates[0].figure->unit, "");
 }
 
 TEST(UtranObservation, WithoutAnActiveSetTheBroadcastNamesTheCell) {

@@ -23,6 +23,7 @@ TEST(TerminalKeys, KnowsBothFormsOfTheArrows) {
     EXPECT_EQ(TerminalKeys().feed("\x1b[5~\x1b[6~\x1b[H\x1bOF"),
               (Keys{TerminalKey::PageUp, TerminalKey::PageDown, TerminalKey::Home, TerminalKey::End}));
     EXPECT_EQ(TerminalKeys().feed("\x1b[D\x1bOC"), (Keys{TerminalKey::Left, TerminalKey::Right}));
+    EXPECT_EQ(TerminalKeys().feed("op"), (Keys{TerminalKey::Overview, TerminalKey::Provenance}));
 }
 
 TEST(TerminalKeys, PutsASequenceTogetherFromPieces) {
@@ -161,6 +162,24 @@ TEST_F(View, KeepsPlaceAndKeysInSightFrom34ColumnsOn) {
     EXPECT_NE(written().find("\x1b[7m 1448-1450 of 1450 p ages, q quits\x1b[0m"), std::string::npos);
 }
 
+TEST_F(View, HasAllKeysWhereThereIsRoom) {
+    const winsize size{5, 60, 0, 0};
+    ioctl(_program.get(), TIOCSWINSZ, &size);
+    TerminalWatchView view(*terminal);
+    view.showDisplay({"a"}, {"s", ""});
+    EXPECT_NE(written().find(" 1-1 of 1" + std::string(24, ' ') + "o overview, p ages, q quits"), std::string::npos);
+}
+
+TEST_F(View, AnotherDisplayIsSeenFromItsBeginning) {
+    TerminalWatchView view(*terminal);
+    view.showDisplay({"a", "b", "c", "d", "e"}, {"s", ""});
+    view.press(TerminalKey::End);
+    written();
+    view.goToTop();
+    view.showAged({"1", "2", "3", "4"}, {"s", ""});
+    EXPECT_NE(written().find("\x1b[1;1H\x1b[K1\x1b[2;1H\x1b[K2"), std::string::npos);
+}
+
 TEST_F(View, DropsTheKeysBeforeThePlaceInFewerColumns) {
     TerminalWatchView view(*terminal);
     view.showDisplay({"a"}, {"Updated 2026-11-22 at 06:00:00", ""});
@@ -205,6 +224,15 @@ TEST(PrintedView, PrintsEveryDisplayUnderItsStatus) {
                   view.showDisplay({"a  1"}, {"Updated", ""});
               }),
               "Connecting...  No telephony service is running\nUpdated\na  1\nb  2\nUpdated\na  1\n");
+}
+
+TEST(PrintedView, WhatIsPrintedDoesNotAge) {
+    PrintedWatchView view;
+    EXPECT_EQ(printed([&] {
+                  view.showDisplay({"RSRP  -90.00 dBm, 0 s ago"}, {"Updated", ""});
+                  view.showAged({"RSRP  -90.00 dBm, 2 s ago"}, {"Updated", ""});
+              }),
+              "Updated\nRSRP  -90.00 dBm, 0 s ago\nUpdated\n");
 }
 
 TEST(PrintedView, TellsOnceThatNoRecordsCome) {

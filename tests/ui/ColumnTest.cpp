@@ -35,8 +35,9 @@ TEST_P(Column, HoldsTheTitleLineAndTheStatusLineTogetherWithTheRows) {
     EXPECT_EQ(right(buttonOf("Save")), right(row) - 4);
     const QQuickItem* title = scene->itemWithText(text("Serving Cell"));
     EXPECT_NEAR((left(title) + right(title)) / 2, (left(row) + right(row)) / 2, 0.51);
-    EXPECT_EQ(scene->itemOfType("TitleBar")->width(), GetParam());  // the bars go on to the edges
-    EXPECT_EQ(scene->itemOfType("StatusBar")->width(), GetParam());
+    const double pane = scene->itemOfType("QQuickStackView")->width();  // the bars go on to its edges
+    EXPECT_EQ(scene->paneItemOfType("TitleBar")->width(), pane);
+    EXPECT_EQ(scene->paneItemOfType("StatusBar")->width(), pane);
 }
 
 TEST_P(Column, HoldsTheIndicatorBesideTheStatus) {

@@ -50,7 +50,8 @@ void Scene::settle() {
         const QQuickItem* stack = itemOfType("QQuickStackView");
         const QQuickItem* sheet = itemOfType("SaveSheet");
         const QQuickItem* details = itemOfType("DetailsSheet");
-        const bool sliding = stack->property("busy").toBool() ||
+        const double arrival = _view->rootObject()->property("arrival").toDouble();  // of the overview
+        const bool sliding = stack->property("busy").toBool() || arrival != (_app->overview()->isOpen() ? 1 : 0) ||
                              (sheet != nullptr && sheet->property("moving").toBool()) ||
                              (details != nullptr && details->property("moving").toBool());
         return !sliding && (sheet != nullptr) == (_app->saveViewController() != nullptr) &&
@@ -60,8 +61,8 @@ void Scene::settle() {
     _view->grabWindow();
 }
 
-QQuickItem* Scene::find(const QString& text) {
-    return findItem(_view->contentItem(), [&](QQuickItem* item) {
+QQuickItem* Scene::find(const QString& text, QQuickItem* within) {
+    return findItem(within, [&](QQuickItem* item) {
         const bool isText = item->inherits("QQuickText");
         return isText && item->property("text").toString() == text;
     });
@@ -70,6 +71,12 @@ QQuickItem* Scene::find(const QString& text) {
 QQuickItem* Scene::itemWithText(const QString& text) {
     QQuickItem* item = find(text);
     EXPECT_NE(item, nullptr) << "nothing on the screen says " << text.toStdString();
+    return item;
+}
+
+QQuickItem* Scene::paneItemWithText(const QString& text) {
+    QQuickItem* item = find(text, itemOfType("QQuickStackView"));
+    EXPECT_NE(item, nullptr) << "nothing on the panes says " << text.toStdString();
     return item;
 }
 
@@ -82,11 +89,15 @@ KelvoCell* Scene::row(const QString& key) {
     return qobject_cast<KelvoCell*>(item);
 }
 
-QQuickItem* Scene::itemOfType(const char* type) {
-    return findItem(_view->contentItem(), [&](QQuickItem* item) {
+QQuickItem* Scene::itemOfType(const char* type, QQuickItem* within) {
+    return findItem(within, [&](QQuickItem* item) {
         return QByteArray(item->metaObject()->className()).startsWith(type) || item->inherits(type);
     });
 }
+
+QQuickItem* Scene::itemOfType(const char* type) { return itemOfType(type, _view->contentItem()); }
+
+QQuickItem* Scene::paneItemOfType(const char* type) { return itemOfType(type, itemOfType("QQuickStackView")); }
 
 void Scene::touch(const QPointF& at) { QTest::touchEvent(_view, touchScreen()).press(0, at.toPoint()); }
 void Scene::move(const QPointF& to) {

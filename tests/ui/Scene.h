@@ -31,6 +31,9 @@ public:
     bool shows(const QString& text) { return find(text) != nullptr; }
     /// The first visible item of a type, by the name its class starts with; null when there is none.
     QQuickItem* itemOfType(const char* type);
+    /// The same of the panes, which in a wide window are not alone.
+    QQuickItem* paneItemOfType(const char* type);
+    QQuickItem* paneItemWithText(const QString& text);
 
     /// The visible row of that key; fails the test when there is none.
     KelvoCell* row(const QString& key);
@@ -46,7 +49,9 @@ public:
     static void useDarkColours(bool dark);
 
 private:
-    QQuickItem* find(const QString& text);
+    QQuickItem* find(const QString& text) { return find(text, _view->contentItem()); }
+    static QQuickItem* find(const QString& text, QQuickItem* within);
+    static QQuickItem* itemOfType(const char* type, QQuickItem* within);
     void nextFrame();
 
     std::unique_ptr<KelvoApp> _app;

@@ -8,6 +8,8 @@
 #include <array>
 #include <cerrno>
 #include <cstdio>
+#include <filesystem>
+#include <fstream>
 #include <map>
 #include <system_error>
 #include <utility>
@@ -26,11 +28,25 @@ constexpr const char* kStandardInput = "-";
 /// A capture's packets are records as they stand.
 class CaptureRecords final : public InputRecords {
 public:
-    explicit CaptureRecords(CaptureReader reader) : _reader(std::move(reader)) {}
-    Result<std::optional<CapturePacket>> next() override { return _reader.next(); }
+    /// `size`: of the file, where it lies there as it is read.
+    CaptureRecords(CaptureReader reader, std::optional<std::uint64_t> size)
+        : _reader(std::move(reader)), _size(size) {}
+    Result<std::optional<CapturePacket>> next() override {
+        auto packet = _reader.next();
+        if (packet && *packet) _read += kPacketHeader + (*packet)->bytes.size();
+        return packet;
+    }
+    std::optional<double> portion() const override {
+        if (!_size) return std::nullopt;
+        return std::min(1.0, static_cast<double>(_read) / static_cast<double>(*_size));
+    }
 
 private:
+    static constexpr std::uint64_t kFileHeader = 24;
+    static constexpr std::uint64_t kPacketHeader = 16;
     CaptureReader _reader;
+    std::optional<std::uint64_t> _size;
+    std::uint64_t _read = kFileHeader;
 };
 
 /// A snapshot's history. It holds what the service has delivered, as a capture does.
@@ -95,6 +111,15 @@ Result<CaptureReader> captureInFile(const std::string& path) {
     return CaptureReader::open(path, stream);
 }
 
+/// The size of a capture's file; none when it is packed.
+std::optional<std::uint64_t> sizeOf(const std::string& path) {
+    constexpr char kGzip = '\x1F';
+    std::error_code error;
+    const auto size = std::filesystem::file_size(path, error);
+    if (error || size == 0 || std::ifstream(path, std::ios::binary).peek() == kGzip) return std::nullopt;
+    return size;
+}
+
 /// A file that is no recording at all.
 Failure noRecording(const std::string& path) {
     constexpr std::array<std::uint8_t, 4> kPcapng = {0x0A, 0x0D, 0x0D, 0x0A};
@@ -116,7 +141,7 @@ Result<Input> Input::open(const std::string& path, std::optional<Technology> cho
     if (!kind) return kind.error();
     switch (*kind) {
         case RecordingKind::Unknown: return noRecording(path);
-        case RecordingKind::Capture: return of(path, captureInFile(path), chosen);
+        case RecordingKind::Capture: return of(path, captureInFile(path), chosen, sizeOf(path));
         case RecordingKind::Snapshot: return ofSnapshot(path, chosen);
         default: return ofRecording(path, *kind, chosen);
     }
@@ -129,7 +154,8 @@ Result<Input> Input::openCapture(const std::string& path, std::optional<Technolo
     return of(path, std::move(capture), chosen);
 }
 
-Result<Input> Input::of(std::string name, Result<CaptureReader> capture, std::optional<Technology> chosen) {
+Result<Input> Input::of(std::string name, Result<CaptureReader> capture, std::optional<Technology> chosen,
+                        std::optional<std::uint64_t> size) {
     if (!capture) return capture.error();
     const auto told = capture->technology();
     const auto technology = chosen ? chosen : told;
@@ -137,7 +163,7 @@ Result<Input> Input::of(std::string name, Result<CaptureReader> capture, std::op
         return Failure{name + " has a link type that names no technology; --technology names one"};
     }
     return Input(std::move(name), RecordingKind::Capture, *technology, told,
-                 std::make_unique<CaptureRecords>(std::move(capture).value()));
+                 std::make_unique<CaptureRecords>(std::move(capture).value(), size));
 }
 
 Result<Input> Input::ofSnapshot(const std::string& path, std::optional<Technology> chosen) {
@@ -185,6 +211,8 @@ std::optional<CapturePacket> Input::next() {
     _count += *packet ? 1 : 0;
     return *packet;
 }
+
+bool isReadOnce(const std::string& path) { return path == kStandardInput || isPipe(path); }
 
 std::vector<std::string> filesOf(std::vector<std::string> paths) {
     std::ranges::replace(paths, std::string(kStandardInput), std::string("/dev/stdin"));

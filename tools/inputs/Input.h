@@ -19,6 +19,8 @@ public:
     virtual ~InputRecords() = default;
     /// The next record, none after the last; a failure where and why nothing more can be read.
     virtual Result<std::optional<CapturePacket>> next() = 0;
+    /// How much of the input has been read, from 0 to 1; none when nobody knows how long it is.
+    virtual std::optional<double> portion() const { return std::nullopt; }
     /// What was not given: damaged stretches, refused records. One sentence each.
     virtual std::vector<std::string> leftOut() const { return {}; }
 };
@@ -52,6 +54,8 @@ public:
     std::uint64_t count() const { return _count; }
     /// Where and why the input can be read no further; none before that, and for one that ends as it should.
     const std::optional<Failure>& breakOff() const { return _breakOff; }
+    /// How much of it has been read, from 0 to 1; none when nobody knows how long it is.
+    std::optional<double> portion() const { return _records->portion(); }
     /// What is not among the records though the input has it, a sentence each that names the file; known at the end.
     std::vector<std::string> leftOut() const { return _records->leftOut(); }
 
@@ -59,7 +63,8 @@ private:
     Input(std::string name, RecordingKind kind, Technology technology, std::optional<Technology> told,
           std::unique_ptr<InputRecords> records)
         : _name(std::move(name)), _kind(kind), _technology(technology), _told(told), _records(std::move(records)) {}
-    static Result<Input> of(std::string name, Result<CaptureReader> capture, std::optional<Technology> chosen);
+    static Result<Input> of(std::string name, Result<CaptureReader> capture, std::optional<Technology> chosen,
+                            std::optional<std::uint64_t> size = {});
     static Result<Input> ofSnapshot(const std::string& path, std::optional<Technology> chosen);
     static Result<Input> ofRecording(const std::string& path, RecordingKind kind, std::optional<Technology> chosen);
 
@@ -71,6 +76,9 @@ private:
     std::uint64_t _count = 0;
     std::optional<Failure> _breakOff;
 };
+
+/// Whether what lies at `path` can be read once alone: standard input, a pipe.
+bool isReadOnce(const std::string& path);
 
 /// The files behind inputs' names, for outputs that must not replace them.
 std::vector<std::string> filesOf(std::vector<std::string> paths);

@@ -17,7 +17,6 @@ namespace {
 using adaptation::Adapted;
 
 constexpr std::size_t kLengthAt = 1;
-constexpr std::size_t kCodeAt = 3;
 constexpr std::size_t kTimestampAt = 5;
 constexpr std::size_t kLongestRecord = 65'535;
 

@@ -30,6 +30,7 @@ public:
     std::optional<ByteView> shareTree(ByteView message);
 
     Replacer& replacer() { return _replacer; }
+    const ShareChoices& choices() const { return _replacer.choices(); }
     SharedTimes& times() { return _times; }
     const ShareTally& tally() const { return _replacer.tally(); }
 

@@ -143,7 +143,9 @@ SharedFile shareDlf(const std::string& in, RecordingFile input, OutputFile outpu
     return shared;
 }
 
-SharedFile shareSnapshot(const std::string& in, RecordingFile input, OutputFile output, RecordSharer& sharer) {
+/// `isKnown`: the file begins as such a one does. The old text form of property lists has no beginning of its own.
+SharedFile shareSnapshot(const std::string& in, RecordingFile input, OutputFile output, bool isKnown,
+                         RecordSharer& sharer) {
     Bytes bytes;
     for (std::size_t got = kPiece; got == kPiece;) {
         const std::size_t size = bytes.size();
@@ -152,9 +154,9 @@ SharedFile shareSnapshot(const std::string& in, RecordingFile input, OutputFile 
         bytes.resize(size + got);
     }
     const Result<Value> snapshot = readPropertyList(bytes);
-    if (!snapshot) throw CommandFailure(in + " is not a snapshot: " + snapshot.error().reason);
-    const SharedSnapshot made = sharedSnapshot(sharer, *snapshot);
-    if (!made.content) throw CommandFailure(in + " is not a snapshot");
+    if (!snapshot && isKnown) throw CommandFailure(in + " is not a snapshot: " + snapshot.error().reason);
+    const SharedSnapshot made = snapshot ? sharedSnapshot(sharer, *snapshot) : SharedSnapshot();
+    if (!made.content) throw CommandFailure(in + (isKnown ? " is not a snapshot" : " holds no diagnostic records"));
     orFail(output.write(orFail(writeXmlPropertyList(made.content))));
     orFail(output.appear());
     return {.kind = RecordingKind::Snapshot, .records = made.records, .read = made.read};
@@ -167,13 +169,14 @@ SharedFile shareFile(const std::string& in, const std::string& out, const Output
     const bool isStandardInput = in == "-";
     const std::string path = isStandardInput ? "/dev/stdin" : in;
     const RecordingKind kind = isStandardInput ? RecordingKind::Capture : orFail(recognizeRecording(path));
-    if (kind == RecordingKind::Unknown) throw CommandFailure(in + " holds no diagnostic records");
     RecordingFile input = orFail(RecordingFile::open(path));
     OutputFile output = orFail(OutputFile::create(out, terms));
     switch (kind) {
         case RecordingKind::Frames: return shareFrames(in, std::move(input), std::move(output), sharer);
         case RecordingKind::Dlf: return shareDlf(in, std::move(input), std::move(output), sharer);
-        case RecordingKind::Snapshot: return shareSnapshot(in, std::move(input), std::move(output), sharer);
+        case RecordingKind::Snapshot:
+        case RecordingKind::Unknown:
+            return shareSnapshot(in, std::move(input), std::move(output), kind == RecordingKind::Snapshot, sharer);
         default:
             return shareCapture(isStandardInput ? "standard input" : in, std::move(input), std::move(output),
                                 technology, sharer);

@@ -50,6 +50,8 @@ public:
     }
 
 private:
+    bool hidesZone() const { return _sharer.times().shifts() || _sharer.choices().hideCells; }
+
     void remove(std::string_view what, std::uint64_t count = 1) { _sharer.replacer().tally().removed(what, count); }
 
     void set(Dictionary& made, std::string_view key, Value value) {
@@ -57,13 +59,16 @@ private:
         made.set(key, std::move(value));
     }
 
-    /// "2011-03-04 09:15:02 +0100", shifted in UTC.
+    /// "2011-03-04 09:15:02 +0100"; in UTC unless places may be told, for a zone is one.
     Value date(const Value& value) {
         constexpr std::size_t kLength = 25;
+        constexpr std::int64_t kLast = 0xFFFFFFFF;  // as captures have their seconds
         const std::string* text = value.string();
-        const auto time = text != nullptr && text->size() == kLength ? dateFromDescription(*text) : std::nullopt;
-        if (!time) return {};
-        if (!_sharer.times().shifts()) return *text;
+        const bool isDate = text != nullptr && text->size() == kLength &&
+                            text->find_first_not_of("0123456789-: +") == std::string::npos;
+        const auto time = isDate ? dateFromDescription(*text) : std::nullopt;
+        if (!time || time->time_since_epoch().count() < 0 || time->time_since_epoch().count() > kLast) return {};
+        if (!hidesZone()) return *text;
         return utcDateDescription(std::chrono::floor<std::chrono::seconds>(_sharer.times().host(*time)));
     }
 
@@ -157,7 +162,7 @@ private:
         return Dictionary::make({{snapshot::kDescription, description}, {snapshot::kDLF, std::move(log)}});
     }
 
-    /// The record that heads a DLF file: of the original's its time is kept, and the zone unless times are shifted.
+    /// The record that heads a DLF file: of the original's its time is kept, and the zone where places may be told.
     Bytes report(const Value& dlf) {
         constexpr std::size_t kTimeAt = 81;
         constexpr std::size_t kZoneAt = 85;
@@ -169,7 +174,7 @@ private:
             const SharedTimes::Time told{seconds(wire::u32At(*bytes, kTimeAt))};
             const auto shared = std::chrono::floor<seconds>(_sharer.times().host(told)).time_since_epoch().count();
             time.seconds = static_cast<std::uint32_t>(shared);
-            if (!_sharer.times().shifts()) {
+            if (!hidesZone()) {
                 time.zoneMinutes = static_cast<std::int16_t>(wire::u16At(*bytes, kZoneAt));
                 time.daylight = (*bytes)[kDaylightAt] != 0 ? 1 : 0;
             }

@@ -9,6 +9,8 @@ FocusScope {
 
     required property KelvoPaneController pane
     required property NavigationStack navigation
+    required property OverviewController overview
+    required property bool wide  // the overview stands beside
 
     Component.onDestruction: navigation.didRemoveView(pane)
 
@@ -118,7 +120,9 @@ FocusScope {
         title: page.pane.title
         backTitle: page.pane.backTitle
         column: list
+        offersOverview: !page.wide && page.pane.backTitle === ""
         onBack: page.navigation.popViewController()
+        onOverview: page.overview.show()
     }
 
     StatusBar {

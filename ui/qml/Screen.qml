@@ -11,7 +11,13 @@ FocusScope {
     property SaveSheet sheet: null
     property DetailsSheet details: null
 
+    readonly property OverviewController overview: application.overview
+    readonly property bool wide: width >= 900  // for the panes and the overview side by side
+    readonly property bool uncovered: !sheet && !details && !alert.shown
+    property real arrival: overview.open ? 1 : 0  // of the overview over the panes
+
     focus: true
+    onWideChanged: giveFocus()
     onWidthChanged: {
         const page = stack.currentItem as PanePage;
         if (details && page)
@@ -25,8 +31,23 @@ FocusScope {
             sheet.forceActiveFocus();
         else if (details)
             details.forceActiveFocus();
+        else if (overview.open)
+            beside.forceActiveFocus();
         else
             stack.forceActiveFocus();
+    }
+
+    // False where nothing lies behind.
+    function back(): bool {
+        if (wide || !overview.open)
+            return application.navigation.popViewController();
+        overview.close();
+        return true;
+    }
+
+    Behavior on arrival {
+        enabled: !screen.wide
+        NumberAnimation { duration: 240; easing.type: Easing.OutCubic }
     }
 
     Rectangle {
@@ -37,9 +58,11 @@ FocusScope {
     T.StackView {
         id: stack
 
-        anchors.fill: parent
+        x: screen.wide ? 0 : -screen.arrival * width / 3
+        width: screen.wide ? Math.max(400, Math.min(640, screen.width - 560)) : screen.width  // 640 is what rows use
+        height: screen.height
         focus: true
-        enabled: !screen.sheet && !screen.details && !alert.shown
+        enabled: screen.uncovered && (screen.wide || !screen.overview.open)
 
         pushEnter: Slide { property: "x"; from: stack.width; to: 0 }
         pushExit: Slide { property: "x"; from: 0; to: -stack.width / 3 }
@@ -59,6 +82,35 @@ FocusScope {
         Component.onCompleted: show(screen.application.navigation.rootViewController, false)
     }
 
+    // Where the overview is: on a phone over the panes, in a wide window beside them.
+    FocusScope {
+        id: beside
+        objectName: "beside"
+
+        readonly property bool used: screen.wide || screen.overview.open || screen.arrival > 0
+        property OverviewView view: null
+
+        x: screen.wide ? stack.width : (1 - screen.arrival) * screen.width
+        width: screen.wide ? screen.width - stack.width : screen.width
+        height: screen.height
+        enabled: screen.uncovered && (screen.wide || screen.overview.open)
+        onUsedChanged: {
+            if (used) {
+                view = overviewView.createObject(beside) as OverviewView;
+            } else {
+                view.visible = false;  // it lives a moment longer
+                view.destroy();
+                view = null;
+            }
+        }
+    }
+
+    Shortcut {
+        sequence: "Ctrl+O"
+        enabled: screen.uncovered
+        onActivated: screen.overview.open ? screen.giveFocus() : screen.overview.show()
+    }
+
     Shortcut {
         sequence: "Ctrl+Q"
         onActivated: screen.Window.window.close()
@@ -67,8 +119,8 @@ FocusScope {
     // The mouse's button for the way back.
     TapHandler {
         acceptedButtons: Qt.BackButton
-        enabled: stack.enabled
-        onTapped: screen.application.navigation.popViewController()
+        enabled: screen.uncovered
+        onTapped: screen.back()
     }
 
     // A swipe from the left edge leads back, with a finger or with the mouse's button held down. What lies under the edge
@@ -79,9 +131,23 @@ FocusScope {
 
         DragHandler {
             target: null
-            enabled: stack.enabled && stack.depth > 1 && !stack.busy
+            enabled: screen.uncovered && !stack.busy && (stack.depth > 1 || (!screen.wide && screen.arrival === 1))
             yAxis.enabled: false
-            onActiveTranslationChanged: if (activeTranslation.x > 64) screen.application.navigation.popViewController()
+            onActiveTranslationChanged: if (activeTranslation.x > 64) screen.back()
+        }
+    }
+
+    Component {
+        id: overviewView
+        OverviewView {
+            anchors.fill: parent
+            focus: true
+            application: screen.application
+            wide: screen.wide
+            onBack: {
+                screen.overview.close();
+                stack.forceActiveFocus();
+            }
         }
     }
 
@@ -89,6 +155,8 @@ FocusScope {
         id: page
         PanePage {
             navigation: screen.application.navigation
+            overview: screen.overview
+            wide: screen.wide
         }
     }
 
@@ -114,6 +182,14 @@ FocusScope {
         z: 1
         application: screen.application
         onShownChanged: screen.giveFocus()
+    }
+
+    Connections {
+        target: screen.overview
+
+        function onOpenChanged() {
+            screen.giveFocus();
+        }
     }
 
     Connections {

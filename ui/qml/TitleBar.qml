@@ -8,8 +8,10 @@ Rectangle {
     required property string title
     required property string backTitle
     required property Item column  // where the rows are
+    property bool offersOverview: false
 
     signal back
+    signal overview
 
     height: 52
     color: Theme.bar
@@ -56,6 +58,15 @@ Rectangle {
         Accessible.ignored: !enabled
         Accessible.role: Accessible.Heading
         Accessible.name: text
+    }
+
+    BarButton {
+        objectName: "overview"
+        x: bar.column.x + bar.column.width - 4 - width
+        anchors.verticalCenter: parent.verticalCenter
+        visible: bar.offersOverview
+        text: qsTr("Overview")
+        onClicked: bar.overview()
     }
 
     Hairline {

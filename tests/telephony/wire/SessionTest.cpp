@@ -205,6 +205,18 @@ TEST_F(SessionTest, SaysOnceWhenLossBeginsAndOnceWhenItHasEnded) {
     EXPECT_EQ(lines().back(), "port: loses records: 1 frame too short");
 }
 
+TEST_F(SessionTest, CallsTextsThatTheModemDroppedTexts) {
+    runWith();
+    say({0x79, 0x00, 0x00, 0x02, 0x00});
+    EXPECT_EQ(lines(), std::vector<std::string>{"port: loses texts: 2 texts dropped by the modem"});
+    pass(5s);
+    EXPECT_EQ(lines().back(), "port: no longer loses texts; it was 2 texts dropped by the modem");
+    say({0x79, 0x00, 0x00, 0x01, 0x00});
+    sayRaw({0x01, 0x7E});
+    pass(5s);
+    EXPECT_EQ(lines().back(), "port: no longer loses records; it was 1 frame too short, 1 text dropped by the modem");
+}
+
 TEST_F(SessionTest, CountsTheFrameInWhoseMiddleTheModemHangsUp) {
     runWith();
     const Bytes frame = plainFrame(recordOf(0xB0C2));

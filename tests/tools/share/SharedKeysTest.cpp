@@ -2,9 +2,12 @@
 
 #include <gtest/gtest.h>
 
+#include "LogGenerator/Factory.h"
 #include "glossary/Glossary.h"
 #include "platform/system/DirectoryResources.h"
+#include "platform/system/Environment.h"
 #include "platform/values/Value.h"
+#include "tools/share/SharedRecords.h"
 
 namespace kelvo {
 namespace {
@@ -64,6 +67,23 @@ TEST(SharedKeys, PassBySortingNumbers) {
 TEST(SharedKeys, KnowNoOthers) {
     EXPECT_EQ(identityOf("", "Subscriber"), std::nullopt);
     EXPECT_FALSE(isScreen(""));
+}
+
+TEST(SharedRecords, HaveATableForEveryCodeThatIsDecoded) {
+    const DirectoryResources resources(KELVO_RESOURCE_DIR);
+    const Environment::Scope environment({.resources = &resources});
+    std::size_t codes = 0;
+    for (const TechnologyNames& names : kTechnologies) {
+        const DictionaryRef command = generatorFromTechnology(names.identifier)->getStartCommand();
+        const ArrayRef list = (*command)["SetOskraLogCodes"].array();
+        if (!list) continue;
+        for (const Value& code : *list) {
+            EXPECT_NE(sharedRecord(static_cast<LogCode>(code.number()->integer())), nullptr)
+                << std::hex << code.number()->integer();
+            ++codes;
+        }
+    }
+    EXPECT_EQ(codes, 44U);  // 8 of CDMA, 25 of GSM and UMTS, 6 of LTE, 5 of UTRAN
 }
 
 TEST(Identity, HiddenIsWhatTheUserWantsAndWhatAlwaysIs) {

@@ -149,7 +149,7 @@ class Zsh(Completion):
         found = Path(f"{self.directory}.found")
         found.write_text("")
         self.addCleanup(lambda: found.unlink(missing_ok=True))
-        subprocess.run(["zsh", "-f", "-c", script], capture_output=True, text=True, timeout=60,
+        subprocess.run(["zsh", "-f", "-c", script], capture_output=True, text=True, timeout=600,
                        env={**os.environ, "TERM": "dumb", "HOME": str(self.directory)})
         return {word for word in re.findall(r"^<(.*)>$", found.read_text(), re.MULTILINE)}
 

@@ -14,9 +14,9 @@ using test::text;
 /// Nothing on the overview moves because a value comes or goes, and what the reader looks at stays in sight.
 class OverviewStillness : public test::OverviewFixture {
 protected:
-    static Value measured(const char* quality, std::uint64_t record) {
+    static Value measured(const char* quality, std::uint64_t record, const char* cell = "185") {
         return shown({{"E-ARFCN", "1300"},
-                      {"Physical Cell ID", "185"},
+                      {"Physical Cell ID", cell},
                       {"Measured RSRP", "-96.50 dBm"},
                       {"Measured RSRQ", quality}},
                      record);
@@ -45,7 +45,7 @@ TEST_F(OverviewStillness, HoldsThePlacesWhileValuesGoAndComeAgain) {
     startWithValues();
     const std::vector<double> before = places();
     showValues(group({{"Serving Cell Info", broadcast("")},
-                      {"Serving Cell Measurements", measured("", 6)},
+                      {"Serving Cell Measurements", measured("", 6, "186")},
                       {"PDP Context Info", list({})}}));
     EXPECT_EQ(places(), before);
     EXPECT_TRUE(isHeard("RSRQ not reported"));
@@ -75,7 +75,7 @@ TEST_F(OverviewStillness, HoldsThePlacesWhileCellsGetLostAndGo) {
 TEST_F(OverviewStillness, LeavesAGaugeAndItsFactsInTheirPlaces) {
     startWithValues();
     const double level = named("levelGauge")->width();
-    showValues(group({{"Serving Cell Measurements", measured("", 6)}}));
+    showValues(group({{"Serving Cell Measurements", measured("", 6, "186")}}));
     EXPECT_EQ(named("levelGauge")->width(), level);
     EXPECT_TRUE(named("qualityGauge")->isVisible());
 }

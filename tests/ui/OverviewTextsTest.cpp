@@ -122,7 +122,7 @@ TEST_F(OverviewTexts, OfCdmaWhoseCellsHaveAQualityAlone) {
     showValues(group(
         {{"1;1x", oneX},
          {"4;System", shown({{"1;Roaming Indicator", "OFF [0]"}, {"2;System ID", "4110"}, {"3;Network ID", "2"}})}}));
-    EXPECT_EQ(behindTitle(), lines({"CDMA2000 1x, Traffic", "channel 283, PN 180", "Rx AGC -74.60 dBm, 0 s ago",
+    EXPECT_EQ(behindTitle(), lines({"CDMA2000 1x, in traffic", "channel 283, PN 180", "Rx AGC -74.60 dBm, 0 s ago",
                                     "Ec/Io -9.58 dB, good, 0 s ago", "Area, SID 4110, NID 2",
                                     "Band, BC 0 (878.5 MHz down, 833.5 MHz up)", "Cells around", "Cells around",
                                     "channel 283, PN 240, active, Ec/Io -19.67 dB, heard 0 s ago",

@@ -29,8 +29,7 @@ constexpr const char* kStandardInput = "-";
 class CaptureRecords final : public InputRecords {
 public:
     /// `size`: of the file, where it lies there as it is read.
-    CaptureRecords(CaptureReader reader, std::optional<std::uint64_t> size)
-        : _reader(std::move(reader)), _size(size) {}
+    CaptureRecords(CaptureReader reader, std::optional<std::uint64_t> size) : _reader(std::move(reader)), _size(size) {}
     Result<std::optional<CapturePacket>> next() override {
         auto packet = _reader.next();
         if (packet && *packet) _read += kPacketHeader + (*packet)->bytes.size();

@@ -91,8 +91,7 @@ public:
     /// Throws what CLI11 throws.
     ModemOptions read(int argc, const char* const* argv) {
         _app.parse(argc, argv);
-        if (_simulate->count() > 0)
-            _options.simulate = *technologyBy(&TechnologyNames::word, std::string_view(_word));
+        if (_simulate->count() > 0) _options.simulate = *technologyBy(&TechnologyNames::word, std::string_view(_word));
         if (_generation->count() > 0) _options.generation = generationOf(_options.simulate, _year);
         _options.faults = *Faults::parse(_faults);
         return _options;

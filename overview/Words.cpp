@@ -3,6 +3,7 @@
 #include <fmt/format.h>
 
 #include <algorithm>
+#include <cmath>
 
 namespace kelvo::overview {
 
@@ -16,8 +17,9 @@ std::string ageText(Time then, Time now) {
 
 std::string differenceText(const std::optional<Measure>& level, const std::optional<Measure>& serving) {
     if (!level || !serving || level->name != serving->name) return {};
-    return fmt::format("{:+.2f}{}", level->figure.number - serving->figure.number,
-                       level->figure.unit.empty() ? "" : " dB");
+    const double difference = level->figure.number - serving->figure.number;
+    const bool isNothing = std::abs(difference) < 0.005;  // which would print as "-0.00" half of the time
+    return fmt::format("{:+.2f}{}", isNothing ? 0.0 : difference, level->figure.unit.empty() ? "" : " dB");
 }
 
 std::string changeText(const std::string& from, const std::string& to, std::string_view arrow) {

@@ -24,6 +24,7 @@ TEST(OverviewWords, AnAgeIsInSecondsThenMinutesThenHoursThenDays) {
 TEST(OverviewWords, ADifferenceIsOfLevelsOfOneKind) {
     EXPECT_EQ(differenceText(level("RSRP", -92.25, "dBm"), level("RSRP", -95.5, "dBm")), "+3.25 dB");
     EXPECT_EQ(differenceText(level("RSCP", 0.125, ""), level("RSCP", 0.25, "")), "-0.12");
+    EXPECT_EQ(differenceText(level("RSCP", 0.125, ""), level("RSCP", 0.12890625, "")), "+0.00");
     EXPECT_EQ(differenceText(level("RSCP", -92, "dBm"), level("RSRP", -95, "dBm")), "");
     EXPECT_EQ(differenceText(level("RSRP", -92, "dBm"), std::nullopt), "");
 }

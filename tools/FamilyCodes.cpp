@@ -2,11 +2,10 @@
 
 #include <algorithm>
 
-#include "LogGenerator/Factory.h"
 #include "LogGenerator/Framing.h"
-#include "platform/system/Environment.h"
 #include "platform/telephony/LogChannelProtocol.h"
 #include "platform/values/Array.h"
+#include "tools/QuietDecoder.h"
 
 namespace kelvo {
 
@@ -35,10 +34,8 @@ FamilyCodes::FamilyCodes(const Dictionary& startCommand) {
 }
 
 FamilyCodes FamilyCodes::of(Technology technology) {
-    Environment silent = Environment::current();
-    silent.log = nullptr;  // generators tell of themselves
-    const Environment::Scope scope(silent);
-    return FamilyCodes(*generatorFromTechnology(namesOf(technology).identifier)->getStartCommand());
+    const QuietDecoder decoder(technology);
+    return FamilyCodes(*decoder.generator().getStartCommand());
 }
 
 bool FamilyCodes::include(ByteView message) const {

@@ -2,21 +2,14 @@
 
 #include <limits>
 
-#include "LogGenerator/Factory.h"
-#include "platform/system/Environment.h"
-#include "platform/values/Dictionary.h"
 #include "tools/CapturePackets.h"
+#include "tools/QuietDecoder.h"
 
 namespace kelvo {
 
 FollowedCapture followCapture(Input& input) {
     const Technology technology = input.technology();
-    Environment silent = Environment::current();
-    silent.log = nullptr;
-    const Environment::Scope scope(silent);
-    const auto generator = generatorFromTechnology(namesOf(technology).identifier);
-    generator->limitRawLog(0);
-    const DictionaryRef state = Dictionary::make();
+    const QuietDecoder decoder(technology);
     RecordLedger records;
     FollowedCapture followed;
     followed.tracker =
@@ -24,8 +17,8 @@ FollowedCapture followCapture(Input& input) {
     while (const auto packet = input.next()) {
         followed.end = std::chrono::floor<std::chrono::microseconds>(packet->time);
         orTell(input.name(), input.count(),
-               [&] { update(*generator, *state, records, packet->bytes, packet->time.time_since_epoch()); });
-        followed.tracker.note(overview::observe(technology, (*state)["Display"]), followed.end);
+               [&] { update(decoder.generator(), decoder.state(), records, packet->bytes, packet->time.time_since_epoch()); });
+        followed.tracker.note(overview::observe(technology, decoder.display()), followed.end);
     }
     followed.messages = input.count();
     followed.breakOff = input.breakOff();

@@ -2,23 +2,17 @@
 
 #include <algorithm>
 
-#include "LogGenerator/Factory.h"
 #include "LogGenerator/RecordBeingShown.h"
-#include "platform/system/Environment.h"
 #include "tools/CapturePackets.h"
+#include "tools/QuietDecoder.h"
 #include "tools/export/DisplayReadings.h"
 
 namespace kelvo {
 
 ReadInput readReadings(Input& input, std::size_t number, const Choice& choice, ValueGlobs& globs, ReadingRows& rows,
                        const std::function<bool()>& goesOn) {
-    Environment silent = Environment::current();
-    silent.log = nullptr;
-    const Environment::Scope scope(silent);
     const Technology technology = input.technology();
-    const auto generator = generatorFromTechnology(namesOf(technology).identifier);
-    generator->limitRawLog(0);
-    const DictionaryRef state = Dictionary::make();
+    const QuietDecoder decoder(technology);
     DisplayReadings readings(technology, choice, globs, rows);
     ReadInput read{.number = number, .name = input.name(), .technology = technology};
     while (goesOn()) {
@@ -27,7 +21,7 @@ ReadInput readReadings(Input& input, std::size_t number, const Choice& choice, V
         try {
             orTell(input.name(), input.count(), [&] {
                 const RecordBeingShown::Scope shown(input.count());
-                generator->updateState(*state, packet->bytes);
+                decoder.generator().updateState(decoder.state(), packet->bytes);
             });
         } catch (const CommandFailure& end) {
             read.breakOff = end.what();
@@ -41,7 +35,7 @@ ReadInput readReadings(Input& input, std::size_t number, const Choice& choice, V
                        .code = codeOf(technology, packet->bytes),
                        .record = input.count(),
                        .input = number},
-                      (*state)["Display"]);
+                      decoder.display());
     }
     readings.end();
     if (input.breakOff() && goesOn()) read.breakOff = input.breakOff()->reason;

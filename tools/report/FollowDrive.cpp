@@ -5,11 +5,9 @@
 #include <filesystem>
 #include <limits>
 
-#include "LogGenerator/Factory.h"
-#include "platform/system/Environment.h"
-#include "platform/values/Dictionary.h"
 #include "tools/CapturePackets.h"
 #include "tools/FamilyCodes.h"
+#include "tools/QuietDecoder.h"
 #include "tools/report/DriveRecorder.h"
 #include "tools/report/Words.h"
 
@@ -87,16 +85,11 @@ std::string withoutFolder(std::string sentence, const std::string& path, const s
 
 Drive followDrive(Input& input, RecordSharer* sharer, const std::function<void()>& afterEach) {
     const Technology technology = input.technology();
-    Environment silent = Environment::current();
-    silent.log = nullptr;
-    const Environment::Scope scope(silent);
-    const auto generator = generatorFromTechnology(namesOf(technology).identifier);
-    generator->limitRawLog(0);
-    const DictionaryRef state = Dictionary::make();
+    const QuietDecoder decoder(technology);
     RecordLedger records;
     overview::Tracker tracker({.events = 2000, .span = overview::Time::duration::max()});
     BothClocks clocks;
-    Unread unread(*generator);
+    Unread unread(decoder.generator());
     std::uint64_t leftOut = 0;
     while (const auto packet = input.next()) {
         afterEach();
@@ -113,8 +106,8 @@ Drive followDrive(Input& input, RecordSharer* sharer, const std::function<void()
         }
         const auto time = std::chrono::floor<std::chrono::microseconds>(clock);
         orTell(input.name(), input.count(),
-               [&] { update(*generator, *state, records, message, clock.time_since_epoch()); });
-        tracker.note(overview::observe(technology, (*state)["Display"]), time);
+               [&] { update(decoder.generator(), decoder.state(), records, message, clock.time_since_epoch()); });
+        tracker.note(overview::observe(technology, decoder.display()), time);
         clocks.note(tracker, time);
         unread.note(records, message);
     }

@@ -3,6 +3,8 @@
 #include <algorithm>
 #include <array>
 
+#include "LogGenerator/PhoneServices/PhoneCodes.h"
+#include "LogGenerator/PhoneServices/SimFiles.h"
 #include "platform/encodings/PropertyList.h"
 #include "platform/telephony/TelephonyConstants.h"
 #include "tools/share/SharedKeys.h"
@@ -11,14 +13,6 @@ namespace kelvo {
 
 namespace {
 
-constexpr LogCode kSimFiles = 0xFF0000;
-constexpr LogCode kCells = 0xFF0001;
-constexpr LogCode kContexts = 0xFF0002;
-
-struct SimFile {
-    std::string_view file;
-    std::string_view label;  ///< of the screens
-};
 struct CellKey {
     std::string_view key;
     std::string_view name;
@@ -26,22 +20,6 @@ struct CellKey {
 };
 
 // clang-format off
-constexpr SimFile kFiles[] = {
-    { "kSimFile_ICCID",    "EF-ICCID"                        },
-    { "kSimFile_MSISDN",   "EF-MSISDN"                       },
-    { "kSimFile_MBDN",     "EF-3GPP MAIL BOX DIALING NUMBER" },
-    { "kSimFile_HPPLMN",   "EF-HPPLMN SEARCH PERIOD"         },
-    { "kSimFile_LOCI",     "EF-LOCI"                         },
-    { "kSimFile_PSLOCI",   "EF-GPRS/PS-LOCI"                 },
-    { "kSimFile_ACC",      "EF-ACCESS CONTROL CLASS"         },
-    { "kSimFile_AD",       "EF-ADMINISTRATIVE DATA"          },
-    { "kSimFile_FPLMN",    "EF-FPLMN"                        },
-    { "kSimFile_AHPLMN",   "EF-ACTING HPLMN"                 },
-    { "kSimFile_RATMODE",  "EF-RAT MODE"                     },
-    { "kSimFile_PNN",      "EF-PLMN NETWORK NAME"            },
-    { "kSimFile_OPL",      "EF-OPERATOR PLMN LIST"           },
-    { "kSimFile_OPLMNAcT", "EF-OPLMNAcT"                     },
-};
 constexpr CellKey kCellKeys[] = {
     { kPLCellMonitorMCC,      "Mobile Country Code", Identity::Country        },
     { kPLCellMonitorMNC,      "Mobile Network Code", Identity::Network        },
@@ -70,13 +48,13 @@ constexpr std::string_view kUnknownForm = "value in a form that Kelvo does not k
 Value sharedFiles(Replacer& replacer, const Dictionary& files) {
     const DictionaryRef shared = Dictionary::make();
     for (const auto& [key, value] : files) {
-        const auto file = std::ranges::find(kFiles, std::string_view(key), &SimFile::file);
-        if (file == std::end(kFiles)) {
+        const auto file = std::ranges::find(kElementaryFiles, Key(key), &SimFile::key);
+        if (file == std::end(kElementaryFiles)) {
             replacer.tally().removed(kUnknownKey);
             continue;
         }
-        const auto identity = identityOf({}, file->label);
-        if (Value other = sharedValue(replacer, identity.value_or(Identity::None), file->label, value)) {
+        const auto identity = identityOf({}, file->label.text());
+        if (Value other = sharedValue(replacer, identity.value_or(Identity::None), file->label.text(), value)) {
             shared->set(key, std::move(other));
         }
     }
@@ -167,9 +145,9 @@ std::optional<Bytes> sharedPayload(Replacer& replacer, LogCode code, ByteView pa
     const Result<Value> tree = readPropertyList(payload);
     if (!tree) return std::nullopt;
     Value shared;
-    if (code == kSimFiles && tree->dictionary()) shared = sharedFiles(replacer, *tree->dictionary());
-    if (code == kCells && tree->array()) shared = sharedList(replacer, *tree, sharedCell);
-    if (code == kContexts && tree->array()) shared = sharedList(replacer, *tree, sharedContext);
+    if (code == code::kSimFiles && tree->dictionary()) shared = sharedFiles(replacer, *tree->dictionary());
+    if (code == code::kCellArray && tree->array()) shared = sharedList(replacer, *tree, sharedCell);
+    if (code == code::kPDPContexts && tree->array()) shared = sharedList(replacer, *tree, sharedContext);
     if (!shared) return std::nullopt;
     Result<Bytes> bytes = writeXmlPropertyList(shared);
     return bytes ? std::optional(*std::move(bytes)) : std::nullopt;

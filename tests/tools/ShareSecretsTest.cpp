@@ -1,8 +1,7 @@
-#include <set>
-
 #include "platform/encodings/Base64.h"
 #include "tests/support/Secrets.h"
 #include "tests/tools/SharedFiles.h"
+#include "tests/tools/share/IdentityKeys.h"
 
 namespace kelvo {
 namespace {
@@ -114,50 +113,6 @@ TEST_F(ShareSecrets, AreNotInACellMonitorsSnapshot) {
 
 // The same screens, level by level: what differs are identities.
 
-const std::set<std::string> kIdentities = {"Physical Cell ID",
-                                           "Serving Physical Cell ID",
-                                           "Serving Cell ID",
-                                           "Cell ID",
-                                           "Cell Identity",
-                                           "Tracking Area Code",
-                                           "PSC",
-                                           "BSIC ID",
-                                           "Pilot",
-                                           "Mobile Country Code",
-                                           "Mobile Network Code",
-                                           "Location Area Code",
-                                           "Routing Area Code",
-                                           "URA ID",
-                                           "Scrambling Code",
-                                           "BSIC",
-                                           "Local Area Code",
-                                           "Cell Scrambling Code",
-                                           "Serving PN Offset",
-                                           "UATI24",
-                                           "Color Code",
-                                           "System ID",
-                                           "Network ID",
-                                           "Base Station ID",
-                                           "Packet Zone ID",
-                                           "PDP Address",
-                                           "MCC",
-                                           "MNC",
-                                           "LAC",
-                                           "CellId",
-                                           "SCN",
-                                           "RAC"};
-const std::set<std::string> kFiles = {"EF-ICCID",
-                                      "EF-MSISDN",
-                                      "EF-LOCI",
-                                      "EF-3GPP MAIL BOX DIALING NUMBER",
-                                      "EF-GPRS/PS-LOCI",
-                                      "EF-ACCESS CONTROL CLASS",
-                                      "EF-FPLMN",
-                                      "EF-ACTING HPLMN",
-                                      "EF-PLMN NETWORK NAME",
-                                      "EF-OPERATOR PLMN LIST",
-                                      "EF-OPLMNAcT"};
-
 using Json = nlohmann::ordered_json;
 
 /// How many values differ that may; everything else must be the same.
@@ -185,7 +140,7 @@ int differences(const Json& one, const Json& other, const std::string& key) {
         return all;
     }
     if (one == other) return 0;
-    EXPECT_TRUE(kIdentities.contains(key) || kFiles.contains(key)) << key << ": " << one << " and " << other;
+    EXPECT_TRUE(test::namesSomebody(key)) << key << ": " << one << " and " << other;
     return 1;
 }
 

@@ -4,7 +4,6 @@
 #include <algorithm>
 #include <array>
 #include <random>
-#include <set>
 
 #include "LogGenerator/Factory.h"
 #include "platform/system/DirectoryResources.h"
@@ -13,44 +12,13 @@
 #include "tests/support/CellArray.h"
 #include "tests/support/Record.h"
 #include "tests/support/Subpackets.h"
+#include "tests/tools/share/IdentityKeys.h"
 #include "tools/share/RecordSharer.h"
 
 namespace kelvo {
 namespace {
 
 using test::Record;
-
-/// The keys under which somebody is named; everything else is a level, a state, a count, a channel.
-const std::set<std::string> kIdentities = {"Physical Cell ID",
-                                           "Serving Physical Cell ID",
-                                           "Serving Cell ID",
-                                           "Cell ID",
-                                           "Cell Identity",
-                                           "Tracking Area Code",
-                                           "PSC",
-                                           "BSIC ID",
-                                           "Pilot",
-                                           "Mobile Country Code",
-                                           "Mobile Network Code",
-                                           "Location Area Code",
-                                           "Routing Area Code",
-                                           "URA ID",
-                                           "Scrambling Code",
-                                           "BSIC",
-                                           "Local Area Code",
-                                           "Cell Scrambling Code",
-                                           "Serving PN Offset",
-                                           "UATI24",
-                                           "Color Code",
-                                           "System ID",
-                                           "Network ID",
-                                           "Base Station ID",
-                                           "Packet Zone ID",
-                                           "EF-ICCID",
-                                           "EF-MSISDN",
-                                           "EF-LOCI",
-                                           "EF-ACTING HPLMN",
-                                           "PDP Address"};
 
 class Random {
 public:
@@ -177,7 +145,7 @@ protected:
 
     void compareTexts(const std::string& original, const std::string& shared, const std::string& key,
                       const std::string& path) {
-        if (!kIdentities.contains(key)) {
+        if (!test::namesSomebody(key)) {
             EXPECT_EQ(original, shared) << path;
         } else {
             EXPECT_EQ(original.size(), shared.size()) << path << ": " << original << " and " << shared;

@@ -16,8 +16,9 @@ FollowedCapture followCapture(Input& input) {
         overview::Tracker({.events = std::numeric_limits<std::size_t>::max(), .span = overview::Time::duration::max()});
     while (const auto packet = input.next()) {
         followed.end = std::chrono::floor<std::chrono::microseconds>(packet->time);
-        orTell(input.name(), input.count(),
-               [&] { update(decoder.generator(), decoder.state(), records, packet->bytes, packet->time.time_since_epoch()); });
+        orTell(input.name(), input.count(), [&] {
+            update(decoder.generator(), decoder.state(), records, packet->bytes, packet->time.time_since_epoch());
+        });
         followed.tracker.note(overview::observe(technology, decoder.display()), followed.end);
     }
     followed.messages = input.count();

@@ -295,11 +295,10 @@ void addExportCommand(CLI::App& app) {
     command.add_flag("--force", options->force, "Replaces a file that is there already");
     command.footer(
         "A row is a reading: a record has written the value, whether or not it changed. Its columns: time (UTC, the\n"
-        "record's own), technology, path (the rows of a list by their cell), text as on the screens, number, unit, "
-        "the\n"
-        "record's code and its number. In a glob * is any text, ? one letter; capitals do not matter.\n"
-        "Of an input that breaks off the good part is written; then one line tells where it ends, and the status is "
-        "1.\n"
+        "record's own), technology, path (the rows of a list by their cell), text as on the screens, number, unit,\n"
+        "the record's code and its number. In a glob * is any text, ? one letter; capitals do not matter.\n"
+        "Of an input that breaks off the good part is written; then one line tells where it ends, and the status\n"
+        "is 1.\n"
         "Ctrl-C leaves whole rows, and a whole database of what was read.\n\n"
         "Examples:\n"
         "  kelvoctl export drive.pcap > drive.csv\n"

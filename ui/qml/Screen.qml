@@ -8,8 +8,8 @@ FocusScope {
     id: screen
 
     required property KelvoApp application
-    property SaveSheet sheet: null
-    property DetailsSheet details: null
+    property var sheet: null  // a SaveSheet
+    property var details: null  // a DetailsSheet
 
     readonly property OverviewController overview: application.overview  // null where nothing is live
     readonly property bool overviewOpen: overview !== null && overview.open
@@ -23,6 +23,13 @@ FocusScope {
         const page = stack.currentItem as PanePage;
         if (details && page)
             details.rowFrame = page.frameOf(details.details.row);
+    }
+
+    // What the first frame does not show is named by its file alone, which is read when it is wanted first: a type's name
+    // would have it read, with all that it is made of, before that frame.
+    function made(file: string, owner: Item, properties: var): var {
+        const all = Object.assign({ application: application, "anchors.fill": owner }, properties);
+        return Qt.createComponent(file).createObject(owner, all);
     }
 
     function giveFocus() {
@@ -89,15 +96,22 @@ FocusScope {
         objectName: "beside"
 
         readonly property bool used: screen.wide || screen.overviewOpen || screen.arrival > 0
-        property OverviewView view: null
+        property var view: null  // an OverviewView
 
         x: screen.wide ? stack.width : (1 - screen.arrival) * screen.width
         width: screen.wide ? screen.width - stack.width : screen.width
         height: screen.height
         enabled: screen.uncovered && (screen.wide || screen.overviewOpen)
+
+        function leave() {
+            screen.overview.close();
+            stack.forceActiveFocus();
+        }
+
         onUsedChanged: {
             if (used) {
-                view = overviewView.createObject(beside) as OverviewView;
+                view = screen.made("OverviewView.qml", beside, { wide: Qt.binding(() => screen.wide), focus: true });
+                view.back.connect(leave);
             } else {
                 view.visible = false;  // it lives a moment longer
                 view.destroy();
@@ -139,41 +153,11 @@ FocusScope {
     }
 
     Component {
-        id: overviewView
-        OverviewView {
-            anchors.fill: parent
-            focus: true
-            application: screen.application
-            wide: screen.wide
-            onBack: {
-                screen.overview.close();
-                stack.forceActiveFocus();
-            }
-        }
-    }
-
-    Component {
         id: page
         PanePage {
             navigation: screen.application.navigation
             overview: screen.overview
             wide: screen.wide
-        }
-    }
-
-    Component {
-        id: saveSheet
-        SaveSheet {
-            application: screen.application
-            anchors.fill: parent
-        }
-    }
-
-    Component {
-        id: detailsSheet
-        DetailsSheet {
-            application: screen.application
-            anchors.fill: parent
         }
     }
 
@@ -208,7 +192,7 @@ FocusScope {
         target: screen.application
 
         function onSaveViewPresented(presented: KelvoSaveViewController) {
-            screen.sheet = saveSheet.createObject(screen, { "saveView": presented }) as SaveSheet;
+            screen.sheet = screen.made("SaveSheet.qml", screen, { saveView: presented });
             screen.giveFocus();
         }
         function onSaveViewDismissed() {
@@ -218,7 +202,7 @@ FocusScope {
         }
         function onDetailsPresented(presented: DetailsController) {
             const page = stack.currentItem as PanePage;
-            screen.details = detailsSheet.createObject(screen, { "details": presented, "rowFrame": page.frameOf(presented.row) }) as DetailsSheet;
+            screen.details = screen.made("DetailsSheet.qml", screen, { details: presented, rowFrame: page.frameOf(presented.row) });
             screen.giveFocus();
         }
         function onDetailsDismissed() {

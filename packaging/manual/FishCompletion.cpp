@@ -21,8 +21,10 @@ std::string offered(const Choice& choice) {
     }
     if (choice.files) {
         if (!commands.empty()) commands += "; ";
-        commands += choice.suffixes.empty() ? "__fish_complete_path (commandline -ct)" : "__fish_complete_suffix";
-        for (const std::string& suffix : choice.suffixes) commands += " ." + suffix;
+        if (choice.suffixes.empty()) commands += "__fish_complete_path (commandline -ct)";
+        // It takes one suffix; of two words the first would be what is completed.
+        for (const std::string& suffix : choice.suffixes)
+            commands += (&suffix == choice.suffixes.data() ? "" : "; ") + ("__fish_complete_suffix ." + suffix);
     }
     if (commands.empty()) return " -x";
     return fmt::format(" -k -x -a {}", quoted("(" + commands + ")"));

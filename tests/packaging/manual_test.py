@@ -96,6 +96,8 @@ class Completion(unittest.TestCase):
         self.assertEqual(self.offered("kelvo-modem --faults noise,fl"), {self.before_comma + word for word in ("flipped-bits", "flood")})
         self.assertEqual(self.offered("kelvoctl explain Srx"), {"Srxlev"})
         self.assertEqual(self.offered("kelvo --vers"), {"--version"})
+        self.assertEqual(self.offered("kelvo dr"), {"drive.pcap"})
+        self.assertEqual(self.offered("kelvo sa"), {"saved.kelvo"})
 
     before_comma = "noise,"
 

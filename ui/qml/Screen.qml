@@ -11,10 +11,11 @@ FocusScope {
     property var sheet: null  // a SaveSheet
     property var details: null  // a DetailsSheet
 
-    readonly property OverviewController overview: application.overview
-    readonly property bool wide: width >= 900  // for the panes and the overview side by side
+    readonly property OverviewController overview: application.overview  // null where nothing is live
+    readonly property bool overviewOpen: overview !== null && overview.open
+    readonly property bool wide: overview !== null && width >= 900  // for the panes and the overview side by side
     readonly property bool uncovered: !sheet && !details && !alert.shown
-    property real arrival: overview.open ? 1 : 0  // of the overview over the panes
+    property real arrival: overviewOpen ? 1 : 0  // of the overview over the panes
 
     focus: true
     onWideChanged: giveFocus()
@@ -38,7 +39,7 @@ FocusScope {
             sheet.forceActiveFocus();
         else if (details)
             details.forceActiveFocus();
-        else if (overview.open)
+        else if (overviewOpen)
             beside.forceActiveFocus();
         else
             stack.forceActiveFocus();
@@ -46,7 +47,7 @@ FocusScope {
 
     // False where nothing lies behind.
     function back(): bool {
-        if (wide || !overview.open)
+        if (wide || !overviewOpen)
             return application.navigation.popViewController();
         overview.close();
         return true;
@@ -69,7 +70,7 @@ FocusScope {
         width: screen.wide ? Math.max(400, Math.min(640, screen.width - 560)) : screen.width  // 640 is what rows use
         height: screen.height
         focus: true
-        enabled: screen.uncovered && (screen.wide || !screen.overview.open)
+        enabled: screen.uncovered && (screen.wide || !screen.overviewOpen)
 
         pushEnter: Slide { property: "x"; from: stack.width; to: 0 }
         pushExit: Slide { property: "x"; from: 0; to: -stack.width / 3 }
@@ -94,13 +95,13 @@ FocusScope {
         id: beside
         objectName: "beside"
 
-        readonly property bool used: screen.wide || screen.overview.open || screen.arrival > 0
+        readonly property bool used: screen.wide || screen.overviewOpen || screen.arrival > 0
         property var view: null  // an OverviewView
 
         x: screen.wide ? stack.width : (1 - screen.arrival) * screen.width
         width: screen.wide ? screen.width - stack.width : screen.width
         height: screen.height
-        enabled: screen.uncovered && (screen.wide || screen.overview.open)
+        enabled: screen.uncovered && (screen.wide || screen.overviewOpen)
 
         function leave() {
             screen.overview.close();
@@ -121,8 +122,8 @@ FocusScope {
 
     Shortcut {
         sequence: "Ctrl+O"
-        enabled: screen.uncovered
-        onActivated: screen.overview.open ? screen.giveFocus() : screen.overview.show()
+        enabled: screen.uncovered && screen.overview !== null
+        onActivated: screen.overviewOpen ? screen.giveFocus() : screen.overview.show()
     }
 
     Shortcut {

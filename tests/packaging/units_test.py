@@ -64,6 +64,13 @@ class Devices(unittest.TestCase):
             self.assertEqual(said["DevicePolicy"], ["closed"])
             self.assertEqual(said["DeviceAllow"], ["char-ttyUSB rw", "char-ttyACM rw", "char-ttyHS rw", "/dev/diag rw"])
 
+    def test_it_writes_nowhere_but_where_it_says(self):
+        for unit, paths in (("system/kelvo-telephonyd@.service", "/run/kelvo-telephonyd/%i/runtime"),
+                            ("user/kelvo-telephonyd.service", "%t/kelvo -%h/.local/state/kelvo")):
+            said = entries(UNITS / unit)
+            self.assertEqual((said["ProtectSystem"], said["ProtectHome"], said["ReadWritePaths"]),
+                             (["strict"], ["read-only"], [paths]))
+
     def test_the_service_is_watched_and_comes_back(self):
         for unit in ("system/kelvo-telephonyd@.service", "user/kelvo-telephonyd.service"):
             said = entries(UNITS / unit)

@@ -22,9 +22,13 @@ constexpr Time kWorthTelling = 10s;         // between the last refresh and the 
 constexpr std::size_t kMostRefreshes = 5;   // that a snapshot keeps
 constexpr std::size_t kEnoughValues = 200;  // to know a family by
 
+/// None for what is no date, and for one outside the 292 years that the clock has on either side of 1970.
 std::optional<Time> timeOf(const std::optional<std::string>& date) {
+    constexpr auto kFirst = std::chrono::ceil<std::chrono::seconds>(Clock::TimePoint::min());
+    constexpr auto kLast = std::chrono::floor<std::chrono::seconds>(Clock::TimePoint::max());
     const auto told = date ? dateFromDescription(*date) : std::nullopt;
-    return told ? std::optional<Time>(told->time_since_epoch()) : std::nullopt;
+    if (!told || *told < kFirst || *told > kLast) return std::nullopt;
+    return Time(told->time_since_epoch());
 }
 
 std::string dayAndTime(Time since1970) {

@@ -58,6 +58,15 @@ TEST_F(SavedScreensOf, AFileWithoutTimesDoNotMakeOneUp) {
     EXPECT_TRUE(screens->trends().changes(kRsrp).empty());
 }
 
+TEST_F(SavedScreensOf, AFileOfTimesBeyondTheClockDoNotMakeOneUpEither) {
+    for (const char* year : {"0000", "1600", "2300", "7073", "9999"}) {
+        std::string file = snapshotXml(refreshXml(year + std::string("-03-04 09:15:00 +0000"), "-95.00 dBm", "17"), "");
+        file.replace(file.find("2011-03-04 09:15:02"), 4, year);
+        EXPECT_EQ(savedScreens(file)->savedText(), "Snapshot of an unknown time") << year;
+        EXPECT_TRUE(savedScreens(file)->trends().changes(kRsrp).empty()) << year;
+    }
+}
+
 TEST_F(SavedScreensOf, ASnapshotKnowWhatStoodThereBefore) {
     using std::chrono::seconds;
     const auto screens = savedScreens(sampleSnapshot());

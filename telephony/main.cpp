@@ -141,7 +141,7 @@ int tellStatus(bool json) {
     const auto port = ports.openRemote(kPLTelephonyServicePort);
     if (!port) return fail({"no telephony service is running"});
     const auto request = writeXmlPropertyList(Dictionary::make({{kPLGetStatus, kPLGetStatus}}));
-    const auto answer = port->request(0, *request, 1s, 1s);
+    const auto answer = port->request(0, *request, 1s, 10s);  // it may have to start for it
     if (!answer) return fail({"the telephony service does not answer"});
     const auto read = readPropertyList(*answer);
     if (!read) return fail(read.error());

@@ -19,13 +19,10 @@ std::string offered(const Choice& choice) {
         for (const std::string& word : choice.words) commands += " " + quoted(word);
         if (choice.listed) commands = "__fish_append , (" + commands + ")";
     }
-    if (choice.files) {
-        if (!commands.empty()) commands += "; ";
-        if (choice.suffixes.empty()) commands += "__fish_complete_path (commandline -ct)";
-        // It takes one suffix; of two words the first would be what is completed.
-        for (const std::string& suffix : choice.suffixes)
-            commands += (&suffix == choice.suffixes.data() ? "" : "; ") + ("__fish_complete_suffix ." + suffix);
-    }
+    const auto add = [&](const std::string& command) { commands += (commands.empty() ? "" : "; ") + command; };
+    if (choice.files && choice.suffixes.empty()) add("__fish_complete_path (commandline -ct)");
+    if (choice.files)  // one at a time: of two words, the first is taken for the beginning of the name
+        for (const std::string& suffix : choice.suffixes) add("__fish_complete_suffix ." + suffix);
     if (commands.empty()) return " -x";
     return fmt::format(" -k -x -a {}", quoted("(" + commands + ")"));
 }

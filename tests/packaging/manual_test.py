@@ -96,7 +96,15 @@ class Completion(unittest.TestCase):
         self.assertEqual(self.offered("kelvo-modem --faults noise,fl"), {self.before_comma + word for word in ("flipped-bits", "flood")})
         self.assertEqual(self.offered("kelvoctl explain Srx"), {"Srxlev"})
         self.assertEqual(self.offered("kelvo --vers"), {"--version"})
+        self.assertEqual(self.offered("kelvoctl export --format "), {"csv", "jsonl", "sqlite", "influx"})
+        self.assertEqual(self.offered("kelvoctl export --wi"), {"--wide"})
+        self.assertEqual(self.offered("kelvoctl doctor --ud"), {"--udev-rule"})
+        self.assertEqual(self.offered("kelvoctl start-command --technology u"), {"utran"})
+        self.assertEqual(self.offered("kelvoctl share sa"), {"saved.kelvo"})
+        for command in ("export", "report", "share", "events"):
+            self.assertEqual((command, self.offered(f"kelvoctl {command} dr")), (command, {"drive.pcap"}))
         self.assertEqual(self.offered("kelvo dr"), {"drive.pcap"})
+        self.assertEqual(self.offered("kelvo-modem --replay ro"), {"road.frames"})
         self.assertEqual(self.offered("kelvo sa"), {"saved.kelvo"})
 
     before_comma = "noise,"

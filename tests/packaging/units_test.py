@@ -36,15 +36,13 @@ class Units(unittest.TestCase):
         directory = tempfile.TemporaryDirectory()
         self.addCleanup(directory.cleanup)
         self.directory = Path(directory.name)
-        for unit in UNITS.glob("*/kelvo-telephonyd*"):
-            shutil.copy(unit, self.directory)
-        # A template is looked at for somebody.
-        (self.directory / "kelvo-telephonyd@somebody.service").write_text(
-            (UNITS / "system/kelvo-telephonyd@.service").read_text())
+        for unit in UNITS.glob("*/kelvo-*"):
+            # A template is looked at for somebody.
+            shutil.copy(unit, self.directory / unit.name.replace("@.", "@somebody."))
 
     def test_are_understood(self):
         for manager, units in (("--user", ["kelvo-telephonyd.socket", "kelvo-telephonyd.service"]),
-                               ("--system", ["kelvo-telephonyd@somebody.service"])):
+                               ("--system", ["kelvo-session@somebody.service", "kelvo-telephonyd@somebody.service"])):
             status, _, said = analyze(manager, "verify", "--man=no", "--recursive-errors=no",
                                       *(self.directory / unit for unit in units))
             said = "\n".join(line for line in said.splitlines() if "kelvo" in line)
@@ -66,10 +64,35 @@ class Devices(unittest.TestCase):
             self.assertEqual(said["DevicePolicy"], ["closed"])
             self.assertEqual(said["DeviceAllow"], ["char-ttyUSB rw", "char-ttyACM rw", "char-ttyHS rw", "/dev/diag rw"])
 
+    def test_it_writes_nowhere_but_where_it_says(self):
+        for unit, paths in (("system/kelvo-telephonyd@.service", "/run/kelvo-telephonyd/%i/runtime"),
+                            ("user/kelvo-telephonyd.service", "%t/kelvo -%h/.local/state/kelvo")):
+            said = entries(UNITS / unit)
+            self.assertEqual((said["ProtectSystem"], said["ProtectHome"], said["ReadWritePaths"]),
+                             (["strict"], ["read-only"], [paths]))
+
     def test_the_service_is_watched_and_comes_back(self):
         for unit in ("system/kelvo-telephonyd@.service", "user/kelvo-telephonyd.service"):
             said = entries(UNITS / unit)
             self.assertEqual((said["Type"], said["WatchdogSec"], said["Restart"]), (["notify"], ["30"], ["on-failure"]))
+
+    def test_what_it_refuses_to_start_with_is_not_tried_again_and_again(self):
+        for unit in ("system/kelvo-telephonyd@.service", "user/kelvo-telephonyd.service"):
+            said = entries(UNITS / unit)
+            self.assertEqual(said["RestartPreventExitStatus"], ["1"])
+            self.assertEqual((said["StartLimitIntervalSec"], said["StartLimitBurst"]), (["60"], ["20"]))
+        self.assertEqual(entries(UNITS / "user/kelvo-telephonyd.socket")["FlushPending"], ["yes"])
+
+    def test_from_boot_on_another_unit_opens_the_session(self):
+        """Who opens one leaves his unit's control group, and its rules for devices."""
+        said = entries(UNITS / "system/kelvo-telephonyd@.service")
+        self.assertNotIn("PAMName", said)
+        self.assertEqual(said["Requires"], ["kelvo-session@%i.service"])
+        self.assertIn("kelvo-session@%i.service", said["After"][0].split())
+        self.assertEqual(said["Environment"], ["XDG_RUNTIME_DIR=/run/kelvo-telephonyd/%i/runtime"])
+        session = entries(UNITS / "system/kelvo-session@.service")
+        self.assertEqual((session["User"], session["PAMName"]), (["%i"], ["login"]))
+        self.assertEqual(session["StopWhenUnneeded"], ["yes"])
 
     def test_nobody_else_reaches_the_users_socket(self):
         said = entries(UNITS / "user/kelvo-telephonyd.socket")

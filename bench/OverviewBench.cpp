@@ -50,6 +50,7 @@ void tell(std::vector<double> times, const char* what) {
 
 void measure(test::Scene& scene, const char* what) {
     std::vector<double> refreshes;
+    std::vector<double> changes;
     std::vector<double> frames;
     for (std::uint32_t at = 0; at < kRefreshes; ++at) {
         scene.ports.deliver(KelvoModel::kLogChannelPortName, 0, measurement(at, 300 + at / 10 % 7));
@@ -59,10 +60,12 @@ void measure(test::Scene& scene, const char* what) {
         const double refreshed = processorMs();
         scene.view().grabWindow();
         refreshes.push_back(refreshed - before);
+        if (at % 10 == 0) changes.push_back(refreshed - before);
         frames.push_back(processorMs() - refreshed);
     }
     fmt::print("{}\n", what);
     tell(std::move(refreshes), "refresh");
+    tell(std::move(changes), "refresh with another serving cell");
     tell(std::move(frames), "frame after it");
 }
 

@@ -9,6 +9,7 @@
 #include "model/Connection.h"
 #include "model/KelvoModelNode.h"
 #include "model/Provenance.h"
+#include "model/ShownValues.h"
 #include "model/Trends.h"
 #include "platform/encodings/PropertyList.h"
 #include "platform/system/Lifetime.h"
@@ -23,7 +24,7 @@ namespace kelvo {
 /// the generator by the technology the modem speaks, feeds it every message, and every two seconds tells the screens
 /// when there is something new. Main queue only; a start blocks it for at most five seconds: two for the channel, two
 /// for the technology, one for the start command.
-class KelvoModel {
+class KelvoModel final : public ShownValues {
 public:
     /// The name of the local port on which the service delivers to the application.
     static constexpr const char* kLogChannelPortName = "com.zorvik.BasebandStateReport.LogChannel";
@@ -47,7 +48,7 @@ public:
     };
 
     explicit KelvoModel(Services services);
-    ~KelvoModel();
+    ~KelvoModel() override;
     KelvoModel(const KelvoModel&) = delete;
     KelvoModel& operator=(const KelvoModel&) = delete;
 
@@ -69,9 +70,9 @@ public:
     /// The node at `path`, of a tree built as for `topLevelNodes`; none when the tree has no such node.
     NodeRef nodeAtPath(const std::string& path);
     /// As `nodeAtPath`, of the tree that is there; none while the next one is not built yet.
-    NodeRef shownNodeAtPath(const std::string& path) const { return _nodesByPath.find(path); }
+    NodeRef shownNodeAtPath(const std::string& path) const override { return _nodesByPath.find(path); }
     /// The family whose screens these are: the first that was spoken; none before.
-    std::optional<Technology> technology() const { return _technology; }
+    std::optional<Technology> technology() const override { return _technology; }
     /// What the modem speaks that was connected last; another than the screens' when it was exchanged. None before.
     std::optional<Technology> spokenTechnology() const { return _spokenTechnology; }
     /// The values of the screens as they are now, without a refresh; none before the first record.
@@ -81,11 +82,11 @@ public:
     /// How often a connection has come: one that went and came back between two looks is another.
     std::uint64_t connectionCount() const { return _connectionCount; }
     /// How the values have gone; each rebuild of the tree is one refresh of them. Their time is that of the main queue.
-    const Trends& trends() const { return _trends; }
-    Trends::Time trendTime() const;
+    const Trends& trends() const override { return _trends; }
+    Trends::Time trendTime() const override;
     /// Where a node's value comes from; none when no record has written it, or another has written in its place since
     /// the tree was built. Ages go on while no records come and when the connection is lost.
-    std::optional<Provenance> provenance(const KelvoModelNode& node) const;
+    std::optional<Provenance> provenance(const KelvoModelNode& node) const override;
     /// The stream's time now: that of the records, going on by the clock behind the last one.
     std::chrono::microseconds streamTime() const { return _records.streamTime(_services.queue.now()); }
     /// Hands one message of the log channel to the generator.

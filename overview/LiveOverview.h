@@ -21,6 +21,10 @@ public:
     static constexpr Trend::Time kSpan = std::chrono::minutes(2);  ///< of the lines
     static constexpr std::size_t kMostPoints = 128;                ///< of each; refreshes come every two seconds
 
+    /// Of several carriers the serving one is told again within it: a refresh shows the last of many records. Still
+    /// shorter than a level is fresh, so that a change after it is the handover that it was.
+    static constexpr auto kTurn = std::chrono::seconds(27);
+
     struct Point {
         Trend::Time at{0};
         double number = 0;  ///< in the line's unit
@@ -68,7 +72,7 @@ private:
     void forgetOld();
 
     const KelvoModel& _model;
-    Tracker _tracker;
+    Tracker _tracker{Tracker::Limits{.turn = kTurn}};
     Time _latest{};  // the stream's time never goes back here
     Line _level;
     Line _quality;

@@ -196,10 +196,14 @@ void Tracker::complete(Event& event, std::string_view name, const std::string& n
 }
 
 /// Of several carriers that are told in turn the first stays the serving one for as long as it is told, and the others
-/// are cells beside it. What a record left out stands as it was, and ages.
+/// are cells beside it; another cell on its own channel takes its place at once. What a record left out stands as it
+/// was, and ages.
 void Tracker::keepServing() {
     const bool isOther = !_before.cell.empty() && _seen.cell != _before.cell;
-    if (isOther && _seen.cellIsOneOfSeveral && _before.cellIsOneOfSeveral && _now - _servingTold <= kTurn) {
+    const bool isTold = std::exchange(_carrierRecord, _seen.cellRecord) != _seen.cellRecord;
+    const bool isCarrier =
+        isOther && _seen.cellIsOneOfSeveral && (_seen.channel.empty() || _seen.channel != _before.channel);
+    if (isCarrier && (!isTold || _now - _servingTold <= _limits.turn)) {
         _seen.cells.push_back({_seen.cell, "active", _seen.level, _seen.quality, _seen.cellRecord});
         _seen.cell = _before.cell;
         _seen.cellRecord = _before.cellRecord;

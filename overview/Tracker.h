@@ -24,13 +24,16 @@ public:
     static constexpr auto kHeardFor = std::chrono::seconds(30);     ///< a cell stays that long after it was heard
     static constexpr auto kLostFor = std::chrono::seconds(10);      ///< and that much longer, marked
     static constexpr auto kSettling = std::chrono::seconds(2);      ///< within which several records tell of one change
-    static constexpr auto kTurn = std::chrono::milliseconds(500);   ///< within which each of several carriers is told
+    static constexpr auto kTurn = std::chrono::milliseconds(500);   ///< of carriers, where every record is seen
     static constexpr auto kMoment = std::chrono::milliseconds(10);  ///< within which all belong to one step of a modem
     static constexpr double kSteady = 2.0;                          ///< dB by which a cell overtakes the one above
 
     struct Limits {
         std::size_t events = 2000;
         Time::duration span = std::chrono::hours(24);  ///< of them
+        /// Of several carriers that are told in turn, the serving one is told again within it. Who sees one record of
+        /// many must wait for longer.
+        Time::duration turn = kTurn;
     };
 
     Tracker() = default;
@@ -101,6 +104,7 @@ private:
     Followed _quality;
     std::string _area;                      // the last that was known
     Time _servingTold{};                    // when a record named the serving cell last
+    std::uint64_t _carrierRecord = 0;       // the last that named it or another carrier's
     std::optional<Time> _connectedSince;    // as the last state said that was known
     std::optional<Time> _leftConnected;     // a cell, and the state in the new one is not known yet
     std::optional<bool> _isWithoutService;  // none while the screens have not told

@@ -4,10 +4,10 @@
 #include <string>
 #include <vector>
 
+#include "model/SnapshotFile.h"
 #include "platform/host/Capture.h"
 #include "platform/system/OutputFile.h"
 #include "platform/telephony/Technology.h"
-#include "tools/SnapshotFile.h"
 
 namespace kelvo {
 

@@ -12,8 +12,8 @@
 #include "tools/DisplayJson.h"
 #include "tools/DisplayText.h"
 #include "tools/NumberOption.h"
+#include "tools/ReadSnapshot.h"
 #include "tools/SnapshotCapture.h"
-#include "tools/SnapshotFile.h"
 #include "tools/StandardOutput.h"
 #include "tools/TechnologyOption.h"
 
@@ -80,7 +80,7 @@ void tellOdd(const std::string& file, const std::vector<std::string>& odd) {
 }
 
 void showSnapshot(const Options& options) {
-    SnapshotFile snapshot = orFail(SnapshotFile::read(options.file));
+    SnapshotFile snapshot = orFail(readSnapshot(options.file));
     std::string text;
     if (options.entry) text += entryDisplay(snapshot, options);
     if (options.dlf) text += extractDlf(snapshot, options);

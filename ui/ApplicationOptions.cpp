@@ -12,15 +12,19 @@ namespace {
 
 constexpr const char* kFooter =
     "Without a file, what it shows comes from the telephony service, kelvo-telephonyd, and a second start brings the\n"
-    "window of the first to the front. In a terminal, \"kelvoctl watch\" shows the same screens.\n\n"
+    "window of the first to the front. A snapshot has a window of its own, which shows its screens as they were "
+    "saved.\n"
+    "What a file is, its content tells. In a terminal, \"kelvoctl watch\" and \"kelvoctl snapshot\" show the same.\n\n"
     "Examples:\n"
     "  kelvo\n"
-    "  kelvo drive.pcap\n";
+    "  kelvo drive.pcap\n"
+    "  kelvo drive.kelvo\n";
 
 struct CommandLine {
     CommandLine() {
         app.footer(kFooter);
-        app.add_option("FILE", options.capture, "A capture to replay, in a loop, instead of the service's log");
+        app.add_option("FILE", options.file,
+                       "A capture to replay, in a loop, or a saved snapshot to read, instead of the service's log");
         app.set_version_flag("--version", versionLine("kelvo"));
     }
     ApplicationOptions options;

@@ -12,7 +12,8 @@ namespace kelvo {
 
 /// What the application's command line asks for.
 struct ApplicationOptions {
-    std::optional<std::string> capture;  ///< to replay; none: the log of the telephony service
+    /// A capture to replay or a snapshot to show, as a path or a file URL; none: the log of the telephony service.
+    std::optional<std::string> file;
 };
 
 /// Options to work with, or the status to exit with at once.

@@ -15,8 +15,10 @@ double axisStep(double range, int most) {
 }
 
 AxisRange axisFor(double least, double most, int mostSteps) {
-    // A level that stands still keeps its place in the middle of an axis that is not all noise.
-    const double shortest = std::max(1.0, std::abs(most) * 1e-6);
+    // A level that stands still keeps its place in the middle of an axis that is not all noise; of parts of a whole,
+    // such as the 256ths of UTRAN's RSCP, a tenth is much.
+    const bool arePartsOfOne = std::max(std::abs(least), std::abs(most)) < 1 && (least != 0 || most != 0);
+    const double shortest = arePartsOfOne ? 0.1 : std::max(1.0, std::abs(most) * 1e-6);
     const double range = std::max(most - least, shortest);
     const double step = axisStep(range, std::max(2, mostSteps - 1));
     double low = std::floor(least / step) * step;

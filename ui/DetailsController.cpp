@@ -8,6 +8,7 @@
 #include "glossary/Glossary.h"
 #include "model/LevelGrades.h"
 #include "model/TrendWords.h"
+#include "ui/DateFormatter.h"
 #include "ui/RecordDump.h"
 #include "ui/ScreenHost.h"
 #include "ui/TrendCandidates.h"
@@ -25,11 +26,11 @@ QString modemTimeText(SystemTime time) {
 
 }  // namespace
 
-DetailsController::DetailsController(const KelvoModel& model, const std::string& path, int row, ScreenHost& host)
-    : _model(model), _host(host), _row(row) {
-    const NodeRef node = model.shownNodeAtPath(path);
+DetailsController::DetailsController(const ShownValues& values, const std::string& path, int row, ScreenHost& host)
+    : _values(values), _host(host), _row(row), _written(shown(values.savedText())) {
+    const NodeRef node = values.shownNodeAtPath(path);
     const std::string leaf = node ? leafOf(*node, path) : path;
-    _name = model.trends().nameAt(leaf);
+    _name = values.trends().nameAt(leaf);
     readMeaning(leaf);
     _title = shown(keyOfTrend(_name));
     _place = shown(placeOfTrend(_name));
@@ -42,8 +43,8 @@ std::string DetailsController::leafOf(const KelvoModelNode& node, const std::str
     int bestRank = 0;
     for (const NodeRef& child : *node.childNodes()) {
         const std::string leaf = pathByAppending(path, child->displayName());
-        const std::string name = _model.trends().nameAt(leaf);
-        const Trend trend = _model.trends().trend(name);
+        const std::string name = _values.trends().nameAt(leaf);
+        const Trend trend = _values.trends().trend(name);
         const int rank = !gradesOf(name, trend.unit).empty() ? 3 : !trend.unit.empty() ? 2 : 1;
         if (child->childNodes() != nullptr || rank <= bestRank) continue;
         best = leaf;
@@ -53,8 +54,8 @@ std::string DetailsController::leafOf(const KelvoModelNode& node, const std::str
 }
 
 void DetailsController::reload() {
-    const Trends& trends = _model.trends();
-    const NodeRef node = _model.shownNodeAtPath(trends.pathOf(_name));
+    const Trends& trends = _values.trends();
+    const NodeRef node = _values.shownNodeAtPath(trends.pathOf(_name));
     if (node && node->value() != nullptr) {
         _valueText = QString::fromStdString(*node->value());
         readProvenance(*node);
@@ -62,13 +63,13 @@ void DetailsController::reload() {
     _trend = trends.trend(_name);
     _comparison = _comparisonName.empty() ? Trend() : trends.trend(_comparisonName);
     _servingCells = trends.servingCells();
-    _now = _model.trendTime();
+    _now = _values.trendTime();
     readChanges();
     Q_EMIT changed();
 }
 
 void DetailsController::readMeaning(const std::string& path) {
-    const auto technology = _model.technology();
+    const auto technology = _values.technology();
     const Meaning* meaning = technology ? meaningAt(*technology, path) : nullptr;
     if (meaning == nullptr) return;
     _meaning = shown(meaning->sentence);
@@ -76,7 +77,7 @@ void DetailsController::readMeaning(const std::string& path) {
 }
 
 void DetailsController::readProvenance(const KelvoModelNode& node) {
-    const auto from = _model.provenance(node);
+    const auto from = _values.provenance(node);
     if (!from) return;  // what was known of the record is still true but for its age
     _written = QStringLiteral("%1 ago, by record %2")
                    .arg(QString::fromStdString(agoText(std::chrono::duration_cast<Trend::Time>(from->age))))
@@ -93,16 +94,21 @@ void DetailsController::readProvenance(const KelvoModelNode& node) {
 void DetailsController::readChanges() {
     _changes.clear();
     if (hasTrend()) return;
-    const std::vector<TrendChange> changes = _model.trends().changes(_name);
-    for (auto change = changes.rbegin(); change != changes.rend(); ++change) {
-        _changes.append(
-            QStringLiteral("%1, since %2")
-                .arg(QString::fromStdString(change->text), QString::fromStdString(agoText(_now - change->at))));
-    }
+    const std::vector<TrendChange> changes = _values.trends().changes(_name);
+    const bool isSaved = !_values.savedText().empty();
+    if (isSaved && changes.size() < 2) return;  // a saved value that stayed as it is has nothing to tell
+    for (auto change = changes.rbegin(); change != changes.rend(); ++change)
+        _changes.append(QString::fromStdString(change->text) + QStringLiteral(", ") + sinceText(change->at));
+}
+
+/// "since 12 seconds"; what was saved grows no older, and has the time of day: "from 09:15:00".
+QString DetailsController::sinceText(Trend::Time at) const {
+    if (_values.savedText().empty()) return QStringLiteral("since ") + QString::fromStdString(agoText(_now - at));
+    return DateFormatter(QStringLiteral("'from' HH:mm:ss")).stringFromDate(Clock::TimePoint(at));
 }
 
 void DetailsController::findCandidates() {
-    _candidates = trendCandidates(_model.trends(), _name);
+    _candidates = trendCandidates(_values.trends(), _name);
     _candidateTitles.clear();
     _candidatePlaces.clear();
     for (const std::string& candidate : _candidates) {

@@ -7,7 +7,7 @@
 #include <string>
 #include <vector>
 
-#include "model/KelvoModel.h"
+#include "model/ShownValues.h"
 #include "model/Trend.h"
 
 namespace kelvo {
@@ -39,9 +39,9 @@ class DetailsController : public QObject {
     Q_PROPERTY(QStringList candidateTitles READ candidateTitles NOTIFY candidatesChanged)
     Q_PROPERTY(QStringList candidatePlaces READ candidatePlaces NOTIFY candidatesChanged)
 public:
-    /// Of the value at `path`, or of the main level of the list's row there. `row` is where it was asked for. The model
-    /// and the host outlive it.
-    DetailsController(const KelvoModel& model, const std::string& path, int row, ScreenHost& host);
+    /// Of the value at `path`, or of the main level of the list's row there. `row` is where it was asked for. The
+    /// values and the host outlive it.
+    DetailsController(const ShownValues& values, const std::string& path, int row, ScreenHost& host);
 
     const QString& title() const { return _title; }  ///< the value's key
     const QString& place() const { return _place; }  ///< the screens that lead to it, and what its row is about
@@ -52,7 +52,7 @@ public:
     const QString& meaning() const { return _meaning; }
     const QString& standard() const { return _standard; }
     // Where the value comes from; each is empty when that is not known.
-    const QString& written() const { return _written; }      ///< "4 seconds ago, by record 4711"
+    const QString& written() const { return _written; }      ///< "4 seconds ago, by record 4711"; of a saved one, when
     const QString& record() const { return _record; }        ///< the record's kind: "0xb17f  LTE serving cell, idle"
     const QString& modemTime() const { return _modemTime; }  ///< by the modem's clock
     const QString& dump() const { return _dump; }            ///< as of `recordDump`
@@ -79,7 +79,7 @@ public:
     Q_INVOKABLE void copyValue();
     Q_INVOKABLE void close();
 
-    /// Takes up what the model has now.
+    /// Takes up what the values are now.
     void reload();
 
 Q_SIGNALS:
@@ -92,9 +92,10 @@ private:
     std::string leafOf(const KelvoModelNode& node, const std::string& path) const;
     void readMeaning(const std::string& path);
     void readChanges();
+    QString sinceText(Trend::Time at) const;
     void readProvenance(const KelvoModelNode& node);
 
-    const KelvoModel& _model;
+    const ShownValues& _values;
     ScreenHost& _host;
     const int _row;
     std::string _name;

@@ -99,10 +99,27 @@ void EventRows::showMore(const std::deque<Event>& events) {
 
 void EventRows::addNewer(const std::deque<Event>& events, std::size_t count) {
     count = std::min(count, _most);
-    if (count == 0) return;
-    beginInsertRows({}, 0, static_cast<int>(count) - 1);
-    for (std::size_t i = events.size() - count; i < events.size(); ++i) _rows.push_front({events[i]});
-    endInsertRows();
+    const std::size_t added = std::min(count, _most - std::min(_most, _rows.size()));
+    if (added > 0) {
+        beginInsertRows({}, 0, static_cast<int>(added) - 1);
+        const std::size_t first = events.size() - count;
+        for (std::size_t i = first; i < first + added; ++i) _rows.push_front({events[i]});
+        endInsertRows();
+    }
+    if (count > added) reuseOldest(events, count - added);
+}
+
+/// Of a full list the oldest rows become the newest: to make a row anew costs the view more than all else in a refresh.
+void EventRows::reuseOldest(const std::deque<Event>& events, std::size_t count) {
+    for (std::size_t row = _rows.size() - count; row < _rows.size(); ++row) setOpen(row, false);
+    if (count < _rows.size()) {
+        const int first = this->count() - static_cast<int>(count);
+        beginMoveRows({}, first, this->count() - 1, {}, 0);
+        std::rotate(_rows.begin(), _rows.begin() + first, _rows.end());
+        endMoveRows();
+    }
+    for (std::size_t row = 0; row < count; ++row) _rows[row].event = events[events.size() - 1 - row];
+    Q_EMIT dataChanged(index(0), index(static_cast<int>(count) - 1));
 }
 
 void EventRows::dropOlder(std::size_t most) {

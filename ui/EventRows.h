@@ -69,6 +69,7 @@ private:
 
     std::size_t newerThanShown(const std::deque<overview::Event>& events) const;
     void addNewer(const std::deque<overview::Event>& events, std::size_t count);
+    void reuseOldest(const std::deque<overview::Event>& events, std::size_t count);
     void addOlder(const std::deque<overview::Event>& events);
     void dropOlder(std::size_t most);
     void fillIn(const std::deque<overview::Event>& events);

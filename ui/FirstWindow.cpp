@@ -9,7 +9,6 @@ namespace {
 
 using namespace std::chrono_literals;
 
-constexpr const char* kPortName = "org.kelvo.Kelvo.FirstWindow";
 constexpr const char* kActivation = "XDG_ACTIVATION_TOKEN";  // a launcher's word that the window may take the focus
 constexpr std::size_t kLongestToken = 1000;
 
@@ -27,14 +26,14 @@ void comeToTheFront(ByteView token) {
 
 }  // namespace
 
-FirstWindow::FirstWindow(MessagePorts& ports) {
-    auto made = ports.createLocal(kPortName, [](std::int32_t, ByteView token) {
+FirstWindow::FirstWindow(MessagePorts& ports, const std::string& name) {
+    auto made = ports.createLocal(name, [](std::int32_t, ByteView token) {
         comeToTheFront(token);
         return Bytes{};
     });
     _port = std::move(made.port);
     if (_port) _port->schedule();
-    const auto other = made.alreadyExisted ? ports.openRemote(kPortName) : nullptr;
+    const auto other = made.alreadyExisted ? ports.openRemote(name) : nullptr;
     if (!other) return;  // this is the first, or the other is just ending
     const QByteArray token = qgetenv(kActivation);
     const auto* const bytes = reinterpret_cast<const std::uint8_t*>(token.constData());

@@ -14,8 +14,23 @@ KelvoApp::KelvoApp(Services services) : _services(std::move(services)) {}
 KelvoApp::~KelvoApp() = default;
 
 void KelvoApp::applicationDidFinishLaunching() {
+    if (_services.saved) return showSaved();
     getSaveButtonPref();
     _window = _services.createWindow();
+    makeModel();
+    setUpdateMessage(QStringLiteral("Connecting..."));
+    _dateFormatter = std::make_unique<DateFormatter>(QStringLiteral("'Updated' yyyy-MM-dd 'at' HH:mm:ss"));
+    auto root = std::make_unique<KelvoPaneController>(nullptr, "/", *this);
+    root->setStatus(QStringLiteral("Connecting"), true);  // the dots come with the first refresh of the status
+    showRoot(std::move(root));
+    _agingTimer = _services.queue.repeat(2s, _lifetime.whileAlive([this] { letValuesAge(); }));
+    _window->makeKeyAndVisible();
+    _services.queue.post(_lifetime.whileAlive([this] {
+        if (_model) _model->restartMonitor();
+    }));
+}
+
+void KelvoApp::makeModel() {
     _model = std::make_unique<KelvoModel>(
         KelvoModel::Services{.queue = _services.queue,
                              .ports = _services.ports,
@@ -23,19 +38,26 @@ void KelvoApp::applicationDidFinishLaunching() {
                              .updateViewControllerFromModel = [this] { updateViewControllerFromModel(); },
                              .connectionChanged = [this] { connectionChanged(); }});
     _overview = std::make_unique<OverviewController>(*_model);
-    setUpdateMessage(QStringLiteral("Connecting..."));
-    _dateFormatter = std::make_unique<DateFormatter>(QStringLiteral("'Updated' yyyy-MM-dd 'at' HH:mm:ss"));
-    auto root = std::make_unique<KelvoPaneController>(nullptr, "/", *this);
-    root->setStatus(QStringLiteral("Connecting"), true);  // the dots come with the first refresh of the status
+}
+
+void KelvoApp::showRoot(std::unique_ptr<KelvoPaneController> root) {
     _navController = std::make_unique<NavigationStack>(std::move(root));
     _navController->setDelegate(this);
     _window->setRootScreen(*this);
     _navController->viewWillAppear();
-    _agingTimer = _services.queue.repeat(2s, _lifetime.whileAlive([this] { letValuesAge(); }));
+}
+
+void KelvoApp::showSaved() {
+    _window = _services.createWindow();
+    auto root = std::make_unique<KelvoPaneController>(_services.saved->topLevelNodes(), "/", *this);
+    updateStatusForViewController(*root);
+    showRoot(std::move(root));
     _window->makeKeyAndVisible();
-    _services.queue.post(_lifetime.whileAlive([this] {
-        if (_model) _model->restartMonitor();
-    }));
+}
+
+const ShownValues* KelvoApp::shownValues() const {
+    if (_services.saved) return _services.saved.get();
+    return _model.get();
 }
 
 void KelvoApp::getSaveButtonPref() {
@@ -44,6 +66,10 @@ void KelvoApp::getSaveButtonPref() {
 }
 
 void KelvoApp::updateStatusForViewController(KelvoPaneController& pane) {
+    if (const SavedScreens* const saved = _services.saved.get()) {
+        pane.setStatus(QString::fromStdString(saved->savedText()), false);
+        return pane.setHints(QString::fromStdString(saved->whyEmpty()), QString::fromStdString(saved->note()));
+    }
     const bool isConnected = _model && _model->isConnected();
     pane.setStatus(QString::fromStdString(statusText(isConnected, _updateMessage.toStdString())), !isConnected);
     if (_model) pane.setConnection(_model->connection());
@@ -102,8 +128,9 @@ void KelvoApp::release(std::vector<std::unique_ptr<Screen>>& leaving, Screen* sc
 }
 
 void KelvoApp::showDetails(const std::string& path, int row) {
-    if (_details || _saveViewController || !_model) return;
-    _details = std::make_unique<DetailsController>(*_model, path, row, *this);
+    const ShownValues* const values = shownValues();
+    if (_details || _saveViewController || values == nullptr) return;
+    _details = std::make_unique<DetailsController>(*values, path, row, *this);
     Q_EMIT detailsPresented(_details.get());
 }
 
@@ -152,7 +179,7 @@ void KelvoApp::_setGSMRSSI(bool shown) {
 void KelvoApp::applicationWillTerminate() {
     if (_terminated) return;
     _terminated = true;
-    _setGSMRSSI(false);
+    if (!_services.saved) _setGSMRSSI(false);
     setUpdateMessage({});
     _dateFormatter.reset();
     closeSaveView();

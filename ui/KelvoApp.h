@@ -16,13 +16,14 @@
 #include "ui/KelvoSaveViewController.h"
 #include "ui/NavigationStack.h"
 #include "ui/OverviewController.h"
+#include "ui/SavedScreens.h"
 #include "ui/ScreenHost.h"
 #include "ui/Window.h"
 
 namespace kelvo {
 
 /// The application: owns the model, the window, the stack of panes, the status text that every pane shows and the save
-/// screen. Main thread only.
+/// screen. Of saved screens it shows the panes and values' details alone. Main thread only.
 class KelvoApp : public QObject, public ScreenHost, public NavigationStack::Delegate {
     Q_OBJECT
     QML_ELEMENT
@@ -45,6 +46,8 @@ public:
         /// A file or directory here permits saving.
         std::string saveMarkerPath = "/ZorvikInternal/Library/PreferenceBundles/Carrier Settings.bundle";
         std::string snapshotDirectory = "/var/mobile/Library/Logs/Quillet";
+        /// Screens to show for reading in place of a modem's; then nothing else here but queue and window is used.
+        std::shared_ptr<const SavedScreens> saved = nullptr;
     };
 
     explicit KelvoApp(Services services);
@@ -56,8 +59,9 @@ public:
     void applicationWillTerminate();
 
     NavigationStack* navigation() const { return _navController.get(); }  ///< null before launch
-    KelvoModel* model() const { return _model.get(); }                    ///< null before launch and after termination
-    OverviewController* overview() const { return _overview.get(); }      ///< likewise
+    /// Null before launch, after termination, and where saved screens are shown.
+    KelvoModel* model() const { return _model.get(); }
+    OverviewController* overview() const { return _overview.get(); }  ///< likewise
     KelvoSaveViewController* saveViewController() const { return _saveViewController.get(); }
 
     const QString& updateMessage() const { return _updateMessage; }
@@ -104,6 +108,10 @@ private:
     template <class Screen>
     static void release(std::vector<std::unique_ptr<Screen>>& leaving, Screen* screen);
     void getSaveButtonPref();
+    void makeModel();
+    void showRoot(std::unique_ptr<KelvoPaneController> root);
+    void showSaved();
+    const ShownValues* shownValues() const;
     void reloadPanes();
     void _setGSMRSSI(bool shown);
     void letValuesAge();

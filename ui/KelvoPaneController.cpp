@@ -159,7 +159,14 @@ void KelvoPaneController::setStatus(const QString& status, bool isLoading) {
 }
 
 void KelvoPaneController::setConnection(const Connection& connection) {
-    _connection = connection;
+    const bool calm = connection.isConnected() && !connection.isSilent();
+    setHints(QString::fromStdString(waitingText(connection)),
+             calm ? QString() : QString::fromStdString(connectionText(connection)));
+}
+
+void KelvoPaneController::setHints(const QString& waiting, const QString& note) {
+    _waiting = waiting;
+    _note = note;
     Q_EMIT hintsChanged();
 }
 
@@ -203,7 +210,7 @@ void KelvoPaneController::didSelectRow(int row) {
     if (child->childNodes() == nullptr) return selectRow(-1);
     auto pane = std::make_unique<KelvoPaneController>(child, pathByAppending(_keyPath, child->displayName()), _host);
     pane->setStatus(_status, _isLoading);
-    pane->setConnection(_connection);
+    pane->setHints(_waiting, _note);
     if (_navigationController != nullptr) _navigationController->pushViewController(std::move(pane), true);
 }
 
@@ -218,14 +225,13 @@ void KelvoPaneController::showDetails(int row) {
 
 QString KelvoPaneController::emptyText() const {
     if (!_rows.empty()) return {};
-    if (!_nodes) return QString::fromStdString(waitingText(_connection));
+    if (!_nodes) return _waiting;
     return _nodes->childNodes() != nullptr ? QStringLiteral("None reported") : QStringLiteral("Nothing reported yet");
 }
 
 QString KelvoPaneController::note() const {
-    const bool saidInPlaceOfRows = !_nodes && !_connection.isConnected();
-    const bool calm = _connection.isConnected() && !_connection.isSilent();
-    return calm || saidInPlaceOfRows ? QString() : QString::fromStdString(connectionText(_connection));
+    const bool saidInPlaceOfRows = !_nodes && _note == _waiting;
+    return saidInPlaceOfRows ? QString() : _note;
 }
 
 int KelvoPaneController::rowCount(const QModelIndex& parent) const {

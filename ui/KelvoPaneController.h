@@ -66,6 +66,8 @@ public:
     void setStatus(const QString& status, bool isLoading);
     /// What `emptyText` and `note` tell of.
     void setConnection(const Connection& connection);
+    /// The same in words: `waiting` stands in place of rows while there is no node, `note` beside the status.
+    void setHints(const QString& waiting, const QString& note);
     /// Values may have become old since they were shown.
     void updateAges();
     void viewWillAppear();
@@ -127,7 +129,8 @@ private:
     const std::string _keyPath;
     QString _status = QStringLiteral("");
     bool _isLoading = true;
-    Connection _connection;
+    QString _waiting = QString::fromStdString(waitingText({}));
+    QString _note = QString::fromStdString(connectionText({}));
     ScreenHost& _host;
     NavigationStack* _navigationController = nullptr;
     QString _title;

@@ -22,8 +22,8 @@ void QuickWindow::chooseSceneGraph() {
     if (devices.isEmpty()) QQuickWindow::setGraphicsApi(QSGRendererInterface::Software);
 }
 
-QuickWindow::QuickWindow() : _view(std::make_unique<QQuickView>()) {
-    _view->setTitle(QStringLiteral("Kelvo"));
+QuickWindow::QuickWindow(const QString& title) : _view(std::make_unique<QQuickView>()) {
+    _view->setTitle(title);
     _view->setResizeMode(QQuickView::SizeRootObjectToView);
     const QSize screen = _view->screen() != nullptr ? _view->screen()->availableSize() : kOnADesk;
     _view->resize(openingSize(screen));

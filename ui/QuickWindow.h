@@ -16,7 +16,7 @@ public:
     /// The size of the new window, in device-independent pixels: a phone's whole screen, or a part of a desk's.
     static QSize openingSize(QSize screen);
 
-    QuickWindow();
+    explicit QuickWindow(const QString& title = QStringLiteral("Kelvo"));
     ~QuickWindow() override;
 
     void setRootScreen(KelvoApp& application) override;

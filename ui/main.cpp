@@ -1,5 +1,6 @@
 #include <fmt/format.h>
 #include <malloc.h>
+#include <unistd.h>
 
 #include <QGuiApplication>
 #include <csignal>
@@ -29,9 +30,9 @@
 #include "ui/ApplicationOptions.h"
 #include "ui/FirstWindow.h"
 #include "ui/KelvoApp.h"
+#include "ui/OpenedFile.h"
 #include "ui/PlatformStart.h"
 #include "ui/QuickWindow.h"
-#include "ui/ReplayService.h"
 #include "ui/Theme.h"
 
 namespace {
@@ -47,11 +48,38 @@ void followDesktop(HostColorScheme::Scheme scheme) {
     Theme::follow(decided ? std::optional(scheme == HostColorScheme::Scheme::Dark) : std::nullopt);
 }
 
-std::unique_ptr<ReplayService> startReplay(const std::string& capture) {
+/// The file that the application was started with; in place of one that cannot be shown, screens that say why.
+struct Start {
+    OpenedFile file;
+    QString title = QStringLiteral("Kelvo");
+    bool failed = false;
+};
+
+/// Whoever started it in a terminal reads the line. Behind a file manager nobody does: then a window says the same, of
+/// a file that everybody there knows by its name alone.
+Start refuse(const std::filesystem::path& path, std::string reason) {
+    if (::isatty(STDERR_FILENO) != 0) throw std::runtime_error(reason);
+    fmt::print(stderr, "kelvo: {}\n", reason);
+    std::fflush(stderr);
+    if (reason.starts_with(path.native())) reason.replace(0, path.native().size(), path.filename().native());
+    Start start;
+    start.file.screens = std::make_shared<const SavedScreens>(SavedScreens::refused(reason));
+    start.failed = true;
+    return start;
+}
+
+Start open(const std::string& argument) {
+    const std::filesystem::path path = pathFromArgument(argument);
     const std::filesystem::path programs = QGuiApplication::applicationDirPath().toStdString();
-    auto started = ReplayService::start(programs / "kelvo-telephonyd", capture);
-    if (!started) throw std::runtime_error(started.error().reason);
-    return std::move(started).value();
+    auto opened = OpenedFile::open(path.native(), programs / "kelvo-telephonyd");
+    Start start;
+    if (opened)
+        start.file = std::move(opened).value();
+    else
+        start = refuse(path, opened.error().reason);
+    if (start.file.screens)
+        start.title = QString::fromStdString(path.filename().native() + ": " + start.file.screens->savedText());
+    return start;
 }
 
 int runApplication(int argc, char** argv, const ApplicationOptions& options) {
@@ -76,14 +104,22 @@ int runApplication(int argc, char** argv, const ApplicationOptions& options) {
         {.log = &log, .resources = &resources, .standardOutput = stdout, .version = version()});
 
     HostMainQueue queue;
-    const std::unique_ptr<ReplayService> replay = options.capture ? startReplay(*options.capture) : nullptr;
-    HostMessagePorts ports(replay ? replay->portDirectory() : HostPaths::portDirectory());
-    const FirstWindow first(ports);
-    if (first.isElsewhere()) return EXIT_SUCCESS;
+    const Start opened = options.file ? open(*options.file) : Start();
+    const OpenedFile& file = opened.file;
+    HostMessagePorts ports(file.replay ? file.replay->portDirectory() : HostPaths::portDirectory());
+    std::optional<FirstWindow> first;
+    if (!opened.failed) first.emplace(ports, file.screens ? file.window : FirstWindow::kLive);
+    if (first && first->isElsewhere()) return EXIT_SUCCESS;
     HostTelephonyClient telephony(ports);
     HostPreferences preferences;
     HostWorker worker;
-    KelvoApp app({queue, ports, telephony, preferences, worker, [] { return std::make_unique<QuickWindow>(); }});
+    KelvoApp app({.queue = queue,
+                  .ports = ports,
+                  .telephony = telephony,
+                  .preferences = preferences,
+                  .worker = worker,
+                  .createWindow = [&opened] { return std::make_unique<QuickWindow>(opened.title); },
+                  .saved = file.screens});
     app.applicationDidFinishLaunching();
     start.reset();  // a first frame was drawn
 
@@ -92,7 +128,8 @@ int runApplication(int argc, char** argv, const ApplicationOptions& options) {
                      [&app] { HostEventLoop::call([&app] { app.applicationWillTerminate(); }); });
     // Making the first screen may have run events, and there was no loop to quit yet.
     if (isEnding) QMetaObject::invokeMethod(&application, &QGuiApplication::quit, Qt::QueuedConnection);
-    return HostEventLoop::run(QGuiApplication::exec);
+    const int status = HostEventLoop::run(QGuiApplication::exec);
+    return opened.failed ? EXIT_FAILURE : status;
 }
 
 }  // namespace

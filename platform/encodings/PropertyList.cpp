@@ -2,6 +2,7 @@
 
 #include <fmt/format.h>
 
+#include <algorithm>
 #include <bit>
 #include <string>
 
@@ -14,7 +15,6 @@ namespace kelvo {
 
 namespace {
 
-constexpr std::size_t kMaxSize = std::size_t{1} << 30;
 constexpr std::string_view kSpace = " \t\n\v\f\r";
 constexpr std::string_view kHexAndSpace = "0123456789abcdefABCDEF \t\n\v\f\r";
 
@@ -50,8 +50,15 @@ std::string_view withoutByteOrderMark(std::string_view text) {
 
 }  // namespace
 
+bool beginsPropertyList(ByteView beginning) {
+    if (isBinaryPropertyList(textOf(beginning))) return true;
+    std::string_view text = withoutByteOrderMark(textOf(beginning));
+    text.remove_prefix(std::min(text.find_first_not_of(kSpace), text.size()));
+    return text.starts_with("<?xml") || text.starts_with("<plist") || text.starts_with("<!DOCTYPE plist");
+}
+
 Result<Value> readPropertyList(ByteView data) {
-    if (data.size() > kMaxSize) return Failure{fmt::format("larger than {} bytes", kMaxSize)};
+    if (data.size() > kMaxPropertyListSize) return Failure{fmt::format("larger than {} bytes", kMaxPropertyListSize)};
     const std::string_view text = textOf(data);
     if (isBinaryPropertyList(text)) return readBinaryPropertyList(data);
     if (const auto order = utf16Order(text)) return readText(withoutByteOrderMark(utf8FromUtf16(data, *order)));

@@ -1,5 +1,7 @@
 #pragma once
 
+#include <cstddef>
+
 #include "platform/values/Bytes.h"
 #include "platform/values/Result.h"
 #include "platform/values/Value.h"
@@ -10,6 +12,11 @@ namespace kelvo {
 /// or dangling object references, lying counts and unknown encodings are failures with a reason, never a crash; no
 /// external entity is followed.
 inline constexpr int kMaxPropertyListDepth = 512;
+/// Larger ones are refused unread.
+inline constexpr std::size_t kMaxPropertyListSize = std::size_t{1} << 30;
+
+/// Whether what begins so is meant as a property list, XML in UTF-8 or binary; nothing but the beginning is looked at.
+bool beginsPropertyList(ByteView beginning);
 
 /// Reads a property list in any encoding: XML, binary ("bplist00") or the old text form, the two texts in UTF-8 or
 /// UTF-16. The result is never none, its strings are always UTF-8 (U+FFFD stands for what was not), and no array or

@@ -3,6 +3,7 @@
 #include <algorithm>
 #include <array>
 
+#include "platform/encodings/PropertyList.h"
 #include "telephony/recordings/DlfRecording.h"
 #include "telephony/recordings/FramesRecording.h"
 #include "telephony/recordings/RecordingFile.h"
@@ -18,14 +19,6 @@ bool isCapture(ByteView bytes) {
     if (bytes.size() < 4) return false;
     const std::uint32_t magic = wire::u32At(bytes, 0);
     return magic == 0xA1B2C3D4 || magic == 0xD4C3B2A1 || magic == 0xA1B23C4D || magic == 0x4D3CB2A1;
-}
-
-bool isPropertyList(ByteView bytes) {
-    std::string_view text(reinterpret_cast<const char*>(bytes.data()), bytes.size());
-    if (text.starts_with("\xEF\xBB\xBF")) text.remove_prefix(3);
-    if (text.starts_with("bplist")) return true;
-    text.remove_prefix(std::min(text.find_first_not_of(" \t\r\n"), text.size()));
-    return text.starts_with("<?xml") || text.starts_with("<plist") || text.starts_with("<!DOCTYPE plist");
 }
 
 /// A checksum may be right by chance, but hardly in a record whose two lengths are right as well.
@@ -62,7 +55,7 @@ std::string_view nameOf(RecordingKind kind) {
 
 RecordingKind recognizeRecording(ByteView beginning) {
     if (isCapture(beginning)) return RecordingKind::Capture;
-    if (isPropertyList(beginning)) return RecordingKind::Snapshot;
+    if (beginsPropertyList(beginning)) return RecordingKind::Snapshot;
     if (holdsFrames(beginning)) return RecordingKind::Frames;
     if (holdsRecords(beginning)) return RecordingKind::Dlf;
     return RecordingKind::Unknown;

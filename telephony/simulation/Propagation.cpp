@@ -46,7 +46,8 @@ double linkCapacity(double bandwidth, double sinr) {
 }
 
 double neededSinr(double bandwidth, double capacity) {
-    return toDecibels(std::exp2(capacity / (kAttenuation * bandwidth)) - 1);
+    // Not exp2, whose last bit is another one on arm64.
+    return toDecibels(std::pow(2, capacity / (kAttenuation * bandwidth)) - 1);
 }
 
 }  // namespace kelvo::simulation

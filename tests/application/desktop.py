@@ -175,8 +175,9 @@ class Eyes:
 class Window:
     """The application's window."""
 
-    def __init__(self, desktop, size=(412, 732)):
+    def __init__(self, desktop, size=(412, 732), title="^Kelvo$"):
         self._desktop = desktop
+        self._title = title
         self._eyes = None
         self._scale = int(desktop.environment["QT_SCALE_FACTOR"])
         self._id = wait_for(self._find, "the window")
@@ -188,7 +189,7 @@ class Window:
         self._tool("windowsize", "--sync", self._id, width * self._scale, height * self._scale)
 
     def _find(self):
-        found = subprocess.run(["xdotool", "search", "--onlyvisible", "--name", "^Kelvo$"], capture_output=True,
+        found = subprocess.run(["xdotool", "search", "--onlyvisible", "--name", self._title], capture_output=True,
                                text=True, env=self._desktop.environment, check=False)
         return found.stdout.split()[0] if found.stdout else None
 

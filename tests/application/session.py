@@ -48,6 +48,11 @@ class Session:
         application = self.desktop.start(*view, *self._clock, self._programs / "kelvo")
         return application, Window(self.desktop, self._size)
 
+    def open(self, file, title):
+        """The application as a file manager starts it for a file, and its window, whose title matches `title`."""
+        application = self.desktop.start(self._programs / "kelvo", file)
+        return application, Window(self.desktop, self._size, title)
+
     def why_no_saving(self):
         """Why the application cannot be started as on an internal installation here; None when it can."""
         try:

@@ -1,14 +1,14 @@
-// Any bytes may come as a snapshot file; what is read can be listed, shown and turned into a capture, and none of its
-// texts reaches a terminal with a control character.
+// Any bytes may come as a snapshot file; what is read can be listed, shown in the terminal and in a window, and turned
+// into a capture, and none of its texts reaches a terminal or a status line with a control character.
 
+#include "model/SnapshotFile.h"
 #include "platform/telephony/Technology.h"
-#include "tests/fuzz/InMemoryFile.h"
 #include "tests/fuzz/PropertyListRoundTrip.h"
 #include "tools/CommandFailure.h"
 #include "tools/DisplayJson.h"
 #include "tools/DisplayText.h"
 #include "tools/SnapshotCapture.h"
-#include "tools/SnapshotFile.h"
+#include "ui/SavedScreens.h"
 
 namespace {
 
@@ -27,6 +27,19 @@ void show(const SnapshotFile::Entry& entry) {
     printedJson(jsonFrom(entry.display));
 }
 
+void walk(const SavedScreens& screens, const KelvoModelNode& node, const std::string& path) {
+    screens.trends().changes(screens.trends().nameAt(path));
+    if (node.childNodes() == nullptr) return;
+    for (const NodeRef& child : *node.childNodes()) walk(screens, *child, pathByAppending(path, child->displayName()));
+}
+
+void showInWindow(const SnapshotFile& snapshot) {
+    const SavedScreens screens(snapshot);
+    requireOneLine(screens.savedText());
+    requireOneLine(screens.note());
+    if (screens.topLevelNodes()) walk(screens, *screens.topLevelNodes(), "/");
+}
+
 void makeCapture(SnapshotFile& snapshot, Technology technology) {
     try {
         writeSnapshotCapture(snapshot, technology, OutputFile::create("/dev/null").value(), snapshot.odd);
@@ -38,9 +51,10 @@ void makeCapture(SnapshotFile& snapshot, Technology technology) {
 }  // namespace
 
 extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size) {
-    auto snapshot = SnapshotFile::read(fuzz::InMemoryFile({data, size}).path());
+    auto snapshot = SnapshotFile::read("in.kelvo", {data, size});
     if (!snapshot) return 0;
     for (const SnapshotFile::Entry& entry : snapshot->entries) show(entry);
+    showInWindow(*snapshot);
     makeCapture(*snapshot, Technology::LTE);
     makeCapture(*snapshot, Technology::IFX);
     return 0;

@@ -28,6 +28,10 @@ protected:
     static Bytes idle(std::uint32_t cell, std::uint32_t level, std::uint32_t quality = 80) {
         return test::Record(0xB17F, 33).u16(17, 1300).u16(19, cell).u32(21, level | quality << 18).bytes();
     }
+    /// A carrier in connected mode, measured as if it served.
+    static Bytes carrier(std::uint32_t channel, std::uint32_t cell, std::uint32_t level = 160) {
+        return test::Record(0xB179, 29).u16(17, channel).u16(19, cell).u16(23, level).u16(25, 80).bytes();
+    }
     /// Time goes by, of the queue and of the day.
     void pass(std::chrono::nanoseconds time) {
         for (; time > 0s; time -= 1s) {
@@ -96,6 +100,64 @@ TEST_F(LiveOverviewTest, TheLinesHoldTwoMinutesOfReadings) {
     pass(10s);
     live->letPass();
     EXPECT_TRUE(live->level().points.empty());
+}
+
+TEST_F(LiveOverviewTest, ASecondCarrierIsNoChangeOfCellWhicheverTheRefreshShows) {
+    startLte();
+    deliver(idle(84, 200));
+    pass(2s);
+    for (const char shown : std::string("221222112122212222222121")) {
+        deliver(shown == '1' ? carrier(5780, 185) : carrier(1300, 84, 164));
+        deliver(shown == '2' ? carrier(5780, 185) : carrier(1300, 84, 164));
+        pass(2s);
+        EXPECT_EQ(live->tracker().latest().cell, "EARFCN 1300, PCI 84");
+    }
+    EXPECT_EQ(kinds(), (std::vector{Kind::CellFound, Kind::State}));
+    EXPECT_TRUE(live->servingCells().empty());
+    EXPECT_EQ(live->tracker().latest().level->figure.text, "-99.00 dBm");
+    ASSERT_EQ(live->tracker().cells().size(), 1u);
+    EXPECT_EQ(live->tracker().cells()[0].heard.identity, "EARFCN 5780, PCI 185");
+    EXPECT_EQ(live->tracker().cells()[0].heard.mark, "active");
+}
+
+TEST_F(LiveOverviewTest, AnotherCellOnTheServingChannelServesAtOnce) {
+    startLte();
+    deliver(carrier(1300, 84));
+    pass(2s);
+    deliver(carrier(5780, 185));
+    pass(2s);
+    deliver(carrier(1300, 12));
+    pass(2s);
+    EXPECT_EQ(live->tracker().latest().cell, "EARFCN 1300, PCI 12");
+    EXPECT_EQ(kinds(), (std::vector{Kind::CellFound, Kind::Handover}));
+}
+
+TEST_F(LiveOverviewTest, ACarrierServesWhenTheServingOneIsNoLongerTold) {
+    startLte();
+    deliver(carrier(1300, 84));
+    pass(2s);  // seen
+    for (int refresh = 0; refresh < 13; ++refresh) {
+        deliver(carrier(5780, 185));
+        pass(2s);
+        EXPECT_EQ(live->tracker().latest().cell, "EARFCN 1300, PCI 84");
+    }
+    deliver(carrier(5780, 185));
+    pass(2s);
+    EXPECT_EQ(live->tracker().latest().cell, "EARFCN 5780, PCI 185");
+    EXPECT_EQ(kinds(), (std::vector{Kind::CellFound, Kind::Handover, Kind::Band}));
+}
+
+TEST_F(LiveOverviewTest, ACarrierThatIsNoLongerToldEitherServesNever) {
+    startLte();
+    deliver(carrier(1300, 84));
+    pass(2s);
+    deliver(carrier(5780, 185));
+    for (int refresh = 0; refresh < 30; ++refresh) {
+        deliver(test::Record(0xB0C1, 22).u8(20, 2).bytes());  // nothing of carriers
+        pass(2s);
+    }
+    EXPECT_EQ(live->tracker().latest().cell, "EARFCN 1300, PCI 84");
+    EXPECT_EQ(kinds(), (std::vector{Kind::CellFound}));
 }
 
 TEST_F(LiveOverviewTest, TheLinesStayShortHoweverOftenAModelRefreshes) {

@@ -31,18 +31,26 @@ TEST(MimeTypes, KnowACaptureByItsLinkType) {
                 EXPECT_EQ(typeOf("drive", pcapHeader(magic, linkType, bigEndian)), "application/x-kelvo-capture");
             }
         }
-        for (const std::uint32_t linkType : {1U, 146U, 152U})
-            EXPECT_NE(typeOf("drive", pcapHeader(0xA1B2C3D4U, linkType, bigEndian)), "application/x-kelvo-capture");
+        for (const std::uint32_t linkType : {1U, 146U, 152U}) {
+            EXPECT_EQ(typeOf("drive", pcapHeader(0xA1B2C3D4U, linkType, bigEndian)), "application/vnd.tcpdump.pcap");
+            EXPECT_EQ(typeOf("drive.pcap", pcapHeader(0xA1B2C3D4U, linkType, bigEndian)),
+                      "application/vnd.tcpdump.pcap");
+        }
     }
 }
 
 TEST(MimeTypes, KnowASnapshotByItsBeginning) {
     const QByteArray snapshot =
-        "<?xml version=\"1.0\" encoding=\"UTF-8\"?>\n<plist version=\"1.0\">\n<dict>\n\t<key>Timestamp</key>\n";
+        "<?xml version=\"1.0\" encoding=\"UTF-8\"?>\n<plist version=\"1.0\">\n<dict>\n\t<key>Timestamp</key>\n"
+        "\t<string>2011-03-04 09:15:02 +0000</string>\n\t<key>Data</key>\n\t<array>\n";
     EXPECT_EQ(typeOf("KelvoSnapshot-1300000000.kelvo", snapshot), "application/x-kelvo-snapshot");
     EXPECT_EQ(typeOf("renamed", snapshot), "application/x-kelvo-snapshot");
-    EXPECT_NE(typeOf("other.xml", "<?xml version=\"1.0\"?>\n<plist version=\"1.0\"><dict/></plist>\n"),
-              "application/x-kelvo-snapshot");
+    for (const char* inside :
+         {"", "<key>Timestamp</key><date>2011-03-04T09:15:02Z</date>", "<key>Data</key><array/>"}) {
+        const QByteArray other = QByteArray("<plist version=\"1.0\"><dict>") + inside + "</dict></plist>\n";
+        EXPECT_NE(typeOf("other.xml", other), "application/x-kelvo-snapshot") << inside;
+        EXPECT_NE(typeOf("other", other), "application/x-kelvo-snapshot") << inside;
+    }
 }
 
 // The database is this tree's file and what Qt brings along; they must be known before Qt looks.

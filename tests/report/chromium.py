@@ -85,6 +85,7 @@ class Browser:
 
     def size(self, width, height, mobile=False):
         self.call("Emulation.setDeviceMetricsOverride", width=width, height=height, deviceScaleFactor=1, mobile=mobile)
+        self.call("Emulation.setTouchEmulationEnabled", enabled=mobile, maxTouchPoints=5 if mobile else 1)
 
     def prefer(self, scheme="light", media=""):
         self.call("Emulation.setEmulatedMedia", media=media, features=[{"name": "prefers-color-scheme", "value": scheme}])
@@ -114,6 +115,10 @@ class Browser:
     def mouse(self, kind, x, y, buttons=0):
         self.call("Input.dispatchMouseEvent", type=kind, x=x, y=y, button="left" if kind != "mouseMoved" else "none",
                   buttons=buttons, clickCount=1)
+
+    def touch(self, kind, *points):
+        """Fingers at these places, each under the number of its place in the list; none when the last is lifted."""
+        self.call("Input.dispatchTouchEvent", type=kind, touchPoints=[{"x": x, "y": y, "id": i} for i, (x, y) in enumerate(points)])
 
     def screenshot(self, path, whole=False):
         picture = self.call("Page.captureScreenshot", format="png", captureBeyondViewport=whole)

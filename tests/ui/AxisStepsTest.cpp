@@ -27,6 +27,14 @@ TEST(AxisSteps, HoldWhatIsSeen) {
     expectAxis(0, 40, 0, 40, 10);
 }
 
+TEST(AxisSteps, ShowHowPartsOfOneChange) {
+    const AxisRange axis = axisFor(0.0625, 0.21875, 5);
+    EXPECT_DOUBLE_EQ(axis.low, 0.05);
+    EXPECT_DOUBLE_EQ(axis.high, 0.25);
+    EXPECT_DOUBLE_EQ(axisFor(0, 0, 5).high - axisFor(0, 0, 5).low, 1);
+    EXPECT_LE(axisFor(0.125, 0.125, 5).high, 0.25);
+}
+
 TEST(AxisSteps, LeaveAStandingLevelInTheMiddle) {
     expectAxis(-95, -95, -95.5, -94.5, 0.5);
     expectAxis(0, 0, -0.5, 0.5, 0.5);

@@ -86,6 +86,45 @@ TEST_F(EventRowsTest, ShowsTwentyAndMoreOnRequest) {
     EXPECT_EQ(textAt(69, EventRows::TimeRole), QStringLiteral("12:32:11"));  // 69 seconds before the newest
 }
 
+TEST_F(EventRowsTest, OfAFullListTheOldestRowBecomesTheNewest) {
+    for (int i = 0; i < 20; ++i) happen(std::chrono::seconds(i), "connected");
+    events[0].values = {{"RSRP", "-95 dBm", "-80 dBm"}};
+    rows.update(events);
+    rows.toggle(19);
+    QSignalSpy moved(&rows, &EventRows::rowsMoved);
+    QSignalSpy inserted(&rows, &EventRows::rowsInserted);
+    QSignalSpy removed(&rows, &EventRows::rowsRemoved);
+    happen(20s, "busy");
+    happen(21s, "asleep");
+    rows.update(events);
+    ASSERT_EQ(moved.count(), 1);
+    EXPECT_EQ(moved[0][1].toInt(), 18);
+    EXPECT_EQ(moved[0][2].toInt(), 19);
+    EXPECT_EQ(moved[0][4].toInt(), 0);
+    EXPECT_EQ(inserted.count() + removed.count(), 0);
+    EXPECT_EQ(rows.count(), 20);
+    EXPECT_EQ(textAt(0, EventRows::TimeRole), QStringLiteral("12:00:21"));
+    EXPECT_EQ(textAt(1, EventRows::WhatRole), QString::fromUtf8("idle → busy"));
+    EXPECT_EQ(textAt(2, EventRows::TimeRole), QStringLiteral("12:00:19"));
+    EXPECT_EQ(textAt(19, EventRows::TimeRole), QStringLiteral("12:00:02"));
+    EXPECT_FALSE(rows.hasOpen());
+}
+
+TEST_F(EventRowsTest, TakesUpMoreNewOnesThanItHasRows) {
+    happen(0s, "connected");
+    rows.update(events);
+    for (int i = 1; i < 50; ++i) happen(std::chrono::seconds(i), "busy");
+    rows.update(events);
+    EXPECT_EQ(rows.count(), 20);
+    EXPECT_EQ(textAt(0, EventRows::TimeRole), QStringLiteral("12:00:49"));
+    EXPECT_EQ(textAt(19, EventRows::TimeRole), QStringLiteral("12:00:30"));
+    for (int i = 50; i < 80; ++i) happen(std::chrono::seconds(i), "idle");
+    rows.update(events);
+    EXPECT_EQ(rows.count(), 20);
+    EXPECT_EQ(textAt(0, EventRows::TimeRole), QStringLiteral("12:01:19"));
+    EXPECT_EQ(textAt(19, EventRows::TimeRole), QStringLiteral("12:01:00"));
+}
+
 TEST_F(EventRowsTest, ForgetsWhatIsNoLongerKept) {
     for (int i = 0; i < 5; ++i) happen(std::chrono::seconds(i), "connected");
     rows.update(events);

@@ -108,6 +108,8 @@ TEST_F(OverviewTexts, OfGsmWithoutAQuality) {
                      "Registration and data", "Service, NORMAL_SERVICE", "GMM, GMM_REGISTERED", "What happened",
                      "What happened", "09:15:04, Cell found, ARFCN 21, BSIC 44, -65 dBm"}));
     EXPECT_FALSE(named("qualityGauge")->isVisible());
+    EXPECT_FALSE(scene->shows(text("Quality")));  // no column has a heading that no cell fills
+    EXPECT_TRUE(scene->shows(text("To serving")));
 }
 
 TEST_F(OverviewTexts, OfCdmaWhoseCellsHaveAQualityAlone) {
@@ -130,6 +132,8 @@ TEST_F(OverviewTexts, OfCdmaWhoseCellsHaveAQualityAlone) {
                                     "09:15:04, Cell found, channel 283, PN 180, -74.60 dBm"}));
     EXPECT_TRUE(scene->shows(text("-19.67 dB")));
     EXPECT_FALSE(scene->shows(text("Level")));  // no cell around has one
+    EXPECT_TRUE(scene->shows(text("Quality")));
+    EXPECT_FALSE(scene->shows(text("To serving")));
 }
 
 TEST_F(OverviewTexts, OfUtraTddWhoseLevelHasNoUnitAndNoGrade) {

@@ -14,7 +14,8 @@ constexpr int kPatience = 20'000;  // milliseconds; a wait ends as soon as its c
 class Program : public testing::Test {
 protected:
     /// With nothing of a desktop but the named platform.
-    void start(const char* platform, const QStringList& arguments = {}) {
+    void start(const char* platform, const QStringList& arguments = {},
+               const QString& command = QStringLiteral(KELVO_PROGRAM)) {
         QProcessEnvironment environment = QProcessEnvironment::systemEnvironment();
         for (const char* name : {"DISPLAY", "WAYLAND_DISPLAY", "WAYLAND_SOCKET", "DBUS_SESSION_BUS_ADDRESS"}) {
             environment.remove(QLatin1String(name));
@@ -22,7 +23,15 @@ protected:
         environment.insert(QStringLiteral("XDG_RUNTIME_DIR"), QString::fromStdString(runtime.path().string()));
         environment.insert(QStringLiteral("QT_QPA_PLATFORM"), QLatin1String(platform));
         program.setProcessEnvironment(environment);
-        program.start(QStringLiteral(KELVO_PROGRAM), arguments);
+        program.start(command, arguments);
+    }
+    /// The same for a file, in a terminal.
+    void startInTerminal(const char* platform, const char* file) {
+        // "script" gives it a terminal, tells its status and shows what it says.
+        start(platform,
+              {QStringLiteral("-qec"), QStringLiteral(KELVO_PROGRAM " ") + QLatin1String(file),
+               QStringLiteral("/dev/null")},
+              QStringLiteral("script"));
     }
     /// The one line that it ends with, and nothing else, having failed in an orderly way.
     std::string lineOfFailure() {
@@ -52,9 +61,21 @@ TEST_F(Program, SaysInOneLineThatThePlatformIsUnknown) {
     EXPECT_NE(line.find("of-another-world"), std::string::npos) << line;
 }
 
-TEST_F(Program, SaysInOneLineWhatIsWrongWithAFile) {
+TEST_F(Program, SaysInOneLineWhatIsWrongWithAFileAndInAWindowBehindAFileManager) {
     start("offscreen", {QStringLiteral("/nowhere/drive.pcap")});
+    program.setReadChannel(QProcess::StandardError);
+    ASSERT_TRUE(program.waitForReadyRead(kPatience));
+    EXPECT_FALSE(program.waitForFinished(0));  // the window is there until somebody closes it
+    program.terminate();
     EXPECT_EQ(lineOfFailure(), "kelvo: /nowhere/drive.pcap cannot be opened: No such file or directory");
+}
+
+TEST_F(Program, LeavesItAtThatLineInATerminal) {
+    startInTerminal("offscreen", "/nowhere/drive.kelvo");
+    ASSERT_TRUE(program.waitForFinished(kPatience));
+    EXPECT_EQ(program.exitCode(), 1);
+    EXPECT_EQ(program.readAllStandardOutput(),
+              QByteArray("kelvo: /nowhere/drive.kelvo cannot be opened: No such file or directory\r\n"));
 }
 
 TEST_F(Program, LeavesTheSecondStartToTheFirstWindow) {

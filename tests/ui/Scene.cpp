@@ -28,7 +28,7 @@ QPointingDevice* touchScreen() {
     return kDevice;
 }
 
-Scene::Scene(bool savingPermitted, QSize size) {
+Scene::Scene(bool savingPermitted, QSize size, std::shared_ptr<const SavedScreens> saved) {
     if (savingPermitted) permitSaving();
     KelvoApp::Services parts = services();
     parts.createWindow = [this, size] {
@@ -37,6 +37,7 @@ Scene::Scene(bool savingPermitted, QSize size) {
         _view->resize(size);
         return window;
     };
+    parts.saved = std::move(saved);
     _app = std::make_unique<KelvoApp>(std::move(parts));
     _app->applicationDidFinishLaunching();
     EXPECT_TRUE(QTest::qWaitForWindowActive(_view));
@@ -51,7 +52,8 @@ void Scene::settle() {
         const QQuickItem* sheet = itemOfType("SaveSheet");
         const QQuickItem* details = itemOfType("DetailsSheet");
         const double arrival = _view->rootObject()->property("arrival").toDouble();  // of the overview
-        const bool sliding = stack->property("busy").toBool() || arrival != (_app->overview()->isOpen() ? 1 : 0) ||
+        const bool overview = _app->overview() != nullptr && _app->overview()->isOpen();
+        const bool sliding = stack->property("busy").toBool() || arrival != (overview ? 1 : 0) ||
                              (sheet != nullptr && sheet->property("moving").toBool()) ||
                              (details != nullptr && details->property("moving").toBool());
         return !sliding && (sheet != nullptr) == (_app->saveViewController() != nullptr) &&

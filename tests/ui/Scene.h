@@ -16,7 +16,9 @@ QPointingDevice* touchScreen();
 /// The application with its real screen, drawn without a display. Starts launched, with its window `size` large.
 class Scene : public AppWorld {
 public:
-    explicit Scene(bool savingPermitted = false, QSize size = {360, 640});
+    /// `saved`: shows these in place of a modem's.
+    explicit Scene(bool savingPermitted = false, QSize size = {360, 640},
+                   std::shared_ptr<const SavedScreens> saved = nullptr);
     ~Scene();
 
     KelvoApp& app() { return *_app; }

@@ -63,12 +63,10 @@ std::string screensText(const FillableScreens& screens) {
 std::string phoneFindingsText(const PhoneFindings& findings) {
     if (findings.modems.empty() && findings.trouble.empty()) return {};
     std::string text;
-    for (std::size_t i = 0; i < findings.modems.size(); ++i) {
-        const phone::PhoneState& phone = findings.modems[i];
+    for (const auto& [phone, lacks] : findings.modems) {
         text += modemText(phone);
-        if (i > 0) continue;  // of the others nothing more has been asked
         text += line("knows", known(phone));
-        for (const std::string& lack : findings.lacks) text += line("lacks", lack);
+        for (const std::string& lack : lacks) text += line("lacks", lack);
         if (const auto screens = screensOf(phone))
             text += line(fmt::format("{} screens", namesOf(screens->technology).name), screensText(*screens));
     }
@@ -79,7 +77,7 @@ std::string phoneFindingsText(const PhoneFindings& findings) {
 
 Json phoneFindingsJson(const PhoneFindings& findings) {
     Json modems = Json::array();
-    for (const phone::PhoneState& phone : findings.modems) {
+    for (const auto& [phone, lacks] : findings.modems) {
         Json json{{"modem", phone.modem},   {"model", phone.model},     {"condition", phone.condition},
                   {"access", phone.access}, {"network", phone.network}, {"ports", Json::array()}};
         for (const phone::DrivenPort& port : phone.ports) json["ports"].push_back(port.name);
@@ -87,13 +85,15 @@ Json phoneFindingsJson(const PhoneFindings& findings) {
         if (phone.cells) json["cells"] = phone.cells->size();
         if (phone.contexts) json["contexts"] = phone.contexts->size();
         const auto screens = screensOf(phone);
-        if (screens && modems.empty())
+        if (screens)
             json["screens"] = {{"technology", namesOf(screens->technology).name},
                                {"filled", screens->filled},
                                {"partly", screens->partly}};
+        json["lacks"] = lacks;
         modems.push_back(std::move(json));
     }
-    return {{"trouble", findings.trouble}, {"modems", std::move(modems)}, {"lacks", findings.lacks}};
+    const auto lacks = findings.modems.empty() ? std::vector<std::string>() : findings.modems.front().lacks;
+    return {{"trouble", findings.trouble}, {"modems", std::move(modems)}, {"lacks", lacks}};
 }
 
 }  // namespace kelvo

@@ -8,11 +8,16 @@
 
 namespace kelvo {
 
+/// What ModemManager knows of one modem.
+struct ModemFindings {
+    phone::PhoneState phone{};
+    std::vector<std::string> lacks{};  ///< what it refuses of this one
+};
+
 /// What ModemManager knows of the phone.
 struct PhoneFindings {
-    std::string trouble{};                    ///< why there is nothing, or less than there may be
-    std::vector<phone::PhoneState> modems{};  ///< the first first; the others without SIM, cells and data contexts
-    std::vector<std::string> lacks{};         ///< what it refuses of the first
+    std::string trouble{};                ///< why there is nothing of the first modem, or less than there may be
+    std::vector<ModemFindings> modems{};  ///< the first first
 };
 
 /// The findings for people; identities are shortened.

@@ -30,7 +30,7 @@ DoctorInputs systemInputs() {
             .access = [](const std::string& path) { return accessTo(path); },
             .holders = [](const std::string& path) { return holdersOf(path, "/proc"); },
             .modemManagerRuns = modemManagerRuns,
-            .phone = askPhone,
+            .phone = [] { return askPhone(); },
             .probe = probePlace,
             .user = userName()};
 }

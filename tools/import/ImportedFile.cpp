@@ -6,8 +6,8 @@
 #include "telephony/recordings/DlfRecording.h"
 #include "telephony/recordings/FramesRecording.h"
 #include "telephony/recordings/RecordingFile.h"
+#include "tools/ReadSnapshot.h"
 #include "tools/SnapshotCapture.h"
-#include "tools/SnapshotFile.h"
 
 namespace kelvo {
 
@@ -61,7 +61,7 @@ Result<ImportedFile> openCapture(const std::string& path, RecordingFile file) {
 }
 
 Result<ImportedFile> openSnapshot(const std::string& path) {
-    auto snapshot = SnapshotFile::read(path);
+    auto snapshot = readSnapshot(path);
     if (!snapshot) return snapshot.error();
     ImportedFile imported{.kind = RecordingKind::Snapshot, .odd = snapshot->odd};
     for (const SnapshotFile::Entry& entry : snapshot->entries) {

@@ -16,6 +16,7 @@
 
 #include "LogGenerator/Framing.h"
 #include "telephony/recordings/RecordingFile.h"
+#include "tools/ReadSnapshot.h"
 #include "tools/SnapshotCapture.h"
 #include "tools/inputs/AdaptedRecording.h"
 
@@ -166,7 +167,7 @@ Result<Input> Input::of(std::string name, Result<CaptureReader> capture, std::op
 }
 
 Result<Input> Input::ofSnapshot(const std::string& path, std::optional<Technology> chosen) {
-    auto snapshot = SnapshotFile::read(path);
+    auto snapshot = readSnapshot(path);
     if (!snapshot) return snapshot.error();
     const bool holdsTrees = std::ranges::any_of(snapshot->entries, [](const SnapshotFile::Entry& entry) {
         return entry.displayState && entry.displayState.data() == nullptr;

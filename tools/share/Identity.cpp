@@ -19,6 +19,9 @@ constexpr std::uint64_t kBsic[] = {64};
 constexpr std::uint64_t kColour[] = {8};
 constexpr std::uint64_t kPilot[] = {5, 512};
 constexpr std::uint64_t kCellParameter[] = {128, 16384};
+// Between them the whole numbers have as many digits, but for those of a site on the border. The last of all is none.
+constexpr std::uint64_t kENodeB[] = {1, 391, 3907, 39063, 390625, 0xFFFFF, 0x100000};
+constexpr std::uint64_t kRnc[] = {1, 16, 153, 1526, 0xFFF, 0x1000};
 
 }  // namespace
 
@@ -33,6 +36,12 @@ std::span<const std::uint64_t> boundsOf(Identity identity) {
         case Identity::CellParameter: return kCellParameter;
         default: return {};
     }
+}
+
+std::optional<Sited> sitedOf(Identity identity) {
+    if (identity == Identity::EutranCell) return Sited{"eNB", "sector", 8, kENodeB};
+    if (identity == Identity::UtranCell) return Sited{"RNC", "cell of an RNC", 16, kRnc};
+    return std::nullopt;
 }
 
 std::string_view nameOf(Identity identity) {
@@ -52,7 +61,9 @@ std::string_view nameOf(Identity identity) {
         case Identity::Network: return "network";
         case Identity::Area:
         case Identity::SubArea: return "area";
-        case Identity::Cell: return "cell";
+        case Identity::Cell:
+        case Identity::EutranCell:
+        case Identity::UtranCell: return "cell";
         case Identity::PhysicalCell:
         case Identity::ScramblingCode:
         case Identity::Bsic:

@@ -1,6 +1,7 @@
 #pragma once
 
 #include <cstdint>
+#include <optional>
 #include <span>
 #include <string_view>
 
@@ -27,11 +28,13 @@ enum class Identity : std::uint8_t {
     Apn,
 
     // With cells. Those up to LastNumber are numbers; their order is that of kBounds.
-    Country,       ///< MCC
-    Network,       ///< MNC
-    Area,          ///< LAC, TAC
-    SubArea,       ///< routing area, URA
-    Cell,          ///< of a network
+    Country,     ///< MCC
+    Network,     ///< MNC
+    Area,        ///< LAC, TAC
+    SubArea,     ///< routing area, URA
+    Cell,        ///< of a network
+    EutranCell,  ///< the same of LTE, 28 bits: an eNB of 20 and a sector of 8 (3GPP TS 36.413, 9.2.1.38)
+    UtranCell,   ///< of UMTS, likewise: an RNC of 12 and a cell of 16 (3GPP TS 25.331, 10.3.2.2); of fewer bits: GSM's
     PhysicalCell,  ///< of LTE
     ScramblingCode,
     Bsic,
@@ -54,6 +57,16 @@ constexpr bool isNumber(Identity identity) { return identity >= Identity::Countr
 
 /// Where ranges of such a number end: pseudonyms stay within theirs.
 std::span<const std::uint64_t> boundsOf(Identity identity);
+
+/// A number of 28 bits in two parts: the lower one says which part of the site that the upper one names.
+struct Sited {
+    std::string_view site;
+    std::string_view part;
+    int partBits;
+    std::span<const std::uint64_t> bounds;  ///< of sites, all of them
+};
+/// None when the identity has no such parts.
+std::optional<Sited> sitedOf(Identity identity);
 
 /// "telephone number".
 std::string_view nameOf(Identity identity);

@@ -5,11 +5,26 @@
 namespace kelvo {
 
 std::uint32_t Replacer::pseudonym(Identity identity, std::uint32_t value) {
+    const auto sited = sitedOf(identity);
+    if (sited && value >> sited->partBits != 0 && value >> 28 == 0) return sitedPseudonym(*sited, value);
     if (identity != Identity::Temporary) return _pseudonyms.number(nameOf(identity), value, boundsOf(identity));
     const std::uint8_t octets[] = {static_cast<std::uint8_t>(value >> 16), static_cast<std::uint8_t>(value >> 8),
                                    static_cast<std::uint8_t>(value)};
     const Bytes other = _pseudonyms.octets(nameOf(identity), octets);
     return std::uint32_t{other[0]} << 16 | std::uint32_t{other[1]} << 8 | other[2];
+}
+
+/// Parts of one site stay parts of one site, in places that are others on every site.
+std::uint32_t Replacer::sitedPseudonym(const Sited& sited, std::uint32_t value) {
+    const std::uint32_t parts = 1U << sited.partBits;
+    const std::uint32_t site = value / parts;
+    const auto above = std::ranges::upper_bound(sited.bounds, std::uint64_t{site});
+    const std::uint64_t other = _pseudonyms.permuted(sited.site, site, *(above - 1), *above);
+    const bool isLast = site == sited.bounds.back() - 1;
+    if (isLast && value % parts == parts - 1) return value;
+    const std::string purpose = std::string(sited.part) + ' ' + std::to_string(site);
+    const std::uint64_t part = _pseudonyms.permuted(purpose, value % parts, 0, isLast ? parts - 1 : parts);
+    return static_cast<std::uint32_t>(other * parts + part);
 }
 
 std::uint32_t Replacer::number(Identity identity, std::string_view field, std::uint32_t value) {

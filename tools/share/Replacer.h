@@ -40,6 +40,7 @@ public:
 private:
     // Without counting.
     std::uint32_t pseudonym(Identity identity, std::uint32_t value);
+    std::uint32_t sitedPseudonym(const Sited& sited, std::uint32_t value);
     std::optional<std::string> textOf(Identity identity, const std::string& text);
     std::optional<Bytes> bytesOf(Identity identity, ByteView bytes);
 

@@ -27,7 +27,7 @@ constexpr SharedField kBlockErrorsEntry[] = { { 0, u8 }, { 1, u32 }, { 5, u32 } 
 constexpr SharedField kFirstByte[] = { { 13, u8 } };  // RRC state, ciphering, dedicated channel, PBCCH
 constexpr SharedField kCellIdentity[] = {
     { 13, u32 }, { 17, u32 },                       // channels, up and down
-    { 21, u32,            Cell,           "Cell ID" },
+    { 21, u32,            UtranCell,      "Cell ID" },
     { 25, u16,            SubArea,        "URA ID" },
 };
 constexpr SharedField kCellSets[] = { { 13, u16 }, { 15, u8 } };

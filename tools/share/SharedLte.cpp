@@ -18,7 +18,7 @@ constexpr SharedField kServingCell[] = {
     { 13, u8 },
     { 14, u16,             PhysicalCell, "Physical Cell ID" },
     { 16, u16 }, { 18, u16 }, { 20, u8 }, { 21, u8 },  // channels and bandwidths, down and up
-    { 22, u32,             Cell,         "Cell Identity" },
+    { 22, u32,             EutranCell,   "Cell Identity" },
     { 26, u16,             Area,         "Tracking Area Code" },
     { 28, u32 },                                    // band
     { 32, u16,             Country,      "Mobile Country Code" },

@@ -61,6 +61,15 @@ Value sharedFiles(Replacer& replacer, const Dictionary& files) {
     return shared;
 }
 
+/// Which parts a cell's number has, its technology says.
+Identity identityOf(const CellKey& known, const Dictionary& cell) {
+    if (known.identity != Identity::Cell) return known.identity;
+    const Value* const technology = cell.find(kPLCellMonitorCellRadioAccessTechnology);
+    const std::string* const word = technology != nullptr ? technology->string() : nullptr;
+    if (word == nullptr || *word == kPLCellMonitorRadioAccessTechnologyGSM) return Identity::Cell;
+    return *word == kPLCellMonitorRadioAccessTechnologyLTE ? Identity::EutranCell : Identity::UtranCell;
+}
+
 Value sharedCell(Replacer& replacer, const Value& cell) {
     if (!cell.dictionary()) return {};
     const DictionaryRef shared = Dictionary::make();
@@ -75,7 +84,8 @@ Value sharedCell(Replacer& replacer, const Value& cell) {
             replacer.tally().removed(kUnknownKey);
         } else if (const auto number = value.number() != nullptr ? value.number()->int32() : std::nullopt) {
             const auto bits = static_cast<std::uint32_t>(*number);
-            const std::uint32_t other = replacer.number(known->identity, known->name, bits);
+            const Identity identity = identityOf(*known, *cell.dictionary());
+            const std::uint32_t other = replacer.number(identity, known->name, bits);
             shared->set(key, std::int64_t{static_cast<std::int32_t>(other)});
         } else {
             replacer.tally().removed(kUnknownForm);

@@ -29,7 +29,7 @@ constexpr SharedField kServingCell[] = {
     { 14, u8 },                                     // access restrictions
     { 15, u8,              SubArea,       "URA ID" },
     { 17, u16 }, { 19, u16 },                       // channels, up and down
-    { 21, u32,             Cell,          "Cell ID" },
+    { 21, u32,             UtranCell,     "Cell ID" },
     { 25, u8.bit(0) },                              // allowed access
 };
 // clang-format on

@@ -23,8 +23,9 @@ Item {
     readonly property real lineHeight: oneLine ? height : (height - 10) / 2
     readonly property string second: mark === "" || age === "" ? mark + age : mark + ", " + age
     // Without levels the qualities take their place.
-    readonly property string firstFigure: overview.cellsHaveLevel ? level : quality
-    readonly property string secondFigure: overview.cellsHaveLevel ? quality : ""
+    readonly property string firstFigure: overview.cellsHaveLevel ? level : knownQuality
+    readonly property string secondFigure: overview.cellsHaveLevel ? knownQuality : ""
+    readonly property string knownQuality: overview.cellsHaveQuality ? quality : ""
     readonly property real differenceWidth: overview.cellsHaveDifference ? (oneLine ? wideFigure : 80) : 0
     // From right to left.
     readonly property real end: width - 14
@@ -70,6 +71,7 @@ Item {
     Figure {
         x: columns.differenceX
         width: columns.differenceWidth
+        visible: columns.overview.cellsHaveDifference
         text: columns.difference
         font.pixelSize: Math.min(columns.pixelSize, columns.oneLine ? 15 : 14)
     }

@@ -61,15 +61,20 @@ OverviewCard {
     }
 
     // The keyboard stays with its event.
+    function growAbove(added: int) {
+        if (rows.currentRow >= 0)
+            rows.currentRow = Math.min(rows.currentRow + added, rows.count - 1);
+        card.grewAbove(rows.y, added * 52);
+    }
+
     Connections {
         target: card.overview.events
         function onRowsInserted(parent: var, first: int, last: int) {
-            if (first > 0)
-                return;
-            const added = last - first + 1;
-            if (rows.currentRow >= 0)
-                rows.currentRow += added;
-            card.grewAbove(rows.y, added * 52);
+            if (first === 0)
+                card.growAbove(last - first + 1);
+        }
+        function onRowsMoved(parent: var, first: int, last: int) {
+            card.growAbove(last - first + 1);
         }
     }
 }

@@ -9,7 +9,7 @@ FocusScope {
 
     required property KelvoPaneController pane
     required property NavigationStack navigation
-    required property OverviewController overview
+    required property OverviewController overview  // null where there is none
     required property bool wide  // the overview stands beside
 
     Component.onDestruction: navigation.didRemoveView(pane)
@@ -105,6 +105,7 @@ FocusScope {
         width: list.width - 64
         visible: text !== ""
         text: page.pane.emptyText
+        textFormat: Text.PlainText
         horizontalAlignment: Text.AlignHCenter
         wrapMode: Text.Wrap
         color: Theme.secondaryText
@@ -120,7 +121,7 @@ FocusScope {
         title: page.pane.title
         backTitle: page.pane.backTitle
         column: list
-        offersOverview: !page.wide && page.pane.backTitle === ""
+        offersOverview: page.overview !== null && !page.wide && page.pane.backTitle === ""
         onBack: page.navigation.popViewController()
         onOverview: page.overview.show()
     }

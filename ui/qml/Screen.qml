@@ -8,13 +8,14 @@ FocusScope {
     id: screen
 
     required property KelvoApp application
-    property SaveSheet sheet: null
-    property DetailsSheet details: null
+    property var sheet: null  // a SaveSheet
+    property var details: null  // a DetailsSheet
 
-    readonly property OverviewController overview: application.overview
-    readonly property bool wide: width >= 900  // for the panes and the overview side by side
+    readonly property OverviewController overview: application.overview  // null where nothing is live
+    readonly property bool overviewOpen: overview !== null && overview.open
+    readonly property bool wide: overview !== null && width >= 900  // for the panes and the overview side by side
     readonly property bool uncovered: !sheet && !details && !alert.shown
-    property real arrival: overview.open ? 1 : 0  // of the overview over the panes
+    property real arrival: overviewOpen ? 1 : 0  // of the overview over the panes
 
     focus: true
     onWideChanged: giveFocus()
@@ -24,6 +25,13 @@ FocusScope {
             details.rowFrame = page.frameOf(details.details.row);
     }
 
+    // What the first frame does not show is named by its file alone, which is read when it is wanted first: a type's name
+    // would have it read, with all that it is made of, before that frame.
+    function made(file: string, owner: Item, properties: var): var {
+        const all = Object.assign({ application: application, "anchors.fill": owner }, properties);
+        return Qt.createComponent(file).createObject(owner, all);
+    }
+
     function giveFocus() {
         if (alert.shown)
             alert.forceActiveFocus();
@@ -31,7 +39,7 @@ FocusScope {
             sheet.forceActiveFocus();
         else if (details)
             details.forceActiveFocus();
-        else if (overview.open)
+        else if (overviewOpen)
             beside.forceActiveFocus();
         else
             stack.forceActiveFocus();
@@ -39,7 +47,7 @@ FocusScope {
 
     // False where nothing lies behind.
     function back(): bool {
-        if (wide || !overview.open)
+        if (wide || !overviewOpen)
             return application.navigation.popViewController();
         overview.close();
         return true;
@@ -62,7 +70,7 @@ FocusScope {
         width: screen.wide ? Math.max(400, Math.min(640, screen.width - 560)) : screen.width  // 640 is what rows use
         height: screen.height
         focus: true
-        enabled: screen.uncovered && (screen.wide || !screen.overview.open)
+        enabled: screen.uncovered && (screen.wide || !screen.overviewOpen)
 
         pushEnter: Slide { property: "x"; from: stack.width; to: 0 }
         pushExit: Slide { property: "x"; from: 0; to: -stack.width / 3 }
@@ -87,16 +95,23 @@ FocusScope {
         id: beside
         objectName: "beside"
 
-        readonly property bool used: screen.wide || screen.overview.open || screen.arrival > 0
-        property OverviewView view: null
+        readonly property bool used: screen.wide || screen.overviewOpen || screen.arrival > 0
+        property var view: null  // an OverviewView
 
         x: screen.wide ? stack.width : (1 - screen.arrival) * screen.width
         width: screen.wide ? screen.width - stack.width : screen.width
         height: screen.height
-        enabled: screen.uncovered && (screen.wide || screen.overview.open)
+        enabled: screen.uncovered && (screen.wide || screen.overviewOpen)
+
+        function leave() {
+            screen.overview.close();
+            stack.forceActiveFocus();
+        }
+
         onUsedChanged: {
             if (used) {
-                view = overviewView.createObject(beside) as OverviewView;
+                view = screen.made("OverviewView.qml", beside, { wide: Qt.binding(() => screen.wide), focus: true });
+                view.back.connect(leave);
             } else {
                 view.visible = false;  // it lives a moment longer
                 view.destroy();
@@ -107,8 +122,8 @@ FocusScope {
 
     Shortcut {
         sequence: "Ctrl+O"
-        enabled: screen.uncovered
-        onActivated: screen.overview.open ? screen.giveFocus() : screen.overview.show()
+        enabled: screen.uncovered && screen.overview !== null
+        onActivated: screen.overviewOpen ? screen.giveFocus() : screen.overview.show()
     }
 
     Shortcut {
@@ -138,41 +153,11 @@ FocusScope {
     }
 
     Component {
-        id: overviewView
-        OverviewView {
-            anchors.fill: parent
-            focus: true
-            application: screen.application
-            wide: screen.wide
-            onBack: {
-                screen.overview.close();
-                stack.forceActiveFocus();
-            }
-        }
-    }
-
-    Component {
         id: page
         PanePage {
             navigation: screen.application.navigation
             overview: screen.overview
             wide: screen.wide
-        }
-    }
-
-    Component {
-        id: saveSheet
-        SaveSheet {
-            application: screen.application
-            anchors.fill: parent
-        }
-    }
-
-    Component {
-        id: detailsSheet
-        DetailsSheet {
-            application: screen.application
-            anchors.fill: parent
         }
     }
 
@@ -207,7 +192,7 @@ FocusScope {
         target: screen.application
 
         function onSaveViewPresented(presented: KelvoSaveViewController) {
-            screen.sheet = saveSheet.createObject(screen, { "saveView": presented }) as SaveSheet;
+            screen.sheet = screen.made("SaveSheet.qml", screen, { saveView: presented });
             screen.giveFocus();
         }
         function onSaveViewDismissed() {
@@ -217,7 +202,7 @@ FocusScope {
         }
         function onDetailsPresented(presented: DetailsController) {
             const page = stack.currentItem as PanePage;
-            screen.details = detailsSheet.createObject(screen, { "details": presented, "rowFrame": page.frameOf(presented.row) }) as DetailsSheet;
+            screen.details = screen.made("DetailsSheet.qml", screen, { details: presented, rowFrame: page.frameOf(presented.row) });
             screen.giveFocus();
         }
         function onDetailsDismissed() {

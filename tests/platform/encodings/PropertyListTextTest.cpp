@@ -150,6 +150,13 @@ TEST(PropertyList, RefusesAnEmptyDocument) {
     EXPECT_EQ(reason(std::string(std::size_t{16} << 20, ' ')), "empty document");
 }
 
+TEST(PropertyList, IsKnownByItsBeginning) {
+    for (const char* text : {"<?xml version", "\xEF\xBB\xBF<?xml", " \r\n\t<plist ", "<!DOCTYPE plist ", "bplist00"})
+        EXPECT_TRUE(beginsPropertyList(bytesOf(text))) << text;
+    for (const char* text : {"", " ", "<", "<html>", "<!DOCTYPE html>", "{ a = b; }", "no list", "\xEF\xBB\xBF"})
+        EXPECT_FALSE(beginsPropertyList(bytesOf(text))) << text;
+}
+
 TEST(PropertyList, RefusesADocumentOfMoreThanAGibibyteUnread) {
     const std::size_t size = (std::size_t{1} << 30) + 1;
     void* unreadable = mmap(nullptr, size, PROT_NONE, MAP_PRIVATE | MAP_ANONYMOUS | MAP_NORESERVE, -1, 0);

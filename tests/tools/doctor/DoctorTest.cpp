@@ -94,8 +94,9 @@ TEST_F(DoctorTest, TellsWhatModemManagerKnowsAndWhichScreensThatFills) {
     modem.cells = {
         {.technology = phone::MonitoredCell::Technology::LTE, .isServing = true, .pid = 301, .uarfcn = 1300}};
     modem.contexts.emplace();
-    phone.modems = {modem, {.modem = "1", .model = "Other", .condition = "disabled"}};
-    phone.lacks = {"signal values: it says no"};
+    phone::PhoneState other{.modem = "1", .model = "Other", .condition = "disabled"};
+    other.sim.iccid = "8900101000000654321";
+    phone.modems = {{modem, {"signal values: it says no"}}, {other, {"cell information: it is off"}}};
     EXPECT_EQ(findingsText(look()),
               "There is no serial port that a modem may be behind.\n"
               "\n"
@@ -108,14 +109,19 @@ TEST_F(DoctorTest, TellsWhatModemManagerKnowsAndWhichScreensThatFills) {
               "  LTE screens    PDP Context Info, SIM Info, Serving Cell Measurements; in part Serving Cell Info\n"
               "ModemManager's modem 1: Other\n"
               "  it is          disabled\n"
+              "  knows          SIM …4321\n"
+              "  lacks          cell information: it is off\n"
               "\n"
               "Next: run \"kelvo-telephonyd --modemmanager\", and then kelvo\n");
-    phone.modems[0].cells->front().pid.reset();  // no way to say whose levels they are
+    phone.modems[0].phone.cells->front().pid.reset();  // no way to say whose levels they are
     EXPECT_NE(findingsText(look()).find("  LTE screens    PDP Context Info, SIM Info; in part Serving Cell Info\n"),
               std::string::npos);
     const auto json = findingsJson(look())["modemManager"];
     EXPECT_EQ(json["modems"][0]["sim"], "…3456");
     EXPECT_EQ(json["modems"][0]["screens"]["technology"], "LTE");
+    EXPECT_EQ(json["modems"][1]["sim"], "…4321");
+    EXPECT_EQ(json["modems"][1]["lacks"], std::vector<std::string>{"cell information: it is off"});
+    EXPECT_EQ(json["lacks"], std::vector<std::string>{"signal values: it says no"});  // of the first
     EXPECT_EQ(json.dump().find("8600"), std::string::npos);
 }
 

@@ -194,6 +194,59 @@ TEST_F(ReplacerTest, ReplacesNumbersInTheTextsOfScreens) {
     EXPECT_EQ(text(Identity::Temporary, "0x00abcd"), expected);
 }
 
+TEST_F(ReplacerTest, KeepsTheSectorsOfAnENodeBTogetherAndTellsNeitherPart) {
+    // 27439618 is sector 2 of eNB 107186.
+    std::set<std::uint32_t> sites;
+    std::set<std::uint32_t> sectors;
+    for (std::uint32_t sector = 0; sector < 256; ++sector) {
+        const std::uint32_t other = replacer.number(Identity::EutranCell, "field", 27'439'616 + sector);
+        sites.insert(other / 256);
+        sectors.insert(other % 256);
+        EXPECT_NE(other % 256, sector);
+    }
+    ASSERT_EQ(sites.size(), 1U);
+    EXPECT_EQ(sectors.size(), 256U);
+    EXPECT_FALSE(sites.contains(107'186));
+    EXPECT_EQ(text(Identity::EutranCell, "27439618"),
+              std::to_string(replacer.number(Identity::EutranCell, "field", 27'439'618)));
+    EXPECT_EQ(text(Identity::EutranCell, "27439618").size(), 8U);
+}
+
+TEST_F(ReplacerTest, KeepsTwoENodeBsApartAndTheirSectorsInPlacesOfTheirOwn) {
+    std::set<std::uint32_t> sites;
+    std::set<std::uint32_t> places;  // of sector 1
+    for (std::uint32_t site = 391; site < 3907; ++site) {
+        const std::uint32_t other = replacer.number(Identity::EutranCell, "field", site * 256 + 1);
+        EXPECT_NE(other / 256, site);
+        EXPECT_GE(other / 256, 391U);
+        EXPECT_LT(other / 256, 3907U);
+        sites.insert(other / 256);
+        places.insert(other % 256);
+    }
+    EXPECT_EQ(sites.size(), 3516U);
+    EXPECT_GT(places.size(), 200U);
+}
+
+TEST_F(ReplacerTest, KeepsTheCellsOfAnRncTogether) {
+    // 44041665 is cell 1 of RNC 672.
+    const std::uint32_t one = replacer.number(Identity::UtranCell, "field", 44'041'665);
+    const std::uint32_t two = replacer.number(Identity::UtranCell, "field", 44'041'666);
+    const std::uint32_t elsewhere = replacer.number(Identity::UtranCell, "field", 44'041'665 + 65'536);
+    EXPECT_NE(one >> 16, 672U);
+    EXPECT_EQ(one >> 16, two >> 16);
+    EXPECT_NE(one, two);
+    EXPECT_NE(elsewhere >> 16, one >> 16);
+    EXPECT_NE(one & 0xFFFF, 1U);
+}
+
+TEST_F(ReplacerTest, TakesNumbersWithoutASiteAndOfMoreBitsAsTheyAre) {
+    EXPECT_EQ(replacer.number(Identity::EutranCell, "field", 0x0FFFFFFF), 0x0FFFFFFFU);
+    EXPECT_NE(replacer.number(Identity::EutranCell, "field", 0x0FFFFFFE), 0x0FFFFFFEU);
+    EXPECT_NE(replacer.number(Identity::EutranCell, "field", 0x0FFFFFFE), 0x0FFFFFFFU);
+    EXPECT_EQ(replacer.number(Identity::UtranCell, "field", 21'345), replacer.number(Identity::Cell, "field", 21'345));
+    EXPECT_GT(replacer.number(Identity::EutranCell, "field", 0x10000001), 0x0FFFFFFFU);
+}
+
 TEST_F(ReplacerTest, RemovesWhatIsNoNumber) {
     EXPECT_EQ(text(Identity::Cell, "310410123456789"), "(removed)");
     EXPECT_EQ(text(Identity::Cell, "12 Main Street"), "(removed)");

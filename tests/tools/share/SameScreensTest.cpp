@@ -224,7 +224,7 @@ TEST_F(Screens, ShowWhatPhonesTellAsTheyDidBefore) {
                              .bytes()));
         EXPECT_TRUE(show(
             test::cellArray({test::cell(radio, "Serving",
-                                        {{"kPLCellMonitorCellId", 77'123},
+                                        {{"kPLCellMonitorCellId", 44'041'665},
                                          {"kPLCellMonitorTAC", 4566},
                                          {"kPLCellMonitorLAC", 4566},
                                          {"kPLCellMonitorMCC", 262},

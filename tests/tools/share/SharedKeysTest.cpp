@@ -52,6 +52,9 @@ TEST(SharedKeys, KnowEveryScreenAndKeyOfTheTemplates) {
 
 TEST(SharedKeys, TellWhoseNumberACellIdIsByItsScreen) {
     EXPECT_EQ(identityOf("GSM Serving Cell", "Cell ID"), Identity::Cell);
+    EXPECT_EQ(identityOf("UMTS RR Info", "Cell ID"), Identity::UtranCell);
+    EXPECT_EQ(identityOf("Serving Cell Info", "Cell ID"), Identity::UtranCell);
+    EXPECT_EQ(identityOf("Serving Cell Info", "Cell Identity"), Identity::EutranCell);
     EXPECT_EQ(identityOf("Reselection Candidates List", "Cell ID"), Identity::PhysicalCell);
     EXPECT_EQ(identityOf("Neighbor Cell List", "Cell ID"), Identity::CellParameter);
     EXPECT_EQ(identityOf("", "Cell ID"), std::nullopt);

@@ -72,6 +72,23 @@ TEST_F(SharedPayloads, OfCellsKeepLevelsAndChannels) {
     EXPECT_EQ(removed(), 1U);
 }
 
+TEST_F(SharedPayloads, OfCellsTellTheSiteByTheirTechnology) {
+    const auto cell = [](const char* technology, int identity) {
+        return Dictionary::make({{"kPLCellMonitorCellRadioAccessTechnology", technology},
+                                 {"kPLCellMonitorCellType", "kPLCellMonitorCellTypeServing"},
+                                 {"kPLCellMonitorCellId", identity}});
+    };
+    const Value shared = share(0xFF0001, Array::make({cell("kPLCellMonitorRadioAccessTechnologyLTE", 27'439'618),
+                                                      cell("kPLCellMonitorRadioAccessTechnologyUMTS", 44'041'665),
+                                                      cell("kPLCellMonitorRadioAccessTechnologyUTRAN2", 44'041'666)}));
+    const auto identity = [&](std::size_t i) {
+        return (*(*shared.array())[i].dictionary())["kPLCellMonitorCellId"].number()->integer();
+    };
+    EXPECT_EQ(identity(0), replacer.number(Identity::EutranCell, "field", 27'439'618));
+    EXPECT_EQ(identity(1), replacer.number(Identity::UtranCell, "field", 44'041'665));
+    EXPECT_EQ(identity(2), replacer.number(Identity::UtranCell, "field", 44'041'666));
+}
+
 TEST_F(SharedPayloads, OfCellsLeaveOutThoseThatAreNone) {
     const Value shared =
         share(0xFF0001, Array::make({"a cell", Dictionary::make({{"kPLCellMonitorCellType", "home"}})}));

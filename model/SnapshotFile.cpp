@@ -1,33 +1,13 @@
-#include "tools/SnapshotFile.h"
+#include "model/SnapshotFile.h"
 
 #include <fmt/format.h>
 
-#include <span>
-
 #include "LogGenerator/SnapshotFormat.h"
 #include "platform/encodings/PropertyList.h"
-#include "telephony/recordings/RecordingFile.h"
 
 namespace kelvo {
 
 namespace {
-
-Result<Bytes> readFile(const std::string& name) {
-    auto file = RecordingFile::open(name);
-    if (!file) return file.error();
-    Bytes bytes;
-    constexpr std::size_t kChunk = 1 << 16;
-    std::size_t count = kChunk;
-    while (count == kChunk) {
-        const std::size_t length = bytes.size();
-        bytes.resize(length + kChunk);
-        const auto got = file->read(std::span(bytes).subspan(length));
-        if (!got) return got.error();
-        count = *got;
-        bytes.resize(length + count);
-    }
-    return bytes;
-}
 
 /// Reads values out of one dictionary and notes what is of another kind than it should be.
 class Reader {
@@ -68,12 +48,9 @@ SnapshotFile::Entry entryFrom(const Value& value, std::size_t number, std::vecto
 
 }  // namespace
 
-Result<SnapshotFile> SnapshotFile::read(const std::filesystem::path& path) {
-    const std::string name = path.string();
-    const Result<Bytes> bytes = readFile(name);
-    if (!bytes) return bytes.error();
-    if (bytes->empty()) return Failure{name + " is empty"};
-    const Result<Value> tree = readPropertyList(*bytes);
+Result<SnapshotFile> SnapshotFile::read(const std::string& name, ByteView bytes) {
+    if (bytes.empty()) return Failure{name + " is empty"};
+    const Result<Value> tree = readPropertyList(bytes);
     if (!tree) return Failure{name + " is not a snapshot: " + tree.error().reason};
     const DictionaryRef& dictionary = tree->dictionary();
     if (!dictionary) return Failure{fmt::format("{} is not a snapshot: it holds a {}", name, kindName(tree->kind()))};

@@ -1,10 +1,10 @@
 #pragma once
 
-#include <filesystem>
 #include <optional>
 #include <string>
 #include <vector>
 
+#include "platform/values/Bytes.h"
 #include "platform/values/Result.h"
 #include "platform/values/Value.h"
 
@@ -26,8 +26,9 @@ struct SnapshotFile {
     std::vector<Entry> entries;
     std::vector<std::string> odd;  ///< one short sentence each
 
-    /// Reads a file that may be cut, hostile or something else altogether: a failure's reason names the file.
-    static Result<SnapshotFile> read(const std::filesystem::path& path);
+    /// Reads the bytes of the file called `name`, which may be cut, hostile or something else altogether: a failure's
+    /// reason names the file.
+    static Result<SnapshotFile> read(const std::string& name, ByteView bytes);
 };
 
 }  // namespace kelvo

@@ -103,8 +103,8 @@ class Completion(unittest.TestCase):
         self.assertEqual(self.offered("kelvoctl share sa"), {"saved.kelvo"})
         for command in ("export", "report", "share", "events"):
             self.assertEqual((command, self.offered(f"kelvoctl {command} dr")), (command, {"drive.pcap"}))
-        self.assertEqual(self.offered("kelvo-modem --replay ro"), {"road.frames"})
         self.assertEqual(self.offered("kelvo dr"), {"drive.pcap"})
+        self.assertEqual(self.offered("kelvo-modem --replay ro"), {"road.frames"})
         self.assertEqual(self.offered("kelvo sa"), {"saved.kelvo"})
 
     before_comma = "noise,"

@@ -12,9 +12,9 @@ namespace {
 
 constexpr const char* kFooter =
     "Without a file, what it shows comes from the telephony service, kelvo-telephonyd, and a second start brings the\n"
-    "window of the first to the front. A snapshot has a window of its own, which shows its screens as they were "
-    "saved.\n"
-    "What a file is, its content tells. In a terminal, \"kelvoctl watch\" and \"kelvoctl snapshot\" show the same.\n\n"
+    "window of the first to the front. A snapshot has a window of its own, which shows the screens as they were\n"
+    "saved. What a file is, its content tells. In a terminal, \"kelvoctl watch\" and \"kelvoctl snapshot\" show the\n"
+    "same.\n\n"
     "Examples:\n"
     "  kelvo\n"
     "  kelvo drive.pcap\n"

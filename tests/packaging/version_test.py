@@ -49,8 +49,8 @@ class Commit(unittest.TestCase):
         self.addCleanup(self._directory.cleanup)
         self.tree = Path(self._directory.name) / "kelvo"
         (self.tree / "cmake").mkdir(parents=True)
-        for name in (".gitattributes", "cmake/archive-commit"):
-            (self.tree / name).write_text((SOURCE / name).read_text())
+        (self.tree / ".gitattributes").write_text((SOURCE / ".gitattributes").read_text())
+        (self.tree / "cmake/archive-commit").write_text("$Format:%H$\n")  # SOURCE may be out of an archive itself
         (self.tree / "file").write_text("as it was\n")
 
     def commit(self):

@@ -1,7 +1,9 @@
 #include <gtest/gtest.h>
 
 #include <QQuickItem>
+#include <QTest>
 
+#include "tests/support/TimeZone.h"
 #include "tests/ui/SavedSample.h"
 #include "tests/ui/ScreenFixture.h"
 
@@ -16,6 +18,8 @@ using test::text;
 /// A saved snapshot in the application's own screens.
 class SnapshotWindow : public test::ScreenFixture {
 protected:
+    const test::TimeZone zone{"UTC"};  // of the reader, in which a snapshot's time is told
+
     /// On an installation that permits saving.
     void open(std::shared_ptr<const SavedScreens> saved, QSize size = {360, 640}) {
         scene = std::make_unique<Scene>(true, size, std::move(saved));

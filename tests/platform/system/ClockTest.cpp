@@ -2,36 +2,12 @@
 
 #include <gtest/gtest.h>
 
-#include <cstdlib>
-#include <optional>
-#include <string>
+#include "tests/support/TimeZone.h"
 
 namespace kelvo {
 namespace {
 
-/// Takes the process into a time zone for as long as it lives.
-class TimeZone {
-public:
-    explicit TimeZone(const char* zone) {
-        if (const char* before = ::getenv("TZ")) _before = before;
-        enter(zone);
-    }
-    ~TimeZone() { enter(_before ? _before->c_str() : nullptr); }
-    TimeZone(const TimeZone&) = delete;
-    TimeZone& operator=(const TimeZone&) = delete;
-
-private:
-    static void enter(const char* zone) {
-        if (zone != nullptr) {
-            ::setenv("TZ", zone, 1);
-        } else {
-            ::unsetenv("TZ");
-        }
-        ::tzset();
-    }
-
-    std::optional<std::string> _before;
-};
+using test::TimeZone;
 
 /// The local time at a number of seconds since 1970-01-01 00:00 UTC.
 std::tm localAt(long long unixSeconds) {

@@ -1,5 +1,7 @@
 #include "telephony/wire/modem/PlayedModem.h"
 
+#include <cstring>
+
 #include "tests/telephony/wire/modem/PlayedModemFixture.h"
 
 namespace kelvo::test {

@@ -12,7 +12,7 @@ if("${CMAKE_CXX_COMPILER_LAUNCHER}" MATCHES "ccache" AND NOT "$ENV{CCACHE_SLOPPI
 endif()
 
 # What most files include one way or another takes half of the time that they are compiled for. A file still includes
-# whatever it uses: the thread sanitizer's build precompiles nothing.
+# whatever it uses: the packages' build and the thread sanitizer's precompile nothing.
 set(KELVO_COMMON_HEADERS <algorithm> <chrono> <functional> <memory> <optional> <string> <string_view> <utility> <vector>
     <fmt/format.h>)
 
